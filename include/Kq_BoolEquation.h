@@ -1,0 +1,201 @@
+// Boolean equations: text in, tree, values, truth table and look-up-table init values out.
+// The class that callers hold; it owns one engine object and forwards to it.
+// Fails: bad input answers false, 0 or empty; only std::bad_alloc is ever thrown.
+// Threads: equations and everything made from them belong to one thread at a time, process-wide.
+#ifndef KQ_BOOLEQUATION_H
+#define KQ_BOOLEQUATION_H
+
+#include <cstddef>
+#include <utility>
+#include <vector>
+
+#include <port/Port_StringBase.h>
+
+#define KQ_EXPORT __attribute__((visibility("default")))
+
+class Kq_BoolEquationImp;
+class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
+
+// Invariants:
+// 1. m_imp is owned by this object alone and comes from the engine class's own operator new.
+// 2. Copies share parsed nodes inside the engine, never variable values.
+class KQ_EXPORT Kq_BoolEquation {
+  public:
+    class Handle;
+    class TruthTable;
+
+    // No equation, no variables.
+    Kq_BoolEquation();
+    // Sets 'equation'; a text that is refused leaves the object empty, which operator! tells.
+    Kq_BoolEquation(const Port::StringBase<char>& equation);
+    Kq_BoolEquation(const Kq_BoolEquation& other);
+    ~Kq_BoolEquation();
+
+    // Three names for one operation: takes the other's equation, variables and values.
+    // Fails: std::bad_alloc, and this object is as it was.
+    Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
+    void Copy(const Kq_BoolEquation& other);
+    void SetEquationFromEquation(const Kq_BoolEquation& other);
+
+    // Removes equation and variables.
+    void Clear();
+    // Sets the equation from an expression in any accepted syntax, or from an init value
+    // ("0x8", "0b1000") over the variables that are defined now, the first the most significant.
+    // Every variable starts at 0, numbered by first occurrence.
+    // Fails: false, and neither equation nor variables are left.
+    // Cost: in step with the text; for an init value, with the expression it stands for.
+    bool SetEquation(const Port::StringBase<char>& equation);
+    // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
+    // text that are no terms follow them. A term that is no legal name or stands twice is skipped.
+    // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
+    // number instead of the highest; 'reverseTerms' defines the terms from the last to the first.
+    // Fails: false, and neither equation nor variables are left.
+    bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
+                                      const Port::StringBase<char>& equation, bool termOrderFlag,
+                                      bool reverseTerms);
+
+    // What the equation was set from: an expression, an init value "0x..." or one "0b...".
+    bool IsExpression() const;
+    bool IsHexInitValue() const;
+    bool IsBinaryInitValue() const;
+
+    // The equation as text, each operator as it was typed (an init value as it was given), or in
+    // one of the three fixed syntaxes (& | ^ ~, * + @ ~, .AND. .OR. .XOR. ~). 'spaces' puts one
+    // blank between tokens. Empty without an equation.
+    // Deliberate: parentheses are written where they were typed and nowhere else, so an equation
+    // with a negated operator ("A ~ | B") followed by another one need not read back the same.
+    Port::StringBase<char> GetEquation(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt1(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt2(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt3(bool spaces) const;
+    // GetEquation for an expression, GetEquationAlt1 for an init value: never "0x...".
+    Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
+
+    // The result column as one number, row 2^n-1 first, leading zeros kept: "0x" and a digit for
+    // four rows (one digit for n = 1), "0b" and a digit for each row. 1 to 30 variables.
+    // Deliberate: without a truth table (a constant, no equation, over 30 variables) the texts are
+    // "0x0" and "0b", for the constant 1 as well.
+    // Cost: O(nodes * 2^n / 64).
+    Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
+    Port::StringBase<char> GetEquationAsBinaryInitValue() const;
+    // All variable names joined with "+", the last one first; empty without variables.
+    Port::StringBase<char> GetInitValueTermEquation() const;
+
+    // Is there no equation; is there one (null or a value that is only for testing).
+    bool operator!() const;
+    operator Kq_PtrTester*() const;
+    // True for the same tree: same operators, groups and names. Spelling of operators, variable
+    // tables and values do not count; two spellings of one function are not equal.
+    bool operator==(const Kq_BoolEquation& other) const;
+    bool operator!=(const Kq_BoolEquation& other) const;
+
+    // The result, 0 or 1, for the current variable values; 0 without an equation.
+    unsigned int Eval() const;
+    // Adds a variable behind the others; 'value' counts as 1 unless 0. A name is letters, digits
+    // and '_', not starting with a digit, or anything that starts with ' and has a second '.
+    // Fails: false for a name already there (its value stays) or not legal.
+    bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
+    bool IsVariableDefined(const Port::StringBase<char>& name) const;
+    bool IsVariableDefined(const Handle& handle) const;
+    // Fails: false when there is no such variable.
+    bool SetVariable(const Port::StringBase<char>& name, unsigned int value);
+    bool SetVariable(const Handle& handle, unsigned int value);
+    // The value, 0 or 1; 0 when there is no such variable.
+    unsigned int GetVariable(const Port::StringBase<char>& name) const;
+    unsigned int GetVariable(const Handle& handle) const;
+    // A handle that stands for the name from now on; empty when there is no such variable.
+    Handle GetVariableHandle(const Port::StringBase<char>& name) const;
+    unsigned int GetNumVariables() const;
+    // The table, in order of definition; any later definition invalidates the reference.
+    const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
+
+    // The full table of results; empty for 0 or more than 30 variables.
+    TruthTable GetTruthTable() const;
+    // The engine object; it belongs to this object.
+    const Kq_BoolEquationImp* GetImp() const;
+    // Writes everything about the equation, its truth table too, to the message manager.
+    void Dbg() const;
+
+  private:
+    Kq_BoolEquationImp* m_imp;
+};
+
+// A variable found once by name. Element 0 is the variable index, the others are the positions of
+// the nodes with that name, ascending. Empty: no such variable.
+// Deliberate: a handle is a cached index. Any equation whose table is long enough honours it; the
+// name is not checked again.
+class KQ_EXPORT Kq_BoolEquation::Handle {
+  public:
+    Handle();
+    Handle(const Handle& other);
+    ~Handle();
+    Handle& operator=(const Handle& other);
+
+    unsigned int* begin();
+    const unsigned int* begin() const;
+    unsigned int* end();
+    const unsigned int* end() const;
+    bool empty() const;
+    size_t size() const;
+    bool operator==(const Handle& other) const;
+    bool operator!=(const Handle& other) const;
+    void Dbg() const;
+
+  private:
+    friend class Kq_BoolEquationImp;
+    explicit Handle(const std::vector<unsigned int>& values);
+    std::vector<unsigned int> m_values;
+};
+
+// Every assignment of an equation's variables with its result; a value that keeps no link to the
+// equation. Row k is the assignment whose binary number, first variable most significant, is k.
+class KQ_EXPORT Kq_BoolEquation::TruthTable {
+  public:
+    class Row;
+
+    TruthTable();
+    TruthTable(const TruthTable& other);
+    TruthTable(const Kq_BoolEquation& equation);
+    ~TruthTable();
+    TruthTable& operator=(const TruthTable& other);
+    TruthTable& operator=(const Kq_BoolEquation& equation);
+
+    // Same names in the same order and the same rows; the text is not compared.
+    bool operator==(const TruthTable& other) const;
+    bool operator!=(const TruthTable& other) const;
+    // Are there no variable names; are there some.
+    bool operator!() const;
+    operator Kq_PtrTester*() const;
+
+    // Copies: changing them does not change the table.
+    std::vector<Port::StringBase<char>> GetVariableNames() const;
+    std::vector<Row> GetRows() const;
+    void Dbg() const;
+
+  private:
+    friend class Kq_BoolEquation;
+    struct Imp;
+    void Build(const Kq_BoolEquation& equation);
+    Imp* m_imp; // owned
+};
+
+// One assignment and its result.
+class KQ_EXPORT Kq_BoolEquation::TruthTable::Row {
+  public:
+    Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
+    Row(const Row& other);
+    ~Row();
+    Row& operator=(const Row& other);
+    bool operator==(const Row& other) const;
+    bool operator!=(const Row& other) const;
+    unsigned int GetResultValue() const;
+    // One value for each variable, in column order.
+    std::vector<unsigned int> GetVariableValues() const;
+    void Dbg() const;
+
+  private:
+    struct Imp;
+    Imp* m_imp; // owned
+};
+
+#endif

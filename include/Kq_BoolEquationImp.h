@@ -1,0 +1,192 @@
+// The engine behind Kq_BoolEquation: a shared tree of nodes and a variable table of its own.
+// Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
+// Fails: bad input answers false, 0 or empty; only std::bad_alloc is ever thrown.
+#ifndef KQ_BOOLEQUATIONIMP_H
+#define KQ_BOOLEQUATIONIMP_H
+
+#include <map>
+#include <memory>
+
+#include <Kq_BoolEquation.h>
+
+// Invariants:
+// 1. m_store is never null; its count is the number of engine objects that point at it.
+// 2. Variable names are unique; a variable's position is its index, its value is 0 or 1.
+// 3. The list of a set equation is its tree in pre-order, and every ID node's value is the index
+//    of the variable with its name.
+class KQ_EXPORT Kq_BoolEquationImp {
+  public:
+    class Node;
+    class StringMgr;
+    class TruthTable;
+    // The shared nodes; completed inside the library.
+    struct Store;
+
+    Kq_BoolEquationImp();
+    // Shares the other's nodes, copies its variables.
+    Kq_BoolEquationImp(const Kq_BoolEquationImp& other);
+    ~Kq_BoolEquationImp();
+    // Fails: std::bad_alloc, and this object is as it was.
+    Kq_BoolEquationImp& operator=(const Kq_BoolEquationImp& other);
+    void Copy(const Kq_BoolEquationImp& other);
+
+    // Removes equation and variables; other objects that share the nodes keep them.
+    void Clear();
+    // See Kq_BoolEquation.
+    bool SetEquation(const Port::StringBase<char>& text);
+    bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
+                                      const Port::StringBase<char>& equation, bool termOrderFlag,
+                                      bool reverseTerms);
+    unsigned int Eval() const;
+
+    // Equal lists in length and equal trees, node by node; variables do not count.
+    bool operator==(const Kq_BoolEquationImp& other) const;
+    bool operator!=(const Kq_BoolEquationImp& other) const;
+    bool operator!() const;
+    operator Kq_PtrTester*() const;
+    bool IsExpression() const;
+
+    // Appends one node for each token of 'text' to the empty list; links nothing. Does nothing for
+    // a null or empty text or a list that is not empty. A text that is refused clears the object.
+    // The text ends at its first NUL byte.
+    void TokenizeNodes(const char* text);
+    // Links the listed nodes into a tree, checks it and records its root. Does nothing when there
+    // is a root or no node. A list that is no equation clears the object.
+    void BuildTree();
+
+    // Renderings, init values and variables: see Kq_BoolEquation.
+    Port::StringBase<char> GetEquation(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt1(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt2(bool spaces) const;
+    Port::StringBase<char> GetEquationAlt3(bool spaces) const;
+    Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
+
+    bool IsHexInitValue() const;
+    bool IsBinaryInitValue() const;
+    Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
+    Port::StringBase<char> GetEquationAsBinaryInitValue() const;
+    Port::StringBase<char> GetInitValueTermEquation() const;
+
+    bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
+    bool IsVariableDefined(const Port::StringBase<char>& name) const;
+    bool IsVariableDefined(const Kq_BoolEquation::Handle& handle) const;
+    bool SetVariable(const Port::StringBase<char>& name, unsigned int value);
+    bool SetVariable(const Kq_BoolEquation::Handle& handle, unsigned int value);
+    unsigned int GetVariable(const Port::StringBase<char>& name) const;
+    unsigned int GetVariable(const Kq_BoolEquation::Handle& handle) const;
+    Kq_BoolEquation::Handle GetVariableHandle(const Port::StringBase<char>& name) const;
+    unsigned int GetNumVariables() const;
+    const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
+
+    TruthTable GetTruthTable() const;
+
+    // The root of the tree, null without an equation. The nodes belong to the object and live
+    // until it, and every copy that shares them, is set, cleared or destroyed.
+    const Node* GetRoot() const;
+
+    void Dbg() const;
+
+    // Exactly the size of an engine object comes from the class allocator.
+    // Deliberate: another size is served by mav_malloc with the size of one engine object, so a
+    // derived class that adds members must bring operators of its own.
+    // Fails: std::bad_alloc.
+    static void* operator new(size_t size);
+    static void operator delete(void* memory, size_t size);
+
+    // While on, Eval and the tree builder trace what they do. Off unless the environment variable
+    // MAV_KQ_BOOL_EQUATION_DEBUG exists when the library is loaded.
+    static bool GetInternalDebugMode();
+    static void SetInternalDebugMode(bool on);
+
+    static std::allocator<Kq_BoolEquationImp> m_kq_boolequationimp_mem;
+
+  private:
+    typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
+
+    bool SetExpression(const char* text);
+    bool FinishEquation(const Port::StringBase<char>* initValue);
+    void DefineListedNames();
+    size_t FindVariable(const Port::StringBase<char>& name) const;
+    bool HasTruthTableRoot() const;
+    bool HasInitValuePrefix(char lowerCase, char upperCase) const;
+
+    Store* m_store;
+    std::vector<Variable> m_variables;
+};
+
+// The process-wide pool of names: each distinct name is kept once, until unload.
+// A trie with one node for each character of a name; it only grows.
+class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
+  public:
+    StringMgr();
+    ~StringMgr();
+    StringMgr(const StringMgr&) = delete;
+    StringMgr& operator=(const StringMgr&) = delete;
+
+    // The one string equal to 'name' (null counts as empty), made on first request.
+    // Valid until the pool is destroyed.  Fails: std::bad_alloc; the pool stays usable.
+    // Cost: one ordered-map search for each character.
+    const Port::StringBase<char>& find(const char* name);
+
+  private:
+    struct StringMgrNode;
+
+    static void cleanup(StringMgrNode* node);
+
+    StringMgrNode* m_root;
+};
+
+// The engine's truth table. Empty (no names, no rows, no text) or built (n names, 2^n rows); row k
+// is the assignment whose binary number, first variable most significant, is k.
+class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
+  public:
+    class Row;
+
+    TruthTable();
+    TruthTable(const Kq_BoolEquationImp& equation);
+    TruthTable(const TruthTable& other);
+    ~TruthTable();
+    TruthTable& operator=(const TruthTable& other);
+    TruthTable& operator=(const Kq_BoolEquationImp& equation);
+
+    // Tabulates 'equation' over all its variables; values set on it stay as they are.
+    // Stays empty without a tree, without variables and, deliberately, with more than 30.
+    // Fails: std::bad_alloc, with the rows appended so far.
+    void Build(const Kq_BoolEquationImp& equation);
+
+    const std::vector<Port::StringBase<char>>& GetVariableNames() const;
+    const std::vector<Row>& GetRows() const;
+
+    // Same names in the same order and the same rows; the text is not compared.
+    bool operator==(const TruthTable& other) const;
+    bool operator!=(const TruthTable& other) const;
+    bool operator!() const;
+    operator Kq_PtrTester*() const;
+    void Dbg() const;
+
+  private:
+    std::vector<Port::StringBase<char>> m_variable_names;
+    std::vector<Row> m_rows;
+    Port::StringBase<char> m_equation;
+};
+
+class KQ_EXPORT Kq_BoolEquationImp::TruthTable::Row {
+  public:
+    Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
+    Row(const Row& other);
+    ~Row();
+    Row& operator=(const Row& other);
+
+    unsigned int GetResultValue() const;
+    const std::vector<unsigned int>& GetVariableValues() const;
+
+    bool operator==(const Row& other) const;
+    bool operator!=(const Row& other) const;
+    void Dbg() const;
+
+  private:
+    std::vector<unsigned int> m_variable_values;
+    unsigned int m_result_value;
+};
+
+#endif

@@ -1,0 +1,62 @@
+// The host tool chain's byte string, as the library's interface uses it.
+// Default host library: a thin class over the standard string. Another host puts its own header of
+// this name first on the include path; the library needs only the members declared here.
+#ifndef PORT_STRINGBASE_H
+#define PORT_STRINGBASE_H
+
+#include <cstddef>
+#include <string>
+
+namespace Port {
+
+template <class CharT>
+class StringBase;
+
+// A byte string of any length; bytes of value 0 may stand in it.
+// A null 'const char*' counts as the empty text.  Fails: std::bad_alloc only.
+template <>
+class StringBase<char> {
+  public:
+    StringBase() = default;
+    // Implicit, so that a literal can be passed where a string is asked for.
+    StringBase(const char* text) : m_text(text ? text : "") {}
+    StringBase(const StringBase& other) = default;
+    StringBase(StringBase&& other) noexcept = default;
+    ~StringBase() = default;
+
+    StringBase& operator=(const StringBase& other) = default;
+    StringBase& operator=(StringBase&& other) noexcept = default;
+    StringBase& operator=(const char* text)
+    {
+        m_text = text ? text : "";
+        return *this;
+    }
+
+    StringBase& operator+=(const StringBase& other)
+    {
+        m_text += other.m_text;
+        return *this;
+    }
+    StringBase& operator+=(const char* text)
+    {
+        m_text += text ? text : "";
+        return *this;
+    }
+    StringBase& operator+=(char character)
+    {
+        m_text += character;
+        return *this;
+    }
+
+    // Number of bytes, a terminating 0 not counted.
+    std::size_t length() const { return m_text.length(); }
+    // The bytes, followed by a 0; valid until the string changes.
+    const char* c_str() const { return m_text.c_str(); }
+
+  private:
+    std::string m_text;
+};
+
+} // namespace Port
+
+#endif

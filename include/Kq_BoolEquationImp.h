@@ -103,10 +103,15 @@ class KQ_EXPORT Kq_BoolEquationImp {
   private:
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
 
-    bool SetExpression(const char* text);
+    static StringMgr& GetNamePool();
+
+    bool SetExpression(const char* text, const Port::StringBase<char>* initValue);
     bool FinishEquation(const Port::StringBase<char>* initValue);
+    void AddTruthTableRoot(const Port::StringBase<char>& initValue);
+    void DefineTerms(const std::vector<Port::StringBase<char>>& terms, bool reverseTerms);
     void DefineListedNames();
     size_t FindVariable(const Port::StringBase<char>& name) const;
+    std::vector<Port::StringBase<char>> GetVariableNames() const;
     bool HasTruthTableRoot() const;
     bool HasInitValuePrefix(char lowerCase, char upperCase) const;
 

@@ -109,8 +109,10 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
   private:
     friend class Kq_BoolEquationImp;
 
-    // Dbg of a node that broke a build: at most 256 node lines, then "NODE: ...\n".
+    // Dbg for the node that broke a build: bounded, as a whole text can hang below it.
     void DbgFailure() const;
+    void DbgLines(int depth, size_t maxNodes) const;
+    void DbgLine(int depth) const;
     void Dbg(int depth) const;
     void DbgName(Port::StringBase<char>& name) const;
     void DbgPrefix(int numPieces) const;

@@ -1,0 +1,368 @@
+// The engine object: life, sharing of nodes, setting an equation, evaluation, dumps.
+// Statics with a run-time initialiser stand here, in the order that they need.
+// Fails: false or 0, with the object cleared when setting fails; std::bad_alloc.
+#include <Kq_BoolEquationImp.h>
+
+#include <new>
+#include <string>
+#include <unordered_map>
+
+#include <port/Port_Env.h>
+#include <port/Port_Init.h>
+#include <port/mav_malloc.h>
+
+#include "Kq_BoolEquationImpDiag.h"
+#include "Kq_BoolEquationImpInitText.h"
+#include "Kq_BoolEquationImpStore.h"
+#include "Kq_BoolEquationImpWalk.h"
+
+typedef Port::StringBase<char> String;
+typedef Kq_BoolEquationImp::Node Node;
+
+namespace {
+
+// The host's services come first: everything below may use them.
+Port::FileInit s_fileInit;
+Port::PathListInit s_pathListInit;
+Port_MsgManInit s_msgManInit;
+InstanceTableInit s_instanceTableInit;
+FactoryInit s_factoryInit;
+
+// The pool of names, from load to unload. With it the texts of nodes are made, so that they
+// outlive every equation, also one that is a static object elsewhere.
+struct NamePool {
+    NamePool()
+    {
+        const Node node;
+        node.GetTypeName();
+        node.GetTokenAlt1();
+    }
+    Kq_BoolEquationImp::StringMgr m_names;
+};
+NamePool s_namePool;
+
+// Any value counts, an empty one too; read at load and never again.
+bool s_internalDebugMode = Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr;
+
+// Whether the trees at 'left' and 'right', either of which may be null, have equal nodes.
+bool IsSameTree(const Node* left, const Node* right)
+{
+    struct Pair {
+        const Node* left;
+        const Node* right;
+    };
+    KqStack<Pair, 64> pending;
+    pending.Push({left, right});
+    while (!pending.IsEmpty()) {
+        const Pair pair = pending.Pop();
+        if (!pair.left != !pair.right)
+            return false;
+        if (!pair.left)
+            continue;
+        if (*pair.left != *pair.right)
+            return false;
+        pending.Push({pair.left->GetRightChild(), pair.right->GetRightChild()});
+        pending.Push({pair.left->GetLeftChild(), pair.right->GetLeftChild()});
+    }
+    return true;
+}
+
+} // namespace
+
+std::allocator<Kq_BoolEquationImp> Kq_BoolEquationImp::m_kq_boolequationimp_mem;
+
+Kq_BoolEquationImp::Kq_BoolEquationImp() : m_store(new Store) {}
+
+Kq_BoolEquationImp::Kq_BoolEquationImp(const Kq_BoolEquationImp& other)
+    : m_store(other.m_store), m_variables(other.m_variables)
+{
+    ++m_store->m_count;
+}
+
+Kq_BoolEquationImp::~Kq_BoolEquationImp()
+{
+    Store::Release(m_store);
+}
+
+Kq_BoolEquationImp& Kq_BoolEquationImp::operator=(const Kq_BoolEquationImp& other)
+{
+    std::vector<Variable> variables(other.m_variables);
+    m_variables.swap(variables);
+    // Counted before the old store is let go, so assignment among copies is harmless.
+    ++other.m_store->m_count;
+    Store* old = m_store;
+    m_store = other.m_store;
+    Store::Release(old);
+    return *this;
+}
+
+void Kq_BoolEquationImp::Copy(const Kq_BoolEquationImp& other)
+{
+    *this = other;
+}
+
+void Kq_BoolEquationImp::Clear()
+{
+    if (m_store->m_count == 1) {
+        m_store->FreeNodes();
+    } else {
+        Store* fresh = new Store;
+        Store::Release(m_store);
+        m_store = fresh;
+    }
+    m_variables.clear();
+}
+
+bool Kq_BoolEquationImp::SetEquation(const String& text)
+{
+    const String copy = text; // may be one of the names that are cleared on the way
+    if (KqInitText::IsCandidate(copy)) {
+        const std::string expression = KqInitText::Expand(copy, GetVariableNames(), false);
+        if (!expression.empty())
+            return SetExpression(expression.c_str(), &copy);
+        // Deliberate: what is no init value over these variables is read as an expression.
+    }
+    return SetExpression(copy.c_str(), nullptr);
+}
+
+// Sets the equation from an expression; 'initValue' is the init value it stands for, null if none.
+bool Kq_BoolEquationImp::SetExpression(const char* text, const String* initValue)
+{
+    Clear();
+    TokenizeNodes(text);
+    return FinishEquation(initValue);
+}
+
+// Makes an equation of the tokens listed: tree, variables, the init value's own root, pre-order.
+bool Kq_BoolEquationImp::FinishEquation(const String* initValue)
+{
+    BuildTree();
+    if (!m_store->m_root) {
+        Clear();
+        return false;
+    }
+    // Variables are numbered in the order of the text, which pre-order need not be.
+    DefineListedNames();
+    if (initValue)
+        AddTruthTableRoot(*initValue);
+    // A second list, so that a failed allocation leaves the first one whole.
+    std::vector<Node*> nodes;
+    nodes.reserve(m_store->m_nodes.size());
+    KqWalkPreOrder(m_store->m_root, 0, [&](Node* node, size_t) {
+        nodes.push_back(node);
+        return true;
+    });
+    m_store->m_nodes.swap(nodes);
+    KqCheckStore(*m_store);
+    return true;
+}
+
+void Kq_BoolEquationImp::AddTruthTableRoot(const String& initValue)
+{
+    std::unique_ptr<Node> table(new Node(Node::TRUTH_TABLE, initValue));
+    m_store->m_nodes.push_back(table.get());
+    Node* root = table.release();
+    root->SetLeftChild(m_store->m_root);
+    m_store->m_root->SetParent(root);
+    m_store->m_root = root;
+}
+
+unsigned int Kq_BoolEquationImp::Eval() const
+{
+    if (!m_store->m_root)
+        return 0;
+    const unsigned int value = m_store->m_root->Eval(m_variables);
+    if (GetInternalDebugMode())
+        m_store->m_root->Dbg();
+    return value;
+}
+
+bool Kq_BoolEquationImp::operator==(const Kq_BoolEquationImp& other) const
+{
+    // Deliberate: variables and values do not count.
+    return m_store == other.m_store || (m_store->m_nodes.size() == other.m_store->m_nodes.size() &&
+                                        IsSameTree(m_store->m_root, other.m_store->m_root));
+}
+
+bool Kq_BoolEquationImp::operator!=(const Kq_BoolEquationImp& other) const
+{
+    return !(*this == other);
+}
+
+bool Kq_BoolEquationImp::operator!() const
+{
+    return !m_store->m_root;
+}
+
+Kq_BoolEquationImp::operator Kq_PtrTester*() const
+{
+    // Never dereferenced; any address that is not null will do.
+    return reinterpret_cast<Kq_PtrTester*>(m_store->m_root);
+}
+
+bool Kq_BoolEquationImp::IsExpression() const
+{
+    return m_store->m_root && !HasTruthTableRoot();
+}
+
+bool Kq_BoolEquationImp::HasTruthTableRoot() const
+{
+    return m_store->m_root && m_store->m_root->GetType() == Node::TRUTH_TABLE;
+}
+
+const Node* Kq_BoolEquationImp::GetRoot() const
+{
+    return m_store->m_root;
+}
+
+void* Kq_BoolEquationImp::operator new(size_t size)
+{
+    if (size == sizeof(Kq_BoolEquationImp))
+        return m_kq_boolequationimp_mem.allocate(1);
+    // Deliberate: the size of one engine object, whatever size was asked for.
+    void* memory = mav_malloc(sizeof(Kq_BoolEquationImp));
+    if (!memory)
+        throw std::bad_alloc();
+    return memory;
+}
+
+void Kq_BoolEquationImp::operator delete(void* memory, size_t size)
+{
+    if (size != sizeof(Kq_BoolEquationImp))
+        mav_free(memory);
+    else if (memory)
+        m_kq_boolequationimp_mem.deallocate(static_cast<Kq_BoolEquationImp*>(memory), 1);
+}
+
+bool Kq_BoolEquationImp::GetInternalDebugMode()
+{
+    return s_internalDebugMode;
+}
+
+void Kq_BoolEquationImp::SetInternalDebugMode(bool on)
+{
+    s_internalDebugMode = on;
+}
+
+Kq_BoolEquationImp::StringMgr& Kq_BoolEquationImp::GetNamePool()
+{
+    return s_namePool.m_names;
+}
+
+// The dumps stand in this file because their messages carry its lines.
+#define KQ_ENGINE_EMIT(...) KQ_EMIT(kKqEngineModule, __LINE__, __VA_ARGS__)
+
+namespace {
+
+typedef std::unordered_map<const Node*, int> Positions;
+
+// A link that leads to no listed node prints like a null one.
+void DumpReference(const Node* node, const Positions& positions)
+{
+    const auto position = positions.find(node);
+    if (position != positions.end())
+        KQ_ENGINE_EMIT(" [%03d]", position->second);
+    else
+        KQ_ENGINE_EMIT(" -----");
+}
+
+void DumpVariables(const std::vector<std::pair<String, unsigned int>>& variables)
+{
+    KQ_ENGINE_EMIT("NumVariables = %d\n", static_cast<int>(variables.size()));
+    KQ_ENGINE_EMIT("\n");
+    KQ_ENGINE_EMIT("  Id Name             Value\n");
+    KQ_ENGINE_EMIT("  == ================ =====\n");
+    // Deliberate: the Id is one more than the variable index.
+    int id = 0;
+    for (const auto& variable : variables)
+        KQ_ENGINE_EMIT("  %2d %-16s %5d\n", ++id, variable.first.c_str(),
+                       static_cast<int>(variable.second));
+}
+
+void DumpNodes(const std::vector<Node*>& nodes, const Node* root)
+{
+    Positions positions;
+    for (const Node* node : nodes)
+        positions.emplace(node, static_cast<int>(positions.size()));
+    KQ_ENGINE_EMIT("NumNodes = %d\n", static_cast<int>(nodes.size()));
+    KQ_ENGINE_EMIT("Root = ");
+    DumpReference(root, positions);
+    KQ_ENGINE_EMIT("\n");
+    if (!nodes.empty()) {
+        KQ_ENGINE_EMIT("\n");
+        KQ_ENGINE_EMIT("     Id     Par  Left Right\n");
+        KQ_ENGINE_EMIT("   =====   ===== ===== =====\n");
+    }
+    for (const Node* node : nodes) {
+        KQ_ENGINE_EMIT("   [%03d] =", positions.at(node));
+        DumpReference(node->GetParent(), positions);
+        DumpReference(node->GetLeftChild(), positions);
+        DumpReference(node->GetRightChild(), positions);
+        KQ_ENGINE_EMIT(" %-12s", node->GetTypeName().c_str());
+        KQ_ENGINE_EMIT(" %s", node->GetToken().c_str());
+        KQ_ENGINE_EMIT("\n");
+    }
+}
+
+} // namespace
+
+void Kq_BoolEquationImp::Dbg() const
+{
+    KQ_ENGINE_EMIT("Bool Equation = %s\n", GetEquation(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt1 = %s\n", GetEquationAlt1(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt2 = %s\n", GetEquationAlt2(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt3 = %s\n", GetEquationAlt3(false).c_str());
+    DumpVariables(std::vector<Variable>(m_variables));
+    KQ_ENGINE_EMIT("\n");
+    KQ_ENGINE_EMIT("ExprTree\n");
+    if (m_store->m_root)
+        m_store->m_root->Dbg();
+    KQ_ENGINE_EMIT("\n");
+    DumpNodes(m_store->m_nodes, m_store->m_root);
+    KQ_ENGINE_EMIT("\n");
+    GetTruthTable().Dbg();
+    KQ_ENGINE_EMIT("\n");
+}
+
+void Kq_BoolEquationImp::TruthTable::Dbg() const
+{
+    KQ_ENGINE_EMIT("TruthTable\n");
+    KQ_ENGINE_EMIT("  Eqn: \"%s\"\n", m_equation.c_str());
+    const int numColumns = static_cast<int>(m_variable_names.size());
+    KQ_ENGINE_EMIT("  NumCols: %d\n", numColumns);
+    for (int column = 0; column < numColumns; ++column)
+        KQ_ENGINE_EMIT("  Col[%d] = \"%s\"\n", column + 1,
+                       m_variable_names[static_cast<size_t>(column)].c_str());
+    KQ_ENGINE_EMIT("  NumRows: %d\n", static_cast<int>(m_rows.size()));
+    if (!m_rows.empty()) {
+        KQ_ENGINE_EMIT("   ");
+        KQ_ENGINE_EMIT("   ");
+        KQ_ENGINE_EMIT("  v");
+        for (int column = 0; column < numColumns; ++column)
+            KQ_ENGINE_EMIT(" %2d", column + 1);
+        KQ_ENGINE_EMIT("\n");
+        KQ_ENGINE_EMIT("   ");
+        KQ_ENGINE_EMIT("   ");
+        KQ_ENGINE_EMIT(" ==");
+        for (int column = 0; column < numColumns; ++column)
+            KQ_ENGINE_EMIT(" ==");
+        KQ_ENGINE_EMIT("\n");
+    }
+    int number = 0;
+    for (const Row& row : m_rows) {
+        KQ_ENGINE_EMIT("   ");
+        KQ_ENGINE_EMIT(" %2d", ++number);
+        KQ_ENGINE_EMIT(" %2d", static_cast<int>(row.GetResultValue()));
+        for (const unsigned int value : row.GetVariableValues())
+            KQ_ENGINE_EMIT("  %d", static_cast<int>(value));
+        KQ_ENGINE_EMIT("\n");
+    }
+}
+
+void Kq_BoolEquationImp::TruthTable::Row::Dbg() const
+{
+    KQ_ENGINE_EMIT("    Row: %d=", static_cast<int>(m_result_value));
+    for (const unsigned int value : m_variable_values)
+        KQ_ENGINE_EMIT("%d", static_cast<int>(value));
+    KQ_ENGINE_EMIT("\n");
+}

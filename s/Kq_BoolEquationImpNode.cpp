@@ -1,0 +1,311 @@
+// The node: its fields, what its type answers, its spellings and its allocator.
+#include <Kq_BoolEquationImpNode.h>
+
+#include <cstring>
+#include <new>
+
+#include <port/mav_malloc.h>
+
+#include "Kq_BoolEquationImpSpelling.h"
+
+typedef Kq_BoolEquationImp::Node Node;
+typedef Port::StringBase<char> String;
+
+std::allocator<Node> Node::m_kq_boolequationimp_node_mem;
+
+namespace {
+
+struct TypeNames {
+    TypeNames()
+    {
+        for (unsigned int type = 0; type <= KqSpelling::kNumTypes; ++type)
+            m_names[type] = KqSpelling::kTypes[type].name;
+    }
+    String m_names[KqSpelling::kNumTypes + 1];
+};
+
+struct Texts {
+    Texts()
+    {
+        for (unsigned int id = 0; id < KqSpelling::kNumSpellings; ++id)
+            m_texts[id] = KqSpelling::kSpellings[id].text;
+    }
+    String m_texts[KqSpelling::kNumSpellings];
+};
+
+// Row of the type tables; every corrupt value shares the row behind the last type.
+unsigned int TypeRow(Node::TYPE type)
+{
+    return type < KqSpelling::kNumTypes ? type : KqSpelling::kNumTypes;
+}
+
+const String& GetAlternative(const Node& node, unsigned int syntaxIndex)
+{
+    const KqSpelling::Id id = KqSpelling::kTypes[TypeRow(node.GetType())].alt[syntaxIndex];
+    return id == KqSpelling::kOwnToken ? node.GetToken() : KqSpelling::GetText(id);
+}
+
+bool HasAsChild(const Node& parent, const Node& node)
+{
+    return parent.GetLeftChild() == &node || parent.GetRightChild() == &node;
+}
+
+} // namespace
+
+const String& KqSpelling::GetText(Id id)
+{
+    static const Texts texts;
+    return texts.m_texts[id];
+}
+
+Node::Node()
+    : m_type(SENTINEL), m_parent(nullptr), m_left_child(nullptr), m_right_child(nullptr), m_value(0)
+{
+}
+
+Node::Node(TYPE type, const String& token)
+    : m_type(type), m_token(token), m_parent(nullptr), m_left_child(nullptr),
+      m_right_child(nullptr), m_value(0)
+{
+}
+
+Node::Node(const Node& other) = default;
+
+Node::~Node() = default;
+
+Node& Node::operator=(const Node& other) = default;
+
+void Node::SetType(TYPE type)
+{
+    m_type = type;
+}
+
+Node::TYPE Node::GetType() const
+{
+    return m_type;
+}
+
+void Node::SetToken(const String& token)
+{
+    m_token = token;
+}
+
+const String& Node::GetToken() const
+{
+    return m_token;
+}
+
+void Node::SetParent(Node* parent)
+{
+    m_parent = parent;
+}
+
+Node* Node::GetParent() const
+{
+    return m_parent;
+}
+
+void Node::SetLeftChild(Node* leftChild)
+{
+    m_left_child = leftChild;
+}
+
+Node* Node::GetLeftChild() const
+{
+    return m_left_child;
+}
+
+void Node::SetRightChild(Node* rightChild)
+{
+    m_right_child = rightChild;
+}
+
+Node* Node::GetRightChild() const
+{
+    return m_right_child;
+}
+
+void Node::SetValue(unsigned int value)
+{
+    m_value = value;
+}
+
+unsigned int Node::GetValue() const
+{
+    return m_value;
+}
+
+bool Node::Is0() const
+{
+    return m_type == ZERO;
+}
+
+bool Node::Is1() const
+{
+    return m_type == ONE;
+}
+
+bool Node::IsConst() const
+{
+    return Is0() || Is1();
+}
+
+bool Node::IsLp() const
+{
+    return m_type == LP;
+}
+
+bool Node::IsRp() const
+{
+    return m_type == RP;
+}
+
+bool Node::IsId() const
+{
+    return m_type == ID;
+}
+
+bool Node::IsNot() const
+{
+    return m_type == NOT;
+}
+
+bool Node::IsAnd() const
+{
+    return m_type == AND;
+}
+
+bool Node::IsOr() const
+{
+    return m_type == OR;
+}
+
+bool Node::IsXor() const
+{
+    return m_type == XOR;
+}
+
+bool Node::IsNAnd() const
+{
+    return m_type == NAND;
+}
+
+bool Node::IsNOr() const
+{
+    return m_type == NOR;
+}
+
+bool Node::IsNXor() const
+{
+    return m_type == NXOR;
+}
+
+bool Node::IsBinOp() const
+{
+    // Deliberate: by exclusion, so constants, TRUTH_TABLE and corrupt types answer true.
+    switch (m_type) {
+    case LP:
+    case RP:
+    case ID:
+    case NOT:
+    case SENTINEL:
+        return false;
+    case AND:
+    case ZERO:
+    case ONE:
+    case NAND:
+    case NOR:
+    case NXOR:
+    case OR:
+    case TRUTH_TABLE:
+    case XOR:
+        return true;
+    }
+    return true;
+}
+
+Node* Node::GetTopParent() const
+{
+    // The mark moves up to the walker whenever the distance has doubled, so a walker that runs in a
+    // circle meets it, and the walk ends after a few times the way's length.
+    const Node* node = this;
+    const Node* mark = this;
+    size_t numSteps = 0;
+    size_t nextMark = 1;
+    while (node->m_parent) {
+        node = node->m_parent;
+        ++numSteps;
+        if (node == mark)
+            break;
+        if (numSteps == nextMark) {
+            mark = node;
+            nextMark *= 2;
+        }
+    }
+    if (!node->m_parent)
+        return const_cast<Node*>(node);
+    // A circle: the first node that its parent does not have. The bound is for circles of true
+    // links, which no builder makes.
+    node = this;
+    while (numSteps-- > 0 && HasAsChild(*node->m_parent, *node))
+        node = node->m_parent;
+    return const_cast<Node*>(node);
+}
+
+const String& Node::GetTypeName() const
+{
+    static const TypeNames names;
+    return names.m_names[TypeRow(m_type)];
+}
+
+const String& Node::GetTokenAlt1() const
+{
+    return GetAlternative(*this, 0);
+}
+
+const String& Node::GetTokenAlt2() const
+{
+    return GetAlternative(*this, 1);
+}
+
+const String& Node::GetTokenAlt3() const
+{
+    return GetAlternative(*this, 2);
+}
+
+bool Node::operator==(const Node& other) const
+{
+    if (m_type != other.m_type)
+        return false;
+    // Only presence of links counts, never what they point at.
+    if (!m_left_child != !other.m_left_child || !m_right_child != !other.m_right_child ||
+        !m_parent != !other.m_parent)
+        return false;
+    if (m_type != ID && m_type != TRUTH_TABLE)
+        return true;
+    return m_token.length() == other.m_token.length() &&
+           std::memcmp(m_token.c_str(), other.m_token.c_str(), m_token.length()) == 0;
+}
+
+bool Node::operator!=(const Node& other) const
+{
+    return !(*this == other);
+}
+
+void* Node::operator new(size_t size)
+{
+    if (size == sizeof(Node))
+        return m_kq_boolequationimp_node_mem.allocate(1);
+    void* memory = mav_malloc(size);
+    if (!memory)
+        throw std::bad_alloc();
+    return memory;
+}
+
+void Node::operator delete(void* memory, size_t size)
+{
+    if (size != sizeof(Node))
+        mav_free(memory);
+    else if (memory)
+        m_kq_boolequationimp_node_mem.deallocate(static_cast<Node*>(memory), 1);
+}

@@ -1,0 +1,232 @@
+// Text in, one node for each token out, in text order and without links.
+// A text that is refused clears the object; nothing is said.  Fails: std::bad_alloc.
+// Cost: one pass; a name is copied once into a scratch string on its way to the pool.
+#include <Kq_BoolEquationImp.h>
+
+#include <cstring>
+#include <memory>
+#include <string>
+
+#include "Kq_BoolEquationImpSpelling.h"
+#include "Kq_BoolEquationImpStore.h"
+
+typedef Kq_BoolEquationImp::Node Node;
+typedef Port::StringBase<char> String;
+
+namespace {
+
+// Ordinary equations never regrow their list; more tokens are accepted.
+constexpr size_t kReservedTokens = 3000;
+
+bool IsNameStart(char character)
+{
+    return (character >= 'A' && character <= 'Z') || (character >= 'a' && character <= 'z') ||
+           character == '_';
+}
+
+bool IsNamePart(char character)
+{
+    return IsNameStart(character) || (character >= '0' && character <= '9');
+}
+
+bool IsBlank(char character)
+{
+    return character == ' ' || character == '\t' || character == '\n';
+}
+
+// The spelling of a token of one character, kOwnToken when there is none.
+KqSpelling::Id SingleSpelling(char character)
+{
+    switch (character) {
+    case '(':
+        return KqSpelling::kLeftParen;
+    case ')':
+        return KqSpelling::kRightParen;
+    case '&':
+        return KqSpelling::kAmpersand;
+    case '*':
+        return KqSpelling::kStar;
+    case '|':
+        return KqSpelling::kBar;
+    case '+':
+        return KqSpelling::kPlus;
+    case '^':
+        return KqSpelling::kCaret;
+    case '@':
+        return KqSpelling::kAt;
+    case '0':
+        return KqSpelling::kZero;
+    case '1':
+        return KqSpelling::kOne;
+    default:
+        return KqSpelling::kOwnToken;
+    }
+}
+
+// The spelling that starts with the negation 'prefix'. An operator written right behind it belongs
+// to it: "~&" is always one NAND and never NOT and AND.
+KqSpelling::Id NegationSpelling(char prefix, char next)
+{
+    const bool isTilde = prefix == '~';
+    switch (next) {
+    case '&':
+        return isTilde ? KqSpelling::kTildeAmpersand : KqSpelling::kBangAmpersand;
+    case '*':
+        return isTilde ? KqSpelling::kTildeStar : KqSpelling::kBangStar;
+    case '|':
+        return isTilde ? KqSpelling::kTildeBar : KqSpelling::kBangBar;
+    case '+':
+        return isTilde ? KqSpelling::kTildePlus : KqSpelling::kBangPlus;
+    case '^':
+        return isTilde ? KqSpelling::kTildeCaret : KqSpelling::kBangCaret;
+    case '@':
+        return isTilde ? KqSpelling::kTildeAt : KqSpelling::kBangAt;
+    default:
+        return isTilde ? KqSpelling::kTilde : KqSpelling::kBang;
+    }
+}
+
+// The keyword of 'length' characters with both dots, kOwnToken when there is no such keyword.
+KqSpelling::Id KeywordSpelling(const char* word, size_t length)
+{
+    constexpr KqSpelling::Id keywords[] = {
+        KqSpelling::kDotAnd,  KqSpelling::kDotOr,  KqSpelling::kDotXor, KqSpelling::kDotNot,
+        KqSpelling::kDotNand, KqSpelling::kDotNor, KqSpelling::kDotNxor};
+    for (const KqSpelling::Id id : keywords) {
+        const char* text = KqSpelling::kSpellings[id].text;
+        if (std::strlen(text) == length && std::memcmp(text, word, length) == 0)
+            return id;
+    }
+    return KqSpelling::kOwnToken;
+}
+
+// The character behind the next 'mark' after the one at 'start', null when the text has none.
+const char* EndOfMarked(const char* start, char mark)
+{
+    const char* end = std::strchr(start + 1, mark);
+    return end ? end + 1 : nullptr;
+}
+
+// Scans one text into one list.
+class Scanner {
+  public:
+    Scanner(Kq_BoolEquationImp::StringMgr& names, std::vector<Node*>& nodes)
+        : m_names(names), m_nodes(nodes)
+    {
+    }
+
+    // False when the text is refused; tokens found so far are in the list then.
+    bool ScanText(const char* text)
+    {
+        m_next = text;
+        while (*m_next) {
+            if (IsBlank(*m_next))
+                ++m_next;
+            else if (!ScanToken())
+                return false;
+        }
+        // Only the totals are compared: ")A(" is left for the tree builder to refuse.
+        return m_num_opened == m_num_closed;
+    }
+
+  private:
+    bool ScanToken()
+    {
+        const char first = *m_next;
+        if (IsNameStart(first))
+            return ScanName();
+        if (first == '\'')
+            return ScanQuotedName();
+        if (first == '.')
+            return ScanKeyword();
+        if (first == '~' || first == '!')
+            return ScanNegation();
+        const KqSpelling::Id id = SingleSpelling(first);
+        if (id == KqSpelling::kOwnToken)
+            return false;
+        m_num_opened += first == '(' ? 1u : 0u;
+        m_num_closed += first == ')' ? 1u : 0u;
+        AppendSpelling(id, 1);
+        return true;
+    }
+
+    bool ScanName()
+    {
+        const char* end = m_next + 1;
+        while (IsNamePart(*end))
+            ++end;
+        AppendName(end);
+        return true;
+    }
+
+    bool ScanQuotedName()
+    {
+        const char* end = EndOfMarked(m_next, '\'');
+        if (!end)
+            return false;
+        AppendName(end);
+        return true;
+    }
+
+    bool ScanKeyword()
+    {
+        const char* end = EndOfMarked(m_next, '.');
+        if (!end)
+            return false;
+        const size_t length = static_cast<size_t>(end - m_next);
+        const KqSpelling::Id id = KeywordSpelling(m_next, length);
+        if (id == KqSpelling::kOwnToken)
+            return false;
+        AppendSpelling(id, length);
+        return true;
+    }
+
+    bool ScanNegation()
+    {
+        const KqSpelling::Id id = NegationSpelling(m_next[0], m_next[1]);
+        const bool isLone = KqSpelling::kSpellings[id].type == Node::NOT;
+        AppendSpelling(id, isLone ? 1 : 2);
+        return true;
+    }
+
+    void AppendSpelling(KqSpelling::Id id, size_t length)
+    {
+        Append(KqSpelling::kSpellings[id].type, KqSpelling::GetText(id));
+        m_next += length;
+    }
+
+    void AppendName(const char* end)
+    {
+        m_name.assign(m_next, end);
+        Append(Node::ID, m_names.find(m_name.c_str()));
+        m_next = end;
+    }
+
+    void Append(Node::TYPE type, const String& token)
+    {
+        std::unique_ptr<Node> node(new Node(type, token));
+        m_nodes.push_back(node.get());
+        node.release();
+    }
+
+    Kq_BoolEquationImp::StringMgr& m_names;
+    std::vector<Node*>& m_nodes;
+    const char* m_next = nullptr;
+    size_t m_num_opened = 0;
+    size_t m_num_closed = 0;
+    std::string m_name; // scratch: the name being handed to the pool
+};
+
+} // namespace
+
+void Kq_BoolEquationImp::TokenizeNodes(const char* text)
+{
+    if (!text || !*text || !m_store->m_nodes.empty())
+        return;
+    // A token is a character at least, so a short text needs no more slots than it has characters.
+    m_store->m_nodes.reserve(strnlen(text, kReservedTokens));
+    if (Scanner(GetNamePool(), m_store->m_nodes).ScanText(text))
+        m_store->m_nodes.shrink_to_fit();
+    else
+        Clear();
+}

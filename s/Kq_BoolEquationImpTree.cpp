@@ -1,0 +1,320 @@
+// Node list in, checked tree out: operands hang below what precedes them, an operator takes the
+// whole run of operators before it, all of one precedence, as its left operand.
+// A list that is no equation clears the object; the node that broke the tree is dumped.
+// Cost: O(nodes); a walk up is paid for by the nodes that then lie below the new operator.
+#include <Kq_BoolEquationImp.h>
+
+#include <unordered_map>
+
+#include "Kq_BoolEquationImpStore.h"
+#include "Kq_BoolEquationImpWalk.h"
+
+typedef Kq_BoolEquationImp::Node Node;
+
+namespace {
+
+// Links the nodes of one list. Its cursor is the node placed last.
+//
+// Invariants:
+// 1. Child links form a tree at all times.
+// 2. A node's parent link names the node that has it as a child, but for the keys of m_holders.
+class TreeBuilder {
+  public:
+    explicit TreeBuilder(const std::vector<Node*>& nodes) : m_nodes(nodes), m_cursor(nodes[0]) {}
+
+    ~TreeBuilder()
+    {
+        if (m_has_passed)
+            return;
+        // The list outlives a failure when another object shares it or an allocation failed: it is
+        // a list of loose tokens again.
+        for (Node* node : m_nodes) {
+            node->SetParent(nullptr);
+            node->SetLeftChild(nullptr);
+            node->SetRightChild(nullptr);
+        }
+    }
+
+    TreeBuilder(const TreeBuilder&) = delete;
+    TreeBuilder& operator=(const TreeBuilder&) = delete;
+
+    // The root of the whole, checked tree, or null. With 'isTracing', the tree so far is dumped
+    // before each placement and once behind the last.
+    Node* Build(bool isTracing)
+    {
+        for (size_t position = 1; position < m_nodes.size(); ++position) {
+            if (isTracing)
+                TopOfCursor()->Dbg();
+            if (!Place(m_nodes[position]))
+                return nullptr;
+        }
+        if (isTracing)
+            TopOfCursor()->Dbg();
+        Node* root = FindRoot();
+        m_has_passed = root != nullptr;
+        return root;
+    }
+
+    // The node to dump after a failure; null when nothing is to be dumped.
+    const Node* GetBrokenNode() const { return m_broken; }
+
+  private:
+    bool Place(Node* node);
+    bool PlaceOperand(Node* node);
+    bool PlaceRightParen(Node* node);
+    bool PlaceOperator(Node* node);
+    bool PlaceInGroup(Node* node, Node* anchor);
+    bool PlaceNegatedOperator(Node* node);
+    Node* FindRoot();
+
+    // The node that has 'node' as a child, null at the top. All walks up go this way, so they
+    // end: it follows child links backwards, and those form a tree (invariants 1 and 2).
+    Node* Up(Node* node) const
+    {
+        if (node->IsNot() && !m_holders.empty()) {
+            const auto holder = m_holders.find(node);
+            if (holder != m_holders.end())
+                return holder->second;
+        }
+        return node->GetParent();
+    }
+
+    Node* TopOfCursor() const
+    {
+        Node* node = m_cursor;
+        while (Node* above = Up(node))
+            node = above;
+        return node;
+    }
+
+    // Makes 'operand' the left operand of 'node'; its parent link is true from now on.
+    void TakeLeft(Node* node, Node* operand)
+    {
+        node->SetLeftChild(operand);
+        operand->SetParent(node);
+        m_holders.erase(operand);
+    }
+
+    static void ReplaceChild(Node* parent, const Node* child, Node* replacement)
+    {
+        if (parent->GetLeftChild() == child)
+            parent->SetLeftChild(replacement);
+        else if (parent->GetRightChild() == child)
+            parent->SetRightChild(replacement);
+    }
+
+    const std::vector<Node*>& m_nodes;
+    Node* m_cursor;
+    const Node* m_broken = nullptr;
+    bool m_has_passed = false;
+    // The top NOT of a negated operator inside something keeps its parent link to the operator's
+    // first operand; this remembers the node that has it as a child.
+    std::unordered_map<const Node*, Node*> m_holders;
+};
+
+bool TreeBuilder::Place(Node* node)
+{
+    switch (node->GetType()) {
+    case Node::LP:
+    case Node::NOT:
+    case Node::ID:
+    case Node::ZERO:
+    case Node::ONE:
+        return PlaceOperand(node);
+    case Node::RP:
+        return PlaceRightParen(node);
+    case Node::SENTINEL:
+        return false;
+    case Node::AND:
+    case Node::NAND:
+    case Node::NOR:
+    case Node::NXOR:
+    case Node::OR:
+    case Node::TRUTH_TABLE:
+    case Node::XOR:
+        break;
+    }
+    return m_cursor->IsNot() ? PlaceNegatedOperator(node) : PlaceOperator(node);
+}
+
+bool TreeBuilder::PlaceOperand(Node* node)
+{
+    if (!m_cursor->GetLeftChild())
+        m_cursor->SetLeftChild(node);
+    else if (!m_cursor->GetRightChild())
+        m_cursor->SetRightChild(node);
+    else
+        return false;
+    node->SetParent(m_cursor);
+    m_cursor = node;
+    return true;
+}
+
+// Closes the nearest open group; the group becomes the cursor, the operand placed last.
+bool TreeBuilder::PlaceRightParen(Node* node)
+{
+    const auto isOpen = [](const Node* group) { return group->IsLp() && !group->GetRightChild(); };
+    Node* group = m_cursor;
+    while (group && !isOpen(group)) {
+        // Deliberate: from the top NOT of a negated operator, an open "(" that is the operator's
+        // first operand is nearer than anything that holds the NOT.
+        Node* parent = group->GetParent();
+        group = parent && isOpen(parent) ? parent : Up(group);
+    }
+    if (!group)
+        return false;
+    group->SetRightChild(node);
+    node->SetParent(group);
+    m_cursor = group;
+    return true;
+}
+
+// A binary operator behind anything but a NOT.
+bool TreeBuilder::PlaceOperator(Node* node)
+{
+    // The first ancestor that is no NOT, and the node below it.
+    Node* below = m_cursor;
+    Node* anchor = Up(m_cursor);
+    while (anchor && anchor->IsNot()) {
+        below = anchor;
+        anchor = Up(anchor);
+    }
+    if (!anchor) {
+        TakeLeft(node, below);
+    } else if (anchor->IsBinOp()) {
+        // One precedence for all: the operator takes the place of the highest one of the run.
+        // Deliberate: IsBinOp is asked as it is, so a constant in an operand's place counts; only
+        // the dump of the failing build can show it.
+        Node* highest = anchor;
+        Node* above = Up(highest);
+        while (above && above->IsBinOp()) {
+            highest = above;
+            above = Up(highest);
+        }
+        if (above)
+            ReplaceChild(above, highest, node);
+        node->SetParent(above);
+        TakeLeft(node, highest);
+    } else if (!PlaceInGroup(node, anchor)) {
+        return false;
+    }
+    m_cursor = node;
+    return true;
+}
+
+// A binary operator whose 'anchor' is no operator: the operator becomes the anchor's child in the
+// cursor's place.
+bool TreeBuilder::PlaceInGroup(Node* node, Node* anchor)
+{
+    if (anchor->GetLeftChild() == m_cursor) {
+        anchor->SetLeftChild(node);
+        TakeLeft(node, m_cursor);
+    } else if (anchor->GetRightChild() == m_cursor) {
+        // Deliberate: the operand goes right, and the next one fills the left slot.
+        anchor->SetRightChild(node);
+        node->SetRightChild(m_cursor);
+        m_cursor->SetParent(node);
+    } else {
+        if (!anchor->IsLp())
+            return false;
+        Node* operand = m_cursor;
+        for (Node* above = Up(operand); above && above->IsNot(); above = Up(operand))
+            operand = above;
+        anchor->SetLeftChild(node);
+        TakeLeft(node, operand);
+    }
+    node->SetParent(anchor);
+    return true;
+}
+
+// A binary operator behind a NOT without operand: "X ~ op Y" means "~(X op Y)". The NOT hangs
+// below X by now; the chain of NOTs goes where X was, and X goes below the operator.
+bool TreeBuilder::PlaceNegatedOperator(Node* node)
+{
+    Node* chainTop = m_cursor;
+    Node* operand = Up(m_cursor);
+    while (operand && operand->IsNot()) {
+        chainTop = operand;
+        operand = Up(operand);
+    }
+    // An operand whose first slot was taken before ("A & ~ | B") has no place to give.
+    if (!operand || operand->GetLeftChild() != chainTop) {
+        m_broken = m_cursor;
+        return false;
+    }
+    Node* holder = operand->GetParent();
+    m_cursor->SetLeftChild(node);
+    node->SetParent(m_cursor);
+    TakeLeft(node, operand);
+    operand->SetLeftChild(nullptr);
+    if (holder) {
+        // Deliberate: the chain's own parent link stays at the operand, and dumps show it.
+        ReplaceChild(holder, operand, chainTop);
+        m_holders[chainTop] = holder;
+    } else {
+        chainTop->SetParent(nullptr);
+    }
+    m_cursor = node;
+    return true;
+}
+
+bool HasAllowedChildren(const Node& node)
+{
+    const Node* left = node.GetLeftChild();
+    const Node* right = node.GetRightChild();
+    switch (node.GetType()) {
+    case Node::NOT:
+        return left && !right;
+    case Node::ID:
+    case Node::ZERO:
+    case Node::ONE:
+    case Node::RP:
+        return !left && !right;
+    case Node::LP:
+        // The left child is not asked for: "()" is an empty group.
+        return right && right->IsRp();
+    case Node::AND:
+    case Node::NAND:
+    case Node::NOR:
+    case Node::NXOR:
+    case Node::OR:
+    case Node::TRUTH_TABLE:
+    case Node::XOR:
+        return left && right;
+    case Node::SENTINEL:
+        return false;
+    }
+    return left && right;
+}
+
+// Checks every node; the one without a parent is the root.
+Node* TreeBuilder::FindRoot()
+{
+    Node* root = nullptr;
+    for (Node* node : m_nodes) {
+        const bool isSecondRoot = root && !node->GetParent();
+        if (isSecondRoot || !HasAllowedChildren(*node)) {
+            m_broken = node;
+            return nullptr;
+        }
+        if (!node->GetParent())
+            root = node;
+    }
+    return root;
+}
+
+} // namespace
+
+void Kq_BoolEquationImp::BuildTree()
+{
+    if (m_store->m_root || m_store->m_nodes.empty())
+        return;
+    {
+        TreeBuilder builder(m_store->m_nodes);
+        m_store->m_root = builder.Build(GetInternalDebugMode());
+        if (builder.GetBrokenNode())
+            builder.GetBrokenNode()->DbgFailure();
+    }
+    if (!m_store->m_root)
+        Clear();
+}

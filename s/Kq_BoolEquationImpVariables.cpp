@@ -1,0 +1,227 @@
+// The variable table: names in order of definition, values 0 or 1, handles.
+// Defining a variable links it to the tree: its index goes into every ID node of its name.
+// Fails: false or 0 for unknown or illegal names; std::bad_alloc.
+// Cost: a look-up walks the table; setting an equation uses an index for the time it takes.
+#include <Kq_BoolEquationImp.h>
+
+#include <cstring>
+#include <functional>
+#include <string_view>
+
+#include "Kq_BoolEquationImpStore.h"
+
+typedef Port::StringBase<char> String;
+typedef std::pair<String, unsigned int> Variable;
+
+namespace {
+
+constexpr size_t kNotFound = SIZE_MAX;
+
+// Equal in length and bytes; a NUL byte is a byte like any other.
+bool IsSameName(const String& left, const String& right)
+{
+    return left.length() == right.length() &&
+           std::memcmp(left.c_str(), right.c_str(), left.length()) == 0;
+}
+
+size_t FindName(const std::vector<Variable>& variables, const String& name)
+{
+    for (size_t index = 0; index < variables.size(); ++index) {
+        if (IsSameName(variables[index].first, name))
+            return index;
+    }
+    return kNotFound;
+}
+
+bool IsLetterOrUnderscore(char character)
+{
+    return (character >= 'A' && character <= 'Z') || (character >= 'a' && character <= 'z') ||
+           character == '_';
+}
+
+bool IsDigit(char character)
+{
+    return character >= '0' && character <= '9';
+}
+
+// Reads the characters up to the first NUL byte.
+bool IsLegalName(const String& name)
+{
+    const char* character = name.c_str();
+    // Deliberate: behind the second quote anything may follow, so "'a'+b" is a legal name.
+    if (*character == '\'')
+        return std::strchr(character + 1, '\'') != nullptr;
+    if (!IsLetterOrUnderscore(*character))
+        return false;
+    while (IsLetterOrUnderscore(*character) || IsDigit(*character))
+        ++character;
+    return *character == '\0';
+}
+
+// Where the names of a growing table stand. Few names are searched one by one; more get a hash
+// table of positions, at most half full, so that setting an equation of many names stays linear.
+// Invariant: once m_slots is not empty it holds every position of the table.
+class NameIndex {
+  public:
+    explicit NameIndex(const std::vector<Variable>& variables) : m_variables(variables) {}
+
+    // Position of 'name', or kNotFound.
+    size_t Find(const String& name)
+    {
+        if (m_variables.size() <= kMaxUnindexed)
+            return FindName(m_variables, name);
+        if (m_slots.size() < 2 * m_variables.size() || m_num_indexed > m_variables.size())
+            Rebuild();
+        while (m_num_indexed < m_variables.size()) {
+            *SlotOf(m_variables[m_num_indexed].first) = m_num_indexed;
+            ++m_num_indexed;
+        }
+        return *SlotOf(name);
+    }
+
+  private:
+    static constexpr size_t kMaxUnindexed = 16;
+
+    void Rebuild()
+    {
+        m_slots.assign(4 * m_variables.size(), kNotFound);
+        m_num_indexed = 0;
+    }
+
+    // The slot that holds the position of 'name', or the free one where it belongs.
+    size_t* SlotOf(const String& name)
+    {
+        const std::string_view text(name.c_str(), name.length());
+        size_t slot = std::hash<std::string_view>()(text) % m_slots.size();
+        while (m_slots[slot] != kNotFound && !IsSameName(m_variables[m_slots[slot]].first, name))
+            slot = slot + 1 == m_slots.size() ? 0 : slot + 1;
+        return &m_slots[slot];
+    }
+
+    const std::vector<Variable>& m_variables;
+    std::vector<size_t> m_slots;
+    size_t m_num_indexed = 0;
+};
+
+} // namespace
+
+size_t Kq_BoolEquationImp::FindVariable(const String& name) const
+{
+    return FindName(m_variables, name);
+}
+
+bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
+{
+    if (FindVariable(name) != kNotFound || name.length() == 0 || !IsLegalName(name))
+        return false;
+    const unsigned int variableIndex = GetNumVariables();
+    m_variables.push_back(Variable(name, value ? 1u : 0u));
+    for (Node* node : m_store->m_nodes) {
+        if (node->IsId() && IsSameName(node->GetToken(), name))
+            node->SetValue(variableIndex);
+    }
+    return true;
+}
+
+// Defines the terms as variables with value 0, while there are no nodes. A term that is not legal
+// or stands twice is skipped.
+void Kq_BoolEquationImp::DefineTerms(const std::vector<String>& terms, bool reverseTerms)
+{
+    assert(m_store->m_nodes.empty());
+    NameIndex index(m_variables);
+    for (size_t position = 0; position < terms.size(); ++position) {
+        const String& name = terms[reverseTerms ? terms.size() - 1 - position : position];
+        if (name.length() != 0 && IsLegalName(name) && index.Find(name) == kNotFound)
+            m_variables.push_back(Variable(name, 0u));
+    }
+}
+
+// Defines the name of every ID node that is no variable yet, with value 0 and in list order, and
+// writes its variable's index into every ID node.
+void Kq_BoolEquationImp::DefineListedNames()
+{
+    NameIndex index(m_variables);
+    for (Node* node : m_store->m_nodes) {
+        if (!node->IsId())
+            continue;
+        size_t variableIndex = index.Find(node->GetToken());
+        if (variableIndex == kNotFound) {
+            variableIndex = m_variables.size();
+            m_variables.push_back(Variable(node->GetToken(), 0u));
+        }
+        node->SetValue(static_cast<unsigned int>(variableIndex));
+    }
+}
+
+bool Kq_BoolEquationImp::IsVariableDefined(const String& name) const
+{
+    return FindVariable(name) != kNotFound;
+}
+
+// Deliberate: of a handle only the index counts, whatever equation it came from.
+bool Kq_BoolEquationImp::IsVariableDefined(const Kq_BoolEquation::Handle& handle) const
+{
+    return !handle.empty() && *handle.begin() < m_variables.size();
+}
+
+bool Kq_BoolEquationImp::SetVariable(const String& name, unsigned int value)
+{
+    const size_t index = FindVariable(name);
+    if (index == kNotFound)
+        return false;
+    m_variables[index].second = value ? 1u : 0u;
+    return true;
+}
+
+bool Kq_BoolEquationImp::SetVariable(const Kq_BoolEquation::Handle& handle, unsigned int value)
+{
+    if (!IsVariableDefined(handle))
+        return false;
+    m_variables[*handle.begin()].second = value ? 1u : 0u;
+    return true;
+}
+
+unsigned int Kq_BoolEquationImp::GetVariable(const String& name) const
+{
+    const size_t index = FindVariable(name);
+    return index == kNotFound ? 0u : m_variables[index].second;
+}
+
+unsigned int Kq_BoolEquationImp::GetVariable(const Kq_BoolEquation::Handle& handle) const
+{
+    return IsVariableDefined(handle) ? m_variables[*handle.begin()].second : 0u;
+}
+
+Kq_BoolEquation::Handle Kq_BoolEquationImp::GetVariableHandle(const String& name) const
+{
+    const size_t index = FindVariable(name);
+    if (index == kNotFound)
+        return Kq_BoolEquation::Handle();
+    std::vector<unsigned int> values(1, static_cast<unsigned int>(index));
+    const std::vector<Node*>& nodes = m_store->m_nodes;
+    for (size_t position = 0; position < nodes.size(); ++position) {
+        // Deliberate: the node's type is not asked for, only its token.
+        if (IsSameName(nodes[position]->GetToken(), name))
+            values.push_back(static_cast<unsigned int>(position));
+    }
+    return Kq_BoolEquation::Handle(values);
+}
+
+unsigned int Kq_BoolEquationImp::GetNumVariables() const
+{
+    return static_cast<unsigned int>(m_variables.size());
+}
+
+const std::vector<Variable>& Kq_BoolEquationImp::GetVariables() const
+{
+    return m_variables;
+}
+
+std::vector<String> Kq_BoolEquationImp::GetVariableNames() const
+{
+    std::vector<String> names;
+    names.reserve(m_variables.size());
+    for (const Variable& variable : m_variables)
+        names.push_back(variable.first);
+    return names;
+}

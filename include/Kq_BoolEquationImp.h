@@ -120,7 +120,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
 };
 
 // The process-wide pool of names: each distinct name is kept once, until unload.
-// A trie with one node for each character of a name; it only grows.
+// A trie; it only grows.
 class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
   public:
     StringMgr();
@@ -130,7 +130,7 @@ class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
 
     // The one string equal to 'name' (null counts as empty), made on first request.
     // Valid until the pool is destroyed.  Fails: std::bad_alloc; the pool stays usable.
-    // Cost: one ordered-map search for each character.
+    // Cost: in step with the name's length, whatever the number of names.
     const Port::StringBase<char>& find(const char* name);
 
   private:

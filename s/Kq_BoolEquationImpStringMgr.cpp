@@ -1,14 +1,34 @@
 // The pool of names: a trie whose path spells a name and whose end holds it as a string.
 // It never forgets and never moves a string.  Fails: std::bad_alloc, and the trie stays whole.
-// Cost: one ordered-map search for each character, whatever the number of names.
+// A node stands for a run of characters and not for one: a name of ten million characters that
+// shares no beginning with another is one node, where a node for each would take a gigabyte.
 #include <Kq_BoolEquationImp.h>
+
+#include <memory>
+#include <string>
 
 typedef Port::StringBase<char> String;
 
+// Invariants:
+// 1. The labels on the way down to a node, its own included, spell its string, when it has one.
+// 2. A child's label is not empty, and its first character is the child's key.
 struct Kq_BoolEquationImp::StringMgr::StringMgrNode {
     std::map<char, StringMgrNode*> m_children; // owned
     const String* m_string = nullptr;          // owned; null until a name ends here
+    std::string m_label;                       // empty at the root only
 };
+
+namespace {
+
+size_t CommonLength(const std::string& label, const char* text)
+{
+    size_t length = 0;
+    while (length < label.size() && label[length] == text[length])
+        ++length;
+    return length;
+}
+
+} // namespace
 
 Kq_BoolEquationImp::StringMgr::StringMgr() : m_root(new StringMgrNode) {}
 
@@ -19,24 +39,41 @@ Kq_BoolEquationImp::StringMgr::~StringMgr()
 
 const String& Kq_BoolEquationImp::StringMgr::find(const char* name)
 {
-    StringMgrNode* node = m_root;
     const char* const text = name ? name : "";
-    for (const char* character = text; *character; ++character) {
-        // The slot is made first and filled second, so a failed allocation loses no node; an
-        // unfilled slot is filled by the next search that comes by.
-        StringMgrNode*& child = node->m_children[*character];
-        if (!child)
-            child = new StringMgrNode;
+    const char* rest = text;
+    StringMgrNode* node = m_root;
+    while (*rest) {
+        const auto slot = node->m_children.find(*rest);
+        if (slot == node->m_children.end()) {
+            std::unique_ptr<StringMgrNode> leaf(new StringMgrNode);
+            leaf->m_label = rest;
+            node->m_children.emplace(*rest, leaf.get());
+            node = leaf.release();
+            break;
+        }
+        StringMgrNode* child = slot->second;
+        const size_t length = CommonLength(child->m_label, rest);
+        if (length < child->m_label.size()) {
+            // The name leaves the run here: a node of its own for the common beginning. All that
+            // can fail comes before the trie changes.
+            std::unique_ptr<StringMgrNode> upper(new StringMgrNode);
+            upper->m_label.assign(child->m_label, 0, length);
+            upper->m_children.emplace(child->m_label[length], child);
+            child->m_label.erase(0, length);
+            child = upper.release();
+            slot->second = child;
+        }
         node = child;
+        rest += length;
     }
     if (!node->m_string)
         node->m_string = new String(text);
     return *node->m_string;
 }
 
-// Frees 'node' and what is below it: children in map order, each before its parent. A name may be
-// millions of characters long, so the way back up is kept in the tree: the map slot that led down
-// holds the parent's parent until the walk returns. Nothing is allocated.
+// Frees 'node' and what is below it: children in map order, each before its parent. The way back
+// up is kept in the tree: the map slot that led down holds the parent's parent until the walk
+// returns. So nothing is allocated, and depth costs nothing.
 void Kq_BoolEquationImp::StringMgr::cleanup(StringMgrNode* node)
 {
     StringMgrNode* parent = nullptr;
@@ -44,10 +81,6 @@ void Kq_BoolEquationImp::StringMgr::cleanup(StringMgrNode* node)
         if (!node->m_children.empty()) {
             const auto slot = node->m_children.begin();
             StringMgrNode* child = slot->second;
-            if (!child) {
-                node->m_children.erase(slot);
-                continue;
-            }
             slot->second = parent;
             parent = node;
             node = child;

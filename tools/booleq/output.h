@@ -1,0 +1,40 @@
+// The result stream: collected in blocks, every write checked.
+#ifndef BOOLEQ_OUTPUT_H
+#define BOOLEQ_OUTPUT_H
+
+#include <cstdio>
+#include <stdexcept>
+#include <string>
+
+namespace booleq {
+
+// Reading or writing failed; the text says what and why.
+class IoError : public std::runtime_error {
+  public:
+    IoError(const std::string& what, int errorNumber);
+};
+
+class Output {
+  public:
+    explicit Output(std::FILE* stream);
+    // Fails: IoError, here or at the next call, when the stream takes no more.
+    void Put(const std::string& text);
+    void Put(const char* text, size_t length);
+    // Everything put so far has left this process afterwards.
+    void Flush();
+
+  private:
+    void WriteBlock();
+    void Write(const char* text, size_t length);
+
+    std::FILE* m_stream;
+    std::string m_block;
+};
+
+// One line on standard error behind "booleq: "; what was put before it is flushed first, so that
+// the two streams keep their order on a terminal.
+void Complain(Output& output, const std::string& message);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,36 @@
+// How a text becomes an equation: with or without listed inputs.
+#ifndef BOOLEQ_READING_H
+#define BOOLEQ_READING_H
+
+#include <string>
+#include <vector>
+
+#include <Kq_BoolEquation.h>
+
+namespace booleq {
+
+struct Reading {
+    bool hasInputs = false;
+    std::vector<std::string> inputs; // first is the most significant
+    bool lsbFirst = false;           // an init value's first input is bit 0 of the row number
+    bool reverse = false;            // an init value's inputs are defined from the last
+};
+
+// Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.
+bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+
+// Names of a list 'A,B,'c,d'': a comma inside single quotes belongs to the name, blanks around a
+// name do not.  Fails: false when a quote is not closed.
+bool SplitInputs(const std::string& list, std::vector<std::string>& inputs);
+
+// Sorts out what the library would skip without a word.
+struct InputCheck {
+    std::vector<std::string> illegal;  // no names; they become no inputs
+    std::vector<std::string> repeated; // listed again; they count once
+    size_t numUsable = 0;
+};
+InputCheck CheckInputs(const std::vector<std::string>& inputs);
+
+} // namespace booleq
+
+#endif

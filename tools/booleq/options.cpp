@@ -89,12 +89,15 @@ Options ParseOptions(const std::vector<std::string>& arguments)
                                                  "The equation, an init value (0x8, 0b1000), or -");
     const CLI::Option* inputs =
         app.add_option("--inputs", list, "The inputs, most significant first; 'a,b' is one name")
-            ->type_name("A,B,C");
+            ->type_name("A,B,C")
+            ->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
     app.add_flag("--lsb-first", options.reading.lsbFirst,
                  "Init value: its first input is bit 0 of the row number");
     app.add_flag("--reverse", options.reading.reverse,
                  "Init value: take --inputs from the last to the first");
-    app.add_option("--rows", rows, "Truth-table rows to print (64)")->type_name("N|all");
+    const CLI::Option* rowsOption = app.add_option("--rows", rows, "Truth-table rows to print (64)")
+                                        ->type_name("N|all")
+                                        ->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
     app.add_flag("--whole", options.wholeInit, "Print init values whole, also over 10 inputs");
     app.add_flag("--debug", options.debug, "Let the library's diagnostics go to standard error");
 
@@ -116,7 +119,10 @@ Options ParseOptions(const std::vector<std::string>& arguments)
     RefuseExtras(app.remaining());
     if (equation->count() == 0)
         throw UsageError("no equation: give one ('A & B'), or '-' for lines of standard input");
-    if (!rows.empty())
+    for (const CLI::Option* option : {inputs, rowsOption})
+        if (option->count() > 1)
+            throw UsageError(option->get_name() + " is given twice");
+    if (rowsOption->count() > 0)
         options.maxRows = ParseRows(rows);
     CheckInputOptions(options, *inputs, list);
     return options;

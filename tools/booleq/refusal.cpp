@@ -100,7 +100,7 @@ std::string SkipDelimited(const std::string& text, size_t& position)
     const size_t end = text.find(text[start], start + 1);
     if (end == std::string::npos)
         return isQuote ? "the quote" + At(start) + " is not closed; not-A is written ~A, not A'"
-                       : "the '.'" + At(start) + " begins no operator word such as .AND.";
+                       : "the '.'" + At(start) + " has no second '.': words like .AND. have two";
     position = end + 1;
     const std::string word = text.substr(start, position - start);
     if (isQuote || IsOperatorWord(word))
@@ -165,8 +165,6 @@ std::string FindPlainFault(const std::string& text)
 
 std::string ExplainRefusal(const std::string& text, const Reading& reading)
 {
-    if (IsBlank(text))
-        return "there is nothing in it";
     std::string reason;
     if (IsTakenForInitValue(text, reading))
         reason = ExplainInitValue(text, reading);

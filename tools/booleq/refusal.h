@@ -8,8 +8,8 @@
 
 namespace booleq {
 
-// Reason and mend in one sentence, for a text that the library refused. Characters are counted
-// from 1, in bytes.
+// Reason and mend in one sentence, for a text that the library refused and that is not blank.
+// Characters are counted from 1, in bytes.
 std::string ExplainRefusal(const std::string& text, const Reading& reading);
 
 } // namespace booleq

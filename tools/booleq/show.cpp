@@ -98,8 +98,8 @@ void PutInitValues(const Kq_BoolEquation& equation, bool whole, Output& output)
 {
     const unsigned int numInputs = equation.GetNumVariables();
     if (numInputs <= kMaxShownInitInputs || whole) {
-        PutDigits(output, "init value", equation.GetEquationAsHexInitValue(false));
-        PutDigits(output, "", equation.GetEquationAsBinaryInitValue());
+        PutDigits(output, "init value hex", equation.GetEquationAsHexInitValue(false));
+        PutDigits(output, "init value bin", equation.GetEquationAsBinaryInitValue());
     } else {
         const uint64_t numRows = uint64_t(1) << numInputs; // at most 30 inputs here
         PutField(output, "init value",
@@ -158,7 +158,8 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Out
         PutField(output, "note", "not in --inputs, so behind them: " + names);
     }
     if (!ReadsBack(equation, reading))
-        PutField(output, "note", "the texts above, read again, do not give this equation");
+        PutField(output, "note",
+                 "read again, the texts above do not give this equation: keep the one you have");
 }
 
 void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Output& output)
@@ -187,29 +188,37 @@ void ShowEquation(Kq_BoolEquation& equation, const Options& options, Output& out
     else
         NoteExpression(equation, reading, output);
     if (numInputs == 1)
-        PutField(output, "note",
-                 "one hexadecimal digit is four rows and does not read back over one input; the "
-                 "binary form does");
+        PutField(output, "note", "over one input only the binary init value reads back");
     NoteNames(equation, hasTable, output);
     if (hasTable)
         PrintTable(equation, options.maxRows, output);
+}
+
+// Empty when the equation is set, otherwise the text and the reason.
+std::string SetOrExplain(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
+{
+    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
+    const size_t nul = text.find('\0');
+    if (nul != std::string::npos)
+        return Excerpt(text) + "\n  a NUL byte at character " + std::to_string(nul + 1) +
+               "; this is no plain text";
+    if (SetFromText(equation, text, reading))
+        return std::string();
+    if (IsBlank(text))
+        return "an empty equation";
+    return Excerpt(text) + "\n  " + ExplainRefusal(text, reading);
 }
 
 } // namespace
 
 bool ShowText(const std::string& text, size_t lineNumber, const Options& options, Output& output)
 {
-    const size_t nul = text.find('\0');
     Kq_BoolEquation equation;
-    if (nul != std::string::npos || !SetFromText(equation, text, options.reading)) {
-        // The library would take a NUL byte for the end of the text and answer for what precedes.
-        const std::string reason =
-            nul != std::string::npos
-                ? "a NUL byte at character " + std::to_string(nul + 1) + "; this is no plain text"
-                : ExplainRefusal(text, options.reading);
+    const std::string refusal = SetOrExplain(equation, text, options.reading);
+    if (!refusal.empty()) {
         const std::string place =
             lineNumber > 0 ? "line " + std::to_string(lineNumber) + ": " : std::string();
-        Complain(output, place + "refused: " + Excerpt(text) + "\n  " + reason);
+        Complain(output, place + "refused: " + refusal);
         return false;
     }
     if (lineNumber > 0)

@@ -94,8 +94,8 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
         output.Put(line);
     }
     if (numPrinted < numRows)
-        output.Put("  " + std::to_string(numRows - numPrinted) +
-                   " more rows; --rows all prints them\n");
+        output.Put("  rows not shown: " + std::to_string(numRows - numPrinted) +
+                   "; --rows all prints them all\n");
 }
 
 } // namespace booleq

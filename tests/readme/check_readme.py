@@ -1,0 +1,128 @@
+#!/usr/bin/env python3
+# Runs what README.md shows and compares the outputs, byte for byte:
+#   commands  every "$ command" of a console block, with the tool on the PATH
+#   program   the C++ example, built as the CMake block and as the pkg-config block say, against
+#             an installed tree in a path with a blank
+import argparse
+import os
+import re
+import shutil
+import subprocess
+import sys
+import tempfile
+
+SKIPPED = 77
+
+
+def blocks(text, kind):
+    return re.findall(rf"^```{re.escape(kind)}\n(.*?)^```$", text, re.M | re.S)
+
+
+def one_block(text, kind):
+    found = blocks(text, kind)
+    if len(found) != 1:
+        sys.exit(f"README has {len(found)} blocks of kind {kind}, not one")
+    return found[0]
+
+
+def run(command, **options):
+    done = subprocess.run(command, stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True,
+                          timeout=300, check=False, **options)
+    return done.returncode, done.stdout
+
+
+def must_run(command, **options):
+    status, output = run(command, **options)
+    if status != 0:
+        sys.exit(f"{command} ended with {status}:\n{output}")
+    return output
+
+
+def compare(what, expected, got):
+    if expected == got:
+        return 0
+    print(f"{what}\n--- README says\n{expected}--- it is\n{got}")
+    return 1
+
+
+def check_commands(readme, tool):
+    environment = dict(os.environ, LC_ALL="C")
+    environment.pop("MAV_KQ_BOOL_EQUATION_DEBUG", None)
+    environment["PATH"] = os.path.dirname(tool) + os.pathsep + environment["PATH"]
+    failures = count = 0
+    for block in blocks(readme, "console"):
+        for example in re.split(r"^\$ ", block, flags=re.M)[1:]:
+            command, expected = example.split("\n", 1)
+            count += 1
+            failures += compare(command, expected,
+                                run(["sh", "-c", command], env=environment)[1])
+    print(f"{count} commands of README run, {failures} differ")
+    return 1 if failures or not count else 0
+
+
+def find_directory(root, file):
+    for directory, _, files in os.walk(root):
+        if file in files:
+            return directory
+    sys.exit(f"no {file} below {root}")
+
+
+def build_with_cmake(readme, directory, prefix, compiler, flags):
+    with open(os.path.join(directory, "CMakeLists.txt"), "w", encoding="utf-8") as file:
+        file.write(one_block(readme, "cmake"))
+    build = os.path.join(directory, "build")
+    must_run(["cmake", "-S", directory, "-B", build, f"-DCMAKE_PREFIX_PATH={prefix}",
+              f"-DCMAKE_CXX_COMPILER={compiler}", f"-DCMAKE_CXX_FLAGS={flags}"])
+    must_run(["cmake", "--build", build])
+    return must_run([os.path.join(build, "example")])
+
+
+def build_with_pkg_config(readme, directory, prefix, compiler, flags):
+    command = one_block(readme, "sh pkg-config").replace("c++ ", f"'{compiler}' {flags} ", 1)
+    # The command is for a prefix without blanks, as an unquoted $(...) is.
+    link = os.path.join(directory, "prefix")
+    os.symlink(prefix, link)
+    libraries = find_directory(link + os.sep, "libkq_boolequation.so")
+    packages = find_directory(link + os.sep, "kq_boolequation.pc")
+    environment = dict(os.environ, PKG_CONFIG_PATH=packages, LD_LIBRARY_PATH=libraries)
+    must_run(["sh", "-c", command], cwd=directory, env=environment)
+    return must_run([os.path.join(directory, "example")], env=environment)
+
+
+def check_program(readme, build, compiler, flags):
+    if not shutil.which("pkg-config"):
+        print("skipped: there is no pkg-config")
+        return SKIPPED
+    expected = one_block(readme, "text")
+    failures = 0
+    with tempfile.TemporaryDirectory() as top:
+        prefix = os.path.join(top, "installed here")
+        must_run(["cmake", "--install", build, "--prefix", prefix])
+        for how in (build_with_cmake, build_with_pkg_config):
+            directory = os.path.join(top, how.__name__)
+            os.mkdir(directory)
+            with open(os.path.join(directory, "example.cpp"), "w", encoding="utf-8") as file:
+                file.write(one_block(readme, "cpp"))
+            failures += compare(how.__name__, expected,
+                                how(readme, directory, prefix, compiler, flags))
+    print(f"C++ example of README built in 2 ways, {failures} differ")
+    return 1 if failures else 0
+
+
+def main():
+    parser = argparse.ArgumentParser()
+    parser.add_argument("--readme", required=True)
+    parser.add_argument("--tool")
+    parser.add_argument("--build")
+    parser.add_argument("--compiler")
+    parser.add_argument("--flags", default="")
+    arguments = parser.parse_args()
+    with open(arguments.readme, encoding="utf-8") as file:
+        readme = file.read()
+    if arguments.tool:
+        return check_commands(readme, os.path.abspath(arguments.tool))
+    return check_program(readme, arguments.build, arguments.compiler, arguments.flags)
+
+
+if __name__ == "__main__":
+    sys.exit(main())

@@ -1,0 +1,186 @@
+// Truth tables: rows, names, comparison, what has none.
+#include <gtest/gtest.h>
+
+#include "unit_support.h"
+
+namespace {
+
+typedef Engine::TruthTable Table;
+
+// "A B | 00=0 01=1 ..."
+std::string TableText(const Table& table)
+{
+    std::string text;
+    for (const String& name : table.GetVariableNames())
+        text += Std(name) + " ";
+    text += "|";
+    for (const Table::Row& row : table.GetRows()) {
+        text += " ";
+        for (const unsigned int value : row.GetVariableValues())
+            text += std::to_string(value);
+        text += "=" + std::to_string(row.GetResultValue());
+    }
+    return text;
+}
+
+std::string TableOf(const char* text)
+{
+    Engine engine;
+    engine.SetEquation(text);
+    return TableText(engine.GetTruthTable());
+}
+
+TEST(TruthTable, RowsCountUpWithTheFirstVariableMostSignificant)
+{
+    EXPECT_EQ("A B | 00=0 01=0 10=0 11=1", TableOf("A & B"));
+    EXPECT_EQ("A B | 00=0 01=0 10=1 11=0", TableOf("A & ~B"));
+    EXPECT_EQ("C A | 00=1 01=0 10=1 11=1", TableOf("C | ~A"));
+    EXPECT_EQ("A | 0=1 1=0", TableOf("~A"));
+}
+
+TEST(TruthTable, ConstantsAndUnsetEquationsHaveNone)
+{
+    for (const char* text : {"0", "1", "(1 & 0)", "()", ""}) {
+        Engine engine;
+        engine.SetEquation(text);
+        const Table table = engine.GetTruthTable();
+        EXPECT_TRUE(!table) << text;
+        EXPECT_FALSE(static_cast<bool>(table.operator Kq_PtrTester*()));
+        EXPECT_TRUE(table.GetRows().empty());
+        EXPECT_TRUE(table.GetVariableNames().empty());
+    }
+}
+
+TEST(TruthTable, VariablesWithoutATreeHaveNone)
+{
+    Engine engine;
+    engine.DefineVariable("A", 1);
+    EXPECT_TRUE(!engine.GetTruthTable());
+}
+
+TEST(TruthTable, ThirtyOneVariablesHaveNone)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A"));
+    for (int number = 1; number < 31; ++number)
+        engine.DefineVariable(("v" + std::to_string(number)).c_str(), 0);
+    ASSERT_EQ(31u, engine.GetNumVariables());
+    EXPECT_TRUE(!engine.GetTruthTable());
+    EXPECT_EQ("0x0", Std(engine.GetEquationAsHexInitValue(false)));
+    EXPECT_EQ("0b", Std(engine.GetEquationAsBinaryInitValue()));
+}
+
+TEST(TruthTable, VariablesDefinedAfterwardsWidenTheTable)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("1"));
+    engine.DefineVariable("A", 1);
+    EXPECT_EQ("A | 0=1 1=1", TableText(engine.GetTruthTable()));
+}
+
+TEST(TruthTable, TabulatingKeepsTheValuesSet)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A | B"));
+    engine.SetVariable("B", 1);
+    engine.GetTruthTable();
+    EXPECT_EQ("A0 B1", VariablesOf(engine));
+}
+
+TEST(TruthTable, ComparisonIsByNamesAndRows)
+{
+    Engine ab;
+    Engine same;
+    Engine ba;
+    ASSERT_TRUE(ab.SetEquation("A & B"));
+    ASSERT_TRUE(same.SetEquation("~(~A | ~B)"));
+    ASSERT_TRUE(ba.SetEquation("B & A"));
+    EXPECT_TRUE(ab.GetTruthTable() == same.GetTruthTable()) << "the text does not count";
+    EXPECT_TRUE(ab.GetTruthTable() != ba.GetTruthTable()) << "the order of names does";
+    ASSERT_TRUE(ba.SetEquationWithExplicitTerms({"A", "B"}, "B & A", false, false));
+    EXPECT_TRUE(ab.GetTruthTable() == ba.GetTruthTable());
+    ASSERT_TRUE(same.SetEquation("A | B"));
+    EXPECT_TRUE(ab.GetTruthTable() != same.GetTruthTable());
+    ASSERT_TRUE(same.SetEquation("A"));
+    EXPECT_TRUE(ab.GetTruthTable() != same.GetTruthTable());
+    EXPECT_TRUE(Table() == Table());
+    EXPECT_TRUE(Table() != ab.GetTruthTable());
+}
+
+TEST(TruthTable, TablesAreValues)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A ^ B"));
+    Table table(engine);
+    const Table copy(table);
+    ASSERT_TRUE(engine.SetEquation("C"));
+    EXPECT_EQ("A B | 00=0 01=1 10=1 11=0", TableText(copy));
+    table = engine;
+    EXPECT_EQ("C | 0=0 1=1", TableText(table));
+    table = copy;
+    EXPECT_TRUE(table == copy);
+    const Table& same = table;
+    table = same;
+    EXPECT_TRUE(table == copy);
+    ASSERT_TRUE(engine.SetEquation("1"));
+    table = engine;
+    EXPECT_TRUE(!table);
+}
+
+TEST(TruthTable, RowsCompareByResultAndValues)
+{
+    const Table::Row row(1, {0, 1});
+    EXPECT_TRUE(row == Table::Row(1, {0, 1}));
+    EXPECT_TRUE(row != Table::Row(0, {0, 1}));
+    EXPECT_TRUE(row != Table::Row(1, {0, 0}));
+    EXPECT_TRUE(row != Table::Row(1, {0, 1, 0}));
+    Table::Row assigned(0, {});
+    assigned = row;
+    EXPECT_TRUE(assigned == row);
+}
+
+TEST(TruthTable, DebugModeTracesAndDumpsEveryRow)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A"));
+    std::string expected;
+    for (const char* value : {"0", "1"})
+        expected += std::string("DEBUG:../s/Kq_BoolEquationImpNode.cpp:446 Eval TOP. type=ID "
+                                "token=A value=") +
+                    value + "\nNODE: TOP. parent= type=ID token=A val=0\n";
+    const DebugMode debugMode;
+    Messages messages;
+    const Table table = engine.GetTruthTable();
+    EXPECT_EQ(expected, messages.Text());
+    EXPECT_EQ("A | 0=0 1=1", TableText(table));
+    EXPECT_EQ("0x2", Std(engine.GetEquationAsHexInitValue(false)));
+    EXPECT_EQ(expected + expected, messages.Text()) << "an init value traces the rows too";
+}
+
+// Small and large tables against node-by-node evaluation of every row.
+TEST(TruthTable, EveryRowIsWhatEvalGives)
+{
+    const char* texts[] = {"a & b | c ^ d ~& e ~| f ~^ g",
+                           "~(a ^ (b | (c & (d ^ (e | (f & (g ^ (h | ~i))))))))",
+                           "a ~ | b & c ~ ^ d | e",
+                           "((a & b) | (c & d)) ^ ((e | f) & (g | h)) ~^ ((i ~| j) ~& (k ^ 1))",
+                           "a",
+                           "a & ()"};
+    for (const char* text : texts) {
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquation(text)) << text;
+        for (const char* extra : {"", "x", "y"}) {
+            engine.DefineVariable(extra, 1);
+            const Table table = engine.GetTruthTable();
+            ASSERT_EQ(size_t(1) << engine.GetNumVariables(), table.GetRows().size());
+            std::vector<std::pair<String, unsigned int>> values = engine.GetVariables();
+            for (const Table::Row& row : table.GetRows()) {
+                for (size_t column = 0; column < values.size(); ++column)
+                    values[column].second = row.GetVariableValues()[column];
+                ASSERT_EQ(engine.GetRoot()->Eval(values), row.GetResultValue()) << text;
+            }
+        }
+    }
+}
+
+} // namespace

@@ -1,0 +1,275 @@
+// The n-th allocation fails, for every n until an operation succeeds: only std::bad_alloc comes
+// out, every object is still safe to ask, assign and destroy, and nothing is leaked.
+// The global operator new is replaced by one that counts; leaks are counted by it as well.
+#include <cstdio>
+#include <cstdlib>
+#include <functional>
+#include <new>
+
+#include <gtest/gtest.h>
+
+#include "unit/unit_support.h"
+
+namespace {
+
+bool s_isArmed = false;
+size_t s_numUntilFailure = 0;
+size_t s_numLive = 0;
+
+void* Allocate(size_t size)
+{
+    if (s_isArmed && s_numUntilFailure-- == 0) {
+        s_isArmed = false;
+        throw std::bad_alloc();
+    }
+    void* memory = std::malloc(size ? size : 1);
+    if (!memory)
+        throw std::bad_alloc();
+    ++s_numLive;
+    return memory;
+}
+
+void Free(void* memory) noexcept
+{
+    if (memory)
+        --s_numLive;
+    std::free(memory);
+}
+
+} // namespace
+
+void* operator new(size_t size)
+{
+    return Allocate(size);
+}
+void* operator new[](size_t size)
+{
+    return Allocate(size);
+}
+void operator delete(void* memory) noexcept
+{
+    Free(memory);
+}
+void operator delete[](void* memory) noexcept
+{
+    Free(memory);
+}
+void operator delete(void* memory, size_t) noexcept
+{
+    Free(memory);
+}
+void operator delete[](void* memory, size_t) noexcept
+{
+    Free(memory);
+}
+
+namespace {
+
+struct Objects {
+    Kq_BoolEquation a;
+    Kq_BoolEquation b;
+    Kq_BoolEquation::TruthTable table;
+    Kq_BoolEquation::Handle handle;
+};
+
+typedef std::function<void(Objects&)> Operation;
+
+// Two equations that share their nodes, a table and a handle.
+void Prepare(Objects& objects)
+{
+    objects.a.SetEquation("a_name_that_needs_memory & ~(B | C) ^ 1");
+    objects.b = objects.a;
+    objects.table = Kq_BoolEquation("X | Y");
+    objects.handle = objects.a.GetVariableHandle("B");
+}
+
+// Asks everything that must answer whatever happened before.
+void Use(Objects& objects)
+{
+    for (Kq_BoolEquation* equation : {&objects.a, &objects.b}) {
+        equation->Eval();
+        equation->GetEquation(true);
+        equation->GetEquationAlt2(false);
+        equation->GetVariable("B");
+        // A failure may leave variables behind; a table of many of them is no test of safety.
+        if (equation->GetNumVariables() <= 6) {
+            equation->GetEquationAsHexInitValue(false);
+            equation->GetTruthTable().GetRows();
+        }
+        Kq_BoolEquation copy(*equation);
+        EXPECT_TRUE(copy == *equation);
+        *equation = objects.b;
+        equation->SetEquation("A & B");
+        EXPECT_EQ("0x8", Std(equation->GetEquationAsHexInitValue(false)));
+        equation->Clear();
+    }
+    objects.table.GetRows();
+    objects.table = Kq_BoolEquation("A");
+    EXPECT_EQ(2u, objects.table.GetRows().size());
+}
+
+// How often the operation failed before it succeeded.
+size_t FailEach(const Operation& operation, bool debugMode)
+{
+    const Messages messages;
+    for (size_t failing = 0;; ++failing) {
+        bool hasFailed = false;
+        Objects objects;
+        Prepare(objects);
+        Kq_BoolEquationImp::SetInternalDebugMode(debugMode);
+        s_numUntilFailure = failing;
+        s_isArmed = true;
+        try {
+            operation(objects);
+        } catch (const std::bad_alloc&) {
+            hasFailed = true;
+        }
+        s_isArmed = false;
+        Kq_BoolEquationImp::SetInternalDebugMode(false);
+        Use(objects);
+        if (!hasFailed)
+            return failing;
+    }
+}
+
+void ExpectSafe(const char* name, const Operation& operation)
+{
+    for (const bool debugMode : {false, true}) {
+        // The first round fills what the process keeps: names, spellings.
+        FailEach(operation, debugMode);
+        const size_t numLive = s_numLive;
+        const size_t numFailures = FailEach(operation, debugMode);
+        EXPECT_EQ(numLive, s_numLive) << name << " leaks";
+        std::printf("%-28s %4zu failures%s\n", name, numFailures, debugMode ? ", traced" : "");
+    }
+}
+
+TEST(Allocation, SettingIsSafeWhateverFails)
+{
+    ExpectSafe("expression", [](Objects& o) {
+        o.a.SetEquation("(P | Q ~ & R) ^ ~quite_a_long_name_for_a_net & P");
+    });
+    ExpectSafe("refused by the tokenizer", [](Objects& o) { o.a.SetEquation("P | Q $"); });
+    ExpectSafe("refused by the builder", [](Objects& o) { o.a.SetEquation("P | Q R S T"); });
+    ExpectSafe("negated operator refused",
+               [](Objects& o) { o.a.SetEquation("(P ~ & Q) & R ~ | S & ~ | T"); });
+    ExpectSafe("init value", [](Objects& o) { o.a.SetEquation("0x96"); });
+    ExpectSafe("init value refused", [](Objects& o) { o.a.SetEquation("0x9"); });
+    ExpectSafe("terms", [](Objects& o) {
+        o.a.SetEquationWithExplicitTerms({"A", "B", "a_listed_input_with_a_long_name"}, "A & D",
+                                         false, false);
+    });
+    ExpectSafe("terms with an init value", [](Objects& o) {
+        o.a.SetEquationWithExplicitTerms({"A", "B"}, "0x6", false, true);
+    });
+    ExpectSafe("many names", [](Objects& o) {
+        o.a.SetEquation("a+b+c+d+e+f+g+h+i+j+k+l+m+n+o+p+q+r+s+t+u+v+w+x+y+z+a1+b1+c1+d1");
+    });
+    ExpectSafe("own name", [](Objects& o) { o.a.SetEquation(o.a.GetVariables()[0].first); });
+}
+
+TEST(Allocation, CopyingIsSafeWhateverFails)
+{
+    ExpectSafe("copy", [](Objects& o) { Kq_BoolEquation copy(o.a); });
+    ExpectSafe("construct", [](Objects&) { Kq_BoolEquation made("P & Q"); });
+    ExpectSafe("clear shared", [](Objects& o) { o.a.Clear(); });
+    ExpectSafe("assign table", [](Objects& o) {
+        Kq_BoolEquation::TruthTable table(o.a);
+        table = o.table;
+        o.table = table;
+    });
+}
+
+TEST(Allocation, FailedAssignmentChangesNothing)
+{
+    for (size_t failing = 0;; ++failing) {
+        Kq_BoolEquation a("A & B");
+        const Kq_BoolEquation b("a_name_that_needs_memory | another_name_that_needs_memory");
+        s_numUntilFailure = failing;
+        s_isArmed = true;
+        try {
+            a = b;
+            s_isArmed = false;
+            break;
+        } catch (const std::bad_alloc&) {
+        }
+        EXPECT_EQ("A&B", Std(a.GetEquation(false)));
+        EXPECT_EQ("A0 B0", VariablesOf(a));
+    }
+}
+
+TEST(Allocation, AskingIsSafeWhateverFails)
+{
+    ExpectSafe("define",
+               [](Objects& o) { o.a.DefineVariable("another_variable_of_some_length", 1); });
+    ExpectSafe("handle", [](Objects& o) { o.handle = o.a.GetVariableHandle("C"); });
+    ExpectSafe("render", [](Objects& o) { o.a.GetEquationAlt3(true); });
+    ExpectSafe("eval", [](Objects& o) { o.a.Eval(); });
+    ExpectSafe("hexadecimal", [](Objects& o) { o.a.GetEquationAsHexInitValue(true); });
+    ExpectSafe("binary", [](Objects& o) { o.a.GetEquationAsBinaryInitValue(); });
+    ExpectSafe("term equation", [](Objects& o) { o.a.GetInitValueTermEquation(); });
+    ExpectSafe("table", [](Objects& o) { o.table = o.a; });
+    ExpectSafe("rows", [](Objects& o) { o.table.GetRows(); });
+    ExpectSafe("names", [](Objects& o) { o.table.GetVariableNames(); });
+    ExpectSafe("dump", [](Objects& o) { o.a.Dbg(); });
+}
+
+TEST(Allocation, PoolOfNamesStaysWhole)
+{
+    const char* names[] = {"abcdefghijklmnopqrstuvwxyz", "abcdefghijklmnop",
+                           "abcdefghijklmnopqrstuvwxyz0", "abd", "b"};
+    for (size_t failing = 0;; ++failing) {
+        bool hasFailed = false;
+        Engine::StringMgr pool;
+        for (const char* name : names) {
+            s_numUntilFailure = failing;
+            s_isArmed = true;
+            try {
+                pool.find(name);
+            } catch (const std::bad_alloc&) {
+                hasFailed = true;
+            }
+            s_isArmed = false;
+        }
+        for (const char* name : names) {
+            EXPECT_EQ(name, Std(pool.find(name)));
+            EXPECT_EQ(&pool.find(name), &pool.find(name));
+        }
+        if (!hasFailed)
+            break;
+    }
+}
+
+struct Thrown {};
+
+TEST(Allocation, AThrowingSinkIsTreatedTheSame)
+{
+    for (const char* text : {"A & ~(B ~ | C)", "A B C", "A & ~ | B"}) {
+        for (size_t failing = 0;; ++failing) {
+            bool hasFailed = false;
+            Objects objects;
+            Prepare(objects);
+            size_t numLeft = failing;
+            const Port_MsgManData::Sink before = Port_MsgManData::setSink(
+                [&](const char*, const char*, int, const char*, const char*) {
+                    if (numLeft-- == 0)
+                        throw Thrown();
+                });
+            Kq_BoolEquationImp::SetInternalDebugMode(true);
+            try {
+                objects.a.SetEquation(text);
+                objects.a.Eval();
+                objects.a.GetTruthTable().Dbg();
+            } catch (const Thrown&) {
+                hasFailed = true;
+            }
+            Kq_BoolEquationImp::SetInternalDebugMode(false);
+            Port_MsgManData::setSink(before);
+            Use(objects);
+            if (!hasFailed)
+                break;
+        }
+    }
+}
+
+} // namespace

@@ -19,7 +19,8 @@ class KQ_EXPORT Kq_BoolEquationImp {
     class Node;
     class StringMgr;
     class TruthTable;
-    // The shared nodes; completed inside the library.
+    // The tokens of a text and the shared nodes made of them; completed inside the library.
+    class Tokens;
     struct Store;
 
     Kq_BoolEquationImp();
@@ -104,12 +105,12 @@ class KQ_EXPORT Kq_BoolEquationImp {
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
 
     static StringMgr& GetNamePool();
+    static bool ScanTokens(const char* text, Tokens& tokens);
 
-    bool SetExpression(const char* text, const Port::StringBase<char>* initValue);
-    bool FinishEquation(const Port::StringBase<char>* initValue);
+    bool FinishEquation(const Tokens& tokens, const Port::StringBase<char>* initValue);
     void AddTruthTableRoot(const Port::StringBase<char>& initValue);
     void DefineTerms(const std::vector<Port::StringBase<char>>& terms, bool reverseTerms);
-    void DefineListedNames();
+    void DefineListedNames(const Tokens& tokens);
     size_t FindVariable(const Port::StringBase<char>& name) const;
     std::vector<Port::StringBase<char>> GetVariableNames() const;
     bool HasTruthTableRoot() const;

@@ -1,5 +1,6 @@
 // One node of an equation: a token of the text first, an element of its tree later.
 // Links between nodes own nothing; the equation's node store owns the nodes.
+// The accessors stand in the header because every step of the library goes through them.
 #ifndef KQ_BOOLEQUATIONIMPNODE_H
 #define KQ_BOOLEQUATIONIMPNODE_H
 
@@ -33,44 +34,52 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     };
 
     // A SENTINEL with an empty token and no links.
-    Node();
-    Node(TYPE type, const Port::StringBase<char>& token);
+    Node()
+        : m_type(SENTINEL), m_parent(nullptr), m_left_child(nullptr), m_right_child(nullptr),
+          m_value(0)
+    {
+    }
+    Node(TYPE type, const Port::StringBase<char>& token)
+        : m_type(type), m_token(token), m_parent(nullptr), m_left_child(nullptr),
+          m_right_child(nullptr), m_value(0)
+    {
+    }
     // Copies the links too: the copy points at the same parent and children.
-    Node(const Node& other);
-    ~Node();
-    Node& operator=(const Node& other);
+    Node(const Node& other) = default;
+    ~Node() = default;
+    Node& operator=(const Node& other) = default;
 
-    void SetType(TYPE type);
-    TYPE GetType() const;
-    void SetToken(const Port::StringBase<char>& token);
+    void SetType(TYPE type) { m_type = type; }
+    TYPE GetType() const { return m_type; }
+    void SetToken(const Port::StringBase<char>& token) { m_token = token; }
     // The token as it was parsed; an ID's name.
-    const Port::StringBase<char>& GetToken() const;
-    void SetParent(Node* parent);
-    Node* GetParent() const;
-    void SetLeftChild(Node* leftChild);
-    Node* GetLeftChild() const;
-    void SetRightChild(Node* rightChild);
-    Node* GetRightChild() const;
+    const Port::StringBase<char>& GetToken() const { return m_token; }
+    void SetParent(Node* parent) { m_parent = parent; }
+    Node* GetParent() const { return m_parent; }
+    void SetLeftChild(Node* leftChild) { m_left_child = leftChild; }
+    Node* GetLeftChild() const { return m_left_child; }
+    void SetRightChild(Node* rightChild) { m_right_child = rightChild; }
+    Node* GetRightChild() const { return m_right_child; }
     // An ID's variable index; no meaning for other types.
-    void SetValue(unsigned int value);
-    unsigned int GetValue() const;
+    void SetValue(unsigned int value) { m_value = value; }
+    unsigned int GetValue() const { return m_value; }
 
-    bool Is0() const;
-    bool Is1() const;
-    bool IsConst() const;
-    bool IsLp() const;
-    bool IsRp() const;
-    bool IsId() const;
-    bool IsNot() const;
-    bool IsAnd() const;
-    bool IsOr() const;
-    bool IsXor() const;
-    bool IsNAnd() const;
-    bool IsNOr() const;
-    bool IsNXor() const;
+    bool Is0() const { return m_type == ZERO; }
+    bool Is1() const { return m_type == ONE; }
+    bool IsConst() const { return Is0() || Is1(); }
+    bool IsLp() const { return m_type == LP; }
+    bool IsRp() const { return m_type == RP; }
+    bool IsId() const { return m_type == ID; }
+    bool IsNot() const { return m_type == NOT; }
+    bool IsAnd() const { return m_type == AND; }
+    bool IsOr() const { return m_type == OR; }
+    bool IsXor() const { return m_type == XOR; }
+    bool IsNAnd() const { return m_type == NAND; }
+    bool IsNOr() const { return m_type == NOR; }
+    bool IsNXor() const { return m_type == NXOR; }
     // Deliberate: anything but LP, RP, ID, NOT and SENTINEL, so constants, TRUTH_TABLE and corrupt
     // types answer true.
-    bool IsBinOp() const;
+    bool IsBinOp() const { return !IsLp() && !IsRp() && !IsId() && !IsNot() && m_type != SENTINEL; }
 
     // The node that parent links lead to. Where they run in a circle (shape 5), the first node on
     // the way whose parent has it as neither child.

@@ -115,65 +115,64 @@ void Kq_BoolEquationImp::Clear()
 
 bool Kq_BoolEquationImp::SetEquation(const String& text)
 {
-    const String copy = text; // may be one of the names that are cleared on the way
-    if (KqInitText::IsCandidate(copy)) {
-        const std::string expression = KqInitText::Expand(copy, GetVariableNames(), false);
-        if (!expression.empty())
-            return SetExpression(expression.c_str(), &copy);
-        // Deliberate: what is no init value over these variables is read as an expression.
-    }
-    return SetExpression(copy.c_str(), nullptr);
-}
-
-// Sets the equation from an expression; 'initValue' is the init value it stands for, null if none.
-bool Kq_BoolEquationImp::SetExpression(const char* text, const String* initValue)
-{
+    // Deliberate: what is no init value over these variables is read as an expression.
+    std::string expression;
+    if (KqInitText::IsCandidate(text))
+        expression = KqInitText::Expand(text, GetVariableNames(), false);
+    const bool isInitValue = !expression.empty();
+    // Read before anything is cleared: the text may be one of the names that go.
+    const String initValue = isInitValue ? text : String();
+    Tokens tokens;
+    const bool isRead = ScanTokens(isInitValue ? expression.c_str() : text.c_str(), tokens);
     Clear();
-    TokenizeNodes(text);
-    return FinishEquation(initValue);
+    if (!isRead || tokens.GetSize() == 0)
+        return false;
+    return FinishEquation(tokens, isInitValue ? &initValue : nullptr);
 }
 
-// Makes an equation of the tokens listed: tree, variables, the init value's own root, pre-order.
-bool Kq_BoolEquationImp::FinishEquation(const String* initValue)
+// Makes an equation of the tokens: nodes, tree, variables, the init value's own root, pre-order.
+// Requires: no nodes; listed inputs are defined.
+bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* initValue)
 {
+    m_store->MakeNodes(tokens);
     BuildTree();
-    if (!m_store->m_root) {
-        Clear();
+    if (!m_store->m_root)
         return false;
-    }
     // Variables are numbered in the order of the text, which pre-order need not be.
-    DefineListedNames();
+    DefineListedNames(tokens);
     if (initValue)
         AddTruthTableRoot(*initValue);
-    // A second list, so that a failed allocation leaves the first one whole.
-    std::vector<Node*> nodes;
-    nodes.reserve(m_store->m_nodes.size());
-    KqWalkPreOrder(m_store->m_root, 0, [&](Node* node, size_t) {
-        nodes.push_back(node);
-        return true;
-    });
-    m_store->m_nodes.swap(nodes);
+    Node** next = m_store->m_nodes.data();
+    try {
+        KqWalkPreOrder(m_store->m_root, 0, [&](Node* node, size_t) {
+            *next++ = node;
+            return true;
+        });
+    } catch (...) {
+        m_store->ListInMakingOrder();
+        throw;
+    }
     KqCheckStore(*m_store);
     return true;
 }
 
 void Kq_BoolEquationImp::AddTruthTableRoot(const String& initValue)
 {
-    std::unique_ptr<Node> table(new Node(Node::TRUTH_TABLE, initValue));
-    m_store->m_nodes.push_back(table.get());
-    Node* root = table.release();
-    root->SetLeftChild(m_store->m_root);
-    m_store->m_root->SetParent(root);
-    m_store->m_root = root;
+    Node* table = m_store->MakeNode(Node::TRUTH_TABLE, initValue);
+    table->SetLeftChild(m_store->m_root);
+    m_store->m_root->SetParent(table);
+    m_store->m_root = table;
 }
 
 unsigned int Kq_BoolEquationImp::Eval() const
 {
     if (!m_store->m_root)
         return 0;
+    if (!GetInternalDebugMode())
+        return m_store->m_compiled.Eval(*m_store->m_root, m_variables);
+    // Node by node, because the trace is output.
     const unsigned int value = m_store->m_root->Eval(m_variables);
-    if (GetInternalDebugMode())
-        m_store->m_root->Dbg();
+    m_store->m_root->Dbg();
     return value;
 }
 

@@ -1,30 +1,104 @@
-// The node store: the nodes of one equation, shared by all engine objects that are copies.
-// The list owns the nodes; the links between them own nothing.
+// The node store: the nodes of one equation, shared by all engine objects that are copies; and the
+// tokens that nodes are made of.
 #ifndef KQ_BOOLEQUATIONIMPSTORE_H
 #define KQ_BOOLEQUATIONIMPSTORE_H
 
+#include <algorithm>
 #include <cassert>
+#include <memory>
+#include <new>
 #include <vector>
 
 #include <Kq_BoolEquationImpNode.h>
 
+#include "Kq_BoolEquationImpProgram.h"
+
+// The tokens of one text, in text order. The first ones need no heap.
+// Texts point into the pool of names and the table of spellings: they outlive every equation.
+class Kq_BoolEquationImp::Tokens {
+  public:
+    struct Token {
+        Node::TYPE type;
+        const Port::StringBase<char>* text;
+    };
+
+    size_t GetSize() const { return m_size; }
+    const Token* begin() const { return m_size <= kInline ? m_first : m_all.data(); }
+    const Token* end() const { return begin() + m_size; }
+
+    void Append(Node::TYPE type, const Port::StringBase<char>& text)
+    {
+        const Token token = {type, &text};
+        if (m_size < kInline) {
+            m_first[m_size] = token;
+        } else {
+            if (m_size == kInline)
+                m_all.assign(m_first, m_first + kInline);
+            m_all.push_back(token);
+        }
+        ++m_size;
+    }
+
+  private:
+    static constexpr size_t kInline = 128;
+
+    size_t m_size = 0;
+    Token m_first[kInline];
+    std::vector<Token> m_all; // all tokens, once they are too many for m_first
+};
+
 // Invariants:
 // 1. m_count is the number of engine objects that point here; the last one to leave deletes.
-// 2. m_nodes owns every node it lists; none stands in it twice, none is null.
+// 2. All nodes lie side by side in one block from the node class's allocator, in the order they
+//    were made. m_nodes lists every one of them once, and owns none.
 // 3. m_root is null until the whole tree has passed its checks. From the end of SetEquation on the
 //    list is the tree in pre-order.
+// 4. m_compiled is made of the nodes and their variable indices, and goes when they change.
 struct Kq_BoolEquationImp::Store {
     Store() = default;
     ~Store() { FreeNodes(); }
     Store(const Store&) = delete;
     Store& operator=(const Store&) = delete;
 
+    // Makes a node of each token and leaves room for one more.
+    // Requires: no nodes.  Fails: std::bad_alloc; the nodes made so far are listed.
+    void MakeNodes(const Tokens& tokens)
+    {
+        assert(m_nodes.empty());
+        FreeNodes(); // an allocation that failed before may have left a block without nodes
+        m_nodes.reserve(tokens.GetSize() + 1);
+        m_block = Node::m_kq_boolequationimp_node_mem.allocate(tokens.GetSize() + 1);
+        m_num_slots = tokens.GetSize() + 1;
+        for (const Tokens::Token& token : tokens)
+            MakeNode(token.type, *token.text);
+    }
+
+    // Requires: fewer nodes than MakeNodes left room for.
+    Node* MakeNode(Node::TYPE type, const Port::StringBase<char>& text)
+    {
+        assert(m_nodes.size() < m_num_slots);
+        Node* node = ::new (static_cast<void*>(m_block + m_nodes.size())) Node(type, text);
+        m_nodes.push_back(node);
+        return node;
+    }
+
+    // Lists the nodes in the order they were made in. Needs no memory.
+    void ListInMakingOrder() noexcept
+    {
+        for (size_t position = 0; position < m_nodes.size(); ++position)
+            m_nodes[position] = m_block + position;
+    }
+
     void FreeNodes() noexcept
     {
         m_root = nullptr;
-        for (Node* node : m_nodes)
-            delete node;
+        m_compiled.Drop();
+        for (size_t position = 0; position < m_nodes.size(); ++position)
+            m_block[position].~Node();
         m_nodes.clear();
+        if (m_block)
+            Node::m_kq_boolequationimp_node_mem.deallocate(m_block, m_num_slots);
+        m_block = nullptr;
     }
 
     // Takes one holder away.
@@ -38,6 +112,10 @@ struct Kq_BoolEquationImp::Store {
     Node* m_root = nullptr;
     std::vector<Node*> m_nodes;
     unsigned int m_count = 1;
+
+    Node* m_block = nullptr;
+    size_t m_num_slots = 0;
+    KqCompiled m_compiled;
 };
 
 // Asserts invariant 3 and that links agree, for the builds that check: every node stands at the

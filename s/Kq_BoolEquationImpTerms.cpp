@@ -12,21 +12,25 @@ bool Kq_BoolEquationImp::SetEquationWithExplicitTerms(const std::vector<String>&
                                                       const String& equation, bool termOrderFlag,
                                                       bool reverseTerms)
 {
-    const String text = equation; // may be one of the names that are cleared now
-    Clear();
-    const bool isInitValue = KqInitText::IsCandidate(text);
-    DefineTerms(terms, isInitValue && reverseTerms);
-    if (!isInitValue) {
-        TokenizeNodes(text.c_str());
-        return FinishEquation(nullptr);
+    Tokens tokens;
+    if (!KqInitText::IsCandidate(equation)) {
+        // Scanned before anything is cleared: the text may be one of the names that go.
+        const bool isRead = ScanTokens(equation.c_str(), tokens);
+        Clear();
+        if (!isRead || tokens.GetSize() == 0)
+            return false;
+        DefineTerms(terms, false);
+        return FinishEquation(tokens, nullptr);
     }
     // Deliberate: over listed inputs every text that starts with a 0 is an init value or refused,
     // "0&A" included.
+    const String text = equation;
+    Clear();
+    DefineTerms(terms, reverseTerms);
     const std::string expression = KqInitText::Expand(text, GetVariableNames(), termOrderFlag);
-    if (expression.empty()) {
+    if (expression.empty() || !ScanTokens(expression.c_str(), tokens)) {
         Clear();
         return false;
     }
-    TokenizeNodes(expression.c_str());
-    return FinishEquation(&text);
+    return FinishEquation(tokens, &text);
 }

@@ -1,10 +1,9 @@
-// Text in, one node for each token out, in text order and without links.
+// Text in, one token or node for each piece out, in text order and without links.
 // A text that is refused clears the object; nothing is said.  Fails: std::bad_alloc.
-// Cost: one pass; a name is copied once into a scratch string on its way to the pool.
+// Cost: one pass; a name that was met lately is found again by a glance at its characters.
 #include <Kq_BoolEquationImp.h>
 
 #include <cstring>
-#include <memory>
 #include <string>
 
 #include "Kq_BoolEquationImpSpelling.h"
@@ -15,8 +14,10 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// Ordinary equations never regrow their list; more tokens are accepted.
-constexpr size_t kReservedTokens = 3000;
+// Names met lately, by a hash of their length and a few characters. They live in the pool of names,
+// which never forgets one.
+constexpr size_t kNumRecent = 256;
+const String* s_recentNames[kNumRecent];
 
 bool IsNameStart(char character)
 {
@@ -107,15 +108,15 @@ const char* EndOfMarked(const char* start, char mark)
     return end ? end + 1 : nullptr;
 }
 
-// Scans one text into one list.
+// Scans one text into tokens.
 class Scanner {
   public:
-    Scanner(Kq_BoolEquationImp::StringMgr& names, std::vector<Node*>& nodes)
-        : m_names(names), m_nodes(nodes)
+    Scanner(Kq_BoolEquationImp::StringMgr& names, Kq_BoolEquationImp::Tokens& tokens)
+        : m_names(names), m_tokens(tokens)
     {
     }
 
-    // False when the text is refused; tokens found so far are in the list then.
+    // False when the text is refused.
     bool ScanText(const char* text)
     {
         m_next = text;
@@ -191,26 +192,34 @@ class Scanner {
 
     void AppendSpelling(KqSpelling::Id id, size_t length)
     {
-        Append(KqSpelling::kSpellings[id].type, KqSpelling::GetText(id));
+        m_tokens.Append(KqSpelling::kSpellings[id].type, KqSpelling::GetText(id));
         m_next += length;
     }
 
     void AppendName(const char* end)
     {
-        m_name.assign(m_next, end);
-        Append(Node::ID, m_names.find(m_name.c_str()));
+        const size_t length = static_cast<size_t>(end - m_next);
+        const String*& recent = s_recentNames[RecentSlot(m_next, length)];
+        if (!recent || recent->length() != length ||
+            std::memcmp(recent->c_str(), m_next, length) != 0) {
+            m_name.assign(m_next, end);
+            recent = &m_names.find(m_name.c_str());
+        }
+        m_tokens.Append(Node::ID, *recent);
         m_next = end;
     }
 
-    void Append(Node::TYPE type, const String& token)
+    // Requires: length > 0.
+    static size_t RecentSlot(const char* name, size_t length)
     {
-        std::unique_ptr<Node> node(new Node(type, token));
-        m_nodes.push_back(node.get());
-        node.release();
+        const size_t mix = static_cast<unsigned char>(name[0]) +
+                           static_cast<unsigned char>(name[length - 1]) * 29u +
+                           static_cast<unsigned char>(name[length / 2]) * 7u + length * 61u;
+        return mix % kNumRecent;
     }
 
     Kq_BoolEquationImp::StringMgr& m_names;
-    std::vector<Node*>& m_nodes;
+    Kq_BoolEquationImp::Tokens& m_tokens;
     const char* m_next = nullptr;
     size_t m_num_opened = 0;
     size_t m_num_closed = 0;
@@ -219,14 +228,19 @@ class Scanner {
 
 } // namespace
 
+// The tokens of 'text'; false when it is refused. Tokens do not point into the text.
+bool Kq_BoolEquationImp::ScanTokens(const char* text, Tokens& tokens)
+{
+    return Scanner(GetNamePool(), tokens).ScanText(text);
+}
+
 void Kq_BoolEquationImp::TokenizeNodes(const char* text)
 {
     if (!text || !*text || !m_store->m_nodes.empty())
         return;
-    // A token is a character at least, so a short text needs no more slots than it has characters.
-    m_store->m_nodes.reserve(strnlen(text, kReservedTokens));
-    if (Scanner(GetNamePool(), m_store->m_nodes).ScanText(text))
-        m_store->m_nodes.shrink_to_fit();
-    else
+    Tokens tokens;
+    if (!ScanTokens(text, tokens))
         Clear();
+    else if (tokens.GetSize() != 0)
+        m_store->MakeNodes(tokens);
 }

@@ -92,7 +92,8 @@ class TreeBuilder {
     {
         node->SetLeftChild(operand);
         operand->SetParent(node);
-        m_holders.erase(operand);
+        if (operand->IsNot() && !m_holders.empty())
+            m_holders.erase(operand);
     }
 
     static void ReplaceChild(Node* parent, const Node* child, Node* replacement)

@@ -4,6 +4,7 @@
 // Cost: a look-up walks the table; setting an equation uses an index for the time it takes.
 #include <Kq_BoolEquationImp.h>
 
+#include <algorithm>
 #include <cstring>
 #include <functional>
 #include <string_view>
@@ -16,6 +17,9 @@ typedef std::pair<String, unsigned int> Variable;
 namespace {
 
 constexpr size_t kNotFound = SIZE_MAX;
+
+// Room made for the first variable of an equation: ordinary ones never regrow their table.
+constexpr size_t kFirstVariables = 8;
 
 // Equal in length and bytes; a NUL byte is a byte like any other.
 bool IsSameName(const String& left, const String& right)
@@ -70,7 +74,7 @@ class NameIndex {
     {
         if (m_variables.size() <= kMaxUnindexed)
             return FindName(m_variables, name);
-        if (m_slots.size() < 2 * m_variables.size() || m_num_indexed > m_variables.size())
+        if (m_slots.size() < 2 * m_variables.size())
             Rebuild();
         while (m_num_indexed < m_variables.size()) {
             *SlotOf(m_variables[m_num_indexed].first) = m_num_indexed;
@@ -103,6 +107,67 @@ class NameIndex {
     size_t m_num_indexed = 0;
 };
 
+// The variable indices of the names of one text. A name of the pool is one string, so its address
+// is its name. A few are searched one by one, more have a hash table, at most half full.
+class PooledNames {
+  public:
+    // Where the index of 'name' is kept; kNotFound is kept for a name that is new.
+    size_t& IndexOf(const String* name)
+    {
+        if (m_slots.empty()) {
+            for (size_t position = 0; position < m_size; ++position) {
+                if (m_first[position].name == name)
+                    return m_first[position].index;
+            }
+            if (m_size < kMaxUnindexed) {
+                m_first[m_size] = Entry{name, kNotFound};
+                return m_first[m_size++].index;
+            }
+        }
+        if (m_slots.size() < 2 * (m_size + 1))
+            Rebuild();
+        Entry* slot = SlotOf(name);
+        if (!slot->name) {
+            *slot = Entry{name, kNotFound};
+            ++m_size;
+        }
+        return slot->index;
+    }
+
+  private:
+    struct Entry {
+        const String* name;
+        size_t index;
+    };
+
+    static constexpr size_t kMaxUnindexed = 12;
+
+    void Rebuild()
+    {
+        std::vector<Entry> entries(4 * (m_size + 1), Entry{nullptr, kNotFound});
+        entries.swap(m_slots);
+        if (entries.empty())
+            entries.assign(m_first, m_first + m_size);
+        for (const Entry& entry : entries) {
+            if (entry.name)
+                *SlotOf(entry.name) = entry;
+        }
+    }
+
+    Entry* SlotOf(const String* name)
+    {
+        const uint64_t mixed = reinterpret_cast<uintptr_t>(name) * 0x9e3779b97f4a7c15u;
+        size_t slot = (mixed >> 32) % m_slots.size();
+        while (m_slots[slot].name && m_slots[slot].name != name)
+            slot = slot + 1 == m_slots.size() ? 0 : slot + 1;
+        return &m_slots[slot];
+    }
+
+    size_t m_size = 0;
+    Entry m_first[kMaxUnindexed];
+    std::vector<Entry> m_slots;
+};
+
 } // namespace
 
 size_t Kq_BoolEquationImp::FindVariable(const String& name) const
@@ -117,8 +182,10 @@ bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
     const unsigned int variableIndex = GetNumVariables();
     m_variables.push_back(Variable(name, value ? 1u : 0u));
     for (Node* node : m_store->m_nodes) {
-        if (node->IsId() && IsSameName(node->GetToken(), name))
+        if (node->IsId() && IsSameName(node->GetToken(), name)) {
             node->SetValue(variableIndex);
+            m_store->m_compiled.Drop();
+        }
     }
     return true;
 }
@@ -136,20 +203,29 @@ void Kq_BoolEquationImp::DefineTerms(const std::vector<String>& terms, bool reve
     }
 }
 
-// Defines the name of every ID node that is no variable yet, with value 0 and in list order, and
-// writes its variable's index into every ID node.
-void Kq_BoolEquationImp::DefineListedNames()
+// Defines the name of every ID node that is no variable yet, with value 0 and in text order, and
+// writes its variable's index into every ID node. The nodes are still in the order of 'tokens'.
+void Kq_BoolEquationImp::DefineListedNames(const Tokens& tokens)
 {
-    NameIndex index(m_variables);
-    for (Node* node : m_store->m_nodes) {
-        if (!node->IsId())
+    assert(m_store->m_nodes.size() == tokens.GetSize());
+    const bool hasListedTerms = !m_variables.empty();
+    NameIndex terms(m_variables);
+    PooledNames names;
+    Node* const* node = m_store->m_nodes.data();
+    for (const Tokens::Token& token : tokens) {
+        Node* const idNode = *node++;
+        if (token.type != Node::ID)
             continue;
-        size_t variableIndex = index.Find(node->GetToken());
+        size_t& variableIndex = names.IndexOf(token.text);
+        if (variableIndex == kNotFound && hasListedTerms)
+            variableIndex = terms.Find(*token.text);
         if (variableIndex == kNotFound) {
+            if (m_variables.capacity() == 0)
+                m_variables.reserve(std::min<size_t>(tokens.GetSize(), kFirstVariables));
             variableIndex = m_variables.size();
-            m_variables.push_back(Variable(node->GetToken(), 0u));
+            m_variables.push_back(Variable(*token.text, 0u));
         }
-        node->SetValue(static_cast<unsigned int>(variableIndex));
+        idNode->SetValue(static_cast<unsigned int>(variableIndex));
     }
 }
 

@@ -1,4 +1,5 @@
 // Result columns: from a checked tree to 2^n bits.
+#include <algorithm>
 #include <memory>
 
 #include <Kq_BoolEquationImp.h>

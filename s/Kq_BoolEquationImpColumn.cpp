@@ -1,205 +1,258 @@
-// Tree in, packed result column out: the tree becomes a list of steps once, and each step works on
-// a block of words at a time, so that a block stays in the cache for all steps.
-// Every operator is symmetric on single bits, so the operand that needs more blocks is computed
-// first: a tree of n nodes never needs more than log2(n)+1 blocks, however deep it is.
+// Tree in, packed result column out. The leading variables are fixed one after another until the
+// rest is a constant, has been written before, or is small enough for a kernel, which then runs it
+// in a block that stays in the cache.
 #include "Kq_BoolEquationImpColumn.h"
 
 #include <algorithm>
 #include <cassert>
+#include <cstring>
 
-#include "Kq_BoolEquationImpWalk.h"
+#include "Kq_BoolEquationImpColumnKernel.h"
 
 typedef Kq_BoolEquationImp::Node Node;
 
 namespace {
 
-// Column of the variable that is bit 'bit' of the row number, for bits below 6.
-constexpr uint64_t kPatterns[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu, 0xf0f0f0f0f0f0f0f0u,
-                                   0xff00ff00ff00ff00u, 0xffff0000ffff0000u, 0xffffffff00000000u};
+// Blocks of up to 2^14 rows, 2 kB, are left to a kernel.
+constexpr unsigned int kKernelLevel = 14;
 
-constexpr unsigned int kNoBit = UINT32_MAX;
+// Larger blocks are not copied but expanded again: their first copy has left the cache.
+constexpr unsigned int kMaxCopyLevel = 20;
 
-void FillVariable(unsigned int bit, uint64_t firstWord, size_t numWords, uint64_t* words)
+size_t NumWords(unsigned int level)
 {
-    if (bit < 6 || bit == kNoBit) {
-        std::fill_n(words, numWords, bit == kNoBit ? 0u : kPatterns[bit]);
-        return;
+    return size_t(1) << (level - 6);
+}
+
+// The highest variable in a set that is not empty.
+unsigned int HighestVariable(uint32_t variables)
+{
+    unsigned int highest = 0;
+    while (variables >>= 1)
+        ++highest;
+    return highest;
+}
+
+// Repeats the first 'numWords' words until there are 'totalWords', a multiple of them.
+void Repeat(size_t numWords, size_t totalWords, uint64_t* words)
+{
+    // Short pieces are doubled, long ones copied from the first, which is still in the cache.
+    constexpr size_t kLongPiece = 2048;
+    while (numWords < totalWords && numWords < kLongPiece) {
+        std::memcpy(words + numWords, words, numWords * sizeof(uint64_t));
+        numWords *= 2;
     }
-    for (size_t word = 0; word < numWords; ++word)
-        words[word] = uint64_t(0) - ((firstWord + word) >> (bit - 6) & 1u);
+    for (size_t word = numWords; word < totalWords; word += numWords)
+        std::memcpy(words + word, words, numWords * sizeof(uint64_t));
 }
 
-// Applies the binary operator 'type' to 'left' and 'right' into 'left'.
-void Combine(Node::TYPE type, size_t numWords, uint64_t* left, const uint64_t* right)
+void RunPlain(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+              uint64_t* stack, uint64_t* words)
 {
-    switch (type) {
-    case Node::AND:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] &= right[word];
-        return;
-    case Node::OR:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] |= right[word];
-        return;
-    case Node::XOR:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] ^= right[word];
-        return;
-    case Node::NAND:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] = ~(left[word] & right[word]);
-        return;
-    case Node::NOR:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] = ~(left[word] | right[word]);
-        return;
-    case Node::NXOR:
-        for (size_t word = 0; word < numWords; ++word)
-            left[word] = ~(left[word] ^ right[word]);
-        return;
-    case Node::ZERO:
-    case Node::ONE:
-    case Node::ID:
-    case Node::LP:
-    case Node::NOT:
-    case Node::RP:
-    case Node::TRUTH_TABLE:
-    case Node::SENTINEL:
-        break;
-    }
-    assert(!"a binary operator");
+    RunTiles<Vectors<16>, 8>(steps, numSteps, isInverted, numWords, stack, words);
 }
 
-// The node whose value 'node' has: groups and init-value roots hand on their operand's, null when
-// there is none.
-const Node* Skip(const Node* node)
+bool IsAlwaysSupported()
 {
-    while (node && (node->IsLp() || node->GetType() == Node::TRUTH_TABLE))
-        node = node->GetLeftChild();
-    return node;
+    return true;
 }
 
-// A node of the tree without groups, with the number of blocks that its subtree needs.
-struct Item {
-    const Node* node; // null counts as 0
-    size_t left;      // positions of the operands, 0 when there are none
-    size_t right;
-    size_t need;
+#if defined(KQ_HAS_X86_KERNELS)
+bool IsAvx2Supported()
+{
+    return __builtin_cpu_supports("avx2") != 0;
+}
+
+bool IsAvx512Supported()
+{
+    return __builtin_cpu_supports("avx512f") != 0 && __builtin_cpu_supports("avx512vl") != 0;
+}
+#endif
+
+const KqNamedKernel kKernels[] = {{"plain", RunPlain, IsAlwaysSupported},
+#if defined(KQ_HAS_X86_KERNELS)
+                                  {"avx2", KqRunAvx2, IsAvx2Supported},
+                                  {"avx512", KqRunAvx512, IsAvx512Supported}
+#endif
 };
 
-bool IsOperator(const Node* node)
+KqKernel ChooseKernel()
 {
-    return node && !node->IsConst() && node->IsBinOp();
-}
-
-// All nodes below 'root', each before its operands.
-std::vector<Item> ListItems(const Node* root)
-{
-    std::vector<Item> items(1, Item{Skip(root), 0, 0, 1});
-    for (size_t position = 0; position < items.size(); ++position) {
-        const Node* node = items[position].node;
-        if (node && (node->IsNot() || IsOperator(node))) {
-            items[position].left = items.size();
-            items.push_back(Item{Skip(node->GetLeftChild()), 0, 0, 1});
-        }
-        if (IsOperator(node)) {
-            items[position].right = items.size();
-            items.push_back(Item{Skip(node->GetRightChild()), 0, 0, 1});
-        }
+    KqKernel best = RunPlain;
+    for (const KqNamedKernel& kernel : kKernels) {
+        if (kernel.isSupported())
+            best = kernel.run;
     }
-    // Operands stand behind their operator, so a walk backwards knows their needs.
-    for (size_t position = items.size(); position-- > 0;) {
-        Item& item = items[position];
-        if (item.left == 0)
-            continue;
-        const size_t left = items[item.left].need;
-        const size_t right = item.right != 0 ? items[item.right].need : 0;
-        item.need = left == right ? left + 1 : std::max(left, right);
-    }
-    return items;
+    return best;
 }
 
 } // namespace
 
-KqColumn::KqColumn(const Node* root, unsigned int numVariables)
-    : m_num_variables(numVariables),
-      m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1)
+const KqNamedKernel* KqGetKernels(size_t* numKernels)
 {
-    assert(numVariables <= 30);
-    Compile(root);
+    *numKernels = sizeof kKernels / sizeof kKernels[0];
+    return kKernels;
 }
 
-void KqColumn::Compile(const Node* root)
+KqColumn::KqColumn(const Node* root, unsigned int numVariables)
+    : m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1)
 {
-    const std::vector<Item> items = ListItems(root);
-    m_steps.reserve(items.size());
-    m_stack.resize(items[0].need * kBlockWords);
-    // Steps come out in reverse, the operator before its operands, and are turned round at the end.
-    KqStack<size_t, 64> pending;
-    pending.Push(0);
-    while (!pending.IsEmpty()) {
-        const Item& item = items[pending.Pop()];
-        Step step = {item.node ? item.node->GetType() : Node::ZERO, kNoBit};
-        if (step.type == Node::ID && item.node->GetValue() < m_num_variables)
-            step.bit = m_num_variables - 1 - item.node->GetValue();
-        m_steps.push_back(step);
-        const bool isRightFirst = item.right != 0 && items[item.right].need > items[item.left].need;
-        // What is pushed last comes out first here, and so is computed last.
-        if (item.right != 0 && isRightFirst)
-            pending.Push(item.right);
-        if (item.left != 0)
-            pending.Push(item.left);
-        if (item.right != 0 && !isRightFirst)
-            pending.Push(item.right);
-    }
-    std::reverse(m_steps.begin(), m_steps.end());
+    assert(numVariables <= kMaxVariables);
+    static const KqKernel kernel = ChooseKernel();
+    m_kernel = kernel;
+    KqProgram program = KqCompile(root, numVariables, true);
+    m_codes.swap(program.codes);
+    m_num_codes = m_codes.size();
+    m_whole = Describe(0, m_num_codes, program.isInverted);
 }
 
 void KqColumn::Fill(uint64_t firstWord, size_t numWords, uint64_t* words)
 {
     assert(firstWord + numWords <= m_num_words);
-    for (size_t done = 0; done < numWords; done += kBlockWords)
-        FillBlock(firstWord + done, std::min(kBlockWords, numWords - done), words + done);
+    // The largest pieces that start at a multiple of their size.
+    while (numWords > 0) {
+        unsigned int level = 6;
+        while (firstWord % NumWords(level + 1) == 0 && NumWords(level + 1) <= numWords)
+            ++level;
+        FillPiece(firstWord, level, words);
+        firstWord += NumWords(level);
+        words += NumWords(level);
+        numWords -= NumWords(level);
+    }
 }
 
-void KqColumn::FillBlock(uint64_t firstWord, size_t numWords, uint64_t* words)
+// Fixes the variables above the piece as its place says. The piece before shares most of them.
+void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words)
 {
-    uint64_t* next = m_stack.data(); // the free block above the stack's top
-    for (const Step& step : m_steps) {
-        switch (step.type) {
-        case Node::ID:
-            FillVariable(step.bit, firstWord, numWords, next);
-            next += kBlockWords;
-            break;
-        case Node::ZERO:
-        case Node::RP:
-        case Node::SENTINEL:
-            std::fill_n(next, numWords, uint64_t(0));
-            next += kBlockWords;
-            break;
-        case Node::ONE:
-            std::fill_n(next, numWords, ~uint64_t(0));
-            next += kBlockWords;
-            break;
-        case Node::NOT:
-            std::transform(next - kBlockWords, next - kBlockWords + numWords, next - kBlockWords,
-                           [](uint64_t word) { return ~word; });
-            break;
-        case Node::AND:
-        case Node::NAND:
-        case Node::NOR:
-        case Node::NXOR:
-        case Node::OR:
-        case Node::XOR:
-            next -= kBlockWords;
-            Combine(step.type, numWords, next - kBlockWords, next);
-            break;
-        case Node::LP:
-        case Node::TRUTH_TABLE:
-            assert(!"groups are left out");
-            break;
+    ForgetWritten();
+    size_t depth = 0;
+    Rest rest = m_whole;
+    while (rest.variables >> level != 0) {
+        const unsigned int variable = HighestVariable(rest.variables);
+        const bool value = (firstWord >> (variable - 6) & 1u) != 0;
+        if (depth < m_path.size() && m_path[depth].variable == variable &&
+            m_path[depth].value == value) {
+            rest = m_path[depth++].rest;
+            continue;
         }
+        m_path.resize(depth);
+        m_num_codes = rest.first + rest.numCodes;
+        rest = Fix(rest, variable, value);
+        m_path.push_back(Fixed{variable, value, rest});
+        ++depth;
     }
-    assert(next == m_stack.data() + kBlockWords);
-    std::copy_n(m_stack.data(), numWords, words);
+    m_num_codes = rest.first + rest.numCodes;
+    Expand(rest, level, words);
+}
+
+void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
+{
+    if (rest.numCodes == 0) {
+        std::memset(words, rest.isInverted ? 0xff : 0, NumWords(level) * sizeof(uint64_t));
+        return;
+    }
+    // The block repeats from the highest variable on that it has.
+    const unsigned int ownLevel = std::max(HighestVariable(rest.variables) + 1, 6u);
+    if (ownLevel <= kKernelLevel) {
+        if (CopyWritten(rest, ownLevel, words))
+            return Repeat(NumWords(ownLevel), NumWords(level), words);
+        RunKernel(rest, ownLevel, words);
+    } else if (!CopyWritten(rest, ownLevel, words)) {
+        ExpandHalves(rest, ownLevel, words);
+    }
+    m_written[rest.hash % kNumWritten] = Written{rest, ownLevel, m_generation, words};
+    Repeat(NumWords(ownLevel), NumWords(level), words);
+}
+
+void KqColumn::ExpandHalves(const Rest& rest, unsigned int level, uint64_t* words)
+{
+    // What is left stays in m_codes while it may be met again, up to a few times the program.
+    const size_t limit = rest.first + rest.numCodes + 4 * m_whole.numCodes + 16384;
+    for (const bool value : {false, true}) {
+        if (m_num_codes > limit) {
+            ForgetWritten();
+            m_num_codes = rest.first + rest.numCodes;
+        }
+        const Rest half = Fix(rest, level - 1, value);
+        Expand(half, level - 1, words + (value ? NumWords(level - 1) : 0));
+    }
+}
+
+void KqColumn::RunKernel(const Rest& rest, unsigned int level, uint64_t* words)
+{
+    const size_t numStacked = KqMakeSteps(m_codes.data() + rest.first, rest.numCodes, m_steps);
+    if (m_stack.size() < (numStacked + 1) * kKqTileWords)
+        m_stack.resize((numStacked + 1) * kKqTileWords);
+    const size_t numWords = NumWords(level);
+    if (numWords >= kKqTileWords) {
+        m_kernel(m_steps.data(), m_steps.size(), rest.isInverted, numWords, m_stack.data(), words);
+        return;
+    }
+    uint64_t tile[kKqTileWords];
+    m_kernel(m_steps.data(), m_steps.size(), rest.isInverted, kKqTileWords, m_stack.data(), tile);
+    std::memcpy(words, tile, numWords * sizeof(uint64_t));
+}
+
+// What is left of 'rest' when 'variable' is 'value'; its codes go behind all others.
+KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value)
+{
+    const size_t first = m_num_codes;
+    if (m_codes.size() < first + rest.numCodes)
+        m_codes.resize(2 * first + rest.numCodes);
+    KqWriter writer(m_codes.data() + first);
+    KqWriter::Value values[kKqMaxStack];
+    KqWriter::Value* top = values - 1;
+    const KqCode* const end = m_codes.data() + rest.first + rest.numCodes;
+    for (const KqCode* next = end - rest.numCodes; next != end; ++next) {
+        const KqCode code = *next;
+        const KqCode kind = KqKindOf(code);
+        if (kind == kKqVariable) {
+            assert(top + 1 < values + kKqMaxStack);
+            *++top = KqVariableOf(code) == variable ? writer.PutConstant(value)
+                                                    : writer.PutVariable(KqVariableOf(code));
+            continue;
+        }
+        const KqWriter::Value upper = *top--;
+        *top = kind == kKqXor ? writer.PutXor(*top, upper)
+                              : writer.PutAnd(KqInverted(*top, (kind & kKqInvertLower) != 0),
+                                              KqInverted(upper, (kind & kKqInvertUpper) != 0));
+    }
+    const size_t numCodes = static_cast<size_t>(writer.GetEnd() - (m_codes.data() + first));
+    m_num_codes += numCodes;
+    return Describe(first, numCodes, top->isInverted != rest.isInverted);
+}
+
+KqColumn::Rest KqColumn::Describe(size_t first, size_t numCodes, bool isInverted) const
+{
+    Rest rest = {first, numCodes, 0, 0, isInverted};
+    for (size_t position = first; position < first + numCodes; ++position) {
+        const KqCode code = m_codes[position];
+        if (KqKindOf(code) == kKqVariable)
+            rest.variables |= 1u << KqVariableOf(code);
+        rest.hash = (rest.hash ^ code) * 0x9e3779b1u;
+        rest.hash ^= rest.hash >> 15;
+    }
+    return rest;
+}
+
+// Copies the block of 'rest' when the same one, or its complement, has been written.
+bool KqColumn::CopyWritten(const Rest& rest, unsigned int level, uint64_t* words)
+{
+    if (level > kMaxCopyLevel)
+        return false;
+    Written& written = m_written[rest.hash % kNumWritten];
+    if (written.generation != m_generation || written.level != level ||
+        written.rest.numCodes != rest.numCodes ||
+        std::memcmp(m_codes.data() + written.rest.first, m_codes.data() + rest.first,
+                    rest.numCodes * sizeof(KqCode)) != 0)
+        return false;
+    if (written.rest.isInverted == rest.isInverted) {
+        std::memcpy(words, written.words, NumWords(level) * sizeof(uint64_t));
+    } else {
+        for (size_t word = 0; word < NumWords(level); ++word)
+            words[word] = ~written.words[word];
+        written.rest.isInverted = rest.isInverted;
+    }
+    written.words = words; // the newest copy is the likeliest in the cache
+    return true;
 }

@@ -7,11 +7,34 @@
 #include <cstdint>
 #include <vector>
 
-#include <Kq_BoolEquationImpNode.h>
+#include "Kq_BoolEquationImpProgram.h"
+
+// Words that every kernel may work on at a time; a column in pieces of a multiple of it is best.
+constexpr size_t kKqTileWords = 64;
+
+// A kernel computes 'numWords' words of the column of the steps' variables, whose number is the bit
+// of the row number that is their value: bit k of the result, bit k % 64 of word k / 64, is
+//     the value of the steps for row k, complemented when 'isInverted'.
+// Requires: numWords a multiple of kKqTileWords; variables below 30; 'stack' has room for as many
+// tiles of kKqTileWords words as the steps stack values.
+typedef void (*KqKernel)(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+                         uint64_t* stack, uint64_t* words);
+
+struct KqNamedKernel {
+    const char* name;
+    KqKernel run;
+    bool (*isSupported)(); // by this processor
+};
+
+// All kernels of this build, the plain one first, each faster than those before it.
+const KqNamedKernel* KqGetKernels(size_t* numKernels);
 
 // Bit k of the column, bit k % 64 of word k / 64, is the value of row k. The first variable is bit
 // numVariables-1 of k, the last is bit 0. With fewer than six variables the one word repeats the
 // column's 2^numVariables bits up to its end.
+//
+// The column is split by fixing its first variable, then the next: what is left of the program is
+// shorter each time, and often a constant or what was left before, whose words are copied.
 class KqColumn {
   public:
     // Compiles the tree at 'root', which may be null and then counts as 0.
@@ -22,28 +45,58 @@ class KqColumn {
     // 2^numVariables / 64, at least 1.
     uint64_t GetNumWords() const { return m_num_words; }
 
-    // Writes words firstWord .. firstWord+numWords-1 of the column to 'words'.
+    // Writes words firstWord .. firstWord+numWords-1 of the column to 'words'. Pieces in sequence,
+    // up or down, whose length is a power of two and divides firstWord are cheapest.
     // Requires: firstWord + numWords <= GetNumWords().
-    // Cost: O(nodes * numWords); nothing is allocated.
+    // Fails: std::bad_alloc.  Cost: O(nodes * numWords) at most.
     void Fill(uint64_t firstWord, size_t numWords, uint64_t* words);
 
   private:
-    // One step of a stack machine over blocks of words. A push writes the block on top, a NOT
-    // changes it, a binary step combines the upper two into the lower.
-    struct Step {
-        Kq_BoolEquationImp::Node::TYPE type;
-        unsigned int bit; // for an ID: the bit of the row number that is the variable's value
+    // What is left of the program when some variables are fixed: codes in m_codes.
+    struct Rest {
+        size_t first;
+        size_t numCodes; // 0 for a constant
+        uint32_t variables;
+        uint32_t hash;
+        bool isInverted; // of a constant: it is 1
     };
 
-    static constexpr size_t kBlockWords = 64;
+    // A rest whose block of 2^level rows has been written.
+    struct Written {
+        Rest rest;
+        unsigned int level;
+        unsigned int generation; // forgotten unless it is the current one
+        const uint64_t* words;
+    };
 
-    void Compile(const Kq_BoolEquationImp::Node* root);
-    void FillBlock(uint64_t firstWord, size_t numWords, uint64_t* words);
+    // A variable fixed on the way to the piece being filled, and what it leaves.
+    struct Fixed {
+        unsigned int variable;
+        bool value;
+        Rest rest;
+    };
 
-    unsigned int m_num_variables;
+    void FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words);
+    void Expand(const Rest& rest, unsigned int level, uint64_t* words);
+    void ExpandHalves(const Rest& rest, unsigned int level, uint64_t* words);
+    void RunKernel(const Rest& rest, unsigned int level, uint64_t* words);
+    Rest Fix(const Rest& rest, unsigned int variable, bool value);
+    Rest Describe(size_t first, size_t numCodes, bool isInverted) const;
+    bool CopyWritten(const Rest& rest, unsigned int level, uint64_t* words);
+    void ForgetWritten() { ++m_generation; }
+
+    static constexpr size_t kNumWritten = 128;
+
     uint64_t m_num_words;
-    std::vector<Step> m_steps;
-    std::vector<uint64_t> m_stack; // as many blocks as the steps ever hold at once
+    KqKernel m_kernel;
+    std::vector<KqCode> m_codes; // the program, then what is left of it
+    size_t m_num_codes = 0;      // of m_codes that are in use
+    Rest m_whole;
+    std::vector<Fixed> m_path;
+    unsigned int m_generation = 1;
+    Written m_written[kNumWritten] = {}; // by hash
+    std::vector<KqStep> m_steps;
+    std::vector<uint64_t> m_stack;
 };
 
 #endif

@@ -290,7 +290,7 @@ size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& st
         } else if (lower != kComputed) {
             steps.push_back(MakeStep(KqStep::COMBINE, lower, ExchangedKind(kind)));
         } else {
-            steps.push_back(MakeStep(KqStep::UNSTACK, 0, kind));
+            steps.push_back(MakeStep(KqStep::UNSTACK, 0, ExchangedKind(kind)));
             --numStacked;
         }
         values.Push(kComputed);
@@ -360,7 +360,7 @@ unsigned int KqCompiled::RunSteps(const Variables& variables) const
             value = operand;
             break;
         case KqStep::UNSTACK:
-            value = step.table >> (stack & 1u) >> (2 * value) & 1u;
+            value = step.table >> (2 * (stack & 1u)) >> value & 1u;
             stack >>= 1;
             break;
         }

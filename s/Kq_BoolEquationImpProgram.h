@@ -124,8 +124,8 @@ constexpr size_t kKqMaxStack = 48;
 KqProgram KqCompile(const Kq_BoolEquationImp::Node* root, uint32_t numVariables, bool isReversed);
 
 // A program for a machine that keeps the last value at hand. TAKE stacks that value and takes a
-// variable's; COMBINE makes the value of it, as the lower one, and a variable, as the upper one;
-// UNSTACK makes it of a value off the stack, as the lower one, and of itself, as the upper one.
+// variable's; COMBINE makes a new one of it, as the lower value, and a variable, as the upper one;
+// UNSTACK makes it of it, as the lower value, and one off the stack, as the upper one.
 struct KqStep {
     enum ACTION : uint8_t { TAKE, COMBINE, UNSTACK };
 

@@ -1,0 +1,9 @@
+// The kernel of the result column for processors with AVX-512: 512 rows to a vector. Compiled for
+// them, so nothing here may be called before the processor is known to be one.
+#include "Kq_BoolEquationImpColumnKernel.h"
+
+void KqRunAvx512(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+                 uint64_t* stack, uint64_t* words)
+{
+    RunTiles<Vectors<64>, 8>(steps, numSteps, isInverted, numWords, stack, words);
+}

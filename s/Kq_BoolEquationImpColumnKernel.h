@@ -1,0 +1,139 @@
+// The kernel of the result column, for vectors of any width: each source that includes this is
+// compiled for one kind of processor. Everything has internal linkage and calls nothing from
+// elsewhere, so that no code of a wider kind is shared with sources of a narrower one.
+#ifndef KQ_BOOLEQUATIONIMPCOLUMNKERNEL_H
+#define KQ_BOOLEQUATIONIMPCOLUMNKERNEL_H
+
+#include "Kq_BoolEquationImpColumn.h"
+
+#if defined(KQ_HAS_X86_KERNELS)
+void KqRunAvx2(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+               uint64_t* stack, uint64_t* words);
+void KqRunAvx512(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+                 uint64_t* stack, uint64_t* words);
+#endif
+
+namespace {
+
+constexpr unsigned int kTileLevel = 12; // a tile has 2^12 rows
+constexpr unsigned int kMaxVariables = 30;
+
+// The columns of the variables of a tile; a variable above it is all zeros or all ones there.
+struct TilePatterns {
+    uint64_t words[kTileLevel][kKqTileWords];
+    uint64_t zeros[kKqTileWords];
+    uint64_t ones[kKqTileWords];
+};
+
+constexpr TilePatterns MakeTilePatterns()
+{
+    constexpr uint64_t inWord[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu, 0xf0f0f0f0f0f0f0f0u,
+                                    0xff00ff00ff00ff00u, 0xffff0000ffff0000u, 0xffffffff00000000u};
+    TilePatterns patterns = {};
+    for (unsigned int variable = 0; variable < kTileLevel; ++variable) {
+        for (unsigned int word = 0; word < kKqTileWords; ++word)
+            patterns.words[variable][word] =
+                variable < 6 ? inWord[variable] : uint64_t(0) - (word >> (variable - 6) & 1u);
+    }
+    for (unsigned int word = 0; word < kKqTileWords; ++word)
+        patterns.ones[word] = ~uint64_t(0);
+    return patterns;
+}
+
+alignas(64) constexpr TilePatterns kTilePatterns = MakeTilePatterns();
+
+// A vector of kBytes in registers, and as it lies in memory, at any multiple of eight bytes.
+template <unsigned int kBytes>
+struct Vectors {
+    typedef uint64_t Value __attribute__((vector_size(kBytes)));
+    typedef uint64_t InMemory __attribute__((vector_size(kBytes), aligned(8), may_alias));
+
+    static constexpr unsigned int kWords = kBytes / sizeof(uint64_t);
+
+    static Value Load(const uint64_t* words) { return *reinterpret_cast<const InMemory*>(words); }
+    static void Store(const Value& value, uint64_t* words)
+    {
+        *reinterpret_cast<InMemory*>(words) = value;
+    }
+};
+
+// Makes the value of itself, as the lower one, and of the operand, as the upper one.
+template <class V, unsigned int kNum>
+inline __attribute__((always_inline)) void Combine(KqCode kind, const uint64_t* operand,
+                                                   typename V::Value* value)
+{
+    switch (kind) {
+    case kKqAnd:
+        for (unsigned int i = 0; i < kNum; ++i)
+            value[i] = value[i] & V::Load(operand + i * V::kWords);
+        return;
+    case kKqAnd | kKqInvertLower:
+        for (unsigned int i = 0; i < kNum; ++i)
+            value[i] = ~value[i] & V::Load(operand + i * V::kWords);
+        return;
+    case kKqAnd | kKqInvertUpper:
+        for (unsigned int i = 0; i < kNum; ++i)
+            value[i] = value[i] & ~V::Load(operand + i * V::kWords);
+        return;
+    case kKqAnd | kKqInvertLower | kKqInvertUpper:
+        for (unsigned int i = 0; i < kNum; ++i)
+            value[i] = ~(value[i] | V::Load(operand + i * V::kWords));
+        return;
+    default:
+        for (unsigned int i = 0; i < kNum; ++i)
+            value[i] = value[i] ^ V::Load(operand + i * V::kWords);
+        return;
+    }
+}
+
+// Runs all steps for 'kNum' vectors of each operand; the value at hand stays in registers.
+template <class V, unsigned int kNum>
+inline __attribute__((always_inline)) void
+RunStrip(const KqStep* steps, size_t numSteps, bool isInverted, const uint64_t* const* operands,
+         size_t offset, uint64_t* stack, uint64_t* words)
+{
+    typename V::Value value[kNum] = {};
+    for (size_t position = 0; position < numSteps; ++position) {
+        const KqStep step = steps[position];
+        if (step.action == KqStep::COMBINE) {
+            Combine<V, kNum>(step.kind, operands[step.variable] + offset, value);
+        } else if (step.action == KqStep::TAKE) {
+            const uint64_t* operand = operands[step.variable] + offset;
+            for (unsigned int i = 0; i < kNum; ++i) {
+                V::Store(value[i], stack + i * V::kWords);
+                value[i] = V::Load(operand + i * V::kWords);
+            }
+            stack += kKqTileWords;
+        } else {
+            stack -= kKqTileWords;
+            Combine<V, kNum>(step.kind, stack, value);
+        }
+    }
+    for (unsigned int i = 0; i < kNum; ++i)
+        V::Store(isInverted ? ~value[i] : value[i], words + offset + i * V::kWords);
+}
+
+// The kernel: tile after tile, and in each as many vectors at a time as registers hold.
+template <class V, unsigned int kNum>
+inline __attribute__((always_inline)) void RunTiles(const KqStep* steps, size_t numSteps,
+                                                    bool isInverted, size_t numWords,
+                                                    uint64_t* stack, uint64_t* words)
+{
+    constexpr size_t kStripWords = kNum * V::kWords;
+    static_assert(kKqTileWords % kStripWords == 0, "a tile is a number of strips");
+    const uint64_t* operands[kMaxVariables];
+    for (unsigned int variable = 0; variable < kTileLevel; ++variable)
+        operands[variable] = kTilePatterns.words[variable];
+    for (size_t tile = 0; tile < numWords / kKqTileWords; ++tile) {
+        for (unsigned int variable = kTileLevel; variable < kMaxVariables; ++variable)
+            operands[variable] = (tile >> (variable - kTileLevel) & 1u) != 0 ? kTilePatterns.ones
+                                                                             : kTilePatterns.zeros;
+        for (size_t offset = 0; offset < kKqTileWords; offset += kStripWords)
+            RunStrip<V, kNum>(steps, numSteps, isInverted, operands, offset, stack,
+                              words + tile * kKqTileWords);
+    }
+}
+
+} // namespace
+
+#endif

@@ -1,9 +1,10 @@
-// The whole road: from text to init value, and from init value to the text of an expression. The
-// object is made and destroyed each time.
+// The whole road: from text to init value or to one value, and from init value to the text of an
+// expression. The object is made and destroyed each time.
 #include <Kq_BoolEquationImp.h>
 
 #include "support/cases.h"
 #include "support/formulas.h"
+#include "support/plain_parser.h"
 #include "support/texts.h"
 
 namespace {
@@ -25,6 +26,28 @@ bench::Case MakeToInitValue(const std::string& text, unsigned int numVariables)
             benchmark::DoNotOptimize(equation.GetEquationAsHexInitValue(false));
         }
         bench::SetItems(state, double(uint64_t(1) << numVariables), "row");
+    };
+    return made;
+}
+
+// One value only: whatever is prepared for evaluation is paid for here.
+bench::Case MakeToValue(const std::string& text)
+{
+    bench::Case made;
+    made.isRight = [=] {
+        const Kq_BoolEquation equation(text.c_str());
+        bench::PlainEquation plain;
+        return plain.Parse(text.c_str()) && equation.Eval() == plain.Eval();
+    };
+    made.ours = [=](benchmark::State& state) {
+        const Port::StringBase<char> equationText(text.c_str());
+        for (auto _ : state) {
+            Kq_BoolEquation equation;
+            equation.SetEquation(equationText);
+            benchmark::DoNotOptimize(equation.Eval());
+        }
+        const Kq_BoolEquation equation(equationText);
+        bench::SetItems(state, double(bench::CountNodes(equation.GetImp()->GetRoot())), "token");
     };
     return made;
 }
@@ -74,6 +97,10 @@ void bench::AddCases()
             return MakeToInitValue(MakeDeep(10 * numVariables + 1, numVariables), numVariables);
         });
     }
+    for (const Shape& shape : GetShapes())
+        for (size_t numTokens : {20u, 100u, 1000u, 10000u})
+            AddSingle("to_value/" + shape.name + "/" + std::to_string(numTokens),
+                      [=] { return MakeToValue(shape.make(numTokens, 16)); });
     for (unsigned int numVariables : {2u, 4u, 6u, 8u, 10u, 12u, 14u})
         AddSingle("from_init_value/n=" + std::to_string(numVariables),
                   [=] { return MakeFromInitValue(numVariables); });

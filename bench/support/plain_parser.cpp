@@ -108,21 +108,27 @@ uint32_t PlainEquation::FindVariable(const char* name, size_t length)
     return uint32_t(m_variables.size() - 1);
 }
 
-unsigned int PlainEquation::EvalNode(uint32_t position) const
+unsigned int PlainEquation::Eval() const
 {
-    const PlainNode& node = m_nodes[position];
-    if (node.operation == 'x')
-        return m_variables[node.left].second;
-    const unsigned int left = EvalNode(node.left);
-    if (node.operation == '~')
-        return left ^ 1u;
-    const unsigned int right = EvalNode(node.right);
-    const unsigned int negated = node.operation >= kNegated ? 1u : 0u;
-    const char character = char(node.operation % kNegated);
-    const unsigned int value = character == '&'   ? left & right
-                               : character == '|' ? left | right
-                                                  : left ^ right;
-    return value ^ negated;
+    // An operator stands behind its operands, and the root is last.
+    std::vector<unsigned int> values;
+    values.reserve(m_nodes.size());
+    for (const PlainNode& node : m_nodes) {
+        if (node.operation == 'x') {
+            values.push_back(m_variables[node.left].second);
+            continue;
+        }
+        const unsigned int left = values[node.left];
+        const unsigned int right = values[node.right];
+        const unsigned int negated = node.operation >= kNegated ? 1u : 0u;
+        const char character = char(node.operation % kNegated);
+        const unsigned int value = character == '~'   ? left ^ 1u
+                                   : character == '&' ? left & right
+                                   : character == '|' ? left | right
+                                                      : left ^ right;
+        values.push_back(value ^ negated);
+    }
+    return values.back();
 }
 
 } // namespace bench

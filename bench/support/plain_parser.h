@@ -23,8 +23,8 @@ static_assert(sizeof(PlainNode) == 16, "the size that the comparison is about");
 class PlainEquation {
   public:
     bool Parse(const char* text);
-    // The value for the variables' present values.
-    unsigned int Eval() const { return EvalNode(m_root); }
+    // The value for the variables' present values.  Requires: a text that was accepted.
+    unsigned int Eval() const;
     std::vector<std::pair<std::string, unsigned int>>& GetVariables() { return m_variables; }
 
   private:
@@ -36,7 +36,6 @@ class PlainEquation {
     uint32_t ReadOperator();
     uint32_t Add(uint32_t operation, uint32_t left, uint32_t right);
     uint32_t FindVariable(const char* name, size_t length);
-    unsigned int EvalNode(uint32_t position) const;
 
     const char* m_next = nullptr;
     uint32_t m_root = kNone;

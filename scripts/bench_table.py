@@ -1,0 +1,265 @@
+#!/usr/bin/env python3
+"""Turns the results of the benchmark executables into tables.
+
+usage: bench_table.py RESULTS... [--pairs] [--doc FILE]
+
+Reads the files of results, as Google Benchmark writes them in JSON, and prints what the library
+takes against its baselines, then how each step grows; with --pairs also every formula by itself.
+With --doc the tables, and the machine they come from, replace what FILE holds between its two
+'figures' marks.
+Times are processor time: the median of all repetitions, the shortest in brackets. Of several
+formulas in one line, the one with the worst ratio is shown.
+Exit status: 1 when a case gave a wrong answer or could not be measured.
+"""
+import argparse
+import collections
+import json
+import pathlib
+import re
+import statistics
+import subprocess
+import sys
+
+BEGIN = "<!-- figures: begin -->"
+END = "<!-- figures: end -->"
+NANOSECONDS = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}
+
+# What is promised. 'pair': ours against the baseline, for all cases whose name starts with the
+# prefix. 'item': time per item. 'growth': time per item at the second size against the first.
+# 'peak': bytes of memory for a byte of text.
+Target = collections.namedtuple("Target", "work kind prefix limit")
+TARGETS = (
+    *(Target(f"column, {size} variables, {2 * size} operators, {kind}", "pair",
+             f"column/n={size}/{kind}/", 5.0 if size == 16 else 1.5)
+      for size in (16, 20, 24, 28) for kind in ("order", "chain", "tree")),
+    Target("hexadecimal text, 30 variables, 60 operators", "pair", "hex_text/n=30/", 3.5),
+    Target("peak memory of that text", "peak", "hex_text_peak/n=30/", 3.0),
+    Target("hexadecimal text, 6 variables, 20 operators", "pair", "hex_text/n=6/", 3.0),
+    Target("engine rows, 10 variables", "pair", "engine_rows/n=10/", 1.2),
+    Target("engine rows, 16 variables", "pair", "engine_rows/n=16/", 1.2),
+    Target("public rows, 16 variables", "pair", "public_rows/n=16/", 1.5),
+    Target("6 variables set, 20 operators evaluated", "pair", "eval/set_6_and_20_operators/", 5.0),
+    Target("200 operators over 30 variables evaluated", "pair", "eval/200_operators/", 8.0),
+    Target("12 tokens set", "pair", "set/12_tokens/", 2.0),
+    Target("100 tokens set", "pair", "set/100_tokens/", 2.0),
+    Target("10^6 tokens against 10^4: chain", "growth", "set_long/chain/", 2.5),
+    Target("10^6 tokens against 10^4: nesting to the right", "growth", "set_long/nesting/", 2.5),
+    Target("10^6 tokens against 10^4: nesting to the left", "growth",
+           "set_long/nesting_left/", 2.5),
+    Target("10^6 tokens against 10^4: up to 10^5 names", "growth", "set_long/names/", 2.5),
+    Target("column of a 16-variable init value, a node", "item",
+           "column_of_terms/init_value/n=16/", 150.0),
+    Target("column of the same as expression, a node", "item",
+           "column_of_terms/expression/n=16/", 150.0),
+)
+GROWTH_SIZES = ("10000", "1000000")
+
+
+class Case:
+    """All repetitions of one side of one case."""
+
+    def __init__(self):
+        self.times = []  # nanoseconds
+        self.items = 1.0
+        self.unit = "call"
+        self.peaks = []
+        self.error = None
+
+    def add(self, entry):
+        if entry.get("error_occurred"):
+            self.error = entry.get("error_message", "failed")
+            return
+        self.times.append(entry["cpu_time"] * NANOSECONDS[entry["time_unit"]])
+        self.items = entry.get("items", self.items)
+        if "peak" in entry:
+            self.peaks.append(entry["peak"])
+        for key in entry:
+            if key.startswith("per_") and key != "per_family_instance_index":
+                self.unit = key[len("per_"):]
+
+    def median(self):
+        return statistics.median(self.times)
+
+    def per_item(self):
+        return self.median() / self.items
+
+
+def read_results(paths):
+    cases, contexts = {}, []
+    for path in paths:
+        results = json.loads(pathlib.Path(path).read_text())
+        contexts.append(results["context"])
+        for entry in results["benchmarks"]:
+            if entry.get("run_type") == "iteration":
+                cases.setdefault(entry["run_name"], Case()).add(entry)
+    return cases, contexts
+
+
+def format_time(nanoseconds):
+    for unit, factor in (("s", 1e9), ("ms", 1e6), ("us", 1e3), ("ns", 1.0)):
+        if nanoseconds >= factor:
+            return f"{nanoseconds / factor:.3g} {unit}"
+    return f"{nanoseconds:.2g} ns"
+
+
+def format_case(case):
+    return f"{format_time(case.median())} ({format_time(min(case.times))})"
+
+
+def judge(worst, target):
+    return "yes" if worst <= target.limit else "no"
+
+
+def find_pairs(cases, prefix):
+    """Ratio, name and both sides of every pair whose name starts with the prefix."""
+    pairs = []
+    for name, ours in cases.items():
+        stem = name[:-len("/ours")]
+        baseline = cases.get(stem + "/baseline")
+        if name.startswith(prefix) and name.endswith("/ours") and baseline:
+            if ours.times and baseline.times:
+                pairs.append((ours.median() / baseline.median(), stem, ours, baseline))
+    return pairs
+
+
+def pair_row(target, cases):
+    ratios = find_pairs(cases, target.prefix)
+    if not ratios:
+        return None
+    worst, _, ours, baseline = max(ratios, key=lambda entry: entry[0])
+    median = statistics.median(entry[0] for entry in ratios)
+    return [format_case(ours), format_case(baseline), f"{worst:.2f}", f"{median:.2f}",
+            str(len(ratios)), f"{target.limit:g}", judge(worst, target)]
+
+
+def growth_row(target, cases):
+    first, last = (cases.get(f"{target.prefix}{size}/ours") for size in GROWTH_SIZES)
+    if not (first and last and first.times and last.times):
+        return None
+    ratio = last.per_item() / first.per_item()
+    return [f"{format_time(last.per_item())}/{last.unit}",
+            f"{format_time(first.per_item())}/{first.unit}", f"{ratio:.2f}", f"{ratio:.2f}", "1",
+            f"{target.limit:g}", judge(ratio, target)]
+
+
+def item_row(target, cases):
+    times = [case.per_item() for name, case in cases.items()
+             if name.startswith(target.prefix) and case.times]
+    if not times:
+        return None
+    return [format_time(max(times)), "", "", "", str(len(times)), format_time(target.limit),
+            judge(max(times), target)]
+
+
+def peak_row(target, cases):
+    peaks = [peak for name, case in cases.items() if name.startswith(target.prefix)
+             for peak in case.peaks]
+    if not peaks:
+        return None
+    return ["", "", f"{max(peaks):.2f}", f"{statistics.median(peaks):.2f}", "",
+            f"{target.limit:g}", judge(max(peaks), target)]
+
+
+ROWS = {"pair": pair_row, "growth": growth_row, "item": item_row, "peak": peak_row}
+
+
+def target_table(cases):
+    table = [["work", "ours", "baseline", "worst ratio", "median", "formulas", "at most", "met"]]
+    for target in TARGETS:
+        row = ROWS[target.kind](target, cases)
+        if row:
+            table.append([target.work] + row)
+    return table
+
+
+def pair_table(cases):
+    return [["pair", "ours", "baseline", "ratio"]] + [
+        [name, format_case(ours), format_case(baseline), f"{ratio:.2f}"]
+        for ratio, name, ours, baseline in sorted(find_pairs(cases, ""), key=lambda pair: pair[1])]
+
+
+def shape_table(cases):
+    """Time per item of every case without a baseline, the sizes of one shape in one line."""
+    lines = {}
+    for name, case in cases.items():
+        match = re.fullmatch(r"(.*?)/((?:n=)?\d+(?:/\d+)?)/ours", name)
+        has_baseline = name[:-len("ours")] + "baseline" in cases
+        if match and case.times and not case.peaks and not has_baseline:
+            lines.setdefault((match[1], case.unit), []).append((match[2], case))
+    table = [["case", "median time per item at each size"]]
+    for (name, unit), sizes in sorted(lines.items()):
+        sizes.sort(key=lambda entry: [int(number) for number in re.findall(r"\d+", entry[0])])
+        table.append([name, f"per {unit}: " + "; ".join(
+            f"{size}: {format_time(case.per_item())}" for size, case in sizes)])
+    return table
+
+
+def format_text(table):
+    widths = [max(len(row[column]) for row in table) for column in range(len(table[0]))]
+    return "\n".join("  ".join(cell.ljust(width) for cell, width in zip(row, widths)).rstrip()
+                     for row in table)
+
+
+def format_markdown(table):
+    lines = ["| " + " | ".join(row) + " |" for row in table]
+    lines.insert(1, "|---" * len(table[0]) + "|")
+    return "\n".join(lines)
+
+
+def find_processor():
+    for line in pathlib.Path("/proc/cpuinfo").read_text().splitlines():
+        if line.startswith("model name"):
+            return line.split(":", 1)[1].strip()
+    return "unknown processor"
+
+
+def describe_run(contexts):
+    root = pathlib.Path(__file__).resolve().parent.parent
+    commit = subprocess.run(["git", "-C", str(root), "describe", "--always", "--dirty=, changed"],
+                            capture_output=True, text=True, check=False).stdout.strip()
+    context = contexts[0]
+    caches = ", ".join(f"L{cache['level']} {cache['type'].lower()} {cache['size'] // 1024} KiB"
+                       for cache in context["caches"])
+    loads = [context["load_avg"][0] for context in contexts if context.get("load_avg")]
+    return [["machine", f"{find_processor()}, {context['num_cpus']} processors"],
+            ["caches", caches],
+            ["compiler", context.get("compiler", "?")],
+            ["flags", context.get("flags", "?")],
+            ["commit", commit or "?"],
+            ["date", min(context["date"] for context in contexts)[:10]],
+            ["load", f"{min(loads):.1f} to {max(loads):.1f} before an executable started"
+             if loads else "?"]]
+
+
+def write_document(path, parts):
+    text = pathlib.Path(path).read_text()
+    before, rest = text.split(BEGIN, 1)
+    after = rest.split(END, 1)[1]
+    figures = "\n\n".join([BEGIN, *parts, END])
+    pathlib.Path(path).write_text(before + figures + after)
+
+
+def main():
+    parser = argparse.ArgumentParser(description="tables of benchmark results")
+    parser.add_argument("results", nargs="+")
+    parser.add_argument("--pairs", action="store_true")
+    parser.add_argument("--doc", metavar="FILE")
+    arguments = parser.parse_args()
+
+    cases, contexts = read_results(arguments.results)
+    if not cases:
+        sys.exit("bench_table.py: there are no results in these files")
+    targets, shapes = target_table(cases), shape_table(cases)
+    run = [["run", ""]] + describe_run(contexts)
+    shown = [run[1:], targets, shapes] + ([pair_table(cases)] if arguments.pairs else [])
+    print("\n\n".join(format_text(table) for table in shown if len(table) > 1))
+    if arguments.doc:
+        write_document(arguments.doc, [format_markdown(table) for table in (run, targets, shapes)])
+    failed = [f"{name}: {case.error}" for name, case in cases.items() if case.error]
+    for line in failed:
+        print("failed:", line, file=sys.stderr)
+    return 1 if failed else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

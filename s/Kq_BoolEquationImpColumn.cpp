@@ -102,7 +102,7 @@ KqColumn::KqColumn(const Node* root, unsigned int numVariables)
     m_kernel = kernel;
     KqProgram program = KqCompile(root, numVariables, true);
     m_codes.swap(program.codes);
-    m_num_codes = m_codes.size();
+    m_num_codes = program.numCodes;
     m_whole = Describe(0, m_num_codes, program.isInverted);
 }
 
@@ -196,42 +196,40 @@ void KqColumn::RunKernel(const Rest& rest, unsigned int level, uint64_t* words)
 // What is left of 'rest' when 'variable' is 'value'; its codes go behind all others.
 KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value)
 {
-    const size_t first = m_num_codes;
-    if (m_codes.size() < first + rest.numCodes)
-        m_codes.resize(2 * first + rest.numCodes);
-    KqWriter writer(m_codes.data() + first);
-    KqWriter::Value values[kKqMaxStack];
-    KqWriter::Value* top = values - 1;
+    if (m_codes.size() < m_num_codes + rest.numCodes)
+        m_codes.resize(2 * m_num_codes + rest.numCodes);
+    const KqCode fixed = KqCodeOf(variable);
+    KqWriter writer(m_codes.data(), m_num_codes);
+    KqValue values[kKqMaxStack];
+    KqValue* top = values - 1;
     const KqCode* const end = m_codes.data() + rest.first + rest.numCodes;
     for (const KqCode* next = end - rest.numCodes; next != end; ++next) {
         const KqCode code = *next;
         const KqCode kind = KqKindOf(code);
         if (kind == kKqVariable) {
             assert(top + 1 < values + kKqMaxStack);
-            *++top = KqVariableOf(code) == variable ? writer.PutConstant(value)
-                                                    : writer.PutVariable(KqVariableOf(code));
-            continue;
+            *++top = code == fixed ? writer.PutConstant(value) : writer.PutVariable(code);
+        } else {
+            const KqValue upper = *top--;
+            *top = writer.PutOperator(kind, *top, upper);
         }
-        const KqWriter::Value upper = *top--;
-        *top = kind == kKqXor ? writer.PutXor(*top, upper)
-                              : writer.PutAnd(KqInverted(*top, (kind & kKqInvertLower) != 0),
-                                              KqInverted(upper, (kind & kKqInvertUpper) != 0));
     }
-    const size_t numCodes = static_cast<size_t>(writer.GetEnd() - (m_codes.data() + first));
-    m_num_codes += numCodes;
-    return Describe(first, numCodes, top->isInverted != rest.isInverted);
+    const size_t first = m_num_codes;
+    m_num_codes = writer.GetEnd();
+    return Describe(first, m_num_codes - first, (top->GetInversion() != 0) != rest.isInverted);
 }
 
 KqColumn::Rest KqColumn::Describe(size_t first, size_t numCodes, bool isInverted) const
 {
     Rest rest = {first, numCodes, 0, 0, isInverted};
-    for (size_t position = first; position < first + numCodes; ++position) {
-        const KqCode code = m_codes[position];
-        if (KqKindOf(code) == kKqVariable)
-            rest.variables |= 1u << KqVariableOf(code);
-        rest.hash = (rest.hash ^ code) * 0x9e3779b1u;
-        rest.hash ^= rest.hash >> 15;
+    uint64_t sum = 0;
+    const KqCode* codes = m_codes.data() + first;
+    for (size_t position = 0; position < numCodes; ++position) {
+        const KqCode code = codes[position];
+        rest.variables |= (KqKindOf(code) == kKqVariable ? 1u : 0u) << (KqVariableOf(code) & 31u);
+        sum += (code + 1 + position * 64) * 0x9e3779b97f4a7c15u ^ (code * uint64_t(0x85ebca6b));
     }
+    rest.hash = static_cast<uint32_t>(sum >> 32);
     return rest;
 }
 

@@ -57,35 +57,6 @@ struct Vectors {
     }
 };
 
-// Makes the value of itself, as the lower one, and of the operand, as the upper one.
-template <class V, unsigned int kNum>
-inline __attribute__((always_inline)) void Combine(KqCode kind, const uint64_t* operand,
-                                                   typename V::Value* value)
-{
-    switch (kind) {
-    case kKqAnd:
-        for (unsigned int i = 0; i < kNum; ++i)
-            value[i] = value[i] & V::Load(operand + i * V::kWords);
-        return;
-    case kKqAnd | kKqInvertLower:
-        for (unsigned int i = 0; i < kNum; ++i)
-            value[i] = ~value[i] & V::Load(operand + i * V::kWords);
-        return;
-    case kKqAnd | kKqInvertUpper:
-        for (unsigned int i = 0; i < kNum; ++i)
-            value[i] = value[i] & ~V::Load(operand + i * V::kWords);
-        return;
-    case kKqAnd | kKqInvertLower | kKqInvertUpper:
-        for (unsigned int i = 0; i < kNum; ++i)
-            value[i] = ~(value[i] | V::Load(operand + i * V::kWords));
-        return;
-    default:
-        for (unsigned int i = 0; i < kNum; ++i)
-            value[i] = value[i] ^ V::Load(operand + i * V::kWords);
-        return;
-    }
-}
-
 // Runs all steps for 'kNum' vectors of each operand; the value at hand stays in registers.
 template <class V, unsigned int kNum>
 inline __attribute__((always_inline)) void
@@ -93,20 +64,44 @@ RunStrip(const KqStep* steps, size_t numSteps, bool isInverted, const uint64_t* 
          size_t offset, uint64_t* stack, uint64_t* words)
 {
     typename V::Value value[kNum] = {};
-    for (size_t position = 0; position < numSteps; ++position) {
-        const KqStep step = steps[position];
-        if (step.action == KqStep::COMBINE) {
-            Combine<V, kNum>(step.kind, operands[step.variable] + offset, value);
-        } else if (step.action == KqStep::TAKE) {
-            const uint64_t* operand = operands[step.variable] + offset;
+    for (const KqStep* step = steps; step != steps + numSteps; ++step) {
+        const uint64_t* operand = operands[step->variable] + offset;
+        if (step->action >= kKqUnstack) {
+            stack -= kKqTileWords;
+            operand = stack;
+        }
+        switch (step->action) {
+        case kKqTake:
             for (unsigned int i = 0; i < kNum; ++i) {
                 V::Store(value[i], stack + i * V::kWords);
                 value[i] = V::Load(operand + i * V::kWords);
             }
             stack += kKqTileWords;
-        } else {
-            stack -= kKqTileWords;
-            Combine<V, kNum>(step.kind, stack, value);
+            break;
+        case kKqCombine | kKqAnd:
+        case kKqUnstack | kKqAnd:
+            for (unsigned int i = 0; i < kNum; ++i)
+                value[i] = value[i] & V::Load(operand + i * V::kWords);
+            break;
+        case kKqCombine | kKqAnd | kKqInvertLower:
+        case kKqUnstack | kKqAnd | kKqInvertLower:
+            for (unsigned int i = 0; i < kNum; ++i)
+                value[i] = ~value[i] & V::Load(operand + i * V::kWords);
+            break;
+        case kKqCombine | kKqAnd | kKqInvertUpper:
+        case kKqUnstack | kKqAnd | kKqInvertUpper:
+            for (unsigned int i = 0; i < kNum; ++i)
+                value[i] = value[i] & ~V::Load(operand + i * V::kWords);
+            break;
+        case kKqCombine | kKqAnd | kKqInvertLower | kKqInvertUpper:
+        case kKqUnstack | kKqAnd | kKqInvertLower | kKqInvertUpper:
+            for (unsigned int i = 0; i < kNum; ++i)
+                value[i] = ~(value[i] | V::Load(operand + i * V::kWords));
+            break;
+        default: // XOR
+            for (unsigned int i = 0; i < kNum; ++i)
+                value[i] = value[i] ^ V::Load(operand + i * V::kWords);
+            break;
         }
     }
     for (unsigned int i = 0; i < kNum; ++i)

@@ -43,19 +43,19 @@ struct Item {
     const Node* node; // null counts as 0
     uint32_t left;    // positions of the operands; 0 when there are none
     uint32_t right;
-    uint32_t need; // how many values the machine stacks for it
-    bool isInverted;
+    uint32_t need;      // how many values the machine stacks for it
+    uint32_t inversion; // 1 when it is complemented
 };
 
 // The item at or below 'node': groups and init values hand on their operand, a NOT inverts it.
 Item FindItem(const Node* node)
 {
-    bool isInverted = false;
+    uint32_t inversion = 0;
     while (node && (node->IsLp() || node->IsNot() || node->GetType() == Node::TRUTH_TABLE)) {
-        isInverted = isInverted != node->IsNot();
+        inversion ^= node->IsNot() ? 1u : 0u;
         node = node->GetLeftChild();
     }
-    return Item{node, 0, 0, 1, isInverted};
+    return Item{node, 0, 0, 1, inversion};
 }
 
 // All items below 'root', operators before their operands.
@@ -86,22 +86,28 @@ std::vector<Item> ListItems(const Node* root)
     return items;
 }
 
-KqWriter::Value PutOperator(Node::TYPE type, const KqWriter::Value& lower,
-                            const KqWriter::Value& upper, KqWriter& writer)
+// A binary operator as a kind, and 1 when the result is complemented: OR is an AND of complements.
+struct Operator {
+    KqCode kind;
+    uint32_t inversion;
+};
+
+Operator OperatorOf(Node::TYPE type)
 {
+    constexpr KqCode invertBoth = kKqInvertLower | kKqInvertUpper;
     switch (type) {
     case Node::AND:
-        return writer.PutAnd(lower, upper);
+        return {kKqAnd, 0};
     case Node::NAND:
-        return KqInverted(writer.PutAnd(lower, upper), true);
+        return {kKqAnd, 1};
     case Node::OR:
-        return KqInverted(writer.PutAnd(KqInverted(lower, true), KqInverted(upper, true)), true);
+        return {kKqAnd | invertBoth, 1};
     case Node::NOR:
-        return writer.PutAnd(KqInverted(lower, true), KqInverted(upper, true));
+        return {kKqAnd | invertBoth, 0};
     case Node::XOR:
-        return writer.PutXor(lower, upper);
+        return {kKqXor, 0};
     case Node::NXOR:
-        return KqInverted(writer.PutXor(lower, upper), true);
+        return {kKqXor, 1};
     case Node::ZERO:
     case Node::ONE:
     case Node::ID:
@@ -113,17 +119,52 @@ KqWriter::Value PutOperator(Node::TYPE type, const KqWriter::Value& lower,
         break;
     }
     assert(!"a binary operator");
-    return writer.PutConstant(false);
+    return {kKqXor, 0};
 }
 
-KqWriter::Value PutLeaf(const Node* node, uint32_t numVariables, bool isReversed, KqWriter& writer)
-{
-    if (node && node->IsId() && node->GetValue() < numVariables) {
-        const uint32_t index = node->GetValue();
-        return writer.PutVariable(isReversed ? numVariables - 1 - index : index);
+// Writes the leaves and operators of one tree into a list that grows as needed.
+class Compiler {
+  public:
+    Compiler(uint32_t numVariables, bool isReversed, std::vector<KqCode>& codes)
+        : m_num_variables(numVariables), m_is_reversed(isReversed), m_codes(codes),
+          m_writer(codes.data(), 0)
+    {
     }
-    return writer.PutConstant(node && node->Is1());
-}
+
+    size_t GetEnd() const { return m_writer.GetEnd(); }
+
+    KqValue PutLeaf(const Item& item)
+    {
+        Reserve();
+        const Node* node = item.node;
+        if (!node || !node->IsId() || node->GetValue() >= m_num_variables)
+            return m_writer.PutConstant(node && node->Is1()).Invert(item.inversion);
+        const uint32_t index = node->GetValue();
+        const uint32_t variable = m_is_reversed ? m_num_variables - 1 - index : index;
+        return m_writer.PutVariable(KqCodeOf(variable)).Invert(item.inversion);
+    }
+
+    KqValue PutOperator(const Node* node, uint32_t inversion, KqValue lower, KqValue upper)
+    {
+        Reserve();
+        const Operator found = OperatorOf(node->GetType());
+        return m_writer.PutOperator(found.kind, lower, upper).Invert(found.inversion ^ inversion);
+    }
+
+  private:
+    void Reserve()
+    {
+        if (m_writer.GetEnd() < m_codes.size())
+            return;
+        m_codes.resize(2 * m_codes.size() + 128);
+        m_writer.SetCodes(m_codes.data());
+    }
+
+    uint32_t m_num_variables;
+    bool m_is_reversed;
+    std::vector<KqCode>& m_codes;
+    KqWriter m_writer;
+};
 
 // The operator's result for lower and upper value, bit lower + 2 * upper.
 uint8_t TableOf(KqCode kind)
@@ -146,41 +187,20 @@ KqCode ExchangedKind(KqCode kind)
            ((kind & kKqInvertUpper) != 0 ? kKqInvertLower : 0u);
 }
 
-KqStep MakeStep(KqStep::ACTION action, uint32_t variable, KqCode kind)
+KqStep MakeStep(uint8_t action, uint32_t variable, KqCode kind)
 {
-    return KqStep{variable, action, static_cast<uint8_t>(kind), TableOf(kind)};
+    return KqStep{variable, static_cast<uint8_t>(action | kind), TableOf(kind)};
 }
 
-// The operators on whole words.
-struct WordOperators {
-    static uint64_t Apply(Node::TYPE type, uint64_t left, uint64_t right)
-    {
-        switch (type) {
-        case Node::AND:
-            return left & right;
-        case Node::OR:
-            return left | right;
-        case Node::XOR:
-            return left ^ right;
-        case Node::NAND:
-            return ~(left & right);
-        case Node::NOR:
-            return ~(left | right);
-        case Node::NXOR:
-            return ~(left ^ right);
-        case Node::ZERO:
-        case Node::ONE:
-        case Node::ID:
-        case Node::LP:
-        case Node::NOT:
-        case Node::RP:
-        case Node::TRUTH_TABLE:
-        case Node::SENTINEL:
-            break;
-        }
-        return 0;
-    }
-};
+uint64_t ApplyToWords(Node::TYPE type, uint64_t left, uint64_t right)
+{
+    const Operator found = OperatorOf(type);
+    if (found.kind == kKqXor)
+        return left ^ right ^ (uint64_t(0) - found.inversion);
+    // Both operands are complemented or none is.
+    const uint64_t inverted = uint64_t(0) - (found.kind & kKqInvertLower);
+    return ((left ^ inverted) & (right ^ inverted)) ^ (uint64_t(0) - found.inversion);
+}
 
 uint64_t LeafWord(const Node* node, unsigned int numVariables)
 {
@@ -197,7 +217,7 @@ uint64_t ComputeWord(const Node* root, unsigned int numVariables)
     struct Pending {
         const Node* node;
         uint64_t left;
-        bool isInverted;
+        uint64_t inversion; // all ones when the result is complemented
         bool hasLeft;
     };
     KqStack<Pending, 32> pending;
@@ -205,14 +225,13 @@ uint64_t ComputeWord(const Node* root, unsigned int numVariables)
     for (;;) {
         Item item = FindItem(next);
         while (item.node && IsBinary(item.node)) {
-            pending.Push({item.node, 0, item.isInverted, false});
+            pending.Push({item.node, 0, uint64_t(0) - item.inversion, false});
             item = FindItem(item.node->GetLeftChild());
         }
-        uint64_t word = LeafWord(item.node, numVariables) ^ (uint64_t(0) - item.isInverted);
+        uint64_t word = LeafWord(item.node, numVariables) ^ (uint64_t(0) - item.inversion);
         while (!pending.IsEmpty() && pending.Top().hasLeft) {
             const Pending done = pending.Pop();
-            word = WordOperators::Apply(done.node->GetType(), done.left, word) ^
-                   (uint64_t(0) - done.isInverted);
+            word = ApplyToWords(done.node->GetType(), done.left, word) ^ done.inversion;
         }
         if (pending.IsEmpty())
             return word;
@@ -222,43 +241,89 @@ uint64_t ComputeWord(const Node* root, unsigned int numVariables)
     }
 }
 
-} // namespace
+// Compiles the tree with the operands as they stand; false when that stacks too many values.
+bool CompileAsItStands(const Node* root, Compiler& compiler, KqValue& result)
+{
+    // An operator, with its first operand once that is written.
+    struct Pending {
+        const Node* node;
+        KqValue lower;
+        uint32_t inversion;
+        bool hasLower;
+    };
+    KqStack<Pending, 32> pending;
+    size_t numValues = 0;
+    const Node* next = root;
+    for (;;) {
+        Item item = FindItem(next);
+        while (item.node && IsBinary(item.node)) {
+            pending.Push({item.node, KqValue(), item.inversion, false});
+            item = FindItem(item.node->GetLeftChild());
+        }
+        KqValue value = compiler.PutLeaf(item);
+        while (!pending.IsEmpty() && pending.Top().hasLower) {
+            const Pending done = pending.Pop();
+            value = compiler.PutOperator(done.node, done.inversion, done.lower, value);
+            --numValues;
+        }
+        if (pending.IsEmpty()) {
+            result = value;
+            return true;
+        }
+        if (++numValues == kKqMaxStack)
+            return false;
+        pending.Top().lower = value;
+        pending.Top().hasLower = true;
+        next = pending.Top().node->GetRightChild();
+    }
+}
 
-KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
+// Compiles the tree with the operand that needs more values first.
+KqValue CompileOrdered(const Node* root, Compiler& compiler)
 {
     const std::vector<Item> items = ListItems(root);
-    KqProgram program;
-    program.codes.resize(items.size());
-    KqWriter writer(program.codes.data());
     struct Work {
         uint32_t position;
         bool hasOperands;
     };
     KqStack<Work, 64> pending;
-    KqStack<KqWriter::Value, kKqMaxStack> values;
+    KqStack<KqValue, kKqMaxStack> values;
     pending.Push({0, false});
     while (!pending.IsEmpty()) {
         const Work work = pending.Pop();
         const Item& item = items[work.position];
         if (work.hasOperands) {
-            const KqWriter::Value upper = values.Pop();
-            const KqWriter::Value lower = values.Pop();
-            values.Push(KqInverted(PutOperator(item.node->GetType(), lower, upper, writer),
-                                   item.isInverted));
+            const KqValue upper = values.Pop();
+            const KqValue lower = values.Pop();
+            values.Push(compiler.PutOperator(item.node, item.inversion, lower, upper));
         } else if (item.left == 0) {
-            values.Push(
-                KqInverted(PutLeaf(item.node, numVariables, isReversed, writer), item.isInverted));
+            values.Push(compiler.PutLeaf(item));
         } else {
-            // All operators are symmetric, so the operand that needs more goes first.
+            // All operators are symmetric, so either operand may go first.
             const bool isRightFirst = items[item.right].need > items[item.left].need;
             pending.Push({work.position, true});
             pending.Push({isRightFirst ? item.left : item.right, false});
             pending.Push({isRightFirst ? item.right : item.left, false});
         }
     }
-    const KqWriter::Value result = values.Pop();
-    program.codes.resize(static_cast<size_t>(writer.GetEnd() - program.codes.data()));
-    program.isInverted = result.isInverted;
+    return values.Pop();
+}
+
+} // namespace
+
+KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
+{
+    KqProgram program;
+    Compiler compiler(numVariables, isReversed, program.codes);
+    KqValue value;
+    if (CompileAsItStands(root, compiler, value)) {
+        program.numCodes = compiler.GetEnd();
+    } else {
+        Compiler again(numVariables, isReversed, program.codes);
+        value = CompileOrdered(root, again);
+        program.numCodes = again.GetEnd();
+    }
+    program.isInverted = value.GetInversion() != 0;
     return program;
 }
 
@@ -271,8 +336,9 @@ size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& st
     size_t numStacked = 0;
     size_t maxStacked = 0;
     steps.clear();
+    steps.reserve(numCodes);
     const auto take = [&](uint32_t variable) {
-        steps.push_back(MakeStep(KqStep::TAKE, variable, kKqXor));
+        steps.push_back(MakeStep(kKqTake, variable, kKqXor));
         maxStacked = std::max(maxStacked, ++numStacked);
     };
     for (size_t position = 0; position < numCodes; ++position) {
@@ -286,11 +352,11 @@ size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& st
         if (upper != kComputed) {
             if (lower != kComputed)
                 take(lower);
-            steps.push_back(MakeStep(KqStep::COMBINE, upper, kind));
+            steps.push_back(MakeStep(kKqCombine, upper, kind));
         } else if (lower != kComputed) {
-            steps.push_back(MakeStep(KqStep::COMBINE, lower, ExchangedKind(kind)));
+            steps.push_back(MakeStep(kKqCombine, lower, ExchangedKind(kind)));
         } else {
-            steps.push_back(MakeStep(KqStep::UNSTACK, 0, ExchangedKind(kind)));
+            steps.push_back(MakeStep(kKqUnstack, 0, ExchangedKind(kind)));
             --numStacked;
         }
         values.Push(kComputed);
@@ -319,8 +385,8 @@ unsigned int KqCompiled::Eval(const Node& root, const Variables& variables)
         const KqProgram program = KqCompile(&root, static_cast<uint32_t>(numVariables), false);
         m_is_inverted = program.isInverted;
         m_steps.clear();
-        if (!program.codes.empty())
-            KqMakeSteps(program.codes.data(), program.codes.size(), m_steps);
+        if (program.numCodes != 0)
+            KqMakeSteps(program.codes.data(), program.numCodes, m_steps);
         m_num_steps_variables = static_cast<uint32_t>(numVariables);
     }
     return RunSteps(variables) ^ (m_is_inverted ? 1u : 0u);
@@ -351,18 +417,14 @@ unsigned int KqCompiled::RunSteps(const Variables& variables) const
     unsigned int value = 0;
     for (const KqStep& step : m_steps) {
         const unsigned int operand = variables[step.variable].second;
-        switch (step.action) {
-        case KqStep::COMBINE:
-            value = step.table >> (2 * operand) >> value & 1u;
-            break;
-        case KqStep::TAKE:
+        if (step.action == kKqTake) {
             stack = stack << 1 | value;
             value = operand;
-            break;
-        case KqStep::UNSTACK:
+        } else if (step.action < kKqUnstack) {
+            value = step.table >> (2 * operand) >> value & 1u;
+        } else {
             value = step.table >> (2 * (stack & 1u)) >> value & 1u;
             stack >>= 1;
-            break;
         }
     }
     return value;

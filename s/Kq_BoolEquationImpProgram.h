@@ -16,8 +16,8 @@
 typedef uint32_t KqCode;
 
 constexpr unsigned int kKqKindBits = 3;
-constexpr KqCode kKqVariable = 0;
-constexpr KqCode kKqXor = 1;
+constexpr KqCode kKqXor = 0;
+constexpr KqCode kKqVariable = 1;
 constexpr KqCode kKqAnd = 4;         // plus the two flags
 constexpr KqCode kKqInvertLower = 1; // AND takes the complement of the value below the top
 constexpr KqCode kKqInvertUpper = 2; // AND takes the complement of the value on top
@@ -32,108 +32,133 @@ inline uint32_t KqVariableOf(KqCode code)
     return code >> kKqKindBits;
 }
 
-// A program that is being written, one operand after another. Keeps the rules that make it short:
-// no constant stands in it, and what a constant decides is taken out again.
-// A code array of 'capacity' is the caller's; no more codes come out than went in.
+inline KqCode KqCodeOf(uint32_t variable)
+{
+    return variable << kKqKindBits | kKqVariable;
+}
+
+// A value that the machine holds: a constant, or what the codes from a start on compute;
+// complemented or not. One word, as programs are rewritten many times.
+class KqValue {
+  public:
+    static KqValue Computed(uint32_t start) { return KqValue(start << 2); }
+    static KqValue Constant(uint32_t start, bool isOne)
+    {
+        return KqValue(start << 2 | kConstant | (isOne ? 1u : 0u));
+    }
+
+    KqValue() : m_word(0) {}
+
+    uint32_t GetStart() const { return m_word >> 2; }
+    bool IsConstant() const { return (m_word & kConstant) != 0; }
+    // 1 for a complemented value, and for the constant 1.
+    uint32_t GetInversion() const { return m_word & 1u; }
+    KqValue Invert(uint32_t inversion) const { return KqValue(m_word ^ inversion); }
+
+  private:
+    static constexpr uint32_t kConstant = 2;
+
+    explicit KqValue(uint32_t word) : m_word(word) {}
+
+    uint32_t m_word;
+};
+
+// Writes a program into a list behind 'first' codes, one operand after another. Keeps the rules
+// that make programs short: no constant stands in them, and what a constant decides is taken out
+// again.
+// Requires: room in the list for each code put; fewer than 2^30 codes.
 class KqWriter {
   public:
-    explicit KqWriter(KqCode* codes) : m_codes(codes), m_end(codes) {}
+    KqWriter(KqCode* codes, size_t first) : m_codes(codes), m_end(static_cast<uint32_t>(first)) {}
 
-    // A value on the stack: a constant, or the codes from 'start' on; complemented or not.
-    struct Value {
-        KqCode* start;
-        bool isConstant;
-        bool isInverted; // of a constant: it is 1
-    };
+    // The number of codes in the list that are in use.
+    size_t GetEnd() const { return m_end; }
+    // The list has moved.
+    void SetCodes(KqCode* codes) { m_codes = codes; }
 
-    Value PutConstant(bool isOne) { return Value{m_end, true, isOne}; }
+    KqValue PutConstant(bool isOne) { return KqValue::Constant(m_end, isOne); }
 
-    Value PutVariable(uint32_t variable)
+    // 'code' is a variable's.
+    KqValue PutVariable(KqCode code)
     {
-        KqCode* start = m_end;
-        *m_end++ = variable << kKqKindBits | kKqVariable;
-        return Value{start, false, false};
+        m_codes[m_end] = code;
+        return KqValue::Computed(m_end++);
     }
 
     // Requires: 'upper' was put right behind 'lower', and nothing behind 'upper'.
-    Value PutAnd(const Value& lower, const Value& upper)
+    KqValue PutOperator(KqCode kind, KqValue lower, KqValue upper)
     {
-        if (lower.isConstant)
-            return lower.isInverted ? upper : Drop(lower.start, false);
-        if (upper.isConstant)
-            return upper.isInverted ? lower : Drop(lower.start, false);
-        if (IsSameVariable(lower, upper)) {
-            if (lower.isInverted != upper.isInverted)
-                return Drop(lower.start, false);
-            m_end = upper.start;
-            return lower;
-        }
-        *m_end++ = kKqAnd | (lower.isInverted ? kKqInvertLower : 0u) |
-                   (upper.isInverted ? kKqInvertUpper : 0u);
-        return Value{lower.start, false, false};
+        const uint32_t isAnd = kind >> 2;
+        lower = lower.Invert(isAnd & kind);
+        upper = upper.Invert(isAnd & kind >> 1);
+        if (lower.IsConstant() || upper.IsConstant())
+            return PutConstantOperand(isAnd != 0, lower, upper);
+        if (m_end - lower.GetStart() == 2 && m_codes[m_end - 2] == m_codes[m_end - 1])
+            return PutSameVariable(isAnd != 0, lower, upper);
+        const uint32_t inversions = lower.GetInversion() | upper.GetInversion() << 1;
+        m_codes[m_end++] = isAnd != 0 ? kKqAnd | inversions : kKqXor;
+        const uint32_t parity = lower.GetInversion() ^ upper.GetInversion();
+        return KqValue::Computed(lower.GetStart()).Invert(parity & (isAnd ^ 1u));
     }
-
-    Value PutXor(const Value& lower, const Value& upper)
-    {
-        const bool isInverted = lower.isInverted != upper.isInverted;
-        if (lower.isConstant || upper.isConstant)
-            return Value{lower.start, lower.isConstant && upper.isConstant, isInverted};
-        if (IsSameVariable(lower, upper))
-            return Drop(lower.start, isInverted);
-        *m_end++ = kKqXor;
-        return Value{lower.start, false, isInverted};
-    }
-
-    KqCode* GetEnd() const { return m_end; }
 
   private:
-    Value Drop(KqCode* start, bool isOne)
+    KqValue PutConstantOperand(bool isAnd, KqValue lower, KqValue upper)
     {
-        m_end = start;
-        return Value{start, true, isOne};
+        const KqValue constant = lower.IsConstant() ? lower : upper;
+        const KqValue other = lower.IsConstant() ? upper : lower;
+        if (!isAnd)
+            return other.Invert(constant.GetInversion());
+        return constant.GetInversion() != 0 ? other : Drop(lower, false);
     }
 
-    bool IsSameVariable(const Value& lower, const Value& upper) const
+    KqValue PutSameVariable(bool isAnd, KqValue lower, KqValue upper)
     {
-        return upper.start - lower.start == 1 && m_end - upper.start == 1 &&
-               *lower.start == *upper.start;
+        const bool isSame = lower.GetInversion() == upper.GetInversion();
+        if (!isAnd || !isSame)
+            return Drop(lower, !isAnd && !isSame);
+        --m_end;
+        return lower;
+    }
+
+    KqValue Drop(KqValue lower, bool isOne)
+    {
+        m_end = lower.GetStart();
+        return KqValue::Constant(m_end, isOne);
     }
 
     KqCode* m_codes;
-    KqCode* m_end;
+    uint32_t m_end;
 };
 
-inline KqWriter::Value KqInverted(const KqWriter::Value& value, bool isInverted)
-{
-    return KqWriter::Value{value.start, value.isConstant, value.isInverted != isInverted};
-}
-
-// A whole program: the codes, none for a constant, and whether its result is complemented.
+// A whole program: the first codes of a list, none for a constant, and whether it is complemented.
 struct KqProgram {
     std::vector<KqCode> codes;
+    size_t numCodes = 0;
     bool isInverted = false;
 };
 
-// How many values the machine's stack ever holds, at most: of two operands the one that needs more
-// is written first, so that n operands never need more than log2(n) + 1 values.
+// How many values the machine ever stacks, at most. Operands are written as they stand while that
+// is enough, and otherwise the one that needs more first: then n operands need log2(n) + 1 values.
 constexpr size_t kKqMaxStack = 48;
 
 // Compiles the tree at 'root', null counting as 0. A variable's number is its index or, when
 // 'isReversed', numVariables-1 less its index. An ID whose index is not below 'numVariables' is 0.
-// Requires: a checked tree, numVariables < 2^29.  Fails: std::bad_alloc.  Cost: O(nodes).
+// Requires: a checked tree of fewer than 2^30 nodes, numVariables < 2^29.
+// Fails: std::bad_alloc.  Cost: O(nodes).
 KqProgram KqCompile(const Kq_BoolEquationImp::Node* root, uint32_t numVariables, bool isReversed);
 
 // A program for a machine that keeps the last value at hand. TAKE stacks that value and takes a
 // variable's; COMBINE makes a new one of it, as the lower value, and a variable, as the upper one;
 // UNSTACK makes it of it, as the lower value, and one off the stack, as the upper one.
 struct KqStep {
-    enum ACTION : uint8_t { TAKE, COMBINE, UNSTACK };
-
     uint32_t variable;
-    ACTION action;
-    uint8_t kind;  // the operator
-    uint8_t table; // the operator's result for lower and upper value, bit lower + 2 * upper
+    uint8_t action; // kKqTake, or kKqCombine or kKqUnstack and the operator's kind
+    uint8_t table;  // the operator's result for lower and upper value, bit lower + 2 * upper
 };
+
+constexpr uint8_t kKqTake = 0;
+constexpr uint8_t kKqCombine = 8;
+constexpr uint8_t kKqUnstack = 16;
 
 // Replaces 'steps' by those of 'codes', at most as many, and returns how many values they stack.
 // Requires: the codes of a program that is no constant.  Fails: std::bad_alloc.

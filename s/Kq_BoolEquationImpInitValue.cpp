@@ -4,6 +4,7 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
+#include <cstring>
 
 #include "Kq_BoolEquationImpColumn.h"
 #include "Kq_BoolEquationImpInitText.h"
@@ -16,79 +17,120 @@ namespace {
 // Deliberate: the limit of the truth table, whose column an init value is.
 constexpr unsigned int kMaxVariables = 30;
 
-constexpr size_t kWords = 64;
+// Words of the column that are turned into text at a time: 2^17 rows.
+constexpr size_t kPieceWords = 2048;
 
-// Appends the digits of the words given, the last word's first. Each digit shows 'digitBits' bits
-// of a word's lowest 'wordBits'; 'digits' are the characters for the values.
-void AppendDigits(const uint64_t* words, size_t numWords, unsigned int wordBits,
-                  unsigned int digitBits, const char* digits, String& text)
+enum BASE : unsigned int { BINARY = 1, HEXADECIMAL = 4 }; // bits per digit
+
+// The digits of a byte of the column, the highest row first.
+template <size_t kNumDigits>
+struct ByteDigits {
+    char digits[256][kNumDigits];
+};
+
+template <unsigned int kDigitBits>
+constexpr ByteDigits<8 / kDigitBits> MakeByteDigits(const char* characters)
 {
-    char piece[kWords * 64 + 1];
-    size_t length = 0;
+    ByteDigits<8 / kDigitBits> table = {};
+    for (unsigned int byte = 0; byte < 256; ++byte) {
+        for (unsigned int digit = 0; digit < 8 / kDigitBits; ++digit)
+            table.digits[byte][digit] =
+                characters[byte >> (8 - kDigitBits * (digit + 1)) & ((1u << kDigitBits) - 1)];
+    }
+    return table;
+}
+
+constexpr char kLowerDigits[] = "0123456789abcdef";
+constexpr char kUpperDigits[] = "0123456789ABCDEF";
+
+constexpr ByteDigits<2> kLowerHex = MakeByteDigits<HEXADECIMAL>(kLowerDigits);
+constexpr ByteDigits<2> kUpperHex = MakeByteDigits<HEXADECIMAL>(kUpperDigits);
+constexpr ByteDigits<8> kBits = MakeByteDigits<BINARY>(kLowerDigits);
+
+// Writes the digits of the words, the last word's highest row first, and returns the text's end.
+template <size_t kNumDigits>
+char* WriteWords(const uint64_t* words, size_t numWords, const ByteDigits<kNumDigits>& table,
+                 char* text)
+{
     for (size_t word = numWords; word-- > 0;) {
-        for (unsigned int bit = wordBits; bit > 0; bit -= digitBits)
-            piece[length++] = digits[words[word] >> (bit - digitBits) & ((1u << digitBits) - 1)];
+        for (unsigned int byte = 8; byte-- > 0; text += kNumDigits)
+            std::memcpy(text, table.digits[words[word] >> (8 * byte) & 0xffu], kNumDigits);
     }
-    piece[length] = '\0';
-    text += piece;
+    return text;
 }
 
-// Appends the column of 'numVariables' variables, from the highest row to the lowest, in pieces
-// that fill(firstWord, numWords, words) computes.
-template <class Fill>
-void AppendColumn(unsigned int numVariables, unsigned int digitBits, const char* digits, Fill fill,
-                  String& text)
+// Appends the digits of a column of up to six variables.
+void AppendFewRows(uint64_t word, unsigned int numVariables, BASE base, bool upperCase,
+                   String& text)
 {
-    const uint64_t numRows = uint64_t(1) << numVariables;
-    const unsigned int wordBits = static_cast<unsigned int>(std::min<uint64_t>(numRows, 64));
-    uint64_t words[kWords];
-    for (uint64_t end = (numRows + 63) / 64; end > 0;) {
-        const size_t numWords = std::min<uint64_t>(kWords, end);
-        end -= numWords;
-        fill(end, numWords, words);
-        // One variable has two rows, which are one hexadecimal digit of two bits.
-        AppendDigits(words, numWords, wordBits, std::min(digitBits, wordBits), digits, text);
-    }
+    // One variable has two rows, which are one hexadecimal digit of two bits.
+    const unsigned int numRows = 1u << numVariables;
+    const unsigned int digitBits = std::min<unsigned int>(base, numRows);
+    const char* digits = upperCase ? kUpperDigits : kLowerDigits;
+    char buffer[64 + 1];
+    char* end = buffer;
+    for (unsigned int bit = numRows; bit > 0; bit -= digitBits)
+        *end++ = digits[word >> (bit - digitBits) & ((1u << digitBits) - 1)];
+    *end = '\0';
+    text += buffer;
 }
 
-// Packs the results of rows that were evaluated one by one.
-void PackRows(const std::vector<Kq_BoolEquationImp::TruthTable::Row>& rows, uint64_t firstWord,
-              size_t numWords, uint64_t* words)
+// Appends the digits of the words, the last word's highest row first.
+void AppendWords(const uint64_t* words, size_t numWords, BASE base, bool upperCase,
+                 std::vector<char>& buffer, String& text)
 {
-    std::fill_n(words, numWords, uint64_t(0));
-    const uint64_t firstRow = firstWord * 64;
-    const uint64_t endRow = std::min<uint64_t>(rows.size(), firstRow + numWords * 64);
-    for (uint64_t row = firstRow; row < endRow; ++row) {
-        if (rows[row].GetResultValue())
-            words[(row - firstRow) / 64] |= uint64_t(1) << (row % 64);
+    buffer.resize(numWords * 64 / base + 1);
+    char* end = nullptr;
+    if (base == BINARY)
+        end = WriteWords(words, numWords, kBits, buffer.data());
+    else
+        end = WriteWords(words, numWords, upperCase ? kUpperHex : kLowerHex, buffer.data());
+    *end = '\0';
+    text += buffer.data();
+}
+
+// Packs the results of all rows, which were evaluated one by one.
+std::vector<uint64_t> PackRows(const std::vector<Kq_BoolEquationImp::TruthTable::Row>& rows)
+{
+    std::vector<uint64_t> words((rows.size() + 63) / 64);
+    for (size_t row = 0; row < rows.size(); ++row)
+        words[row / 64] |= uint64_t(rows[row].GetResultValue() ? 1 : 0) << (row % 64);
+    return words;
+}
+
+// Appends the column of more than six variables in pieces, from the highest row to the lowest.
+void AppendColumn(const Kq_BoolEquationImp& equation, BASE base, bool upperCase, String& text)
+{
+    KqColumn column(equation.GetRoot(), equation.GetNumVariables());
+    std::vector<uint64_t> words(std::min<uint64_t>(kPieceWords, column.GetNumWords()));
+    std::vector<char> buffer;
+    for (uint64_t end = column.GetNumWords(); end > 0; end -= words.size()) {
+        column.Fill(end - words.size(), words.size(), words.data());
+        AppendWords(words.data(), words.size(), base, upperCase, buffer, text);
     }
 }
 
 // Appends the init value's digits; nothing when the equation has no truth table.
-void AppendInitValue(const Kq_BoolEquationImp& equation, unsigned int digitBits, const char* digits,
-                     String& text)
+void AppendDigits(const Kq_BoolEquationImp& equation, KqCompiled& compiled, BASE base,
+                  bool upperCase, String& text)
 {
     const unsigned int numVariables = equation.GetNumVariables();
     if (!equation || numVariables == 0 || numVariables > kMaxVariables)
         return;
     if (Kq_BoolEquationImp::GetInternalDebugMode()) {
         // The table evaluates node by node, because there the trace is output.
-        const Kq_BoolEquationImp::TruthTable table = equation.GetTruthTable();
-        AppendColumn(
-            numVariables, digitBits, digits,
-            [&](uint64_t firstWord, size_t numWords, uint64_t* words) {
-                PackRows(table.GetRows(), firstWord, numWords, words);
-            },
-            text);
-        return;
+        const std::vector<uint64_t> words = PackRows(equation.GetTruthTable().GetRows());
+        std::vector<char> buffer;
+        if (numVariables <= 6)
+            AppendFewRows(words[0], numVariables, base, upperCase, text);
+        else
+            AppendWords(words.data(), words.size(), base, upperCase, buffer, text);
+    } else if (numVariables <= 6) {
+        const uint64_t word = compiled.GetWord(*equation.GetRoot(), numVariables);
+        AppendFewRows(word, numVariables, base, upperCase, text);
+    } else {
+        AppendColumn(equation, base, upperCase, text);
     }
-    KqColumn column(equation.GetRoot(), numVariables);
-    AppendColumn(
-        numVariables, digitBits, digits,
-        [&](uint64_t firstWord, size_t numWords, uint64_t* words) {
-            column.Fill(firstWord, numWords, words);
-        },
-        text);
 }
 
 } // namespace
@@ -115,7 +157,7 @@ bool Kq_BoolEquationImp::IsBinaryInitValue() const
 String Kq_BoolEquationImp::GetEquationAsHexInitValue(bool upperCase) const
 {
     String text = "0x";
-    AppendInitValue(*this, 4, upperCase ? "0123456789ABCDEF" : "0123456789abcdef", text);
+    AppendDigits(*this, m_store->m_compiled, HEXADECIMAL, upperCase, text);
     // Deliberate: without a truth table one digit 0 is written, for the constant 1 as well.
     if (text.length() == KqInitText::kPrefixLength)
         text += '0';
@@ -126,7 +168,7 @@ String Kq_BoolEquationImp::GetEquationAsBinaryInitValue() const
 {
     // Deliberate: without a truth table no digit is written, unlike in the hexadecimal form.
     String text = "0b";
-    AppendInitValue(*this, 1, "01", text);
+    AppendDigits(*this, m_store->m_compiled, BINARY, false, text);
     return text;
 }
 

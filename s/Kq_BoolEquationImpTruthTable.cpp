@@ -27,14 +27,14 @@ bool IsSameText(const String& left, const String& right)
 // Makes 'values' those of row 'rowIndex', the first variable being the most significant bit.
 void SetRowValues(uint32_t rowIndex, std::vector<unsigned int>& values)
 {
-    for (size_t column = 0; column < values.size(); ++column)
-        values[column] = rowIndex >> (values.size() - 1 - column) & 1u;
+    for (size_t column = values.size(); column-- > 0; rowIndex >>= 1)
+        values[column] = rowIndex & 1u;
 }
 
-// Appends all rows of the column.
+// Appends all rows of the column, each with one allocation.
 void AppendRows(KqColumn& column, std::vector<unsigned int>& values, std::vector<Row>& rows)
 {
-    constexpr size_t kWords = 64;
+    constexpr size_t kWords = 256;
     uint64_t words[kWords];
     const uint32_t numRows = uint32_t(1) << values.size();
     for (uint32_t rowIndex = 0; rowIndex < numRows; ++rowIndex) {
@@ -42,7 +42,7 @@ void AppendRows(KqColumn& column, std::vector<unsigned int>& values, std::vector
         if (rowIndex % (64 * kWords) == 0)
             column.Fill(word, std::min<uint64_t>(kWords, column.GetNumWords() - word), words);
         SetRowValues(rowIndex, values);
-        rows.push_back(Row(words[word % kWords] >> (rowIndex % 64) & 1u, values));
+        rows.emplace_back(words[word % kWords] >> (rowIndex % 64) & 1u, values);
     }
 }
 
@@ -59,7 +59,7 @@ void AppendTracedRows(const Kq_BoolEquationImp::Node& root,
         const unsigned int result = root.Eval(variables);
         if (Kq_BoolEquationImp::GetInternalDebugMode())
             root.Dbg();
-        rows.push_back(Row(result, values));
+        rows.emplace_back(result, values);
     }
 }
 

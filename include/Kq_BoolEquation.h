@@ -131,12 +131,12 @@ class KQ_EXPORT Kq_BoolEquation::Handle {
     ~Handle();
     Handle& operator=(const Handle& other);
 
-    unsigned int* begin();
-    const unsigned int* begin() const;
-    unsigned int* end();
-    const unsigned int* end() const;
-    bool empty() const;
-    size_t size() const;
+    unsigned int* begin() { return m_values.data(); }
+    const unsigned int* begin() const { return m_values.data(); }
+    unsigned int* end() { return m_values.data() + m_values.size(); }
+    const unsigned int* end() const { return m_values.data() + m_values.size(); }
+    bool empty() const { return m_values.empty(); }
+    size_t size() const { return m_values.size(); }
     bool operator==(const Handle& other) const;
     bool operator!=(const Handle& other) const;
     void Dbg() const;

@@ -112,6 +112,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     void DefineTerms(const std::vector<Port::StringBase<char>>& terms, bool reverseTerms);
     void DefineListedNames(const Tokens& tokens);
     size_t FindVariable(const Port::StringBase<char>& name) const;
+    size_t FindVariable(const Kq_BoolEquation::Handle& handle) const;
     std::vector<Port::StringBase<char>> GetVariableNames() const;
     bool HasTruthTableRoot() const;
     bool HasInitValuePrefix(char lowerCase, char upperCase) const;

@@ -237,36 +237,6 @@ Kq_BoolEquation::Handle::~Handle() = default;
 
 Kq_BoolEquation::Handle& Kq_BoolEquation::Handle::operator=(const Handle& other) = default;
 
-unsigned int* Kq_BoolEquation::Handle::begin()
-{
-    return m_values.data();
-}
-
-const unsigned int* Kq_BoolEquation::Handle::begin() const
-{
-    return m_values.data();
-}
-
-unsigned int* Kq_BoolEquation::Handle::end()
-{
-    return m_values.data() + m_values.size();
-}
-
-const unsigned int* Kq_BoolEquation::Handle::end() const
-{
-    return m_values.data() + m_values.size();
-}
-
-bool Kq_BoolEquation::Handle::empty() const
-{
-    return m_values.empty();
-}
-
-size_t Kq_BoolEquation::Handle::size() const
-{
-    return m_values.size();
-}
-
 bool Kq_BoolEquation::Handle::operator==(const Handle& other) const
 {
     return m_values == other.m_values;

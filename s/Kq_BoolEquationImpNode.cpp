@@ -42,7 +42,7 @@ unsigned int TypeRow(Node::TYPE type)
 const String& GetAlternative(const Node& node, unsigned int syntaxIndex)
 {
     const KqSpelling::Id id = KqSpelling::kTypes[TypeRow(node.GetType())].alt[syntaxIndex];
-    return id == KqSpelling::kOwnToken ? node.GetToken() : KqSpelling::GetText(id);
+    return id == KqSpelling::kOwnToken ? node.GetToken() : KqSpelling::GetTexts()[id];
 }
 
 bool HasAsChild(const Node& parent, const Node& node)
@@ -52,10 +52,10 @@ bool HasAsChild(const Node& parent, const Node& node)
 
 } // namespace
 
-const String& KqSpelling::GetText(Id id)
+const String* KqSpelling::GetTexts()
 {
     static const Texts texts;
-    return texts.m_texts[id];
+    return texts.m_texts;
 }
 
 Node* Node::GetTopParent() const

@@ -89,9 +89,8 @@ constexpr TypeSpelling kTypes[kNumTypes + 1] = {{"AND", {kAmpersand, kStar, kDot
                                                 {"SENTINEL", {kUnset, kUnset, kUnset}},
                                                 {"UNKNOWN", {kCorrupt, kCorrupt, kCorrupt}}};
 
-// The spelling as a string that is made once and shared by all nodes; valid until unload.
-// Requires: id < kNumSpellings.
-const Port::StringBase<char>& GetText(Id id);
+// The spellings as strings, by Id, made once and shared by all nodes; valid until unload.
+const Port::StringBase<char>* GetTexts();
 
 } // namespace KqSpelling
 

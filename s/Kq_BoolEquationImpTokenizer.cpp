@@ -19,49 +19,70 @@ namespace {
 constexpr size_t kNumRecent = 256;
 const String* s_recentNames[kNumRecent];
 
-bool IsNameStart(char character)
+// What a character starts.
+enum CLASS : uint8_t {
+    REFUSED,
+    BLANK,
+    NAME,
+    DIGIT_OF_NAME,
+    CONSTANT,
+    SINGLE,
+    NEGATION,
+    KEYWORD,
+    QUOTE
+};
+
+struct Character {
+    CLASS startsA;
+    KqSpelling::Id spelling; // of CONSTANT and SINGLE
+};
+
+struct Characters {
+    Character of[256];
+
+    const Character& operator[](char character) const
+    {
+        return of[static_cast<unsigned char>(character)];
+    }
+};
+
+constexpr Characters MakeCharacters()
 {
-    return (character >= 'A' && character <= 'Z') || (character >= 'a' && character <= 'z') ||
-           character == '_';
+    Characters table = {};
+    for (Character& character : table.of)
+        character = {REFUSED, KqSpelling::kOwnToken};
+    for (unsigned int letter = 0; letter < 26; ++letter) {
+        table.of['A' + letter].startsA = NAME;
+        table.of['a' + letter].startsA = NAME;
+    }
+    table.of[static_cast<int>('_')].startsA = NAME;
+    for (int digit = '2'; digit <= '9'; ++digit)
+        table.of[digit].startsA = DIGIT_OF_NAME;
+    for (const char blank : {' ', '\t', '\n'})
+        table.of[static_cast<int>(blank)].startsA = BLANK;
+    table.of[static_cast<int>('0')] = {CONSTANT, KqSpelling::kZero};
+    table.of[static_cast<int>('1')] = {CONSTANT, KqSpelling::kOne};
+    table.of[static_cast<int>('(')] = {SINGLE, KqSpelling::kLeftParen};
+    table.of[static_cast<int>(')')] = {SINGLE, KqSpelling::kRightParen};
+    table.of[static_cast<int>('&')] = {SINGLE, KqSpelling::kAmpersand};
+    table.of[static_cast<int>('*')] = {SINGLE, KqSpelling::kStar};
+    table.of[static_cast<int>('|')] = {SINGLE, KqSpelling::kBar};
+    table.of[static_cast<int>('+')] = {SINGLE, KqSpelling::kPlus};
+    table.of[static_cast<int>('^')] = {SINGLE, KqSpelling::kCaret};
+    table.of[static_cast<int>('@')] = {SINGLE, KqSpelling::kAt};
+    for (const char prefix : {'~', '!'})
+        table.of[static_cast<int>(prefix)].startsA = NEGATION;
+    table.of[static_cast<int>('.')].startsA = KEYWORD;
+    table.of[static_cast<int>('\'')].startsA = QUOTE;
+    return table;
 }
+
+constexpr Characters kCharacters = MakeCharacters();
 
 bool IsNamePart(char character)
 {
-    return IsNameStart(character) || (character >= '0' && character <= '9');
-}
-
-bool IsBlank(char character)
-{
-    return character == ' ' || character == '\t' || character == '\n';
-}
-
-// The spelling of a token of one character, kOwnToken when there is none.
-KqSpelling::Id SingleSpelling(char character)
-{
-    switch (character) {
-    case '(':
-        return KqSpelling::kLeftParen;
-    case ')':
-        return KqSpelling::kRightParen;
-    case '&':
-        return KqSpelling::kAmpersand;
-    case '*':
-        return KqSpelling::kStar;
-    case '|':
-        return KqSpelling::kBar;
-    case '+':
-        return KqSpelling::kPlus;
-    case '^':
-        return KqSpelling::kCaret;
-    case '@':
-        return KqSpelling::kAt;
-    case '0':
-        return KqSpelling::kZero;
-    case '1':
-        return KqSpelling::kOne;
-    default:
-        return KqSpelling::kOwnToken;
-    }
+    const CLASS startsA = kCharacters[character].startsA;
+    return startsA == NAME || startsA == CONSTANT || startsA == DIGIT_OF_NAME;
 }
 
 // The spelling that starts with the negation 'prefix'. An operator written right behind it belongs
@@ -121,9 +142,7 @@ class Scanner {
     {
         m_next = text;
         while (*m_next) {
-            if (IsBlank(*m_next))
-                ++m_next;
-            else if (!ScanToken())
+            if (!ScanToken())
                 return false;
         }
         // Only the totals are compared: ")A(" is left for the tree builder to refuse.
@@ -133,22 +152,30 @@ class Scanner {
   private:
     bool ScanToken()
     {
-        const char first = *m_next;
-        if (IsNameStart(first))
+        const Character& first = kCharacters[*m_next];
+        switch (first.startsA) {
+        case BLANK:
+            ++m_next;
+            return true;
+        case NAME:
             return ScanName();
-        if (first == '\'')
-            return ScanQuotedName();
-        if (first == '.')
-            return ScanKeyword();
-        if (first == '~' || first == '!')
+        case CONSTANT:
+        case SINGLE:
+            m_num_opened += first.spelling == KqSpelling::kLeftParen ? 1u : 0u;
+            m_num_closed += first.spelling == KqSpelling::kRightParen ? 1u : 0u;
+            AppendSpelling(first.spelling, 1);
+            return true;
+        case NEGATION:
             return ScanNegation();
-        const KqSpelling::Id id = SingleSpelling(first);
-        if (id == KqSpelling::kOwnToken)
+        case KEYWORD:
+            return ScanKeyword();
+        case QUOTE:
+            return ScanQuotedName();
+        case REFUSED:
+        case DIGIT_OF_NAME:
             return false;
-        m_num_opened += first == '(' ? 1u : 0u;
-        m_num_closed += first == ')' ? 1u : 0u;
-        AppendSpelling(id, 1);
-        return true;
+        }
+        return false;
     }
 
     bool ScanName()
@@ -192,7 +219,7 @@ class Scanner {
 
     void AppendSpelling(KqSpelling::Id id, size_t length)
     {
-        m_tokens.Append(KqSpelling::kSpellings[id].type, KqSpelling::GetText(id));
+        m_tokens.Append(KqSpelling::kSpellings[id].type, m_spellings[id]);
         m_next += length;
     }
 
@@ -220,6 +247,7 @@ class Scanner {
 
     Kq_BoolEquationImp::StringMgr& m_names;
     Kq_BoolEquationImp::Tokens& m_tokens;
+    const String* m_spellings = KqSpelling::GetTexts();
     const char* m_next = nullptr;
     size_t m_num_opened = 0;
     size_t m_num_closed = 0;

@@ -175,6 +175,11 @@ size_t Kq_BoolEquationImp::FindVariable(const String& name) const
     return FindName(m_variables, name);
 }
 
+inline size_t Kq_BoolEquationImp::FindVariable(const Kq_BoolEquation::Handle& handle) const
+{
+    return !handle.empty() && *handle.begin() < m_variables.size() ? *handle.begin() : kNotFound;
+}
+
 bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
 {
     if (FindVariable(name) != kNotFound || name.length() == 0 || !IsLegalName(name))
@@ -237,7 +242,7 @@ bool Kq_BoolEquationImp::IsVariableDefined(const String& name) const
 // Deliberate: of a handle only the index counts, whatever equation it came from.
 bool Kq_BoolEquationImp::IsVariableDefined(const Kq_BoolEquation::Handle& handle) const
 {
-    return !handle.empty() && *handle.begin() < m_variables.size();
+    return FindVariable(handle) != kNotFound;
 }
 
 bool Kq_BoolEquationImp::SetVariable(const String& name, unsigned int value)
@@ -251,9 +256,10 @@ bool Kq_BoolEquationImp::SetVariable(const String& name, unsigned int value)
 
 bool Kq_BoolEquationImp::SetVariable(const Kq_BoolEquation::Handle& handle, unsigned int value)
 {
-    if (!IsVariableDefined(handle))
+    const size_t index = FindVariable(handle);
+    if (index == kNotFound)
         return false;
-    m_variables[*handle.begin()].second = value ? 1u : 0u;
+    m_variables[index].second = value ? 1u : 0u;
     return true;
 }
 
@@ -265,7 +271,8 @@ unsigned int Kq_BoolEquationImp::GetVariable(const String& name) const
 
 unsigned int Kq_BoolEquationImp::GetVariable(const Kq_BoolEquation::Handle& handle) const
 {
-    return IsVariableDefined(handle) ? m_variables[*handle.begin()].second : 0u;
+    const size_t index = FindVariable(handle);
+    return index == kNotFound ? 0u : m_variables[index].second;
 }
 
 Kq_BoolEquation::Handle Kq_BoolEquationImp::GetVariableHandle(const String& name) const

@@ -87,7 +87,10 @@ class Case:
 def read_results(paths):
     cases, contexts = {}, []
     for path in paths:
-        results = json.loads(pathlib.Path(path).read_text())
+        text = pathlib.Path(path).read_text()
+        if not text:
+            continue  # a filter that fits no case of this executable
+        results = json.loads(text)
         contexts.append(results["context"])
         for entry in results["benchmarks"]:
             if entry.get("run_type") == "iteration":

@@ -122,7 +122,7 @@ bool Kq_BoolEquationImp::SetEquation(const String& text)
     const bool isInitValue = !expression.empty();
     // Read before anything is cleared: the text may be one of the names that go.
     const String initValue = isInitValue ? text : String();
-    Tokens tokens;
+    Tokens tokens(isInitValue ? expression.length() : text.length());
     const bool isRead = ScanTokens(isInitValue ? expression.c_str() : text.c_str(), tokens);
     Clear();
     if (!isRead || tokens.GetSize() == 0)
@@ -142,16 +142,7 @@ bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* init
     DefineListedNames(tokens);
     if (initValue)
         AddTruthTableRoot(*initValue);
-    Node** next = m_store->m_nodes.data();
-    try {
-        KqWalkPreOrder(m_store->m_root, 0, [&](Node* node, size_t) {
-            *next++ = node;
-            return true;
-        });
-    } catch (...) {
-        m_store->ListInMakingOrder();
-        throw;
-    }
+    m_store->ListInPreOrder();
     KqCheckStore(*m_store);
     return true;
 }

@@ -366,14 +366,12 @@ size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& st
     return maxStacked;
 }
 
-unsigned int KqCompiled::Eval(const Node& root, const Variables& variables)
+unsigned int KqCompiled::EvalOther(const Node& root, const Variables& variables)
 {
     const size_t numVariables = variables.size();
     if (numVariables <= 6) {
-        unsigned int row = 0;
-        for (const auto& variable : variables)
-            row = row << 1 | variable.second;
-        return GetWord(root, static_cast<unsigned int>(numVariables)) >> row & 1u;
+        GetWord(root, static_cast<unsigned int>(numVariables));
+        return Eval(root, variables);
     }
     // Compiling costs several evaluations, and many equations are evaluated just once.
     if (m_num_evaluations == 0) {
@@ -404,7 +402,7 @@ uint64_t KqCompiled::GetWord(const Node& root, unsigned int numVariables)
 
 void KqCompiled::Drop() noexcept
 {
-    m_num_word_variables = UINT32_MAX;
+    m_num_word_variables = kNoWord;
     m_num_evaluations = 0;
     m_num_steps_variables = 0;
     std::vector<KqStep>().swap(m_steps);

@@ -172,7 +172,15 @@ class KqCompiled {
 
     // The value of the tree at 'root' for a table of values 0 or 1.
     // Fails: std::bad_alloc.  Cost: O(variables) for up to six, else O(nodes).
-    unsigned int Eval(const Kq_BoolEquationImp::Node& root, const Variables& variables);
+    unsigned int Eval(const Kq_BoolEquationImp::Node& root, const Variables& variables)
+    {
+        if (variables.size() != m_num_word_variables)
+            return EvalOther(root, variables);
+        unsigned int row = 0;
+        for (const auto& variable : variables)
+            row = row << 1 | variable.second;
+        return m_word >> row & 1u;
+    }
 
     // The column of up to six variables, repeated up to the word's end.
     uint64_t GetWord(const Kq_BoolEquationImp::Node& root, unsigned int numVariables);
@@ -180,10 +188,13 @@ class KqCompiled {
     void Drop() noexcept;
 
   private:
+    unsigned int EvalOther(const Kq_BoolEquationImp::Node& root, const Variables& variables);
     unsigned int RunSteps(const Variables& variables) const;
 
+    static constexpr size_t kNoWord = SIZE_MAX;
+
     uint64_t m_word = 0;
-    unsigned int m_num_word_variables = UINT32_MAX; // what m_word is for; none
+    size_t m_num_word_variables = kNoWord; // what m_word is for
     unsigned int m_num_evaluations = 0;
     uint32_t m_num_steps_variables = 0; // what m_steps is for
     bool m_is_inverted = false;

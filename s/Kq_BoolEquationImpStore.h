@@ -12,6 +12,7 @@
 #include <Kq_BoolEquationImpNode.h>
 
 #include "Kq_BoolEquationImpProgram.h"
+#include "Kq_BoolEquationImpWalk.h"
 
 // The tokens of one text, in text order. The first ones need no heap.
 // Texts point into the pool of names and the table of spellings: they outlive every equation.
@@ -26,6 +27,10 @@ class Kq_BoolEquationImp::Tokens {
     const Token* begin() const { return m_size <= kInline ? m_first : m_all.data(); }
     const Token* end() const { return begin() + m_size; }
 
+    // Few texts have more tokens than every second character starts one: room for so many is made
+    // at once, as growing a long list costs more than memory that is never touched.
+    explicit Tokens(size_t textLength) : m_expected_size(textLength / 2) {}
+
     void Append(Node::TYPE type, const Port::StringBase<char>& text)
     {
         const Token token = {type, &text};
@@ -33,7 +38,7 @@ class Kq_BoolEquationImp::Tokens {
             m_first[m_size] = token;
         } else {
             if (m_size == kInline)
-                m_all.assign(m_first, m_first + kInline);
+                Spill();
             m_all.push_back(token);
         }
         ++m_size;
@@ -42,6 +47,13 @@ class Kq_BoolEquationImp::Tokens {
   private:
     static constexpr size_t kInline = 128;
 
+    void Spill()
+    {
+        m_all.reserve(std::max(m_expected_size, 2 * kInline));
+        m_all.assign(m_first, m_first + kInline);
+    }
+
+    size_t m_expected_size;
     size_t m_size = 0;
     Token m_first[kInline];
     std::vector<Token> m_all; // all tokens, once they are too many for m_first
@@ -82,11 +94,27 @@ struct Kq_BoolEquationImp::Store {
         return node;
     }
 
-    // Lists the nodes in the order they were made in. Needs no memory.
-    void ListInMakingOrder() noexcept
+    // Lists the tree in pre-order.
+    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the order as it was made.
+    void ListInPreOrder()
     {
-        for (size_t position = 0; position < m_nodes.size(); ++position)
-            m_nodes[position] = m_block + position;
+        KqStack<Node*, 32> pending;
+        pending.Push(m_root);
+        try {
+            for (Node*& position : m_nodes) {
+                Node* node = pending.Pop();
+                position = node;
+                // The right child is pushed first, so the left one is listed first.
+                if (node->GetRightChild())
+                    pending.Push(node->GetRightChild());
+                if (node->GetLeftChild())
+                    pending.Push(node->GetLeftChild());
+            }
+        } catch (...) {
+            for (size_t position = 0; position < m_nodes.size(); ++position)
+                m_nodes[position] = m_block + position;
+            throw;
+        }
     }
 
     void FreeNodes() noexcept

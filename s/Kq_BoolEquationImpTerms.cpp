@@ -12,8 +12,8 @@ bool Kq_BoolEquationImp::SetEquationWithExplicitTerms(const std::vector<String>&
                                                       const String& equation, bool termOrderFlag,
                                                       bool reverseTerms)
 {
-    Tokens tokens;
     if (!KqInitText::IsCandidate(equation)) {
+        Tokens tokens(equation.length());
         // Scanned before anything is cleared: the text may be one of the names that go.
         const bool isRead = ScanTokens(equation.c_str(), tokens);
         Clear();
@@ -28,6 +28,7 @@ bool Kq_BoolEquationImp::SetEquationWithExplicitTerms(const std::vector<String>&
     Clear();
     DefineTerms(terms, reverseTerms);
     const std::string expression = KqInitText::Expand(text, GetVariableNames(), termOrderFlag);
+    Tokens tokens(expression.length());
     if (expression.empty() || !ScanTokens(expression.c_str(), tokens)) {
         Clear();
         return false;

@@ -266,7 +266,7 @@ void Kq_BoolEquationImp::TokenizeNodes(const char* text)
 {
     if (!text || !*text || !m_store->m_nodes.empty())
         return;
-    Tokens tokens;
+    Tokens tokens(std::strlen(text));
     if (!ScanTokens(text, tokens))
         Clear();
     else if (tokens.GetSize() != 0)

@@ -177,7 +177,10 @@ size_t Kq_BoolEquationImp::FindVariable(const String& name) const
 
 inline size_t Kq_BoolEquationImp::FindVariable(const Kq_BoolEquation::Handle& handle) const
 {
-    return !handle.empty() && *handle.begin() < m_variables.size() ? *handle.begin() : kNotFound;
+    if (handle.empty())
+        return kNotFound;
+    const size_t index = *handle.begin();
+    return index < m_variables.size() ? index : kNotFound;
 }
 
 bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)

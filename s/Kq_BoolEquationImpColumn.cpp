@@ -46,10 +46,10 @@ void Repeat(size_t numWords, size_t totalWords, uint64_t* words)
         std::memcpy(words + word, words, numWords * sizeof(uint64_t));
 }
 
-void RunPlain(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+void RunPlain(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
               uint64_t* stack, uint64_t* words)
 {
-    RunTiles<Vectors<16>, 8>(steps, numSteps, isInverted, numWords, stack, words);
+    RunTiles<Vectors<16>, 8>(codes, numCodes, isInverted, numWords, stack, words);
 }
 
 bool IsAlwaysSupported()
@@ -130,16 +130,15 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
     while (rest.variables >> level != 0) {
         const unsigned int variable = HighestVariable(rest.variables);
         const bool value = (firstWord >> (variable - 6) & 1u) != 0;
-        if (depth < m_path.size() && m_path[depth].variable == variable &&
+        if (depth < m_path_length && m_path[depth].variable == variable &&
             m_path[depth].value == value) {
             rest = m_path[depth++].rest;
             continue;
         }
-        m_path.resize(depth);
         m_num_codes = rest.first + rest.numCodes;
         rest = Fix(rest, variable, value);
-        m_path.push_back(Fixed{variable, value, rest});
-        ++depth;
+        m_path[depth++] = Fixed{variable, value, rest};
+        m_path_length = depth;
     }
     m_num_codes = rest.first + rest.numCodes;
     Expand(rest, level, words);
@@ -180,16 +179,14 @@ void KqColumn::ExpandHalves(const Rest& rest, unsigned int level, uint64_t* word
 
 void KqColumn::RunKernel(const Rest& rest, unsigned int level, uint64_t* words)
 {
-    const size_t numStacked = KqMakeSteps(m_codes.data() + rest.first, rest.numCodes, m_steps);
-    if (m_stack.size() < (numStacked + 1) * kKqTileWords)
-        m_stack.resize((numStacked + 1) * kKqTileWords);
+    const KqCode* codes = m_codes.data() + rest.first;
     const size_t numWords = NumWords(level);
     if (numWords >= kKqTileWords) {
-        m_kernel(m_steps.data(), m_steps.size(), rest.isInverted, numWords, m_stack.data(), words);
+        m_kernel(codes, rest.numCodes, rest.isInverted, numWords, m_stack, words);
         return;
     }
     uint64_t tile[kKqTileWords];
-    m_kernel(m_steps.data(), m_steps.size(), rest.isInverted, kKqTileWords, m_stack.data(), tile);
+    m_kernel(codes, rest.numCodes, rest.isInverted, kKqTileWords, m_stack, tile);
     std::memcpy(words, tile, numWords * sizeof(uint64_t));
 }
 
@@ -198,25 +195,28 @@ KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value
 {
     if (m_codes.size() < m_num_codes + rest.numCodes)
         m_codes.resize(2 * m_num_codes + rest.numCodes);
-    const KqCode fixed = KqCodeOf(variable);
     KqWriter writer(m_codes.data(), m_num_codes);
-    KqValue values[kKqMaxStack];
-    KqValue* top = values - 1;
+    KqValue hand = writer.PutConstant(false);
+    KqValue stack[kKqMaxStack];
+    KqValue* top = stack;
     const KqCode* const end = m_codes.data() + rest.first + rest.numCodes;
     for (const KqCode* next = end - rest.numCodes; next != end; ++next) {
-        const KqCode code = *next;
-        const KqCode kind = KqKindOf(code);
-        if (kind == kKqVariable) {
-            assert(top + 1 < values + kKqMaxStack);
-            *++top = code == fixed ? writer.PutConstant(value) : writer.PutVariable(code);
+        const KqCode action = KqActionOf(*next);
+        const bool isFixed = KqVariableOf(*next) == variable;
+        if (action >= kKqUnstack) {
+            hand = writer.PutUnstack(KqKindOf(action), hand, *--top);
+        } else if (action >= kKqCombine) {
+            hand = isFixed ? writer.PutConstantOperand(KqKindOf(action), hand, value)
+                           : writer.PutCombine(KqKindOf(action), hand, KqVariableOf(*next));
         } else {
-            const KqValue upper = *top--;
-            *top = writer.PutOperator(kind, *top, upper);
+            assert(top < stack + kKqMaxStack);
+            *top++ = hand;
+            hand = isFixed ? writer.PutConstant(value) : writer.PutVariable(KqVariableOf(*next));
         }
     }
     const size_t first = m_num_codes;
     m_num_codes = writer.GetEnd();
-    return Describe(first, m_num_codes - first, (top->GetInversion() != 0) != rest.isInverted);
+    return Describe(first, m_num_codes - first, (hand.GetInversion() != 0) != rest.isInverted);
 }
 
 KqColumn::Rest KqColumn::Describe(size_t first, size_t numCodes, bool isInverted) const
@@ -226,7 +226,7 @@ KqColumn::Rest KqColumn::Describe(size_t first, size_t numCodes, bool isInverted
     const KqCode* codes = m_codes.data() + first;
     for (size_t position = 0; position < numCodes; ++position) {
         const KqCode code = codes[position];
-        rest.variables |= (KqKindOf(code) == kKqVariable ? 1u : 0u) << (KqVariableOf(code) & 31u);
+        rest.variables |= (KqActionOf(code) < kKqUnstack ? 1u : 0u) << (KqVariableOf(code) & 31u);
         sum += (code + 1 + position * 64) * 0x9e3779b97f4a7c15u ^ (code * uint64_t(0x85ebca6b));
     }
     rest.hash = static_cast<uint32_t>(sum >> 32);

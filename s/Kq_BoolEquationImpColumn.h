@@ -12,12 +12,12 @@
 // Words that every kernel may work on at a time; a column in pieces of a multiple of it is best.
 constexpr size_t kKqTileWords = 64;
 
-// A kernel computes 'numWords' words of the column of the steps' variables, whose number is the bit
-// of the row number that is their value: bit k of the result, bit k % 64 of word k / 64, is
-//     the value of the steps for row k, complemented when 'isInverted'.
+// A kernel computes 'numWords' words of the column of a program whose variables are numbered by the
+// bit of the row number that is their value: bit k of the result, bit k % 64 of word k / 64, is
+//     the value of the program for row k, complemented when 'isInverted'.
 // Requires: numWords a multiple of kKqTileWords; variables below 30; 'stack' has room for as many
-// tiles of kKqTileWords words as the steps stack values.
-typedef void (*KqKernel)(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+// tiles of kKqTileWords words as the program stacks values.
+typedef void (*KqKernel)(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
                          uint64_t* stack, uint64_t* words);
 
 struct KqNamedKernel {
@@ -92,11 +92,11 @@ class KqColumn {
     std::vector<KqCode> m_codes; // the program, then what is left of it
     size_t m_num_codes = 0;      // of m_codes that are in use
     Rest m_whole;
-    std::vector<Fixed> m_path;
+    Fixed m_path[32]; // of m_path_length variables
+    size_t m_path_length = 0;
     unsigned int m_generation = 1;
-    Written m_written[kNumWritten] = {}; // by hash
-    std::vector<KqStep> m_steps;
-    std::vector<uint64_t> m_stack;
+    Written m_written[kNumWritten] = {};          // by hash
+    uint64_t m_stack[kKqMaxStack * kKqTileWords]; // the kernel's; set before it is read
 };
 
 #endif

@@ -2,8 +2,8 @@
 // them, so nothing here may be called before the processor is known to be one.
 #include "Kq_BoolEquationImpColumnKernel.h"
 
-void KqRunAvx512(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+void KqRunAvx512(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
                  uint64_t* stack, uint64_t* words)
 {
-    RunTiles<Vectors<64>, 8>(steps, numSteps, isInverted, numWords, stack, words);
+    RunTiles<Vectors<64>, 8>(codes, numCodes, isInverted, numWords, stack, words);
 }

@@ -7,9 +7,9 @@
 #include "Kq_BoolEquationImpColumn.h"
 
 #if defined(KQ_HAS_X86_KERNELS)
-void KqRunAvx2(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+void KqRunAvx2(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
                uint64_t* stack, uint64_t* words);
-void KqRunAvx512(const KqStep* steps, size_t numSteps, bool isInverted, size_t numWords,
+void KqRunAvx512(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
                  uint64_t* stack, uint64_t* words);
 #endif
 
@@ -60,17 +60,18 @@ struct Vectors {
 // Runs all steps for 'kNum' vectors of each operand; the value at hand stays in registers.
 template <class V, unsigned int kNum>
 inline __attribute__((always_inline)) void
-RunStrip(const KqStep* steps, size_t numSteps, bool isInverted, const uint64_t* const* operands,
+RunStrip(const KqCode* codes, size_t numCodes, bool isInverted, const uint64_t* const* operands,
          size_t offset, uint64_t* stack, uint64_t* words)
 {
     typename V::Value value[kNum] = {};
-    for (const KqStep* step = steps; step != steps + numSteps; ++step) {
-        const uint64_t* operand = operands[step->variable] + offset;
-        if (step->action >= kKqUnstack) {
+    for (const KqCode* next = codes; next != codes + numCodes; ++next) {
+        const KqCode action = *next & ((1u << kKqVariableShift) - 1);
+        const uint64_t* operand = operands[*next >> kKqVariableShift] + offset;
+        if (action >= kKqUnstack) {
             stack -= kKqTileWords;
             operand = stack;
         }
-        switch (step->action) {
+        switch (action) {
         case kKqTake:
             for (unsigned int i = 0; i < kNum; ++i) {
                 V::Store(value[i], stack + i * V::kWords);
@@ -110,7 +111,7 @@ RunStrip(const KqStep* steps, size_t numSteps, bool isInverted, const uint64_t* 
 
 // The kernel: tile after tile, and in each as many vectors at a time as registers hold.
 template <class V, unsigned int kNum>
-inline __attribute__((always_inline)) void RunTiles(const KqStep* steps, size_t numSteps,
+inline __attribute__((always_inline)) void RunTiles(const KqCode* codes, size_t numCodes,
                                                     bool isInverted, size_t numWords,
                                                     uint64_t* stack, uint64_t* words)
 {
@@ -124,7 +125,7 @@ inline __attribute__((always_inline)) void RunTiles(const KqStep* steps, size_t 
             operands[variable] = (tile >> (variable - kTileLevel) & 1u) != 0 ? kTilePatterns.ones
                                                                              : kTilePatterns.zeros;
         for (size_t offset = 0; offset < kKqTileWords; offset += kStripWords)
-            RunStrip<V, kNum>(steps, numSteps, isInverted, operands, offset, stack,
+            RunStrip<V, kNum>(codes, numCodes, isInverted, operands, offset, stack,
                               words + tile * kKqTileWords);
     }
 }

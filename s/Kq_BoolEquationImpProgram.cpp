@@ -140,15 +140,16 @@ class Compiler {
         if (!node || !node->IsId() || node->GetValue() >= m_num_variables)
             return m_writer.PutConstant(node && node->Is1()).Invert(item.inversion);
         const uint32_t index = node->GetValue();
-        const uint32_t variable = m_is_reversed ? m_num_variables - 1 - index : index;
-        return m_writer.PutVariable(KqCodeOf(variable)).Invert(item.inversion);
+        return m_writer.PutVariable(m_is_reversed ? m_num_variables - 1 - index : index)
+            .Invert(item.inversion);
     }
 
-    KqValue PutOperator(const Node* node, uint32_t inversion, KqValue lower, KqValue upper)
+    // All operators are symmetric: either operand may be the one put last.
+    KqValue PutOperator(const Node* node, uint32_t inversion, KqValue last, KqValue before)
     {
         Reserve();
         const Operator found = OperatorOf(node->GetType());
-        return m_writer.PutOperator(found.kind, lower, upper).Invert(found.inversion ^ inversion);
+        return m_writer.PutUnstack(found.kind, last, before).Invert(found.inversion ^ inversion);
     }
 
   private:
@@ -166,31 +167,8 @@ class Compiler {
     KqWriter m_writer;
 };
 
-// The operator's result for lower and upper value, bit lower + 2 * upper.
-uint8_t TableOf(KqCode kind)
-{
-    constexpr unsigned int lower = 0xa;
-    constexpr unsigned int upper = 0xc;
-    if (kind == kKqXor)
-        return lower ^ upper;
-    const unsigned int left = (kind & kKqInvertLower) != 0 ? ~lower : lower;
-    const unsigned int right = (kind & kKqInvertUpper) != 0 ? ~upper : upper;
-    return static_cast<uint8_t>(left & right & 0xfu);
-}
-
-// The same operator with lower and upper value exchanged.
-KqCode ExchangedKind(KqCode kind)
-{
-    if (kind == kKqXor)
-        return kind;
-    return kKqAnd | ((kind & kKqInvertLower) != 0 ? kKqInvertUpper : 0u) |
-           ((kind & kKqInvertUpper) != 0 ? kKqInvertLower : 0u);
-}
-
-KqStep MakeStep(uint8_t action, uint32_t variable, KqCode kind)
-{
-    return KqStep{variable, static_cast<uint8_t>(action | kind), TableOf(kind)};
-}
+// The operator's result for lower and upper value, bit lower + 2 * upper, by kind.
+constexpr uint8_t kTables[8] = {0x6, 0, 0, 0, 0x8, 0x4, 0x2, 0x1};
 
 uint64_t ApplyToWords(Node::TYPE type, uint64_t left, uint64_t right)
 {
@@ -241,29 +219,44 @@ uint64_t ComputeWord(const Node* root, unsigned int numVariables)
     }
 }
 
-// Compiles the tree with the operands as they stand; false when that stacks too many values.
+bool IsOperator(const Item& item)
+{
+    return item.node && IsBinary(item.node);
+}
+
+// Compiles the tree with the operands as they stand, but a leaf behind an operand that is none;
+// false when that stacks too many values.
 bool CompileAsItStands(const Node* root, Compiler& compiler, KqValue& result)
 {
-    // An operator, with its first operand once that is written.
+    // An operator, with its first operand once that is written, and its second one until then.
     struct Pending {
         const Node* node;
-        KqValue lower;
+        const Node* second;
+        KqValue first;
         uint32_t inversion;
-        bool hasLower;
+        bool hasFirst;
     };
     KqStack<Pending, 32> pending;
     size_t numValues = 0;
     const Node* next = root;
     for (;;) {
         Item item = FindItem(next);
-        while (item.node && IsBinary(item.node)) {
-            pending.Push({item.node, KqValue(), item.inversion, false});
-            item = FindItem(item.node->GetLeftChild());
+        while (IsOperator(item)) {
+            const Node* left = item.node->GetLeftChild();
+            const Node* right = item.node->GetRightChild();
+            Item first = FindItem(left);
+            if (IsOperator(first)) {
+                pending.Push({item.node, right, KqValue(), item.inversion, false});
+            } else {
+                pending.Push({item.node, left, KqValue(), item.inversion, false});
+                first = FindItem(right);
+            }
+            item = first;
         }
         KqValue value = compiler.PutLeaf(item);
-        while (!pending.IsEmpty() && pending.Top().hasLower) {
+        while (!pending.IsEmpty() && pending.Top().hasFirst) {
             const Pending done = pending.Pop();
-            value = compiler.PutOperator(done.node, done.inversion, done.lower, value);
+            value = compiler.PutOperator(done.node, done.inversion, value, done.first);
             --numValues;
         }
         if (pending.IsEmpty()) {
@@ -272,9 +265,9 @@ bool CompileAsItStands(const Node* root, Compiler& compiler, KqValue& result)
         }
         if (++numValues == kKqMaxStack)
             return false;
-        pending.Top().lower = value;
-        pending.Top().hasLower = true;
-        next = pending.Top().node->GetRightChild();
+        pending.Top().first = value;
+        pending.Top().hasFirst = true;
+        next = pending.Top().second;
     }
 }
 
@@ -293,9 +286,9 @@ KqValue CompileOrdered(const Node* root, Compiler& compiler)
         const Work work = pending.Pop();
         const Item& item = items[work.position];
         if (work.hasOperands) {
-            const KqValue upper = values.Pop();
-            const KqValue lower = values.Pop();
-            values.Push(compiler.PutOperator(item.node, item.inversion, lower, upper));
+            const KqValue last = values.Pop();
+            const KqValue before = values.Pop();
+            values.Push(compiler.PutOperator(item.node, item.inversion, last, before));
         } else if (item.left == 0) {
             values.Push(compiler.PutLeaf(item));
         } else {
@@ -327,45 +320,6 @@ KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
     return program;
 }
 
-size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& steps)
-{
-    // Values on the program's stack: a variable that no step has taken yet, or a computed one.
-    // Only the topmost computed value is at hand, the others have been stacked.
-    constexpr uint32_t kComputed = UINT32_MAX;
-    KqStack<uint32_t, kKqMaxStack> values;
-    size_t numStacked = 0;
-    size_t maxStacked = 0;
-    steps.clear();
-    steps.reserve(numCodes);
-    const auto take = [&](uint32_t variable) {
-        steps.push_back(MakeStep(kKqTake, variable, kKqXor));
-        maxStacked = std::max(maxStacked, ++numStacked);
-    };
-    for (size_t position = 0; position < numCodes; ++position) {
-        const KqCode kind = KqKindOf(codes[position]);
-        if (kind == kKqVariable) {
-            values.Push(KqVariableOf(codes[position]));
-            continue;
-        }
-        const uint32_t upper = values.Pop();
-        const uint32_t lower = values.Pop();
-        if (upper != kComputed) {
-            if (lower != kComputed)
-                take(lower);
-            steps.push_back(MakeStep(kKqCombine, upper, kind));
-        } else if (lower != kComputed) {
-            steps.push_back(MakeStep(kKqCombine, lower, ExchangedKind(kind)));
-        } else {
-            steps.push_back(MakeStep(kKqUnstack, 0, ExchangedKind(kind)));
-            --numStacked;
-        }
-        values.Push(kComputed);
-    }
-    if (values.Top() != kComputed)
-        take(values.Top());
-    return maxStacked;
-}
-
 unsigned int KqCompiled::EvalOther(const Node& root, const Variables& variables)
 {
     const size_t numVariables = variables.size();
@@ -374,20 +328,15 @@ unsigned int KqCompiled::EvalOther(const Node& root, const Variables& variables)
         return Eval(root, variables);
     }
     // Compiling costs several evaluations, and many equations are evaluated just once.
-    if (m_num_evaluations == 0) {
-        ++m_num_evaluations;
+    if (!m_is_evaluated || numVariables > kKqMaxVariables) {
+        m_is_evaluated = true;
         return root.Eval(variables);
     }
-    if (m_num_steps_variables != numVariables) {
-        m_num_steps_variables = 0;
-        const KqProgram program = KqCompile(&root, static_cast<uint32_t>(numVariables), false);
-        m_is_inverted = program.isInverted;
-        m_steps.clear();
-        if (program.numCodes != 0)
-            KqMakeSteps(program.codes.data(), program.numCodes, m_steps);
-        m_num_steps_variables = static_cast<uint32_t>(numVariables);
+    if (m_num_program_variables != numVariables) {
+        m_program = KqCompile(&root, static_cast<uint32_t>(numVariables), false);
+        m_num_program_variables = numVariables;
     }
-    return RunSteps(variables) ^ (m_is_inverted ? 1u : 0u);
+    return RunProgram(variables) ^ (m_program.isInverted ? 1u : 0u);
 }
 
 uint64_t KqCompiled::GetWord(const Node& root, unsigned int numVariables)
@@ -403,26 +352,31 @@ uint64_t KqCompiled::GetWord(const Node& root, unsigned int numVariables)
 void KqCompiled::Drop() noexcept
 {
     m_num_word_variables = kNoWord;
-    m_num_evaluations = 0;
-    m_num_steps_variables = 0;
-    std::vector<KqStep>().swap(m_steps);
+    m_num_program_variables = 0;
+    m_is_evaluated = false;
+    m_program = KqProgram();
 }
 
-unsigned int KqCompiled::RunSteps(const Variables& variables) const
+unsigned int KqCompiled::RunProgram(const Variables& variables) const
 {
     static_assert(kKqMaxStack < 64, "the stack is the bits of a word");
     uint64_t stack = 0;
     unsigned int value = 0;
-    for (const KqStep& step : m_steps) {
-        const unsigned int operand = variables[step.variable].second;
-        if (step.action == kKqTake) {
+    const KqCode* const end = m_program.codes.data() + m_program.numCodes;
+    for (const KqCode* next = m_program.codes.data(); next != end; ++next) {
+        const KqCode action = KqActionOf(*next);
+        const unsigned int table = kTables[KqKindOf(action)];
+        if (action >= kKqUnstack) {
+            value = table >> (2 * (stack & 1u)) >> value & 1u;
+            stack >>= 1;
+            continue;
+        }
+        const unsigned int operand = variables[KqVariableOf(*next)].second;
+        if (action >= kKqCombine) {
+            value = table >> (2 * operand) >> value & 1u;
+        } else {
             stack = stack << 1 | value;
             value = operand;
-        } else if (step.action < kKqUnstack) {
-            value = step.table >> (2 * operand) >> value & 1u;
-        } else {
-            value = step.table >> (2 * (stack & 1u)) >> value & 1u;
-            stack >>= 1;
         }
     }
     return value;

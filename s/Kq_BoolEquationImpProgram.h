@@ -1,4 +1,4 @@
-// An equation as a program: the tree without its groups and constants, operands before operators.
+// An equation as a program: the tree without its groups and constants, as steps of a machine.
 // Evaluation runs it for one assignment; the result column fixes its variables one after another.
 #ifndef KQ_BOOLEQUATIONIMPPROGRAM_H
 #define KQ_BOOLEQUATIONIMPPROGRAM_H
@@ -9,35 +9,42 @@
 
 #include <Kq_BoolEquationImpNode.h>
 
-// One code of a program, for a machine with a stack of bits: a variable pushes its value, an
-// operator replaces the two values on top. Inversions are part of the AND that takes the value, so
-// four forms of AND and one XOR are all there is; what is left of an inversion at the very end is
-// the program's own. The low bits are the kind, the others a variable's number.
+// One step of a machine that keeps the last value at hand. TAKE stacks that value and takes a
+// variable's; COMBINE makes a new one of it, as the lower value, and a variable, as the upper one;
+// UNSTACK makes it of it, as the lower value, and one off the stack, as the upper one. Inversions
+// are part of the AND that takes the value, so four forms of AND and one XOR are all there is;
+// what is left of an inversion at the very end is the program's own.
+// The lowest three bits are the operator's kind, the next two the action, the others a variable.
 typedef uint32_t KqCode;
 
-constexpr unsigned int kKqKindBits = 3;
 constexpr KqCode kKqXor = 0;
-constexpr KqCode kKqVariable = 1;
 constexpr KqCode kKqAnd = 4;         // plus the two flags
-constexpr KqCode kKqInvertLower = 1; // AND takes the complement of the value below the top
-constexpr KqCode kKqInvertUpper = 2; // AND takes the complement of the value on top
+constexpr KqCode kKqInvertLower = 1; // AND takes the complement of the lower value
+constexpr KqCode kKqInvertUpper = 2; // AND takes the complement of the upper value
+
+constexpr KqCode kKqTake = 0;
+constexpr KqCode kKqCombine = 8;
+constexpr KqCode kKqUnstack = 16;
+
+constexpr unsigned int kKqVariableShift = 5;
+
+// What the step does, without the variable.
+inline KqCode KqActionOf(KqCode code)
+{
+    return code & ((1u << kKqVariableShift) - 1);
+}
 
 inline KqCode KqKindOf(KqCode code)
 {
-    return code & ((1u << kKqKindBits) - 1);
+    return code & (kKqCombine - 1);
 }
 
 inline uint32_t KqVariableOf(KqCode code)
 {
-    return code >> kKqKindBits;
+    return code >> kKqVariableShift;
 }
 
-inline KqCode KqCodeOf(uint32_t variable)
-{
-    return variable << kKqKindBits | kKqVariable;
-}
-
-// A value that the machine holds: a constant, or what the codes from a start on compute;
+// A value that the machine holds: a constant, or what the steps from a start on compute;
 // complemented or not. One word, as programs are rewritten many times.
 class KqValue {
   public:
@@ -63,10 +70,10 @@ class KqValue {
     uint32_t m_word;
 };
 
-// Writes a program into a list behind 'first' codes, one operand after another. Keeps the rules
-// that make programs short: no constant stands in them, and what a constant decides is taken out
-// again.
-// Requires: room in the list for each code put; fewer than 2^30 codes.
+// Writes a program into a list behind 'first' codes, one value after another. Keeps the rules that
+// make programs short: no constant stands in them, and what a constant decides is taken out again.
+// The steps of a value leave the machine's stack one higher, whatever they simplify to.
+// Requires: room in the list for each step put; fewer than 2^30 of them.
 class KqWriter {
   public:
     KqWriter(KqCode* codes, size_t first) : m_codes(codes), m_end(static_cast<uint32_t>(first)) {}
@@ -78,51 +85,80 @@ class KqWriter {
 
     KqValue PutConstant(bool isOne) { return KqValue::Constant(m_end, isOne); }
 
-    // 'code' is a variable's.
-    KqValue PutVariable(KqCode code)
+    KqValue PutVariable(uint32_t variable)
     {
-        m_codes[m_end] = code;
+        m_codes[m_end] = variable << kKqVariableShift | kKqTake;
         return KqValue::Computed(m_end++);
     }
 
-    // Requires: 'upper' was put right behind 'lower', and nothing behind 'upper'.
-    KqValue PutOperator(KqCode kind, KqValue lower, KqValue upper)
+    // The value at hand, put last, with a variable as the upper value.
+    KqValue PutCombine(KqCode kind, KqValue lower, uint32_t variable)
+    {
+        const uint32_t isAnd = kind >> 2;
+        const uint32_t inverted = isAnd & kind >> 1;
+        lower = lower.Invert(isAnd & kind);
+        if (lower.IsConstant()) {
+            if (isAnd != 0)
+                return lower.GetInversion() != 0 ? PutVariable(variable).Invert(inverted) : lower;
+            return PutVariable(variable).Invert(lower.GetInversion());
+        }
+        if (IsVariable(lower, variable)) {
+            if (isAnd != 0 && lower.GetInversion() == inverted)
+                return lower;
+            return Drop(lower, isAnd == 0 && lower.GetInversion() != 0);
+        }
+        const uint32_t inversions = lower.GetInversion() | inverted << 1;
+        m_codes[m_end++] =
+            variable << kKqVariableShift | kKqCombine | (isAnd != 0 ? kKqAnd | inversions : kKqXor);
+        return KqValue::Computed(lower.GetStart()).Invert(inversions & (isAnd ^ 1u));
+    }
+
+    // The value at hand with a constant as the upper value.
+    KqValue PutConstantOperand(KqCode kind, KqValue lower, bool isOne)
+    {
+        const uint32_t isAnd = kind >> 2;
+        const uint32_t value = (isOne ? 1u : 0u) ^ (isAnd & kind >> 1);
+        if (isAnd == 0)
+            return lower.Invert(value);
+        return value != 0 ? lower.Invert(kind & 1u) : Drop(lower, false);
+    }
+
+    // The value at hand with the one that was put right before it as the upper value.
+    KqValue PutUnstack(KqCode kind, KqValue lower, KqValue upper)
     {
         const uint32_t isAnd = kind >> 2;
         lower = lower.Invert(isAnd & kind);
         upper = upper.Invert(isAnd & kind >> 1);
-        if (lower.IsConstant() || upper.IsConstant())
-            return PutConstantOperand(isAnd != 0, lower, upper);
-        if (m_end - lower.GetStart() == 2 && m_codes[m_end - 2] == m_codes[m_end - 1])
-            return PutSameVariable(isAnd != 0, lower, upper);
+        if (lower.IsConstant() || upper.IsConstant()) {
+            const KqValue constant = lower.IsConstant() ? lower : upper;
+            const KqValue other = lower.IsConstant() ? upper : lower;
+            if (isAnd == 0)
+                return other.Invert(constant.GetInversion());
+            return constant.GetInversion() != 0 ? other : Drop(upper, false);
+        }
+        if (m_end - lower.GetStart() == 1) {
+            // A variable alone need not be taken: the value stacked is at hand instead.
+            const uint32_t variable = KqVariableOf(m_codes[--m_end]);
+            if (isAnd == 0)
+                return PutCombine(kKqXor, upper.Invert(lower.GetInversion()), variable);
+            return PutCombine(kKqAnd | lower.GetInversion() << 1, upper, variable);
+        }
         const uint32_t inversions = lower.GetInversion() | upper.GetInversion() << 1;
-        m_codes[m_end++] = isAnd != 0 ? kKqAnd | inversions : kKqXor;
+        m_codes[m_end++] = kKqUnstack | (isAnd != 0 ? kKqAnd | inversions : kKqXor);
         const uint32_t parity = lower.GetInversion() ^ upper.GetInversion();
-        return KqValue::Computed(lower.GetStart()).Invert(parity & (isAnd ^ 1u));
+        return KqValue::Computed(upper.GetStart()).Invert(parity & (isAnd ^ 1u));
     }
 
   private:
-    KqValue PutConstantOperand(bool isAnd, KqValue lower, KqValue upper)
+    bool IsVariable(KqValue value, uint32_t variable) const
     {
-        const KqValue constant = lower.IsConstant() ? lower : upper;
-        const KqValue other = lower.IsConstant() ? upper : lower;
-        if (!isAnd)
-            return other.Invert(constant.GetInversion());
-        return constant.GetInversion() != 0 ? other : Drop(lower, false);
+        return m_end - value.GetStart() == 1 &&
+               m_codes[value.GetStart()] == (variable << kKqVariableShift | kKqTake);
     }
 
-    KqValue PutSameVariable(bool isAnd, KqValue lower, KqValue upper)
+    KqValue Drop(KqValue value, bool isOne)
     {
-        const bool isSame = lower.GetInversion() == upper.GetInversion();
-        if (!isAnd || !isSame)
-            return Drop(lower, !isAnd && !isSame);
-        --m_end;
-        return lower;
-    }
-
-    KqValue Drop(KqValue lower, bool isOne)
-    {
-        m_end = lower.GetStart();
+        m_end = value.GetStart();
         return KqValue::Constant(m_end, isOne);
     }
 
@@ -143,29 +179,13 @@ constexpr size_t kKqMaxStack = 48;
 
 // Compiles the tree at 'root', null counting as 0. A variable's number is its index or, when
 // 'isReversed', numVariables-1 less its index. An ID whose index is not below 'numVariables' is 0.
-// Requires: a checked tree of fewer than 2^30 nodes, numVariables < 2^29.
+// Requires: a checked tree of fewer than 2^30 nodes, numVariables <= kKqMaxVariables.
 // Fails: std::bad_alloc.  Cost: O(nodes).
+constexpr uint32_t kKqMaxVariables = 1u << (32 - kKqVariableShift);
 KqProgram KqCompile(const Kq_BoolEquationImp::Node* root, uint32_t numVariables, bool isReversed);
 
-// A program for a machine that keeps the last value at hand. TAKE stacks that value and takes a
-// variable's; COMBINE makes a new one of it, as the lower value, and a variable, as the upper one;
-// UNSTACK makes it of it, as the lower value, and one off the stack, as the upper one.
-struct KqStep {
-    uint32_t variable;
-    uint8_t action; // kKqTake, or kKqCombine or kKqUnstack and the operator's kind
-    uint8_t table;  // the operator's result for lower and upper value, bit lower + 2 * upper
-};
-
-constexpr uint8_t kKqTake = 0;
-constexpr uint8_t kKqCombine = 8;
-constexpr uint8_t kKqUnstack = 16;
-
-// Replaces 'steps' by those of 'codes', at most as many, and returns how many values they stack.
-// Requires: the codes of a program that is no constant.  Fails: std::bad_alloc.
-size_t KqMakeSteps(const KqCode* codes, size_t numCodes, std::vector<KqStep>& steps);
-
 // What a store keeps of its tree for evaluation: the column of up to six variables as a word, or
-// steps for more. Made when it pays: the word at once, steps at the second evaluation.
+// a program for more. Made when it pays: the word at once, a program at the second evaluation.
 class KqCompiled {
   public:
     typedef std::vector<std::pair<Port::StringBase<char>, unsigned int>> Variables;
@@ -189,16 +209,15 @@ class KqCompiled {
 
   private:
     unsigned int EvalOther(const Kq_BoolEquationImp::Node& root, const Variables& variables);
-    unsigned int RunSteps(const Variables& variables) const;
+    unsigned int RunProgram(const Variables& variables) const;
 
     static constexpr size_t kNoWord = SIZE_MAX;
 
     uint64_t m_word = 0;
     size_t m_num_word_variables = kNoWord; // what m_word is for
-    unsigned int m_num_evaluations = 0;
-    uint32_t m_num_steps_variables = 0; // what m_steps is for
-    bool m_is_inverted = false;
-    std::vector<KqStep> m_steps;
+    KqProgram m_program;
+    size_t m_num_program_variables = 0; // what m_program is for
+    bool m_is_evaluated = false;        // at least once, for more than six variables
 };
 
 #endif

@@ -9,10 +9,30 @@
 #include <new>
 #include <vector>
 
+#if defined(__linux__)
+#include <sys/mman.h>
+#endif
+
 #include <Kq_BoolEquationImpNode.h>
 
 #include "Kq_BoolEquationImpProgram.h"
 #include "Kq_BoolEquationImpWalk.h"
+
+// Asks for large pages for a block of many megabytes that is about to be filled: half the time of
+// setting a text of a million tokens would go into small ones. A hint, and nothing elsewhere.
+inline void KqAdviseLargePages(void* block, size_t size)
+{
+#if defined(__linux__)
+    constexpr uintptr_t kPage = 2u << 20;
+    const uintptr_t begin = (reinterpret_cast<uintptr_t>(block) + kPage - 1) / kPage * kPage;
+    const uintptr_t end = (reinterpret_cast<uintptr_t>(block) + size) / kPage * kPage;
+    if (end > begin + kPage)
+        madvise(reinterpret_cast<void*>(begin), end - begin, MADV_HUGEPAGE);
+#else
+    (void)block;
+    (void)size;
+#endif
+}
 
 // The tokens of one text, in text order. The first ones need no heap.
 // Texts point into the pool of names and the table of spellings: they outlive every equation.
@@ -81,6 +101,7 @@ struct Kq_BoolEquationImp::Store {
         m_nodes.reserve(tokens.GetSize() + 1);
         m_block = Node::m_kq_boolequationimp_node_mem.allocate(tokens.GetSize() + 1);
         m_num_slots = tokens.GetSize() + 1;
+        KqAdviseLargePages(m_block, m_num_slots * sizeof(Node));
         for (const Tokens::Token& token : tokens)
             MakeNode(token.type, *token.text);
     }

@@ -111,8 +111,7 @@ class KQ_EXPORT Kq_BoolEquation {
 
     // The full table of results; empty for 0 or more than 30 variables.
     TruthTable GetTruthTable() const;
-    // The engine object; it belongs to this object.
-    const Kq_BoolEquationImp* GetImp() const;
+    const Kq_BoolEquationImp* GetImp() const; // the engine object, owned by this one
     // Writes everything about the equation, its truth table too, to the message manager.
     void Dbg() const;
 
@@ -179,8 +178,7 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
     Imp* m_imp; // owned
 };
 
-// One assignment and its result.
-class KQ_EXPORT Kq_BoolEquation::TruthTable::Row {
+class KQ_EXPORT Kq_BoolEquation::TruthTable::Row { // one assignment and its result
   public:
     Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
     Row(const Row& other);

@@ -6,6 +6,7 @@
 #include <cassert>
 
 #include "Kq_BoolEquationImpWalk.h"
+#include "Kq_BoolEquationImpWriter.h"
 
 typedef Kq_BoolEquationImp::Node Node;
 

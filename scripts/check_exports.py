@@ -1,0 +1,67 @@
+#!/usr/bin/env python3
+"""Checks what the built library shows to the dynamic linker; prints one line for each violation.
+
+usage: check_exports.py LIBRARY [--host NAME] [--objects FILE...]
+
+Exported names belong to the classes Kq_BoolEquation and Kq_BoolEquationImp; the needed libraries are
+the host library, the C++ library and the C library. With --objects, static objects with a run-time
+initialiser are looked for too: only the engine's main source may have them (and the node model its
+class allocator), because the order of initialisation across files is undefined.
+Exit status: 1 when something was found.
+"""
+import argparse
+import pathlib
+import re
+import subprocess
+import sys
+
+EXPORTED = re.compile(r"(vtable for |typeinfo for |typeinfo name for )?Kq_BoolEquation(Imp)?::")
+NEEDED = re.compile(r"(libstdc\+\+|libc\+\+|libc\+\+abi|libgcc_s|libc|libm|ld-linux[-\w]*)\.so[.\d]*")
+WITH_INITIALISERS = {"Kq_BoolEquationImp.cpp.o", "Kq_BoolEquationImpNode.cpp.o"}
+
+
+def output_of(*command):
+    return subprocess.run(command, stdout=subprocess.PIPE, text=True, check=True).stdout
+
+
+def find_foreign_exports(library):
+    names = [line.split(None, 2)[2] for line in
+             output_of("nm", "-DC", "--defined-only", library).splitlines()]
+    if not any(EXPORTED.match(name) for name in names):
+        yield f"{library} exports nothing of ours"
+    for name in names:
+        if not EXPORTED.match(name):
+            yield f"exported, but not ours: {name}"
+
+
+def find_foreign_libraries(library, host):
+    needed = re.findall(r"\(NEEDED\).*\[(.*)\]", output_of("readelf", "-dW", library))
+    if not any(name.startswith(host + ".") for name in needed):
+        yield f"{host} is not among the needed libraries"
+    for name in needed:
+        if not name.startswith(host + ".") and not NEEDED.fullmatch(name):
+            yield f"needs {name}"
+
+
+def find_initialisers(objects):
+    for path in objects:
+        if pathlib.Path(path).name not in WITH_INITIALISERS and "_GLOBAL__sub_I" in output_of(
+                "nm", path):
+            yield f"{path} has a static object with a run-time initialiser"
+
+
+def main():
+    parser = argparse.ArgumentParser()
+    parser.add_argument("library")
+    parser.add_argument("--host", default="libkq_port.so")
+    parser.add_argument("--objects", nargs="*", default=[])
+    arguments = parser.parse_args()
+    found = [*find_foreign_exports(arguments.library),
+             *find_foreign_libraries(arguments.library, arguments.host.removesuffix(".so") + ".so"),
+             *find_initialisers(arguments.objects)]
+    print("\n".join(found), end="\n" if found else "")
+    return 1 if found else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

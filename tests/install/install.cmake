@@ -1,0 +1,6 @@
+# Installs BUILD and moves the tree to PREFIX: nothing in it may know where it was installed.
+file(REMOVE_RECURSE "${PREFIX}" "${PREFIX} first")
+execute_process(
+    COMMAND "${CMAKE_COMMAND}" --install "${BUILD}" --prefix "${PREFIX} first"
+    COMMAND_ERROR_IS_FATAL ANY)
+file(RENAME "${PREFIX} first" "${PREFIX}")

@@ -1,0 +1,212 @@
+#!/usr/bin/env python3
+"""Breaks one rule at a time in a copy of the sources; each check must report exactly that.
+
+usage: checks_can_fail.py [UNITTEST OPTION...] ROOT COMPILER
+"""
+import pathlib
+import shutil
+import subprocess
+import sys
+import tempfile
+import unittest
+
+ROOT = COMPILER = None
+ENGINE = "s/Kq_BoolEquationImp"
+
+
+def run(*command):
+    done = subprocess.run([str(part) for part in command], stdout=subprocess.PIPE,
+                          stderr=subprocess.STDOUT, text=True, check=False)
+    return done.returncode, done.stdout
+
+
+class InCopy(unittest.TestCase):
+    def setUp(self):
+        self.directory = tempfile.TemporaryDirectory()
+        self.addCleanup(self.directory.cleanup)
+        self.copy = pathlib.Path(self.directory.name)
+
+
+class Includes(InCopy):
+    def setUp(self):
+        super().setUp()
+        for folder in ("include", "s", "port", "tools"):
+            shutil.copytree(ROOT / folder, self.copy / folder)
+        self.before = self.check()[1]
+
+    def check(self):
+        status, output = run(sys.executable, ROOT / "scripts/check_includes.py", self.copy)
+        return status, output.splitlines()
+
+    # What the sources violate as they are is the business of another test.
+    def find_new(self):
+        status, lines = self.check()
+        self.assertEqual(status, 1 if lines else 0)
+        return [line for line in lines if line not in self.before]
+
+    def expect(self, file, message):
+        found = self.find_new()
+        self.assertEqual(len(found), 1, found)
+        self.assertTrue(found[0].startswith(file + ":"), found)
+        self.assertIn(message, found[0])
+
+    def append(self, file, text):
+        path = self.copy / file
+        path.parent.mkdir(parents=True, exist_ok=True)
+        with path.open("a", encoding="utf-8") as stream:
+            stream.write(text)
+
+    def prepend(self, file, text):
+        path = self.copy / file
+        path.write_text(text + path.read_text(encoding="utf-8"), encoding="utf-8")
+
+    def test_public_header_that_looks_up(self):
+        self.append("include/Kq_BoolEquation.h", "#include <Kq_BoolEquationImp.h>\n")
+        self.expect("include/Kq_BoolEquation.h", "may not include")
+
+    def test_internal_header_that_looks_up(self):
+        self.append(ENGINE + "InitText.h", '#include "Kq_BoolEquationImpColumn.h"\n')
+        self.expect(ENGINE + "InitText.h", "may not include")
+
+    def test_source_that_uses_what_is_not_its_job(self):
+        self.append(ENGINE + "Tokenizer.cpp", '#include "Kq_BoolEquationImpWalk.h"\n')
+        self.expect(ENGINE + "Tokenizer.cpp", "may not include")
+
+    def test_source_that_includes_a_source(self):
+        self.append(ENGINE + "Tree.cpp", '#include "Kq_BoolEquationImpRender.cpp"\n')
+        self.expect(ENGINE + "Tree.cpp", "may not include")
+
+    def test_internal_header_in_angle_brackets(self):
+        self.append(ENGINE + "Tree.cpp", "#include <Kq_BoolEquationImpWalk.h>\n")
+        self.expect(ENGINE + "Tree.cpp", "may not include")
+
+    def test_own_header_not_first(self):
+        self.prepend(ENGINE + "NodeEval.cpp", "#include <vector>\n")
+        self.expect(ENGINE + "NodeEval.cpp", "first include must be Kq_BoolEquationImpNode.h")
+
+    def test_source_without_a_floor(self):
+        self.append(ENGINE + "Extra.cpp", "#include <Kq_BoolEquationImp.h>\n")
+        self.expect(ENGINE + "Extra.cpp", "not in the tables")
+
+    def test_long_header(self):
+        self.append(ENGINE + "Diag.h", "// line\n" * 200)
+        self.expect(ENGINE + "Diag.h", "the limit is 199")
+
+    def test_long_source(self):
+        self.append(ENGINE + "Terms.cpp", "// line\n" * 500)
+        self.expect(ENGINE + "Terms.cpp", "the limit is 499")
+
+    def test_constant_tables_have_no_size(self):
+        self.append(ENGINE + "Terms.cpp", "const int kTable[] = {\n" + "    1,\n" * 600 + "};\n")
+        self.assertEqual(self.find_new(), [])
+
+    def test_long_function(self):
+        self.append(ENGINE + "Terms.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
+        self.expect(ENGINE + "Terms.cpp", "function of 60 lines")
+
+    def test_byte_that_is_not_ascii(self):
+        self.append("tools/booleq/text.cpp", "// \u00ab\n")
+        self.expect("tools/booleq/text.cpp", "not plain ASCII")
+
+    def test_host_that_knows_us(self):
+        self.append("port/Port_Env.cpp", "class Kq_BoolEquation;\n")
+        self.expect("port/Port_Env.cpp", "knows nothing of Kq_")
+
+    def test_macro(self):
+        self.append(ENGINE + "Tree.cpp", "#define MAXIMUM 5\n")
+        self.expect(ENGINE + "Tree.cpp", "macro MAXIMUM")
+
+    def test_file_macro(self):
+        self.append(ENGINE + "Tree.cpp", "const char* const kName = __FILE__;\n")
+        self.expect(ENGINE + "Tree.cpp", "__FILE__")
+
+    def test_foreign_declaration(self):
+        self.append(ENGINE + "Tree.cpp", "extern int s_other;\n")
+        self.expect(ENGINE + "Tree.cpp", "foreign declaration")
+
+    def test_tool_that_uses_internals(self):
+        self.append("tools/booleq/text.cpp", '#include "Kq_BoolEquationImpStore.h"\n')
+        self.expect("tools/booleq/text.cpp", "is internal")
+
+    def test_model_that_uses_the_library(self):
+        self.append("tests/reference/model.cpp", "#include <Kq_BoolEquation.h>\n")
+        self.expect("tests/reference/model.cpp", "shares no code")
+
+
+class Exports(InCopy):
+    def build(self, source, *options):
+        (self.copy / "host.cpp").write_text("void HostCall() {}\n")
+        (self.copy / "library.cpp").write_text(source)
+        compiler = (COMPILER, "-shared", "-fPIC", "-fvisibility=hidden")
+        host = self.copy / "libkq_port.so"
+        for command in (
+                (COMPILER, "-shared", "-fPIC", "-Wl,-soname,libkq_port.so.1",
+                 self.copy / "host.cpp", "-o", host),
+                (COMPILER, "-c", "-fPIC", "-fvisibility=hidden", self.copy / "library.cpp",
+                 "-o", self.copy / "library.o"),
+                (*compiler, self.copy / "library.o", host, "-o", self.copy / "library.so",
+                 *options)):
+            status, output = run(*command)
+            self.assertEqual(status, 0, output)
+
+    def check(self, *arguments):
+        return run(sys.executable, ROOT / "scripts/check_exports.py", self.copy / "library.so",
+                   *arguments)
+
+    GOOD = """
+void HostCall();
+struct __attribute__((visibility("default"))) Kq_BoolEquation { void Use(); };
+void Kq_BoolEquation::Use() { HostCall(); }
+"""
+
+    def test_good_library(self):
+        self.build(self.GOOD)
+        self.assertEqual(self.check("--objects", self.copy / "library.o"), (0, ""))
+
+    def test_foreign_export(self):
+        self.build(self.GOOD + '__attribute__((visibility("default"))) void Helper() {}\n')
+        self.assertEqual(self.check(), (1, "exported, but not ours: Helper()\n"))
+
+    def test_foreign_library(self):
+        self.build(self.GOOD, "-Wl,--no-as-needed", "-lpthread", "-lresolv")
+        status, output = self.check()
+        self.assertEqual(status, 1)
+        self.assertIn("needs libresolv.so.2\n", output)
+
+    def test_no_host(self):
+        self.build(self.GOOD.replace("{ HostCall(); }", "{}"), "-Wl,--as-needed")
+        status, output = self.check("--host", "libother.so")
+        self.assertEqual(status, 1)
+        self.assertIn("libother.so is not among the needed libraries\n", output)
+
+    def test_run_time_initialiser(self):
+        self.build(self.GOOD + "int Number();\nstatic int s_number = Number();\n"
+                   "int Number() { return s_number; }\n")
+        status, output = self.check("--objects", self.copy / "library.o")
+        self.assertEqual(status, 1)
+        self.assertIn("run-time initialiser", output)
+
+
+class Headers(InCopy):
+    def check(self, text):
+        header = self.copy / "header.h"
+        header.write_text(text)
+        return run(sys.executable, ROOT / "scripts/check_headers.py", "--compiler", COMPILER, "--",
+                   header)
+
+    def test_good_header(self):
+        self.assertEqual(self.check("#ifndef A\n#define A\n#include <vector>\n"
+                                    "inline std::vector<int> F() { return {}; }\n#endif\n"),
+                         (0, "1 of 1 headers compile alone\n"))
+
+    def test_missing_include(self):
+        self.assertEqual(self.check("#ifndef A\n#define A\nstd::vector<int> F();\n#endif\n")[0], 1)
+
+    def test_missing_guard(self):
+        self.assertEqual(self.check("struct Twice {};\n")[0], 1)
+
+
+if __name__ == "__main__":
+    COMPILER = sys.argv.pop()
+    ROOT = pathlib.Path(sys.argv.pop()).resolve()
+    unittest.main()

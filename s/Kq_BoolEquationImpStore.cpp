@@ -81,7 +81,6 @@ void KqCheckStore(const Kq_BoolEquationImp::Store& store)
 #ifdef NDEBUG
     (void)store;
 #else
-    typedef Kq_BoolEquationImp::Node Node;
     std::vector<const Node*> pending;
     if (store.m_root)
         pending.push_back(store.m_root);

@@ -119,7 +119,7 @@ Operator OperatorOf(Node::TYPE type)
     case Node::SENTINEL:
         break;
     }
-    assert(!"a binary operator");
+    assert(false && "a binary operator");
     return {kKqXor, 0};
 }
 

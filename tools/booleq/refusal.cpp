@@ -142,7 +142,7 @@ std::string FindPlainFault(const std::string& text)
             continue;
         }
         if (character == '\'' || character == '.') {
-            const std::string fault = SkipDelimited(text, position);
+            std::string fault = SkipDelimited(text, position);
             if (!fault.empty())
                 return fault;
             continue;

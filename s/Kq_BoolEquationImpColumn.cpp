@@ -145,6 +145,7 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
     Expand(rest, level, words);
 }
 
+// Calls itself through ExpandHalves, once for each variable and so at most 30 deep.
 void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
 {
     if (rest.numCodes == 0) {

@@ -1,6 +1,6 @@
 // The engine behind Kq_BoolEquation: a shared tree of nodes and a variable table of its own.
 // Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
-// Fails: bad input answers false, 0 or empty; only std::bad_alloc is ever thrown.
+// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
 #ifndef KQ_BOOLEQUATIONIMP_H
 #define KQ_BOOLEQUATIONIMP_H
 
@@ -81,8 +81,8 @@ class KQ_EXPORT Kq_BoolEquationImp {
 
     TruthTable GetTruthTable() const;
 
-    // The root of the tree, null without an equation. The nodes belong to the object and live
-    // until it, and every copy that shares them, is set, cleared or destroyed.
+    // The root of the tree, null without an equation. Only for reading: results are kept of the
+    // nodes, which live until the object, and every copy, is set, cleared or destroyed.
     const Node* GetRoot() const;
 
     void Dbg() const;

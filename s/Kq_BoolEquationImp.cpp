@@ -134,15 +134,20 @@ bool Kq_BoolEquationImp::SetEquation(const String& text)
 // Requires: no nodes; listed inputs are defined.
 bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* initValue)
 {
-    m_store->MakeNodes(tokens);
-    BuildTree();
-    if (!m_store->m_root)
-        return false;
-    // Variables are numbered in the order of the text, which pre-order need not be.
-    DefineListedNames(tokens);
-    if (initValue)
-        AddTruthTableRoot(*initValue);
-    m_store->ListInPreOrder();
+    try {
+        m_store->MakeNodes(tokens);
+        BuildTree();
+        if (!m_store->m_root)
+            return false;
+        // Variables are numbered in the order of the text, which pre-order need not be.
+        DefineListedNames(tokens);
+        if (initValue)
+            AddTruthTableRoot(*initValue);
+        m_store->ListInPreOrder();
+    } catch (...) {
+        Clear(); // rather than an equation that lacks some of its variables
+        throw;
+    }
     KqCheckStore(*m_store);
     return true;
 }

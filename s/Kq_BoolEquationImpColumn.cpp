@@ -98,7 +98,7 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels)
 KqColumn::KqColumn(const Node* root, unsigned int numVariables)
     : m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1)
 {
-    assert(numVariables <= kMaxVariables);
+    assert(numVariables <= kKqMaxColumnVariables);
     static const KqKernel kernel = ChooseKernel();
     m_kernel = kernel;
     KqProgram program = KqCompile(root, numVariables, true);
@@ -141,6 +141,8 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
         m_path[depth++] = Fixed{variable, value, rest};
         m_path_length = depth;
     }
+    // What the piece before had fixed below this depth is overwritten now.
+    m_path_length = depth;
     m_num_codes = rest.first + rest.numCodes;
     Expand(rest, level, words);
 }

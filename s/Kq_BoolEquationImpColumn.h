@@ -9,6 +9,9 @@
 
 #include "Kq_BoolEquationImpProgram.h"
 
+// Deliberate: 30 variables are tabulated, 31 are not; row numbers stay within 32 bits.
+constexpr unsigned int kKqMaxColumnVariables = 30;
+
 // Words that every kernel may work on at a time; a column in pieces of a multiple of it is best.
 constexpr size_t kKqTileWords = 64;
 
@@ -38,8 +41,8 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels);
 class KqColumn {
   public:
     // Compiles the tree at 'root', which may be null and then counts as 0.
-    // Requires: a checked tree; numVariables <= 30. An ID whose index is no variable counts as 0.
-    // Fails: std::bad_alloc.  Cost: O(nodes).
+    // Requires: a checked tree; numVariables <= kKqMaxColumnVariables. An ID whose index is no
+    // variable counts as 0. Fails: std::bad_alloc.  Cost: O(nodes).
     KqColumn(const Kq_BoolEquationImp::Node* root, unsigned int numVariables);
 
     // 2^numVariables / 64, at least 1.
@@ -58,14 +61,14 @@ class KqColumn {
         size_t numCodes; // 0 for a constant
         uint32_t variables;
         uint32_t hash;
-        bool isInverted; // of a constant: it is 1
+        bool isInverted; // complemented; a constant is 1 then
     };
 
     // A rest whose block of 2^level rows has been written.
     struct Written {
         Rest rest;
         unsigned int level;
-        unsigned int generation; // forgotten unless it is the current one
+        uint64_t generation; // forgotten unless it is the current one
         const uint64_t* words;
     };
 
@@ -94,7 +97,7 @@ class KqColumn {
     Rest m_whole;
     Fixed m_path[32]; // of m_path_length variables
     size_t m_path_length = 0;
-    unsigned int m_generation = 1;
+    uint64_t m_generation = 1;
     Written m_written[kNumWritten] = {};          // by hash
     uint64_t m_stack[kKqMaxStack * kKqTileWords]; // the kernel's; set before it is read
 };

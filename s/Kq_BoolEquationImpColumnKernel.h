@@ -16,7 +16,6 @@ void KqRunAvx512(const KqCode* codes, size_t numCodes, bool isInverted, size_t n
 namespace {
 
 constexpr unsigned int kTileLevel = 12; // a tile has 2^12 rows
-constexpr unsigned int kMaxVariables = 30;
 
 // The columns of the variables of a tile; a variable above it is all zeros or all ones there.
 struct TilePatterns {
@@ -117,11 +116,11 @@ inline __attribute__((always_inline)) void RunTiles(const KqCode* codes, size_t 
 {
     constexpr size_t kStripWords = kNum * V::kWords;
     static_assert(kKqTileWords % kStripWords == 0, "a tile is a number of strips");
-    const uint64_t* operands[kMaxVariables];
+    const uint64_t* operands[kKqMaxColumnVariables];
     for (unsigned int variable = 0; variable < kTileLevel; ++variable)
         operands[variable] = kTilePatterns.words[variable];
     for (size_t tile = 0; tile < numWords / kKqTileWords; ++tile) {
-        for (unsigned int variable = kTileLevel; variable < kMaxVariables; ++variable)
+        for (unsigned int variable = kTileLevel; variable < kKqMaxColumnVariables; ++variable)
             operands[variable] = (tile >> (variable - kTileLevel) & 1u) != 0 ? kTilePatterns.ones
                                                                              : kTilePatterns.zeros;
         for (size_t offset = 0; offset < kKqTileWords; offset += kStripWords)

@@ -14,9 +14,6 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// Deliberate: the limit of the truth table, whose column an init value is.
-constexpr unsigned int kMaxVariables = 30;
-
 // Words of the column that are turned into text at a time: 2^17 rows.
 constexpr size_t kPieceWords = 2048;
 
@@ -115,7 +112,7 @@ void AppendDigits(const Kq_BoolEquationImp& equation, KqCompiled& compiled, BASE
                   bool upperCase, String& text)
 {
     const unsigned int numVariables = equation.GetNumVariables();
-    if (!equation || numVariables == 0 || numVariables > kMaxVariables)
+    if (!equation || numVariables == 0 || numVariables > kKqMaxColumnVariables)
         return;
     if (Kq_BoolEquationImp::GetInternalDebugMode()) {
         // The table evaluates node by node, because there the trace is output.

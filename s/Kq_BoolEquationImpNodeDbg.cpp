@@ -13,7 +13,7 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// The numbers that node dumps have always carried; they name no line of this file.
+// Node dumps carry fixed numbers; they name no line of this file.
 constexpr int kPrefixLine = 487;
 constexpr int kLeftLine = 503;
 constexpr int kRightLine = 508;

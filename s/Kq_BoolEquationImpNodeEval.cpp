@@ -11,7 +11,7 @@ typedef std::vector<std::pair<String, unsigned int>> Variables;
 
 namespace {
 
-// The numbers that the evaluation trace has always carried; they name no line of this file.
+// The evaluation trace carries fixed numbers; they name no line of this file.
 constexpr int kTraceLine = 444;
 constexpr int kTraceTextLine = 446;
 

@@ -55,11 +55,13 @@ struct KqProgram {
 // is enough, and otherwise the one that needs more first: then n operands need log2(n) + 1 values.
 constexpr size_t kKqMaxStack = 48;
 
+// As many as a step can name.
+constexpr uint32_t kKqMaxVariables = 1u << (32 - kKqVariableShift);
+
 // Compiles the tree at 'root', null counting as 0. A variable's number is its index or, when
 // 'isReversed', numVariables-1 less its index. An ID whose index is not below 'numVariables' is 0.
 // Requires: a checked tree of fewer than 2^30 nodes, numVariables <= kKqMaxVariables.
 // Fails: std::bad_alloc.  Cost: O(nodes).
-constexpr uint32_t kKqMaxVariables = 1u << (32 - kKqVariableShift);
 KqProgram KqCompile(const Kq_BoolEquationImp::Node* root, uint32_t numVariables, bool isReversed);
 
 // What a store keeps of its tree for evaluation: the column of up to six variables as a word, or
@@ -69,7 +71,8 @@ class KqCompiled {
     typedef std::vector<std::pair<Port::StringBase<char>, unsigned int>> Variables;
 
     // The value of the tree at 'root' for a table of values 0 or 1.
-    // Fails: std::bad_alloc.  Cost: O(variables) for up to six, else O(nodes).
+    // Fails: std::bad_alloc.  Cost: O(nodes); for up to six variables O(variables), but for the
+    // first time and after a copy with another number of variables.
     unsigned int Eval(const Kq_BoolEquationImp::Node& root, const Variables& variables)
     {
         if (variables.size() != m_num_word_variables)

@@ -102,7 +102,8 @@ void Writer::WriteToken(const String& token)
     if (m_spaces && m_has_written)
         m_buffer[m_length++] = ' ';
     m_has_written = m_has_written || length > 0;
-    if (length + 2 > kBufferSize) {
+    // The buffer ends at its first NUL byte; a token that is longer or has one goes straight.
+    if (length + 2 > kBufferSize || std::memchr(token.c_str(), '\0', length)) {
         Flush();
         m_result += token;
         return;

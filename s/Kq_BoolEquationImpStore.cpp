@@ -2,6 +2,8 @@
 // Fails: std::bad_alloc, with the nodes made so far listed.
 #include "Kq_BoolEquationImpStore.h"
 
+#include <cerrno>
+
 #if defined(__linux__)
 #include <sys/mman.h>
 #endif
@@ -13,16 +15,20 @@ typedef Kq_BoolEquationImp::Store Store;
 
 namespace {
 
-// Asks for large pages for a block of many megabytes that is about to be filled: half the time of
-// setting a text of a million tokens would go into small ones. A hint, and nothing elsewhere.
+constexpr size_t kKeptSlots = 3000;
+
+// Asks for large pages for a block of several megabytes that is about to be filled. A hint to the
+// system where there is one, and nothing elsewhere; docs/benchmarks.md says what it saves.
 void AdviseLargePages(void* block, size_t size)
 {
 #if defined(__linux__)
     constexpr uintptr_t kPage = 2u << 20;
     const uintptr_t begin = (reinterpret_cast<uintptr_t>(block) + kPage - 1) / kPage * kPage;
     const uintptr_t end = (reinterpret_cast<uintptr_t>(block) + size) / kPage * kPage;
+    const int savedErrno = errno;
     if (end > begin + kPage)
         madvise(reinterpret_cast<void*>(begin), end - begin, MADV_HUGEPAGE);
+    errno = savedErrno;
 #else
     (void)block;
     (void)size;
@@ -71,6 +77,9 @@ void Store::FreeNodes() noexcept
     for (size_t position = 0; position < m_nodes.size(); ++position)
         m_block[position].~Node();
     m_nodes.clear();
+    // The list of an ordinary equation is kept for the next one, a long one is given back.
+    if (m_nodes.capacity() > kKeptSlots)
+        std::vector<Node*>().swap(m_nodes);
     if (m_block)
         Node::m_kq_boolequationimp_node_mem.deallocate(m_block, m_num_slots);
     m_block = nullptr;

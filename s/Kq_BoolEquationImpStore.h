@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <cassert>
+#include <cstring>
 #include <memory>
 #include <new>
 #include <vector>
@@ -12,6 +13,13 @@
 #include <Kq_BoolEquationImpNode.h>
 
 #include "Kq_BoolEquationImpProgram.h"
+
+// Equal in length and bytes; a NUL byte is a byte like any other.
+inline bool KqIsSameText(const Port::StringBase<char>& left, const Port::StringBase<char>& right)
+{
+    return left.length() == right.length() &&
+           std::memcmp(left.c_str(), right.c_str(), left.length()) == 0;
+}
 
 // The tokens of one text, in text order. The first ones need no heap.
 // Texts point into the pool of names and the table of spellings: they outlive every equation.
@@ -28,7 +36,7 @@ class Kq_BoolEquationImp::Tokens {
 
     // Few texts have more tokens than every second character starts one: room for so many is made
     // at once, as growing a long list costs more than memory that is never touched.
-    explicit Tokens(size_t textLength) : m_expected_size(textLength / 2) {}
+    explicit Tokens(size_t textLength) : m_expected_size(std::min(textLength / 2, kMaxExpected)) {}
 
     void Append(Node::TYPE type, const Port::StringBase<char>& text)
     {
@@ -45,6 +53,8 @@ class Kq_BoolEquationImp::Tokens {
 
   private:
     static constexpr size_t kInline = 128;
+    // A text may be blanks for the most part, so the guess is worth 16 MB at most.
+    static constexpr size_t kMaxExpected = size_t(1) << 20;
 
     void Spill()
     {

@@ -4,7 +4,6 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
-#include <cstring>
 
 #include "Kq_BoolEquationImpColumn.h"
 #include "Kq_BoolEquationImpStore.h"
@@ -14,15 +13,6 @@ typedef Kq_BoolEquationImp::TruthTable TruthTable;
 typedef TruthTable::Row Row;
 
 namespace {
-
-// Deliberate: 30 variables are tabulated, 31 are not; row numbers stay within 32 bits.
-constexpr unsigned int kMaxVariables = 30;
-
-bool IsSameText(const String& left, const String& right)
-{
-    return left.length() == right.length() &&
-           std::memcmp(left.c_str(), right.c_str(), left.length()) == 0;
-}
 
 // Makes 'values' those of row 'rowIndex', the first variable being the most significant bit.
 void SetRowValues(uint32_t rowIndex, std::vector<unsigned int>& values)
@@ -129,14 +119,16 @@ void TruthTable::Build(const Kq_BoolEquationImp& equation)
     m_variable_names.clear();
     const unsigned int numVariables = equation.GetNumVariables();
     // Deliberate: a constant has no table, not one of a single row.
-    if (!equation || numVariables > kMaxVariables || numVariables == 0)
+    if (!equation || numVariables > kKqMaxColumnVariables || numVariables == 0)
         return;
     m_equation = equation.GetEquation(false);
     m_variable_names = equation.GetVariableNames();
     std::vector<unsigned int> values(numVariables);
     m_rows.reserve(size_t(1) << numVariables);
     if (GetInternalDebugMode()) {
-        AppendTracedRows(*equation.GetRoot(), equation.GetVariables(), values, m_rows);
+        // Holds the nodes: a message's receiver may set or clear the equation.
+        const Kq_BoolEquationImp working(equation);
+        AppendTracedRows(*working.GetRoot(), working.GetVariables(), values, m_rows);
     } else {
         KqColumn column(equation.GetRoot(), numVariables);
         AppendRows(column, values, m_rows);
@@ -158,7 +150,7 @@ bool TruthTable::operator==(const TruthTable& other) const
     // The text is not compared: differently written equations may have equal tables.
     return m_variable_names.size() == other.m_variable_names.size() &&
            std::equal(m_variable_names.begin(), m_variable_names.end(),
-                      other.m_variable_names.begin(), IsSameText) &&
+                      other.m_variable_names.begin(), KqIsSameText) &&
            m_rows == other.m_rows;
 }
 

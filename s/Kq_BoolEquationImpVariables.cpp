@@ -21,17 +21,10 @@ constexpr size_t kNotFound = SIZE_MAX;
 // Room made for the first variable of an equation: ordinary ones never regrow their table.
 constexpr size_t kFirstVariables = 8;
 
-// Equal in length and bytes; a NUL byte is a byte like any other.
-bool IsSameName(const String& left, const String& right)
-{
-    return left.length() == right.length() &&
-           std::memcmp(left.c_str(), right.c_str(), left.length()) == 0;
-}
-
 size_t FindName(const std::vector<Variable>& variables, const String& name)
 {
     for (size_t index = 0; index < variables.size(); ++index) {
-        if (IsSameName(variables[index].first, name))
+        if (KqIsSameText(variables[index].first, name))
             return index;
     }
     return kNotFound;
@@ -97,7 +90,7 @@ class NameIndex {
     {
         const std::string_view text(name.c_str(), name.length());
         size_t slot = std::hash<std::string_view>()(text) % m_slots.size();
-        while (m_slots[slot] != kNotFound && !IsSameName(m_variables[m_slots[slot]].first, name))
+        while (m_slots[slot] != kNotFound && !KqIsSameText(m_variables[m_slots[slot]].first, name))
             slot = slot + 1 == m_slots.size() ? 0 : slot + 1;
         return &m_slots[slot];
     }
@@ -190,7 +183,7 @@ bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
     const unsigned int variableIndex = GetNumVariables();
     m_variables.push_back(Variable(name, value ? 1u : 0u));
     for (Node* node : m_store->m_nodes) {
-        if (node->IsId() && IsSameName(node->GetToken(), name)) {
+        if (node->IsId() && KqIsSameText(node->GetToken(), name)) {
             node->SetValue(variableIndex);
             m_store->m_compiled.Drop();
         }
@@ -287,7 +280,7 @@ Kq_BoolEquation::Handle Kq_BoolEquationImp::GetVariableHandle(const String& name
     const std::vector<Node*>& nodes = m_store->m_nodes;
     for (size_t position = 0; position < nodes.size(); ++position) {
         // Deliberate: the node's type is not asked for, only its token.
-        if (IsSameName(nodes[position]->GetToken(), name))
+        if (KqIsSameText(nodes[position]->GetToken(), name))
             values.push_back(static_cast<unsigned int>(position));
     }
     return Kq_BoolEquation::Handle(values);

@@ -183,6 +183,27 @@ TEST(Allocation, CopyingIsSafeWhateverFails)
     });
 }
 
+TEST(Allocation, FailedSettingLeavesAWholeEquationOrNone)
+{
+    for (size_t failing = 0;; ++failing) {
+        Kq_BoolEquation equation("A & B");
+        bool hasFailed = false;
+        s_numUntilFailure = failing;
+        s_isArmed = true;
+        try {
+            equation.SetEquation("a_name_that_needs_memory & ~another_name_that_needs_memory");
+        } catch (const std::bad_alloc&) {
+            hasFailed = true;
+        }
+        s_isArmed = false;
+        if (!hasFailed)
+            break;
+        const std::string text = Std(equation.GetEquation(false));
+        EXPECT_EQ(text.empty() ? "" : "A&B", text);
+        EXPECT_EQ(text.empty() ? 0u : 2u, equation.GetNumVariables());
+    }
+}
+
 TEST(Allocation, FailedAssignmentChangesNothing)
 {
     for (size_t failing = 0;; ++failing) {

@@ -154,6 +154,23 @@ TEST(Column, PiecesInAnyOrderAreThoseOfTheWhole)
     }
 }
 
+TEST(Column, SmallPieceAfterALargeOneIsThatOfTheWhole)
+{
+    const Engine engine = MakeEngine("x0^x1&x2|x3&x4^x5|x6|x7^x8&x9|x10|x11&x12^x13^x14&x15", 16);
+    const std::vector<uint64_t> whole = WholeColumn(engine);
+    KqColumn column(engine.GetRoot(), 16);
+    std::mt19937 random(20267);
+    for (unsigned int count = 0; count < 2000; ++count) {
+        const size_t length = size_t(1) << random() % 11;
+        const size_t first = random() % (whole.size() / length) * length;
+        std::vector<uint64_t> words(length);
+        column.Fill(first, length, words.data());
+        ASSERT_TRUE(std::equal(words.begin(), words.end(),
+                               whole.begin() + static_cast<std::ptrdiff_t>(first)))
+            << first << ", " << length;
+    }
+}
+
 TEST(Column, ThirtyVariablesInPieces)
 {
     std::mt19937 random(20263);

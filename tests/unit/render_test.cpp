@@ -80,6 +80,16 @@ TEST(Render, InitValueIsItsTextOrTheExpressionBelow)
     EXPECT_FALSE(engine.IsExpression());
 }
 
+TEST(Render, NulBytesInATokenAreKept)
+{
+    Engine engine;
+    engine.TokenizeNodes("a & b & c");
+    engine.BuildTree();
+    engine.GetRoot()->GetRightChild()->GetParent()->GetLeftChild()->GetRightChild()->SetToken(
+        FromBytes(std::string("b\0x", 3)));
+    EXPECT_EQ(std::string("a&b\0x&c", 7), Std(engine.GetEquation(false)));
+}
+
 TEST(Render, TextsLongerThanAnyBufferAreWhole)
 {
     for (const size_t length : {65533u, 65534u, 65535u, 65536u, 65537u, 200000u}) {

@@ -157,6 +157,19 @@ TEST(TruthTable, DebugModeTracesAndDumpsEveryRow)
     EXPECT_EQ(expected + expected, messages.Text()) << "an init value traces the rows too";
 }
 
+TEST(TruthTable, ReceiverOfATraceMayClearTheEquation)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A & B"));
+    const DebugMode debugMode;
+    const Port_MsgManData::Sink before = Port_MsgManData::setSink(
+        [&](const char*, const char*, int, const char*, const char*) { engine.Clear(); });
+    const Table table(engine);
+    Port_MsgManData::setSink(before);
+    EXPECT_EQ("A B | 00=0 01=0 10=0 11=1", TableText(table));
+    EXPECT_TRUE(!engine);
+}
+
 // Small and large tables against node-by-node evaluation of every row.
 TEST(TruthTable, EveryRowIsWhatEvalGives)
 {

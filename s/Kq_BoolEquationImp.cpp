@@ -144,11 +144,11 @@ bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* init
         if (initValue)
             AddTruthTableRoot(*initValue);
         m_store->ListInPreOrder();
+        KqCheckStore(*m_store); // allocates, in the builds that check
     } catch (...) {
         Clear(); // rather than an equation that lacks some of its variables
         throw;
     }
-    KqCheckStore(*m_store);
     return true;
 }
 

@@ -4,7 +4,6 @@
 #ifndef KQ_BOOLEQUATIONIMP_H
 #define KQ_BOOLEQUATIONIMP_H
 
-#include <map>
 #include <memory>
 
 #include <Kq_BoolEquation.h>

@@ -6,7 +6,6 @@
 #include <algorithm>
 #include <cassert>
 #include <cstring>
-#include <memory>
 #include <new>
 #include <vector>
 

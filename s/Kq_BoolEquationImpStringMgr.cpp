@@ -4,6 +4,7 @@
 // shares no beginning with another is one node, where a node for each would take a gigabyte.
 #include <Kq_BoolEquationImp.h>
 
+#include <map>
 #include <memory>
 #include <string>
 

@@ -7,7 +7,6 @@
 #include <unordered_map>
 
 #include "Kq_BoolEquationImpStore.h"
-#include "Kq_BoolEquationImpWalk.h"
 
 typedef Kq_BoolEquationImp::Node Node;
 

@@ -8,6 +8,8 @@
 
 #include <Kq_BoolEquation.h>
 
+class KqInitText; // an init value as read; inside the library
+
 // Invariants:
 // 1. m_store is never null; its count is the number of engine objects that point at it.
 // 2. Variable names are unique; a variable's position is its index, its value is 0 or 1.
@@ -105,16 +107,15 @@ class KQ_EXPORT Kq_BoolEquationImp {
 
     static StringMgr& GetNamePool();
     static bool ScanTokens(const char* text, Tokens& tokens);
+    static std::vector<Variable> ListTerms(const std::vector<Port::StringBase<char>>& terms,
+                                           bool reverseTerms);
 
     bool FinishEquation(const Tokens& tokens, const Port::StringBase<char>* initValue);
-    void AddTruthTableRoot(const Port::StringBase<char>& initValue);
-    void DefineTerms(const std::vector<Port::StringBase<char>>& terms, bool reverseTerms);
+    bool FinishInitValue(std::unique_ptr<KqInitText> initText);
     void DefineListedNames(const Tokens& tokens);
     size_t FindVariable(const Port::StringBase<char>& name) const;
     size_t FindVariable(const Kq_BoolEquation::Handle& handle) const;
     std::vector<Port::StringBase<char>> GetVariableNames() const;
-    bool HasTruthTableRoot() const;
-    bool HasInitValuePrefix(char lowerCase, char upperCase) const;
 
     Store* m_store;
     std::vector<Variable> m_variables;

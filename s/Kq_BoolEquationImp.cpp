@@ -44,29 +44,6 @@ NamePool s_namePool;
 // Any value counts, an empty one too; read at load and never again.
 bool s_internalDebugMode = Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr;
 
-// Whether the trees at 'left' and 'right', either of which may be null, have equal nodes.
-bool IsSameTree(const Node* left, const Node* right)
-{
-    struct Pair {
-        const Node* left;
-        const Node* right;
-    };
-    KqStack<Pair, 64> pending;
-    pending.Push({left, right});
-    while (!pending.IsEmpty()) {
-        const Pair pair = pending.Pop();
-        if (!pair.left != !pair.right)
-            return false;
-        if (!pair.left)
-            continue;
-        if (*pair.left != *pair.right)
-            return false;
-        pending.Push({pair.left->GetRightChild(), pair.right->GetRightChild()});
-        pending.Push({pair.left->GetLeftChild(), pair.right->GetLeftChild()});
-    }
-    return true;
-}
-
 } // namespace
 
 std::allocator<Kq_BoolEquationImp> Kq_BoolEquationImp::m_kq_boolequationimp_mem;
@@ -104,7 +81,7 @@ void Kq_BoolEquationImp::Copy(const Kq_BoolEquationImp& other)
 void Kq_BoolEquationImp::Clear()
 {
     if (m_store->m_count == 1) {
-        m_store->FreeNodes();
+        m_store->Clear();
     } else {
         Store* fresh = new Store;
         Store::Release(m_store);
@@ -115,19 +92,21 @@ void Kq_BoolEquationImp::Clear()
 
 bool Kq_BoolEquationImp::SetEquation(const String& text)
 {
-    // Deliberate: what is no init value over these variables is read as an expression.
-    std::string expression;
-    if (KqInitText::IsCandidate(text))
-        expression = KqInitText::Expand(text, GetVariableNames(), false);
-    const bool isInitValue = !expression.empty();
+    if (KqInitText::IsCandidate(text)) {
+        // Deliberate: what is no init value over these variables is read as an expression.
+        std::unique_ptr<KqInitText> initText = KqInitText::Read(text, m_variables, false);
+        if (initText) {
+            Clear();
+            return FinishInitValue(std::move(initText));
+        }
+    }
     // Read before anything is cleared: the text may be one of the names that go.
-    const String initValue = isInitValue ? text : String();
-    Tokens tokens(isInitValue ? expression.length() : text.length());
-    const bool isRead = ScanTokens(isInitValue ? expression.c_str() : text.c_str(), tokens);
+    Tokens tokens(text.length());
+    const bool isRead = ScanTokens(text.c_str(), tokens);
     Clear();
     if (!isRead || tokens.GetSize() == 0)
         return false;
-    return FinishEquation(tokens, isInitValue ? &initValue : nullptr);
+    return FinishEquation(tokens, nullptr);
 }
 
 // Makes an equation of the tokens: nodes, tree, variables, the init value's own root, pre-order.
@@ -137,12 +116,12 @@ bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* init
     try {
         m_store->MakeNodes(tokens);
         BuildTree();
-        if (!m_store->m_root)
+        if (!m_store->HasEquation())
             return false;
         // Variables are numbered in the order of the text, which pre-order need not be.
         DefineListedNames(tokens);
         if (initValue)
-            AddTruthTableRoot(*initValue);
+            m_store->AddTruthTableRoot(*initValue);
         m_store->ListInPreOrder();
         KqCheckStore(*m_store); // allocates, in the builds that check
     } catch (...) {
@@ -152,31 +131,50 @@ bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* init
     return true;
 }
 
-void Kq_BoolEquationImp::AddTruthTableRoot(const String& initValue)
+// Makes an equation of an init value. Its tree is owed, but where the way to it is output or only
+// the expression counts.
+// Requires: no nodes; either no variables or, as listed inputs, those of the value's names.
+bool Kq_BoolEquationImp::FinishInitValue(std::unique_ptr<KqInitText> initText)
 {
-    Node* table = m_store->MakeNode(Node::TRUTH_TABLE, initValue);
-    table->SetLeftChild(m_store->m_root);
-    m_store->m_root->SetParent(table);
-    m_store->m_root = table;
+    try {
+        if (initText->IsExact() && !GetInternalDebugMode()) {
+            if (m_variables.empty()) {
+                m_variables.reserve(initText->GetNumNames());
+                for (const String& name : initText->GetNames())
+                    m_variables.push_back(Variable(name, 0u));
+            }
+            m_store->Owe(std::move(initText));
+            return true;
+        }
+        const std::string expression = initText->Expand();
+        Tokens tokens(expression.length());
+        if (ScanTokens(expression.c_str(), tokens))
+            return FinishEquation(tokens, &initText->GetText());
+    } catch (...) {
+        Clear();
+        throw;
+    }
+    Clear();
+    return false;
 }
 
 unsigned int Kq_BoolEquationImp::Eval() const
 {
-    if (!m_store->m_root)
-        return 0;
     if (!GetInternalDebugMode())
-        return m_store->m_compiled.Eval(*m_store->m_root, m_variables);
+        return m_store->Eval(m_variables);
+    const Node* const root = m_store->GetRoot();
+    if (!root)
+        return 0;
     // Node by node, because the trace is output.
-    const unsigned int value = m_store->m_root->Eval(m_variables);
-    m_store->m_root->Dbg();
+    const unsigned int value = root->Eval(m_variables);
+    root->Dbg();
     return value;
 }
 
 bool Kq_BoolEquationImp::operator==(const Kq_BoolEquationImp& other) const
 {
     // Deliberate: variables and values do not count.
-    return m_store == other.m_store || (m_store->m_nodes.size() == other.m_store->m_nodes.size() &&
-                                        IsSameTree(m_store->m_root, other.m_store->m_root));
+    return m_store->IsSame(*other.m_store);
 }
 
 bool Kq_BoolEquationImp::operator!=(const Kq_BoolEquationImp& other) const
@@ -186,28 +184,23 @@ bool Kq_BoolEquationImp::operator!=(const Kq_BoolEquationImp& other) const
 
 bool Kq_BoolEquationImp::operator!() const
 {
-    return !m_store->m_root;
+    return !m_store->HasEquation();
 }
 
 Kq_BoolEquationImp::operator Kq_PtrTester*() const
 {
     // Never dereferenced; any address that is not null will do.
-    return reinterpret_cast<Kq_PtrTester*>(m_store->m_root);
+    return m_store->HasEquation() ? reinterpret_cast<Kq_PtrTester*>(m_store) : nullptr;
 }
 
 bool Kq_BoolEquationImp::IsExpression() const
 {
-    return m_store->m_root && !HasTruthTableRoot();
-}
-
-bool Kq_BoolEquationImp::HasTruthTableRoot() const
-{
-    return m_store->m_root && m_store->m_root->GetType() == Node::TRUTH_TABLE;
+    return m_store->HasEquation() && !m_store->GetInitValue();
 }
 
 const Node* Kq_BoolEquationImp::GetRoot() const
 {
-    return m_store->m_root;
+    return m_store->GetRoot();
 }
 
 void* Kq_BoolEquationImp::operator new(size_t size)
@@ -310,10 +303,10 @@ void Kq_BoolEquationImp::Dbg() const
     DumpVariables(std::vector<Variable>(m_variables));
     KQ_ENGINE_EMIT("\n");
     KQ_ENGINE_EMIT("ExprTree\n");
-    if (m_store->m_root)
-        m_store->m_root->Dbg();
+    if (m_store->HasEquation())
+        m_store->GetRoot()->Dbg();
     KQ_ENGINE_EMIT("\n");
-    DumpNodes(m_store->m_nodes, m_store->m_root);
+    DumpNodes(m_store->GetNodes(), m_store->GetRoot());
     KQ_ENGINE_EMIT("\n");
     GetTruthTable().Dbg();
     KQ_ENGINE_EMIT("\n");

@@ -5,6 +5,7 @@
 #define KQ_BOOLEQUATIONIMPCOLUMNKERNEL_H
 
 #include "Kq_BoolEquationImpColumn.h"
+#include "Kq_BoolEquationImpWord.h"
 
 #if defined(KQ_HAS_X86_KERNELS)
 void KqRunAvx2(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
@@ -26,13 +27,12 @@ struct TilePatterns {
 
 constexpr TilePatterns MakeTilePatterns()
 {
-    constexpr uint64_t inWord[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu, 0xf0f0f0f0f0f0f0f0u,
-                                    0xff00ff00ff00ff00u, 0xffff0000ffff0000u, 0xffffffff00000000u};
     TilePatterns patterns = {};
     for (unsigned int variable = 0; variable < kTileLevel; ++variable) {
         for (unsigned int word = 0; word < kKqTileWords; ++word)
-            patterns.words[variable][word] =
-                variable < 6 ? inWord[variable] : uint64_t(0) - (word >> (variable - 6) & 1u);
+            patterns.words[variable][word] = variable < 6
+                                                 ? kKqRowsWithBit[variable]
+                                                 : uint64_t(0) - (word >> (variable - 6) & 1u);
     }
     for (unsigned int word = 0; word < kKqTileWords; ++word)
         patterns.ones[word] = ~uint64_t(0);

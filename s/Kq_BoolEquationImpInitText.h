@@ -1,130 +1,107 @@
-// Init values as pure text: what counts as one, and the expression that one stands for.
+// Init values as pure text: what counts as one, and what it stands for.
 // Knows names and digits only; no nodes, no engine object.
 #ifndef KQ_BOOLEQUATIONIMPINITTEXT_H
 #define KQ_BOOLEQUATIONIMPINITTEXT_H
 
+#include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <port/Port_StringBase.h>
 
-namespace KqInitText {
-
-typedef Port::StringBase<char> String;
-
-constexpr size_t kPrefixLength = 2;
-
-// Whether a text is to be read as an init value: at least three characters, the first a 0.
-inline bool IsCandidate(const String& text)
-{
-    return text.length() > kPrefixLength && text.c_str()[0] == '0';
-}
-
-// Bits per digit: 4 for "0x" and "0X", 1 for "0b" and "0B", 0 for any other prefix.
-// Requires: at least two characters.
-inline unsigned int BitsPerDigit(const String& text)
-{
-    switch (text.c_str()[1]) {
-    case 'x':
-    case 'X':
-        return 4;
-    case 'b':
-    case 'B':
-        return 1;
-    default:
-        return 0;
-    }
-}
-
-// The value of a hexadecimal digit, 16 for any other character.
-inline unsigned int DigitValue(char digit)
-{
-    if (digit >= '0' && digit <= '9')
-        return static_cast<unsigned int>(digit - '0');
-    if (digit >= 'a' && digit <= 'f')
-        return static_cast<unsigned int>(digit - 'a') + 10;
-    if (digit >= 'A' && digit <= 'F')
-        return static_cast<unsigned int>(digit - 'A') + 10;
-    return 16;
-}
-
-// The digits of an init value as '0' and '1', the highest row first; empty when a character is no
-// digit of its base or the prefix is unknown.
-inline std::string ReadBits(const String& text)
-{
-    const unsigned int bitsPerDigit = BitsPerDigit(text);
-    if (bitsPerDigit == 0)
-        return std::string();
-    const char* const digits = text.c_str() + kPrefixLength;
-    const size_t numDigits = text.length() - kPrefixLength;
-    std::string bits;
-    bits.reserve(numDigits * bitsPerDigit);
-    for (size_t position = 0; position < numDigits; ++position) {
-        const unsigned int value = DigitValue(digits[position]);
-        if (value >= 1u << bitsPerDigit)
-            return std::string();
-        for (unsigned int bit = bitsPerDigit; bit-- > 0;)
-            bits += (value >> bit & 1u) != 0 ? '1' : '0';
-    }
-    return bits;
-}
-
-// How many variables a value of 'numBits' rows is read over: as many as number its rows.
-inline unsigned int RequiredVariables(size_t numBits)
-{
-    unsigned int numVariables = 0;
-    for (size_t highestRow = numBits - 1; highestRow != 0; highestRow >>= 1)
-        ++numVariables;
-    return numVariables;
-}
-
-// Appends the term of row 'row': every name, joined with 'operation', with a "~" in front where
-// the row's bit is not 'plainBit'.
-inline void AppendTerm(uint64_t row, const std::vector<String>& names, bool isFirstLowest,
-                       char operation, unsigned int plainBit, std::string& text)
-{
-    text += '(';
-    for (size_t index = 0; index < names.size(); ++index) {
-        const size_t bit = isFirstLowest ? index : names.size() - 1 - index;
-        if (index > 0)
-            text += operation;
-        if ((row >> bit & 1u) != plainBit)
-            text += '~';
-        text.append(names[index].c_str(), names[index].length());
-    }
-    text += ')';
-}
-
-// The expression that the init value 'text' stands for over 'names'; empty when it is none: a bad
-// digit, or digits for another number of names. 'isFirstLowest' gives the first name the lowest
-// bit of the row number instead of the highest.
-// Fewer ones than zeros, or only ones, give a sum of products over the rows of result 1; otherwise
-// a product of sums over the rows of result 0.
+// An init value as read: its text, the names it is read over, and the results of all rows, packed.
+//
+// Fewer ones than zeros, or only ones, make it a sum of products over the rows of result 1;
+// otherwise it is a product of sums over the rows of result 0. Each of these rows is a term.
 // Deliberate: a value with fewer digits than rows is not padded. Its missing high rows have no
 // term, so they are 0 in a sum of products and 1 in a product of sums.
-// Requires: IsCandidate(text).
-inline std::string Expand(const String& text, const std::vector<String>& names, bool isFirstLowest)
-{
-    const std::string bits = ReadBits(text);
-    if (bits.empty() || names.size() != RequiredVariables(bits.size()))
-        return std::string();
-    size_t numOnes = 0;
-    for (const char bit : bits)
-        numOnes += bit == '1' ? 1u : 0u;
-    const size_t numZeros = bits.size() - numOnes;
-    const bool isSum = numOnes != 0 && (numZeros == 0 || numOnes < numZeros);
-    std::string expression;
-    for (size_t row = 0; row < bits.size(); ++row) {
-        if ((bits[bits.size() - 1 - row] == '1') != isSum)
-            continue;
-        if (!expression.empty())
-            expression += isSum ? '+' : '*';
-        AppendTerm(row, names, isFirstLowest, isSum ? '*' : '+', isSum ? 1u : 0u, expression);
-    }
-    return expression;
-}
+//
+// Invariants:
+// 1. Bit k of the results is that of the truth table's row k: the first name is the most
+//    significant bit of k, whichever way the digits count.
+// 2. There is at least one term.
+class KqInitText {
+  public:
+    typedef Port::StringBase<char> String;
+    typedef std::vector<std::pair<String, unsigned int>> Variables;
 
-} // namespace KqInitText
+    static constexpr size_t kPrefixLength = 2;
+
+    // Whether a text is to be read as an init value: at least three characters, the first a 0.
+    static bool IsCandidate(const String& text)
+    {
+        return text.length() > kPrefixLength && text.c_str()[0] == '0';
+    }
+
+    // Reads 'text' over the names of 'inputs'. 'isFirstLowest' gives the first one the lowest bit
+    // of a digit's row number instead of the highest. Null when the text is none: an unknown
+    // prefix, a bad digit, or digits for another number of names.
+    // Requires: IsCandidate(text).  Fails: std::bad_alloc.  Cost: O(text).
+    static std::unique_ptr<KqInitText> Read(const String& text, const Variables& inputs,
+                                            bool isFirstLowest);
+
+    // As given.
+    const String& GetText() const { return m_text; }
+    const std::vector<String>& GetNames() const { return m_names; }
+    size_t GetNumNames() const { return m_names.size(); }
+    bool IsFirstLowest() const { return m_is_first_lowest; }
+    bool IsSum() const { return m_is_sum; }
+
+    // Whether the results are those of the expression as the tokenizer reads it: there is a name,
+    // and each is one name to the tokenizer too. Otherwise only the expression counts.
+    bool IsExact() const;
+
+    // The expression, its terms in the order of the digits, from the last to the first.
+    std::string Expand() const;
+
+    // The row that each term stands for, in the same order.
+    template <class Visit>
+    void VisitTerms(Visit visit) const
+    {
+        for (uint64_t digit = 0; digit < m_num_digits; ++digit) {
+            const uint64_t row = m_is_first_lowest ? ReverseBits(digit) : digit;
+            if ((m_words[row / 64] >> (row % 64) & 1u) == (m_is_sum ? 1u : 0u))
+                visit(row);
+        }
+    }
+
+    // How many of the first 'numNames' names have a "~" in the term of 'row'.
+    unsigned int CountNegations(uint64_t row, size_t numNames) const;
+
+    // Whether the name has a "~" in the term of 'row'.
+    bool IsNegated(uint64_t row, size_t nameIndex) const
+    {
+        return (row >> (m_names.size() - 1 - nameIndex) & 1u) != (m_is_sum ? 1u : 0u);
+    }
+
+    // The result for a table of values 0 or 1 whose first variables are the names.
+    unsigned int Eval(const Variables& variables) const;
+
+    // Writes words of the column over 'numVariables' variables, the first ones being the names;
+    // with fewer than six the one word repeats the column up to its end.
+    // Requires: numVariables >= the number of names.
+    void Fill(unsigned int numVariables, uint64_t firstWord, size_t numWords,
+              uint64_t* words) const;
+
+  private:
+    KqInitText(const String& text, const Variables& inputs, bool isFirstLowest);
+
+    bool ReadDigits(unsigned int bitsPerDigit);
+    void ChooseForm();
+    void AddMissingRows();
+    void ReverseRows();
+    void AppendTerm(uint64_t row, std::string& text) const;
+    uint64_t ReverseBits(uint64_t row) const;
+
+    String m_text;
+    std::vector<String> m_names;
+    std::vector<uint64_t> m_words; // with fewer than six names the rows repeat up to the end
+    uint64_t m_num_digits = 0;     // binary ones
+    bool m_is_first_lowest;
+    bool m_is_sum = false;
+};
 
 #endif

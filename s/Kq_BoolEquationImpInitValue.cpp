@@ -6,10 +6,11 @@
 #include <algorithm>
 #include <cstring>
 
-#include "Kq_BoolEquationImpColumn.h"
 #include "Kq_BoolEquationImpInitText.h"
+#include "Kq_BoolEquationImpResults.h"
 #include "Kq_BoolEquationImpStore.h"
 
+typedef Kq_BoolEquationImp::Store Store;
 typedef Port::StringBase<char> String;
 
 namespace {
@@ -96,20 +97,19 @@ std::vector<uint64_t> PackRows(const std::vector<Kq_BoolEquationImp::TruthTable:
 }
 
 // Appends the column of more than six variables in pieces, from the highest row to the lowest.
-void AppendColumn(const Kq_BoolEquationImp& equation, BASE base, bool upperCase, String& text)
+void AppendColumn(KqResults results, BASE base, bool upperCase, String& text)
 {
-    KqColumn column(equation.GetRoot(), equation.GetNumVariables());
-    std::vector<uint64_t> words(std::min<uint64_t>(kPieceWords, column.GetNumWords()));
+    std::vector<uint64_t> words(std::min<uint64_t>(kPieceWords, results.GetNumWords()));
     std::vector<char> buffer;
-    for (uint64_t end = column.GetNumWords(); end > 0; end -= words.size()) {
-        column.Fill(end - words.size(), words.size(), words.data());
+    for (uint64_t end = results.GetNumWords(); end > 0; end -= words.size()) {
+        results.Fill(end - words.size(), words.size(), words.data());
         AppendWords(words.data(), words.size(), base, upperCase, buffer, text);
     }
 }
 
 // Appends the init value's digits; nothing when the equation has no truth table.
-void AppendDigits(const Kq_BoolEquationImp& equation, KqCompiled& compiled, BASE base,
-                  bool upperCase, String& text)
+void AppendDigits(const Kq_BoolEquationImp& equation, Store& store, BASE base, bool upperCase,
+                  String& text)
 {
     const unsigned int numVariables = equation.GetNumVariables();
     if (!equation || numVariables == 0 || numVariables > kKqMaxColumnVariables)
@@ -123,38 +123,36 @@ void AppendDigits(const Kq_BoolEquationImp& equation, KqCompiled& compiled, BASE
         else
             AppendWords(words.data(), words.size(), base, upperCase, buffer, text);
     } else if (numVariables <= 6) {
-        const uint64_t word = compiled.GetWord(*equation.GetRoot(), numVariables);
-        AppendFewRows(word, numVariables, base, upperCase, text);
+        AppendFewRows(store.GetWord(numVariables), numVariables, base, upperCase, text);
     } else {
-        AppendColumn(equation, base, upperCase, text);
+        AppendColumn(KqResults(store, numVariables), base, upperCase, text);
     }
+}
+
+// Whether 'initValue', null for none, starts with a 0 and the given character in either case.
+bool HasPrefix(const String* initValue, char lowerCase, char upperCase)
+{
+    return initValue && initValue->length() >= KqInitText::kPrefixLength &&
+           initValue->c_str()[0] == '0' &&
+           (initValue->c_str()[1] == lowerCase || initValue->c_str()[1] == upperCase);
 }
 
 } // namespace
 
-bool Kq_BoolEquationImp::HasInitValuePrefix(char lowerCase, char upperCase) const
-{
-    if (!HasTruthTableRoot())
-        return false;
-    const String& token = m_store->m_root->GetToken();
-    return token.length() >= KqInitText::kPrefixLength && token.c_str()[0] == '0' &&
-           (token.c_str()[1] == lowerCase || token.c_str()[1] == upperCase);
-}
-
 bool Kq_BoolEquationImp::IsHexInitValue() const
 {
-    return HasInitValuePrefix('x', 'X');
+    return HasPrefix(m_store->GetInitValue(), 'x', 'X');
 }
 
 bool Kq_BoolEquationImp::IsBinaryInitValue() const
 {
-    return HasInitValuePrefix('b', 'B');
+    return HasPrefix(m_store->GetInitValue(), 'b', 'B');
 }
 
 String Kq_BoolEquationImp::GetEquationAsHexInitValue(bool upperCase) const
 {
     String text = "0x";
-    AppendDigits(*this, m_store->m_compiled, HEXADECIMAL, upperCase, text);
+    AppendDigits(*this, *m_store, HEXADECIMAL, upperCase, text);
     // Deliberate: without a truth table one digit 0 is written, for the constant 1 as well.
     if (text.length() == KqInitText::kPrefixLength)
         text += '0';
@@ -165,7 +163,7 @@ String Kq_BoolEquationImp::GetEquationAsBinaryInitValue() const
 {
     // Deliberate: without a truth table no digit is written, unlike in the hexadecimal form.
     String text = "0b";
-    AppendDigits(*this, m_store->m_compiled, BINARY, false, text);
+    AppendDigits(*this, *m_store, BINARY, false, text);
     return text;
 }
 

@@ -6,15 +6,12 @@
 #include <cassert>
 
 #include "Kq_BoolEquationImpWalk.h"
+#include "Kq_BoolEquationImpWord.h"
 #include "Kq_BoolEquationImpWriter.h"
 
 typedef Kq_BoolEquationImp::Node Node;
 
 namespace {
-
-// Column of each of six variables, the most significant one first.
-constexpr uint64_t kPatterns[6] = {0xffffffff00000000u, 0xffff0000ffff0000u, 0xff00ff00ff00ff00u,
-                                   0xf0f0f0f0f0f0f0f0u, 0xccccccccccccccccu, 0xaaaaaaaaaaaaaaaau};
 
 bool IsBinary(const Node* node)
 {
@@ -184,7 +181,7 @@ uint64_t ApplyToWords(Node::TYPE type, uint64_t left, uint64_t right)
 uint64_t LeafWord(const Node* node, unsigned int numVariables)
 {
     if (node && node->IsId() && node->GetValue() < numVariables)
-        return kPatterns[6 - numVariables + node->GetValue()];
+        return kKqRowsWithBit[numVariables - 1 - node->GetValue()];
     return node && node->Is1() ? ~uint64_t(0) : 0;
 }
 
@@ -321,12 +318,12 @@ KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
     return program;
 }
 
-unsigned int KqCompiled::EvalOther(const Node& root, const Variables& variables)
+unsigned int KqCompiled::Eval(const Node& root, const Variables& variables)
 {
     const size_t numVariables = variables.size();
     if (numVariables <= 6) {
         GetWord(root, static_cast<unsigned int>(numVariables));
-        return Eval(root, variables);
+        return EvalWord(variables);
     }
     // Compiling costs several evaluations, and many equations are evaluated just once.
     if (!m_is_evaluated || numVariables > kKqMaxVariables) {
@@ -343,10 +340,8 @@ unsigned int KqCompiled::EvalOther(const Node& root, const Variables& variables)
 uint64_t KqCompiled::GetWord(const Node& root, unsigned int numVariables)
 {
     assert(numVariables <= 6);
-    if (m_num_word_variables != numVariables) {
-        m_word = ComputeWord(&root, numVariables);
-        m_num_word_variables = numVariables;
-    }
+    if (!HasWord(numVariables))
+        SetWord(ComputeWord(&root, numVariables), numVariables);
     return m_word;
 }
 

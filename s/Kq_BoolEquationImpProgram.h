@@ -70,26 +70,36 @@ class KqCompiled {
   public:
     typedef std::vector<std::pair<Port::StringBase<char>, unsigned int>> Variables;
 
-    // The value of the tree at 'root' for a table of values 0 or 1.
-    // Fails: std::bad_alloc.  Cost: O(nodes); for up to six variables O(variables), but for the
-    // first time and after a copy with another number of variables.
-    unsigned int Eval(const Kq_BoolEquationImp::Node& root, const Variables& variables)
+    // Whether the column over so many variables is at hand.
+    bool HasWord(size_t numVariables) const { return numVariables == m_num_word_variables; }
+
+    // The value for a table of values 0 or 1.  Requires: HasWord(variables.size()).
+    unsigned int EvalWord(const Variables& variables) const
     {
-        if (variables.size() != m_num_word_variables)
-            return EvalOther(root, variables);
         unsigned int row = 0;
         for (const auto& variable : variables)
             row = row << 1 | variable.second;
         return m_word >> row & 1u;
     }
 
+    // The value of the tree at 'root' for a table of values 0 or 1.
+    // Fails: std::bad_alloc.  Cost: O(nodes); for up to six variables O(variables), but for the
+    // first time and after a copy with another number of variables.
+    unsigned int Eval(const Kq_BoolEquationImp::Node& root, const Variables& variables);
+
     // The column of up to six variables, repeated up to the word's end.
     uint64_t GetWord(const Kq_BoolEquationImp::Node& root, unsigned int numVariables);
+
+    // Takes a column that is known.  Requires: numVariables <= 6.
+    void SetWord(uint64_t word, unsigned int numVariables)
+    {
+        m_word = word;
+        m_num_word_variables = numVariables;
+    }
 
     void Drop() noexcept;
 
   private:
-    unsigned int EvalOther(const Kq_BoolEquationImp::Node& root, const Variables& variables);
     unsigned int RunProgram(const Variables& variables) const;
 
     static constexpr size_t kNoWord = SIZE_MAX;

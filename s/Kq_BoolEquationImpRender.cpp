@@ -136,24 +136,23 @@ const Node* ExpressionOf(const Node* root)
 
 String Kq_BoolEquationImp::GetEquation(bool spaces) const
 {
-    if (HasTruthTableRoot())
-        return m_store->m_root->GetToken();
-    return Write(m_store->m_root, &Node::GetToken, spaces);
+    const String* const initValue = m_store->GetInitValue();
+    return initValue ? *initValue : Write(m_store->GetRoot(), &Node::GetToken, spaces);
 }
 
 String Kq_BoolEquationImp::GetEquationAlt1(bool spaces) const
 {
-    return Write(ExpressionOf(m_store->m_root), &Node::GetTokenAlt1, spaces);
+    return Write(ExpressionOf(m_store->GetRoot()), &Node::GetTokenAlt1, spaces);
 }
 
 String Kq_BoolEquationImp::GetEquationAlt2(bool spaces) const
 {
-    return Write(ExpressionOf(m_store->m_root), &Node::GetTokenAlt2, spaces);
+    return Write(ExpressionOf(m_store->GetRoot()), &Node::GetTokenAlt2, spaces);
 }
 
 String Kq_BoolEquationImp::GetEquationAlt3(bool spaces) const
 {
-    return Write(ExpressionOf(m_store->m_root), &Node::GetTokenAlt3, spaces);
+    return Write(ExpressionOf(m_store->GetRoot()), &Node::GetTokenAlt3, spaces);
 }
 
 String Kq_BoolEquationImp::GetEquationAsExpression(bool spaces) const

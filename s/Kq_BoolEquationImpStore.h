@@ -6,11 +6,12 @@
 #include <algorithm>
 #include <cassert>
 #include <cstring>
-#include <new>
+#include <memory>
 #include <vector>
 
 #include <Kq_BoolEquationImpNode.h>
 
+#include "Kq_BoolEquationImpInitText.h"
 #include "Kq_BoolEquationImpProgram.h"
 
 // Equal in length and bytes; a NUL byte is a byte like any other.
@@ -67,6 +68,10 @@ class Kq_BoolEquationImp::Tokens {
     std::vector<Token> m_all; // all tokens, once they are too many for m_first
 };
 
+// The tree of an equation that was read from an init value is owed at first: it is made when
+// somebody asks for the root or the nodes, for all holders at once. Whoever asks for them cannot
+// tell; what can be told of the digits is told without them.
+//
 // Invariants:
 // 1. m_count is the number of engine objects that point here; the last one to leave deletes.
 // 2. All nodes lie side by side in one block from the node class's allocator, in the order they
@@ -74,30 +79,14 @@ class Kq_BoolEquationImp::Tokens {
 // 3. m_root is null until the whole tree has passed its checks. From the end of SetEquation on the
 //    list is the tree in pre-order.
 // 4. m_compiled is made of the nodes and their variable indices, and goes when they change.
+// 5. The tree is owed while there is an m_init_text and no root; then there are no nodes. The
+//    names of an m_init_text are the first variables of every holder.
 struct Kq_BoolEquationImp::Store {
+  public:
     Store() = default;
-    ~Store() { FreeNodes(); }
+    ~Store() { Clear(); }
     Store(const Store&) = delete;
     Store& operator=(const Store&) = delete;
-
-    // Makes a node of each token and leaves room for one more.
-    // Requires: no nodes.  Fails: std::bad_alloc; the nodes made so far are listed.
-    void MakeNodes(const Tokens& tokens);
-
-    // Requires: fewer nodes than MakeNodes left room for.
-    Node* MakeNode(Node::TYPE type, const Port::StringBase<char>& text)
-    {
-        assert(m_nodes.size() < m_num_slots);
-        Node* node = ::new (static_cast<void*>(m_block + m_nodes.size())) Node(type, text);
-        m_nodes.push_back(node);
-        return node;
-    }
-
-    // Lists the tree in pre-order.
-    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the order as it was made.
-    void ListInPreOrder();
-
-    void FreeNodes() noexcept;
 
     // Takes one holder away.
     static void Release(Store* store) noexcept
@@ -107,18 +96,94 @@ struct Kq_BoolEquationImp::Store {
             delete store;
     }
 
-    Node* m_root = nullptr;
-    std::vector<Node*> m_nodes;
+    // Whether there are neither nodes nor a tree that is owed.
+    bool IsEmpty() const { return m_nodes.empty() && !m_init_text; }
+    bool HasEquation() const { return m_root || m_init_text; }
+
+    // Make the tree when it is owed.  Fails: std::bad_alloc; the tree is owed still.
+    Node* GetRoot()
+    {
+        EnsureTree();
+        return m_root;
+    }
+    const std::vector<Node*>& GetNodes()
+    {
+        EnsureTree();
+        return m_nodes;
+    }
+
+    // Makes a node of each token and leaves room for one more.
+    // Requires: no nodes.  Fails: std::bad_alloc; the nodes made so far are listed.
+    void MakeNodes(const Tokens& tokens);
+    void SetRoot(Node* root) { m_root = root; }
+    // Puts the init value's own root above the tree.
+    void AddTruthTableRoot(const Port::StringBase<char>& initValue);
+    // Lists the tree in pre-order.
+    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the order as it was made.
+    void ListInPreOrder();
+
+    // Takes an init value whose tree is owed from now on.
+    // Requires: an empty store; a value whose results are its expression's.
+    void Owe(std::unique_ptr<KqInitText> initText) noexcept;
+
+    void Clear() noexcept;
+
+    // The text of an equation that is an init value, null for any other.
+    const Port::StringBase<char>* GetInitValue() const;
+
+    // Whether both are of the same nodes.
+    bool IsSame(Store& other);
+
+    // Writes a new variable's index into the ID nodes of its name.
+    void LinkVariable(const Port::StringBase<char>& name, unsigned int variableIndex);
+    // Appends the position of every node whose token is the variable's name.
+    void AppendPositions(const Port::StringBase<char>& name,
+                         std::vector<unsigned int>& positions) const;
+
+    // The equation's value for a table of values 0 or 1; 0 without an equation.
+    // Fails: std::bad_alloc.
+    unsigned int Eval(const std::vector<Variable>& variables)
+    {
+        if (m_compiled.HasWord(variables.size()))
+            return m_compiled.EvalWord(variables);
+        return EvalOther(variables);
+    }
+    // The column of up to six variables, repeated up to the word's end.
+    // Requires: an equation.
+    uint64_t GetWord(unsigned int numVariables);
+    // The results as read, null for an equation that was not read from digits.
+    const KqInitText* GetInitText() const { return m_init_text.get(); }
+
     unsigned int m_count = 1;
 
+  private:
+    Node* MakeNode(Node::TYPE type, const Port::StringBase<char>& text);
+    void MakeRoom(size_t numNodes);
+    void FreeNodes() noexcept;
+    void EnsureTree()
+    {
+        if (!m_root && m_init_text)
+            MakeInitTree();
+    }
+    void MakeInitTree();
+    Node* MakeInitTerm(uint64_t row);
+    void AppendInitPositions(const Port::StringBase<char>& name,
+                             std::vector<unsigned int>& positions) const;
+    unsigned int EvalOther(const std::vector<Variable>& variables);
+
+    class Chain;
+
+    Node* m_root = nullptr;
+    std::vector<Node*> m_nodes;
     Node* m_block = nullptr;
     size_t m_num_slots = 0;
     KqCompiled m_compiled;
+    std::unique_ptr<KqInitText> m_init_text;
 };
 
 // Asserts invariant 3 and that links agree, for the builds that check: every node stands at the
 // place that pre-order gives it, and its parent has it as a child. A NOT's parent link may differ:
 // that of the top NOT of a negated operator inside something stays at the operator's first operand.
-void KqCheckStore(const Kq_BoolEquationImp::Store& store);
+void KqCheckStore(Kq_BoolEquationImp::Store& store);
 
 #endif

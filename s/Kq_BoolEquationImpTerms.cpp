@@ -12,26 +12,24 @@ bool Kq_BoolEquationImp::SetEquationWithExplicitTerms(const std::vector<String>&
                                                       const String& equation, bool termOrderFlag,
                                                       bool reverseTerms)
 {
+    // Everything is read before anything is cleared: the texts may be names that go.
     if (!KqInitText::IsCandidate(equation)) {
+        std::vector<Variable> inputs = ListTerms(terms, false);
         Tokens tokens(equation.length());
-        // Scanned before anything is cleared: the text may be one of the names that go.
         const bool isRead = ScanTokens(equation.c_str(), tokens);
         Clear();
         if (!isRead || tokens.GetSize() == 0)
             return false;
-        DefineTerms(terms, false);
+        m_variables.swap(inputs);
         return FinishEquation(tokens, nullptr);
     }
     // Deliberate: over listed inputs every text that starts with a 0 is an init value or refused,
     // "0&A" included.
-    const String text = equation;
+    std::vector<Variable> inputs = ListTerms(terms, reverseTerms);
+    std::unique_ptr<KqInitText> initText = KqInitText::Read(equation, inputs, termOrderFlag);
     Clear();
-    DefineTerms(terms, reverseTerms);
-    const std::string expression = KqInitText::Expand(text, GetVariableNames(), termOrderFlag);
-    Tokens tokens(expression.length());
-    if (expression.empty() || !ScanTokens(expression.c_str(), tokens)) {
-        Clear();
+    if (!initText)
         return false;
-    }
-    return FinishEquation(tokens, &text);
+    m_variables.swap(inputs);
+    return FinishInitValue(std::move(initText));
 }

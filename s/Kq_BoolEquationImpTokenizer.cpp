@@ -264,7 +264,7 @@ bool Kq_BoolEquationImp::ScanTokens(const char* text, Tokens& tokens)
 
 void Kq_BoolEquationImp::TokenizeNodes(const char* text)
 {
-    if (!text || !*text || !m_store->m_nodes.empty())
+    if (!text || !*text || !m_store->IsEmpty())
         return;
     Tokens tokens(std::strlen(text));
     if (!ScanTokens(text, tokens))

@@ -307,14 +307,14 @@ Node* TreeBuilder::FindRoot()
 
 void Kq_BoolEquationImp::BuildTree()
 {
-    if (m_store->m_root || m_store->m_nodes.empty())
+    if (m_store->HasEquation() || m_store->IsEmpty())
         return;
     {
-        TreeBuilder builder(m_store->m_nodes);
-        m_store->m_root = builder.Build(GetInternalDebugMode());
+        TreeBuilder builder(m_store->GetNodes());
+        m_store->SetRoot(builder.Build(GetInternalDebugMode()));
         if (builder.GetBrokenNode())
             builder.GetBrokenNode()->DbgFailure();
     }
-    if (!m_store->m_root)
+    if (!m_store->HasEquation())
         Clear();
 }

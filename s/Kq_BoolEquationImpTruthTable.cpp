@@ -5,8 +5,7 @@
 
 #include <algorithm>
 
-#include "Kq_BoolEquationImpColumn.h"
-#include "Kq_BoolEquationImpStore.h"
+#include "Kq_BoolEquationImpResults.h"
 
 typedef Port::StringBase<char> String;
 typedef Kq_BoolEquationImp::TruthTable TruthTable;
@@ -22,7 +21,7 @@ void SetRowValues(uint32_t rowIndex, std::vector<unsigned int>& values)
 }
 
 // Appends all rows of the column, each with one allocation.
-void AppendRows(KqColumn& column, std::vector<unsigned int>& values, std::vector<Row>& rows)
+void AppendRows(KqResults results, std::vector<unsigned int>& values, std::vector<Row>& rows)
 {
     constexpr size_t kWords = 256;
     uint64_t words[kWords];
@@ -30,7 +29,7 @@ void AppendRows(KqColumn& column, std::vector<unsigned int>& values, std::vector
     for (uint32_t rowIndex = 0; rowIndex < numRows; ++rowIndex) {
         const uint64_t word = rowIndex / 64;
         if (rowIndex % (64 * kWords) == 0)
-            column.Fill(word, std::min<uint64_t>(kWords, column.GetNumWords() - word), words);
+            results.Fill(word, std::min<uint64_t>(kWords, results.GetNumWords() - word), words);
         SetRowValues(rowIndex, values);
         rows.emplace_back(words[word % kWords] >> (rowIndex % 64) & 1u, values);
     }
@@ -130,8 +129,7 @@ void TruthTable::Build(const Kq_BoolEquationImp& equation)
         const Kq_BoolEquationImp working(equation);
         AppendTracedRows(*working.GetRoot(), working.GetVariables(), values, m_rows);
     } else {
-        KqColumn column(equation.GetRoot(), numVariables);
-        AppendRows(column, values, m_rows);
+        AppendRows(KqResults(*equation.m_store, numVariables), values, m_rows);
     }
 }
 

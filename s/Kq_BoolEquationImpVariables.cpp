@@ -182,37 +182,35 @@ bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
         return false;
     const unsigned int variableIndex = GetNumVariables();
     m_variables.push_back(Variable(name, value ? 1u : 0u));
-    for (Node* node : m_store->m_nodes) {
-        if (node->IsId() && KqIsSameText(node->GetToken(), name)) {
-            node->SetValue(variableIndex);
-            m_store->m_compiled.Drop();
-        }
-    }
+    m_store->LinkVariable(name, variableIndex);
     return true;
 }
 
-// Defines the terms as variables with value 0, while there are no nodes. A term that is not legal
-// or stands twice is skipped.
-void Kq_BoolEquationImp::DefineTerms(const std::vector<String>& terms, bool reverseTerms)
+// The variables that the terms define, with value 0. A term that is not legal or stands twice is
+// skipped.
+std::vector<Variable> Kq_BoolEquationImp::ListTerms(const std::vector<String>& terms,
+                                                    bool reverseTerms)
 {
-    assert(m_store->m_nodes.empty());
-    NameIndex index(m_variables);
+    std::vector<Variable> variables;
+    variables.reserve(terms.size());
+    NameIndex index(variables);
     for (size_t position = 0; position < terms.size(); ++position) {
         const String& name = terms[reverseTerms ? terms.size() - 1 - position : position];
         if (name.length() != 0 && IsLegalName(name) && index.Find(name) == kNotFound)
-            m_variables.push_back(Variable(name, 0u));
+            variables.push_back(Variable(name, 0u));
     }
+    return variables;
 }
 
 // Defines the name of every ID node that is no variable yet, with value 0 and in text order, and
 // writes its variable's index into every ID node. The nodes are still in the order of 'tokens'.
 void Kq_BoolEquationImp::DefineListedNames(const Tokens& tokens)
 {
-    assert(m_store->m_nodes.size() == tokens.GetSize());
+    assert(m_store->GetNodes().size() == tokens.GetSize());
     const bool hasListedTerms = !m_variables.empty();
     NameIndex terms(m_variables);
     PooledNames names;
-    Node* const* node = m_store->m_nodes.data();
+    Node* const* node = m_store->GetNodes().data();
     for (const Tokens::Token& token : tokens) {
         Node* const idNode = *node++;
         if (token.type != Node::ID)
@@ -277,12 +275,7 @@ Kq_BoolEquation::Handle Kq_BoolEquationImp::GetVariableHandle(const String& name
     if (index == kNotFound)
         return Kq_BoolEquation::Handle();
     std::vector<unsigned int> values(1, static_cast<unsigned int>(index));
-    const std::vector<Node*>& nodes = m_store->m_nodes;
-    for (size_t position = 0; position < nodes.size(); ++position) {
-        // Deliberate: the node's type is not asked for, only its token.
-        if (KqIsSameText(nodes[position]->GetToken(), name))
-            values.push_back(static_cast<unsigned int>(position));
-    }
+    m_store->AppendPositions(name, values);
     return Kq_BoolEquation::Handle(values);
 }
 

@@ -1,0 +1,43 @@
+// The result column of what a store holds: of its tree, or of the digits it was read from.
+#ifndef KQ_BOOLEQUATIONIMPRESULTS_H
+#define KQ_BOOLEQUATIONIMPRESULTS_H
+
+#include <optional>
+
+#include "Kq_BoolEquationImpColumn.h"
+#include "Kq_BoolEquationImpStore.h"
+
+class KqResults {
+  public:
+    // Requires: an equation; numVariables <= kKqMaxColumnVariables, all variables of an object that
+    // holds the store, which is neither set nor cleared while this is in use.
+    // Fails: std::bad_alloc.
+    KqResults(Kq_BoolEquationImp::Store& store, unsigned int numVariables)
+        : m_init_text(store.GetInitText()), m_num_variables(numVariables)
+    {
+        if (!m_init_text)
+            m_column.emplace(store.GetRoot(), numVariables);
+    }
+
+    // 2^numVariables / 64, at least 1.
+    uint64_t GetNumWords() const
+    {
+        return m_num_variables > 6 ? uint64_t(1) << (m_num_variables - 6) : 1;
+    }
+
+    // As KqColumn::Fill.
+    void Fill(uint64_t firstWord, size_t numWords, uint64_t* words)
+    {
+        if (m_init_text)
+            m_init_text->Fill(m_num_variables, firstWord, numWords, words);
+        else
+            m_column->Fill(firstWord, numWords, words);
+    }
+
+  private:
+    const KqInitText* m_init_text;
+    unsigned int m_num_variables;
+    std::optional<KqColumn> m_column;
+};
+
+#endif

@@ -6,6 +6,7 @@
 #define KQ_BOOLEQUATION_H
 
 #include <cstddef>
+#include <cstdint>
 #include <utility>
 #include <vector>
 
@@ -80,6 +81,11 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     // All variable names joined with "+", the last one first; empty without variables.
     Port::StringBase<char> GetInitValueTermEquation() const;
+    // The result column, 64 rows to a word: row k is bit k % 64 of word k / 64; bits beyond the last
+    // row are 0. Without variables it has the one row of a constant. The debug mode changes nothing.
+    // Fails: false, and no words, without an equation or with more than 30 variables.
+    // Cost: O(nodes * 2^n / 64); 128 MB for 30 variables.
+    bool GetColumn(std::vector<uint64_t>& words) const;
 
     // Is there no equation; is there one (null or a value that is only for testing).
     bool operator!() const;

@@ -81,6 +81,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
 
     TruthTable GetTruthTable() const;
+    bool GetColumn(std::vector<uint64_t>& words) const; // see Kq_BoolEquation
 
     // The root of the tree, null without an equation. Only for reading: results are kept of the
     // nodes, which live until the object, and every copy, is set, cleared or destroyed.

@@ -217,6 +217,11 @@ Kq_BoolEquation::TruthTable Kq_BoolEquation::GetTruthTable() const
     return TruthTable(*this);
 }
 
+bool Kq_BoolEquation::GetColumn(std::vector<uint64_t>& words) const
+{
+    return m_imp->GetColumn(words);
+}
+
 const Kq_BoolEquationImp* Kq_BoolEquation::GetImp() const
 {
     return m_imp;

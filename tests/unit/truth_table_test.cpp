@@ -196,4 +196,69 @@ TEST(TruthTable, EveryRowIsWhatEvalGives)
     }
 }
 
+// The column as the library gives it must be the rows of the truth table.
+void ExpectColumnIsTheRows(const Engine& engine)
+{
+    std::vector<uint64_t> words(3, 7);
+    ASSERT_TRUE(engine.GetColumn(words));
+    const auto rows = engine.GetTruthTable().GetRows();
+    ASSERT_EQ((rows.size() + 63) / 64, words.size());
+    for (size_t row = 0; row < words.size() * 64; ++row) {
+        const unsigned int expected = row < rows.size() ? rows[row].GetResultValue() : 0;
+        ASSERT_EQ(expected, words[row / 64] >> (row % 64) & 1u) << "row " << row;
+    }
+}
+
+TEST(TruthTable, ColumnIsTheRowsPackedWithZerosBehindThem)
+{
+    std::string text = "~v1";
+    for (int numVariables = 1; numVariables <= 12; ++numVariables) {
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquation(text.c_str()));
+        ExpectColumnIsTheRows(engine);
+        const std::string next = "v" + std::to_string(numVariables + 1);
+        text = "(" + text + (numVariables % 2 != 0 ? ") ^ " : ") | ~") + next;
+    }
+}
+
+TEST(TruthTable, ColumnOfAConstantIsOneRow)
+{
+    for (const char* text : {"0", "1", "()", "~(1 & 0)"}) {
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquation(text));
+        std::vector<uint64_t> words;
+        ASSERT_TRUE(engine.GetColumn(words)) << text;
+        EXPECT_EQ(std::vector<uint64_t>(1, engine.Eval()), words) << text;
+    }
+}
+
+TEST(TruthTable, ColumnIsRefusedWithoutEquationAndAboveThirtyVariables)
+{
+    std::vector<uint64_t> words(1, 1);
+    Engine engine;
+    EXPECT_FALSE(engine.GetColumn(words));
+    EXPECT_TRUE(words.empty());
+    ASSERT_TRUE(engine.SetEquation("A"));
+    for (int number = 1; number < 31; ++number)
+        engine.DefineVariable(("v" + std::to_string(number)).c_str(), 0);
+    words.assign(1, 1);
+    EXPECT_FALSE(engine.GetColumn(words));
+    EXPECT_TRUE(words.empty());
+}
+
+TEST(TruthTable, ColumnIsTheSameInDebugModeAndSilent)
+{
+    Kq_BoolEquation equation;
+    ASSERT_TRUE(equation.SetEquation("A & ~B | C"));
+    std::vector<uint64_t> words;
+    ASSERT_TRUE(equation.GetColumn(words));
+    const Messages messages;
+    const DebugMode debugMode;
+    std::vector<uint64_t> traced;
+    ASSERT_TRUE(equation.GetColumn(traced));
+    EXPECT_EQ(words, traced);
+    EXPECT_EQ(std::vector<uint64_t>(1, 0xba), words);
+    EXPECT_EQ("", messages.Text());
+}
+
 } // namespace

@@ -179,11 +179,11 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words) const
 {
     words.clear();
     const unsigned int numVariables = GetNumVariables();
-    if (!m_store->m_root || numVariables > kKqMaxColumnVariables)
+    if (!m_store->HasEquation() || numVariables > kKqMaxColumnVariables)
         return false;
-    KqColumn column(m_store->m_root, numVariables);
-    words.resize(column.GetNumWords());
-    column.Fill(0, words.size(), words.data());
+    KqResults results(*m_store, numVariables);
+    words.resize(results.GetNumWords());
+    results.Fill(0, words.size(), words.data());
     if (numVariables < 6) // the one word repeats the rows
         words[0] &= (uint64_t(1) << (1u << numVariables)) - 1;
     return true;

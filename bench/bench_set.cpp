@@ -77,31 +77,6 @@ bench::Case MakeLong(const std::string& text)
     return made;
 }
 
-bench::Case MakeFromInitValue(unsigned int numVariables)
-{
-    const std::string text = bench::MakeInitValue(numVariables, 1);
-    const std::vector<Port::StringBase<char>> names = bench::MakeNames(numVariables);
-    bench::Case made;
-    made.isRight = [=] {
-        Kq_BoolEquation equation;
-        return equation.SetEquationWithExplicitTerms(names, text.c_str(), false, false) &&
-               text == equation.GetEquationAsHexInitValue(false).c_str();
-    };
-    made.ours = [=](benchmark::State& state) {
-        const Port::StringBase<char> value(text.c_str());
-        for (auto _ : state) {
-            Kq_BoolEquation equation;
-            benchmark::DoNotOptimize(
-                equation.SetEquationWithExplicitTerms(names, value, false, false));
-        }
-        Kq_BoolEquation equation;
-        equation.SetEquationWithExplicitTerms(names, value, false, false);
-        const size_t numNodes = bench::CountNodes(equation.GetImp()->GetRoot());
-        bench::SetItems(state, double(numNodes), "node");
-    };
-    return made;
-}
-
 void AddLong(const std::string& kind, size_t size, std::string (*make)(size_t, size_t),
              size_t numNames)
 {
@@ -130,7 +105,4 @@ void bench::AddCases()
         AddLong("nesting_left", size, MakeDeepLeft, 20);
         AddLong("names", size, MakeWide, 100000);
     }
-    for (unsigned int numVariables : {4u, 6u, 8u, 10u, 12u})
-        AddSingle("set_init_value/n=" + std::to_string(numVariables),
-                  [=] { return MakeFromInitValue(numVariables); });
 }

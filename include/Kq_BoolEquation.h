@@ -81,9 +81,9 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     // All variable names joined with "+", the last one first; empty without variables.
     Port::StringBase<char> GetInitValueTermEquation() const;
-    // The result column, 64 rows to a word: row k is bit k % 64 of word k / 64; bits beyond the last
-    // row are 0. Without variables it has the one row of a constant. The debug mode changes nothing.
-    // Fails: false, and no words, without an equation or with more than 30 variables.
+    // The result column, 64 rows to a word: row k is bit k % 64 of word k / 64; bits beyond the
+    // last row are 0. Without variables it has the one row of a constant. The debug mode changes
+    // nothing. Fails: false, and no words, without an equation or with more than 30 variables.
     // Cost: O(nodes * 2^n / 64); 128 MB for 30 variables.
     bool GetColumn(std::vector<uint64_t>& words) const;
 
@@ -148,7 +148,7 @@ class KQ_EXPORT Kq_BoolEquation::Handle {
 
   private:
     friend class Kq_BoolEquationImp;
-    explicit Handle(const std::vector<unsigned int>& values);
+    explicit Handle(std::vector<unsigned int> values);
     std::vector<unsigned int> m_values;
 };
 

@@ -234,7 +234,7 @@ void Kq_BoolEquation::Dbg() const
 
 Kq_BoolEquation::Handle::Handle() = default;
 
-Kq_BoolEquation::Handle::Handle(const std::vector<unsigned int>& values) : m_values(values) {}
+Kq_BoolEquation::Handle::Handle(std::vector<unsigned int> values) : m_values(std::move(values)) {}
 
 Kq_BoolEquation::Handle::Handle(const Handle& other) = default;
 

@@ -3,7 +3,6 @@
 #include "Kq_BoolEquationImpInitText.h"
 
 #include <algorithm>
-#include <bitset>
 #include <cassert>
 #include <cstring>
 
@@ -187,9 +186,10 @@ void KqInitText::ChooseForm()
 {
     uint64_t numOnes = 0;
     for (const uint64_t word : m_words)
-        numOnes += std::bitset<64>(word).count();
+        numOnes += KqCountBits(word);
     const uint64_t numZeros = m_num_digits - numOnes;
     m_is_sum = numOnes != 0 && (numZeros == 0 || numOnes < numZeros);
+    m_num_terms = static_cast<size_t>(m_is_sum ? numOnes : numZeros);
 }
 
 // Gives the rows that have no digit the result that an expression without their terms has.
@@ -230,7 +230,7 @@ bool KqInitText::IsExact() const
 
 unsigned int KqInitText::CountNegations(uint64_t row, size_t numNames) const
 {
-    const size_t numOnes = std::bitset<64>(row >> (m_names.size() - numNames)).count();
+    const size_t numOnes = KqCountBits(row >> (m_names.size() - numNames));
     return static_cast<unsigned int>(m_is_sum ? numNames - numOnes : numOnes);
 }
 

@@ -57,14 +57,26 @@ class KqInitText {
     // The expression, its terms in the order of the digits, from the last to the first.
     std::string Expand() const;
 
+    size_t GetNumTerms() const { return m_num_terms; }
+
     // The row that each term stands for, in the same order.
     template <class Visit>
     void VisitTerms(Visit visit) const
     {
-        for (uint64_t digit = 0; digit < m_num_digits; ++digit) {
-            const uint64_t row = m_is_first_lowest ? ReverseBits(digit) : digit;
-            if ((m_words[row / 64] >> (row % 64) & 1u) == (m_is_sum ? 1u : 0u))
-                visit(row);
+        if (m_is_first_lowest) {
+            for (uint64_t digit = 0; digit < m_num_digits; ++digit) {
+                const uint64_t row = ReverseBits(digit);
+                if ((GetTermRows(row / 64) >> (row % 64) & 1u) != 0)
+                    visit(row);
+            }
+            return;
+        }
+        for (uint64_t word = 0; word * 64 < m_num_digits; ++word) {
+            uint64_t rows = GetTermRows(word);
+            if (m_num_digits - word * 64 < 64)
+                rows &= (uint64_t(1) << m_num_digits % 64) - 1;
+            for (; rows != 0; rows &= rows - 1)
+                visit(word * 64 + static_cast<uint64_t>(__builtin_ctzll(rows)));
         }
     }
 
@@ -91,6 +103,7 @@ class KqInitText {
 
     bool ReadDigits(unsigned int bitsPerDigit);
     void ChooseForm();
+    uint64_t GetTermRows(uint64_t word) const { return m_is_sum ? m_words[word] : ~m_words[word]; }
     void AddMissingRows();
     void ReverseRows();
     void AppendTerm(uint64_t row, std::string& text) const;
@@ -100,6 +113,7 @@ class KqInitText {
     std::vector<String> m_names;
     std::vector<uint64_t> m_words; // with fewer than six names the rows repeat up to the end
     uint64_t m_num_digits = 0;     // binary ones
+    size_t m_num_terms = 0;
     bool m_is_first_lowest;
     bool m_is_sum = false;
 };

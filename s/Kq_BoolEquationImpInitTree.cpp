@@ -79,12 +79,9 @@ class Store::Chain {
 void Store::MakeInitTree()
 {
     const KqInitText& initText = *m_init_text;
-    size_t numTerms = 0;
+    const size_t numTerms = initText.GetNumTerms();
     size_t numTermNodes = 0;
-    initText.VisitTerms([&](uint64_t row) {
-        ++numTerms;
-        numTermNodes += CountTermNodes(initText, row);
-    });
+    initText.VisitTerms([&](uint64_t row) { numTermNodes += CountTermNodes(initText, row); });
     try {
         MakeRoom(1 + CountOperators(numTerms) + numTermNodes);
         Node* const table = MakeNode(Node::TRUTH_TABLE, initText.GetText());
@@ -130,11 +127,8 @@ void Store::AppendInitPositions(const String& name, std::vector<unsigned int>& p
         ++index;
     if (index == names.size())
         return;
-    size_t numTerms = 0;
-    initText.VisitTerms([&](uint64_t) { ++numTerms; });
-    positions.reserve(positions.size() + numTerms);
     // Behind the init value's own root and the operators between terms.
-    size_t term = 1 + CountOperators(numTerms);
+    size_t term = 1 + CountOperators(initText.GetNumTerms());
     initText.VisitTerms([&](uint64_t row) {
         const size_t inTerm =
             1 + CountOperators(names.size()) + index + initText.CountNegations(row, index + 1);

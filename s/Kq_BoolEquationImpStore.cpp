@@ -189,15 +189,21 @@ void Store::LinkVariable(const String& name, unsigned int variableIndex)
     }
 }
 
-void Store::AppendPositions(const String& name, std::vector<unsigned int>& positions) const
+std::vector<unsigned int> Store::MakeHandle(const String& name, unsigned int variableIndex) const
 {
-    if (m_init_text)
-        return AppendInitPositions(name, positions);
+    std::vector<unsigned int> values;
+    values.reserve(1 + (m_init_text ? m_init_text->GetNumTerms() : 0));
+    values.push_back(variableIndex);
+    if (m_init_text) {
+        AppendInitPositions(name, values);
+        return values;
+    }
     for (size_t position = 0; position < m_nodes.size(); ++position) {
         // Deliberate: the node's type is not asked for, only its token.
         if (KqIsSameText(m_nodes[position]->GetToken(), name))
-            positions.push_back(static_cast<unsigned int>(position));
+            values.push_back(static_cast<unsigned int>(position));
     }
+    return values;
 }
 
 uint64_t Store::GetWord(unsigned int numVariables)

@@ -136,9 +136,9 @@ struct Kq_BoolEquationImp::Store {
 
     // Writes a new variable's index into the ID nodes of its name.
     void LinkVariable(const Port::StringBase<char>& name, unsigned int variableIndex);
-    // Appends the position of every node whose token is the variable's name.
-    void AppendPositions(const Port::StringBase<char>& name,
-                         std::vector<unsigned int>& positions) const;
+    // The variable's index, then the position of every node whose token is the name.
+    std::vector<unsigned int> MakeHandle(const Port::StringBase<char>& name,
+                                         unsigned int variableIndex) const;
 
     // The equation's value for a table of values 0 or 1; 0 without an equation.
     // Fails: std::bad_alloc.

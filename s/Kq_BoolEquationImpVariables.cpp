@@ -274,9 +274,7 @@ Kq_BoolEquation::Handle Kq_BoolEquationImp::GetVariableHandle(const String& name
     const size_t index = FindVariable(name);
     if (index == kNotFound)
         return Kq_BoolEquation::Handle();
-    std::vector<unsigned int> values(1, static_cast<unsigned int>(index));
-    m_store->AppendPositions(name, values);
-    return Kq_BoolEquation::Handle(values);
+    return Kq_BoolEquation::Handle(m_store->MakeHandle(name, static_cast<unsigned int>(index)));
 }
 
 unsigned int Kq_BoolEquationImp::GetNumVariables() const

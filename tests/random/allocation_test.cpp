@@ -1,71 +1,18 @@
 // The n-th allocation fails, for every n until an operation succeeds: only std::bad_alloc comes
 // out, every object is still safe to ask, assign and destroy, and nothing is leaked.
-// The global operator new is replaced by one that counts; leaks are counted by it as well.
+// Situations and promises; operations_test.cpp goes through every exported member.
 #include <cstdio>
-#include <cstdlib>
 #include <functional>
 #include <new>
 
 #include <gtest/gtest.h>
 
+#include "random/failing_memory.h"
 #include "unit/unit_support.h"
 
 namespace {
 
-size_t s_numAllocations = 0;
-bool s_isArmed = false;
-size_t s_numUntilFailure = 0;
-size_t s_numLive = 0;
-
-void* Allocate(size_t size)
-{
-    if (s_isArmed && s_numUntilFailure-- == 0) {
-        s_isArmed = false;
-        throw std::bad_alloc();
-    }
-    void* memory = std::malloc(size ? size : 1);
-    if (!memory)
-        throw std::bad_alloc();
-    ++s_numLive;
-    ++s_numAllocations;
-    return memory;
-}
-
-void Free(void* memory) noexcept
-{
-    if (memory)
-        --s_numLive;
-    std::free(memory);
-}
-
-} // namespace
-
-void* operator new(size_t size)
-{
-    return Allocate(size);
-}
-void* operator new[](size_t size)
-{
-    return Allocate(size);
-}
-void operator delete(void* memory) noexcept
-{
-    Free(memory);
-}
-void operator delete[](void* memory) noexcept
-{
-    Free(memory);
-}
-void operator delete(void* memory, size_t) noexcept
-{
-    Free(memory);
-}
-void operator delete[](void* memory, size_t) noexcept
-{
-    Free(memory);
-}
-
-namespace {
+using memory::FailingAllocation;
 
 struct Objects {
     Kq_BoolEquation a;
@@ -120,14 +67,12 @@ size_t FailEach(const Operation& operation, bool debugMode)
         Objects objects;
         Prepare(objects);
         Kq_BoolEquationImp::SetInternalDebugMode(debugMode);
-        s_numUntilFailure = failing;
-        s_isArmed = true;
         try {
+            const FailingAllocation armed(failing);
             operation(objects);
         } catch (const std::bad_alloc&) {
             hasFailed = true;
         }
-        s_isArmed = false;
         Kq_BoolEquationImp::SetInternalDebugMode(false);
         Use(objects);
         if (!hasFailed)
@@ -140,9 +85,9 @@ void ExpectSafe(const char* name, const Operation& operation)
     for (const bool debugMode : {false, true}) {
         // The first round fills what the process keeps: names, spellings.
         FailEach(operation, debugMode);
-        const size_t numLive = s_numLive;
+        const size_t numLive = memory::NumLive();
         const size_t numFailures = FailEach(operation, debugMode);
-        EXPECT_EQ(numLive, s_numLive) << name << " leaks";
+        EXPECT_EQ(numLive, memory::NumLive()) << name << " leaks";
         std::printf("%-28s %4zu failures%s\n", name, numFailures, debugMode ? ", traced" : "");
     }
 }
@@ -188,14 +133,12 @@ TEST(Allocation, FailedSettingLeavesAWholeEquationOrNone)
     for (size_t failing = 0;; ++failing) {
         Kq_BoolEquation equation("A & B");
         bool hasFailed = false;
-        s_numUntilFailure = failing;
-        s_isArmed = true;
         try {
+            const FailingAllocation armed(failing);
             equation.SetEquation("a_name_that_needs_memory & ~another_name_that_needs_memory");
         } catch (const std::bad_alloc&) {
             hasFailed = true;
         }
-        s_isArmed = false;
         if (!hasFailed)
             break;
         const std::string text = Std(equation.GetEquation(false));
@@ -209,11 +152,9 @@ TEST(Allocation, FailedAssignmentChangesNothing)
     for (size_t failing = 0;; ++failing) {
         Kq_BoolEquation a("A & B");
         const Kq_BoolEquation b("a_name_that_needs_memory | another_name_that_needs_memory");
-        s_numUntilFailure = failing;
-        s_isArmed = true;
         try {
+            const FailingAllocation armed(failing);
             a = b;
-            s_isArmed = false;
             break;
         } catch (const std::bad_alloc&) {
         }
@@ -246,14 +187,12 @@ TEST(Allocation, PoolOfNamesStaysWhole)
         bool hasFailed = false;
         Engine::StringMgr pool;
         for (const char* name : names) {
-            s_numUntilFailure = failing;
-            s_isArmed = true;
             try {
+                const FailingAllocation armed(failing);
                 pool.find(name);
             } catch (const std::bad_alloc&) {
                 hasFailed = true;
             }
-            s_isArmed = false;
         }
         for (const char* name : names) {
             EXPECT_EQ(name, Std(pool.find(name)));
@@ -268,9 +207,9 @@ TEST(Allocation, PoolOfNamesStaysWhole)
 template <class Counted>
 size_t CountAllocations(Counted operation)
 {
-    const size_t before = s_numAllocations;
+    const size_t before = memory::NumAllocations();
     operation();
-    return s_numAllocations - before;
+    return memory::NumAllocations() - before;
 }
 
 TEST(Allocation, SmallEquationsNeedFew)

@@ -1,0 +1,115 @@
+#include "random/failing_memory.h"
+
+#include <cstdlib>
+#include <cstring>
+#include <malloc.h>
+#include <new>
+
+#include <port/mav_malloc.h>
+
+namespace {
+
+size_t s_numAllocations = 0;
+size_t s_numRawAllocations = 0;
+size_t s_numLive = 0;
+bool s_isArmed = false;
+size_t s_numUntilFailure = 0;
+
+void* AllocateOrNull(size_t size)
+{
+    if (s_isArmed && s_numUntilFailure-- == 0) {
+        s_isArmed = false;
+        return nullptr;
+    }
+    void* memory = std::malloc(size ? size : 1);
+    if (!memory)
+        return nullptr;
+    ++s_numLive;
+    ++s_numAllocations;
+    return memory;
+}
+
+void* Allocate(size_t size)
+{
+    void* memory = AllocateOrNull(size);
+    if (!memory)
+        throw std::bad_alloc();
+    return memory;
+}
+
+void Free(void* memory) noexcept
+{
+    if (!memory)
+        return;
+    --s_numLive;
+    // Large blocks are given back to the system anyway.
+    const size_t size = malloc_usable_size(memory);
+    if (size <= 4096)
+        std::memset(memory, 0xdd, size);
+    std::free(memory);
+}
+
+} // namespace
+
+size_t memory::NumAllocations()
+{
+    return s_numAllocations;
+}
+
+size_t memory::NumRawAllocations()
+{
+    return s_numRawAllocations;
+}
+
+size_t memory::NumLive()
+{
+    return s_numLive;
+}
+
+memory::FailingAllocation::FailingAllocation(size_t numBefore)
+{
+    s_numUntilFailure = numBefore;
+    s_isArmed = true;
+}
+
+memory::FailingAllocation::~FailingAllocation()
+{
+    s_isArmed = false;
+}
+
+void* operator new(size_t size)
+{
+    return Allocate(size);
+}
+void* operator new[](size_t size)
+{
+    return Allocate(size);
+}
+void operator delete(void* memory) noexcept
+{
+    Free(memory);
+}
+void operator delete[](void* memory) noexcept
+{
+    Free(memory);
+}
+void operator delete(void* memory, size_t) noexcept
+{
+    Free(memory);
+}
+void operator delete[](void* memory, size_t) noexcept
+{
+    Free(memory);
+}
+
+// An executable's own definition comes before the host library's.
+void* mav_malloc(size_t size)
+{
+    ++s_numRawAllocations;
+    return AllocateOrNull(size);
+}
+
+void mav_free(void* memory)
+{
+    Free(memory);
+}

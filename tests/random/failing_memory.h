@@ -1,0 +1,28 @@
+// Memory whose n-th allocation fails: the global operator new and the host's raw memory, replaced
+// for the whole executable. Both count, so leaks show; freed memory is overwritten, so that what
+// is still used by mistake does not look whole.
+#ifndef FAILING_MEMORY_H
+#define FAILING_MEMORY_H
+
+#include <cstddef>
+
+namespace memory {
+
+// Allocations so far, and those that have not been freed.
+size_t NumAllocations();
+size_t NumLive();
+// Allocations of the host's raw memory, mav_malloc, so far.
+size_t NumRawAllocations();
+
+// While it lives, allocation number 'numBefore', counted from 0, fails; those behind it do not.
+class FailingAllocation {
+  public:
+    explicit FailingAllocation(size_t numBefore);
+    ~FailingAllocation();
+    FailingAllocation(const FailingAllocation&) = delete;
+    FailingAllocation& operator=(const FailingAllocation&) = delete;
+};
+
+} // namespace memory
+
+#endif

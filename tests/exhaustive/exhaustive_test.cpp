@@ -157,24 +157,10 @@ TEST(Exhaustive, EveryTextOfSixCharactersAroundDotsAndQuotesAgrees)
     checker.ExpectCounts(39913, 557957);
 }
 
-// Debug mode, whatever happens.
-class DebugMode {
-  public:
-    DebugMode() { Set(true); }
-    ~DebugMode() { Set(false); }
-
-  private:
-    static void Set(bool on)
-    {
-        reference::SetDebugMode(on);
-        Kq_BoolEquationImp::SetInternalDebugMode(on);
-    }
-};
-
 TEST(Exhaustive, UpToFiveTokensTraceAndDumpTheSameInDebugMode)
 {
     Checker checker;
-    DebugMode debugMode;
+    support::DebugMode debugMode;
     for (size_t length = 1; length <= 5; ++length) {
         ForEachText(kOneOfEachKind, length, "", [&checker](const std::string& text) {
             checker.Check(text);

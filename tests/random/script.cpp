@@ -10,49 +10,22 @@ namespace {
 
 using support::RandomText;
 
-const char* const kOpNames[] = {
-    "Create",       "CreateFromText", "CreateCopy",       "Assign",     "Clear",
-    "Set",          "SetTerms",       "Define",           "SetVar",     "GetVar",
-    "GetHandle",    "UseHandle",      "CompareHandles",   "DumpHandle", "CompareObjects",
-    "Eval",         "Render",         "RenderInitValues", "Dump",       "DumpRoot",
-    "SetDebugMode", "BuildTable",     "CompareTables",    "ReadTable",  "Tokenize",
-    "Build"};
+const char* const kOpNames[] = {"Create",         "CreateFromText", "CreateCopy",
+                                "Assign",         "Clear",          "Set",
+                                "SetTerms",       "Define",         "SetVar",
+                                "GetVar",         "GetHandle",      "UseHandle",
+                                "CompareHandles", "DumpHandle",     "CompareObjects",
+                                "Eval",           "Render",         "RenderInitValues",
+                                "Dump",           "DumpRoot",       "SetDebugMode",
+                                "BuildTable",     "CompareTables",  "ReadTable",
+                                "Tokenize",       "Build",          "Ask"};
 
-const size_t kWeights[] = {1, 2, 5, 7, 2, 15, 8, 10, 10, 4, 5, 6, 1,
-                           1, 4, 6, 4, 4, 2,  2, 1,  4,  2, 2, 2, 0};
-
-const std::vector<std::string> kNames = {"a", "b", "c", "A", "x1", "'q r'"};
-
-const std::vector<std::string>& OddNames()
-{
-    static const std::vector<std::string> names = {
-        "_",
-        "''",
-        "'a'+b",
-        "'a'xyz",
-        "'a')",
-        "'a'\n",
-        "'",
-        "'abc",
-        "1x",
-        "",
-        "a-b",
-        "a b",
-        "a.",
-        "\xc3\xa4",
-        std::string("a\0b", 3),
-        std::string("a\0", 2),
-        std::string("\0a", 2),
-        std::string("'\0'", 3),
-        "a_name_that_is_much_longer_than_sixteen_characters",
-        "a",
-        "b"};
-    return names;
-}
+const size_t kWeights[] = {1, 2, 5, 7, 2, 15, 8, 10, 10, 4, 5, 6, 1, 1,
+                           4, 6, 4, 4, 2, 2,  1, 4,  2,  2, 2, 0, 20};
 
 std::string Name(RandomText& random)
 {
-    return random.Chance(75) ? random.OneOf(kNames) : random.OneOf(OddNames());
+    return random.Chance(75) ? random.OneOf(UsualNames()) : random.OneOf(OddNames());
 }
 
 std::string InitValue(RandomText& random, size_t numVariables)
@@ -73,11 +46,11 @@ std::string EquationText(RandomText& random)
     const size_t kind = random.Below(100);
     const size_t numTokens = 1 + random.Below(random.Chance(90) ? 9 : 24);
     if (kind < 55)
-        return random.WellFormed(numTokens, kNames, true);
+        return random.WellFormed(numTokens, UsualNames(), true);
     if (kind < 70)
-        return random.Mutated(random.WellFormed(numTokens, kNames, true));
+        return random.Mutated(random.WellFormed(numTokens, UsualNames(), true));
     if (kind < 80)
-        return random.TokenSoup(numTokens, kNames);
+        return random.TokenSoup(numTokens, UsualNames());
     if (kind < 85)
         return random.Bytes(random.Below(12));
     return InitValue(random, random.Below(4));
@@ -132,6 +105,9 @@ Step RandomStep(RandomText& random, bool isEngine)
     case Op::SetDebugMode:
         step.firstFlag = random.Chance(25);
         break;
+    case Op::Ask:
+        step.value = static_cast<unsigned int>(random.Below(16));
+        break;
     default:
         step.text = Name(random);
     }
@@ -148,7 +124,7 @@ void AppendInitValue(RandomText& random, std::vector<Step>& steps)
     const size_t numVariables = random.Below(5);
     for (size_t index = 0; index < numVariables; ++index) {
         step.op = Op::Define;
-        step.text = random.Chance(90) ? kNames[index] : Name(random);
+        step.text = random.Chance(90) ? UsualNames()[index] : Name(random);
         steps.push_back(step);
     }
     step.op = Op::Set;
@@ -162,11 +138,11 @@ void AppendBuildByHand(RandomText& random, std::vector<Step>& steps)
     Step step;
     step.object = random.Below(kNumObjects);
     step.op = Op::Tokenize;
-    step.text = random.WellFormed(1 + random.Below(9), kNames, true);
+    step.text = random.WellFormed(1 + random.Below(9), UsualNames(), true);
     steps.push_back(step);
     for (size_t numSteps = random.Below(5); numSteps > 0; --numSteps) {
         step.op = random.Chance(30) ? Op::Build : Op::Define;
-        step.text = random.OneOf(kNames);
+        step.text = random.OneOf(UsualNames());
         steps.push_back(step);
     }
     step.op = Op::Build;
@@ -174,6 +150,39 @@ void AppendBuildByHand(RandomText& random, std::vector<Step>& steps)
 }
 
 } // namespace
+
+const std::vector<std::string>& UsualNames()
+{
+    static const std::vector<std::string> names = {"a", "b", "c", "A", "x1", "'q r'"};
+    return names;
+}
+
+const std::vector<std::string>& OddNames()
+{
+    static const std::vector<std::string> names = {
+        "_",
+        "''",
+        "'a'+b",
+        "'a'xyz",
+        "'a')",
+        "'a'\n",
+        "'",
+        "'abc",
+        "1x",
+        "",
+        "a-b",
+        "a b",
+        "a.",
+        "\xc3\xa4",
+        std::string("a\0b", 3),
+        std::string("a\0", 2),
+        std::string("\0a", 2),
+        std::string("'\0'", 3),
+        "a_name_that_is_much_longer_than_sixteen_characters",
+        "a",
+        "b"};
+    return names;
+}
 
 std::vector<Step> RandomScript(unsigned int seed, size_t numSteps, bool isEngine)
 {
@@ -204,6 +213,14 @@ std::string Describe(const Step& step)
     }
     text += " flags=" + std::to_string(step.firstFlag) + std::to_string(step.secondFlag);
     return text + " value=" + std::to_string(step.value);
+}
+
+std::string Describe(const std::vector<Step>& steps)
+{
+    std::string text;
+    for (const Step& step : steps)
+        text += "  " + Describe(step) + "\n";
+    return text;
 }
 
 } // namespace script

@@ -38,6 +38,7 @@ enum class Op {
     ReadTable,
     Tokenize, // engine only; clears first
     Build,    // engine only
+    Ask,      // one question, 'value' says which
     kCount
 };
 
@@ -59,6 +60,12 @@ struct Step {
 std::vector<Step> RandomScript(unsigned int seed, size_t numSteps, bool isEngine);
 
 std::string Describe(const Step& step);
+// A line for each step.
+std::string Describe(const std::vector<Step>& steps);
+
+// Names that scripts use: legal ones, and others that are refused or legal all the same.
+const std::vector<std::string>& UsualNames();
+const std::vector<std::string>& OddNames();
 
 } // namespace script
 

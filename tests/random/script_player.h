@@ -58,6 +58,8 @@ class Player {
     std::string PlayTexts(const Step& step);
     std::string PlayTables(const Step& step);
     std::string PlayByHand(const Step& step);
+    std::string PlayQuestion(const Step& step);
+    std::string PlayRendering(const Step& step);
 
     std::array<std::unique_ptr<Equation>, kNumObjects> m_objects;
     std::array<Handle, kNumHandles> m_handles;
@@ -133,6 +135,8 @@ std::string Player<Side>::Play(const Step& step)
     case Op::Tokenize:
     case Op::Build:
         return PlayByHand(step);
+    case Op::Ask:
+        return PlayQuestion(step);
     case Op::kCount:
         break;
     }
@@ -295,6 +299,62 @@ std::string Player<Side>::PlayByHand(const Step& step)
         Side::Build(equation);
     }
     return "";
+}
+
+// One question at a time: whatever the library puts off is then asked for in every order.
+template <class Side>
+std::string Player<Side>::PlayQuestion(const Step& step)
+{
+    const Equation& equation = *m_objects[step.object];
+    std::vector<unsigned int> values;
+    switch (step.value % 16) {
+    case 0:
+        return std::to_string(!equation);
+    case 1:
+        return std::to_string(equation.IsExpression());
+    case 2:
+        return std::to_string(equation.IsHexInitValue());
+    case 3:
+        return std::to_string(equation.IsBinaryInitValue());
+    case 4:
+        return std::to_string(equation.Eval());
+    case 5:
+        return TellTree(Side::Tree(equation));
+    case 6:
+        return std::to_string(Side::IsSameTree(equation, *m_objects[step.other]));
+    case 7: // the variables' values in reverse, and not all of them
+        for (size_t index = equation.GetNumVariables(); index-- > (step.firstFlag ? 1 : 0);)
+            values.push_back(equation.GetVariables()[index].second + (step.secondFlag ? 2 : 0));
+        return std::to_string(Side::EvalNodes(equation, values));
+    case 8:
+        return std::to_string(equation == *m_objects[step.other]);
+    default:
+        return PlayRendering(step);
+    }
+}
+
+template <class Side>
+std::string Player<Side>::PlayRendering(const Step& step)
+{
+    const Equation& equation = *m_objects[step.object];
+    switch (step.value % 16) {
+    case 9:
+        return Side::ToStd(equation.GetEquation(step.firstFlag));
+    case 10:
+        return Side::ToStd(equation.GetEquationAlt1(step.firstFlag));
+    case 11:
+        return Side::ToStd(equation.GetEquationAlt2(step.firstFlag));
+    case 12:
+        return Side::ToStd(equation.GetEquationAlt3(step.firstFlag));
+    case 13:
+        return Side::ToStd(equation.GetEquationAsExpression(step.firstFlag));
+    case 14:
+        return IsTabulated(equation) ? Side::ToStd(equation.GetEquationAsBinaryInitValue()) : "";
+    default:
+        return IsTabulated(equation)
+                   ? Side::ToStd(equation.GetEquationAsHexInitValue(step.firstFlag))
+                   : "";
+    }
 }
 
 template <class Side>

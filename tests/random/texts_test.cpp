@@ -6,9 +6,10 @@
 #include <functional>
 #include <iostream>
 
-#include "reference/evaluation.h"
-#include "support/equation_compare.h"
+#include "reference/equation.h"
+#include "support/library_view.h"
 #include "support/random_text.h"
+#include "support/text_compare.h"
 
 namespace {
 
@@ -18,70 +19,6 @@ typedef std::function<std::string(support::RandomText&)> Generator;
 const Texts kFewNames = {"a", "b", "c", "'d e'"};
 const Texts kTenNames = {"a", "B", "c_1", "_", "''", "'0x8'", "'&'", "AND", "x", "'.OR.'"};
 
-// Node evaluation for tables whose entries are any 32 bits, shorter tables included.
-std::string CompareNodeEval(unsigned int seed, const reference::Equation& model,
-                            const Kq_BoolEquationImp& library)
-{
-    support::RandomText random(seed);
-    for (int round = 0; round < 4; ++round) {
-        std::vector<unsigned int> values;
-        std::vector<std::pair<Port::StringBase<char>, unsigned int>> table;
-        const size_t numEntries = model.GetNumVariables() + (round == 3 ? 0 : 1);
-        while (values.size() + 1 < numEntries) {
-            values.push_back(
-                static_cast<unsigned int>(random.Below(round == 0 ? 4 : size_t(1) << 32)));
-            table.push_back({"unused", values.back()});
-        }
-        const reference::Store& store = model.GetStore();
-        if (reference::EvalTree(store.nodes, store.root, values) != library.GetRoot()->Eval(table))
-            return "node evaluation differs in round " + std::to_string(round);
-    }
-    return "";
-}
-
-// Whether a tree read back from its own rendering is the same on both sides too.
-std::string CompareReadBack(const reference::Equation& model, const Kq_BoolEquationImp& library)
-{
-    reference::Equation modelAgain;
-    Kq_BoolEquationImp libraryAgain;
-    support::Capture capture;
-    const bool expected = modelAgain.SetEquation(model.GetEquation(true));
-    if (expected != libraryAgain.SetEquation(library.GetEquation(true)))
-        return "the rendering is read back by one side only";
-    if ((modelAgain == model) != (libraryAgain == library) ||
-        (modelAgain != model) != (libraryAgain != library))
-        return "the rendering is read back as the same tree by one side only";
-    return support::CompareState(modelAgain, libraryAgain);
-}
-
-std::string CompareText(unsigned int seed, const std::string& text)
-{
-    reference::Equation model;
-    Kq_BoolEquationImp library;
-    support::Capture capture;
-    std::string difference = support::CompareSet(text, model, library, capture);
-    if (!difference.empty() || !model)
-        return difference;
-    difference = CompareNodeEval(seed, model, library);
-    return difference.empty() ? CompareReadBack(model, library) : difference;
-}
-
-// Removes pieces of the text, long ones first, while it still fails.
-std::string Shrink(unsigned int seed, std::string text)
-{
-    for (size_t length = text.size() / 2; length > 0; length /= 2) {
-        for (size_t position = 0; position + length <= text.size();) {
-            std::string shorter = text;
-            shorter.erase(position, length);
-            if (CompareText(seed, shorter).empty())
-                position += length;
-            else
-                text = shorter;
-        }
-    }
-    return text;
-}
-
 // The number of accepted texts among 'numTexts'.
 size_t CheckTexts(unsigned int firstSeed, unsigned int numTexts, const Generator& generate)
 {
@@ -89,10 +26,10 @@ size_t CheckTexts(unsigned int firstSeed, unsigned int numTexts, const Generator
     for (unsigned int seed = firstSeed; seed < firstSeed + numTexts; ++seed) {
         support::RandomText random(seed);
         const std::string text = generate(random);
-        if (!CompareText(seed, text).empty()) {
-            const std::string shrunk = Shrink(seed, text);
+        if (!support::CompareText(seed, text).empty()) {
+            const std::string shrunk = support::ShrinkText(seed, text);
             ADD_FAILURE() << "seed " << seed << ", text \"" << support::Printable(shrunk)
-                          << "\": " << CompareText(seed, shrunk);
+                          << "\": " << support::CompareText(seed, shrunk);
             break;
         }
         reference::Equation model;
@@ -170,8 +107,8 @@ TEST(Texts, FailureDumpsOf250To262NodesAgree)
             std::string text = "& ";
             while (text.size() < 2 * numNodes)
                 text += unit;
-            EXPECT_EQ(CompareText(1, text), "") << numNodes << " " << unit;
-            EXPECT_EQ(CompareText(1, text + "a"), "") << numNodes << " " << unit;
+            EXPECT_EQ(support::CompareText(1, text), "") << numNodes << " " << unit;
+            EXPECT_EQ(support::CompareText(1, text + "a"), "") << numNodes << " " << unit;
         }
     }
 }

@@ -60,6 +60,18 @@ Capture::~Capture()
     Port_MsgManData::setSink(m_former);
 }
 
+DebugMode::DebugMode()
+{
+    reference::SetDebugMode(true);
+    Kq_BoolEquationImp::SetInternalDebugMode(true);
+}
+
+DebugMode::~DebugMode()
+{
+    reference::SetDebugMode(false);
+    Kq_BoolEquationImp::SetInternalDebugMode(false);
+}
+
 Port::StringBase<char> ToPort(const std::string& text)
 {
     Port::StringBase<char> result;

@@ -35,6 +35,15 @@ class Capture {
     Port_MsgManData::Sink m_former;
 };
 
+// Debug mode of library and model, whatever happens, while it lives.
+class DebugMode {
+  public:
+    DebugMode();
+    ~DebugMode();
+    DebugMode(const DebugMode&) = delete;
+    DebugMode& operator=(const DebugMode&) = delete;
+};
+
 Port::StringBase<char> ToPort(const std::string& text);
 std::string ToStd(const Port::StringBase<char>& text);
 std::vector<Port::StringBase<char>> ToPort(const std::vector<std::string>& texts);

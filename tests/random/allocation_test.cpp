@@ -280,4 +280,73 @@ TEST(Allocation, AThrowingSinkIsTreatedTheSame)
     }
 }
 
+// An init value's tree is made when somebody asks for it.
+TEST(Allocation, TreeThatIsOwedIsOwedStillAfterAFailure)
+{
+    const std::string expected = "(a_name_that_needs_memory|B)&(~a_name_that_needs_memory|~B)";
+    Kq_BoolEquationImp warm;
+    warm.SetEquationWithExplicitTerms({"a_name_that_needs_memory", "B"}, "0x6", false, false);
+    EXPECT_EQ(expected, Std(warm.GetEquationAlt1(false)));
+    warm.Clear();
+    const size_t numLive = memory::NumLive();
+    size_t numFailures = 0;
+    for (size_t failing = 0;; ++failing) {
+        Kq_BoolEquationImp equation;
+        ASSERT_TRUE(equation.SetEquationWithExplicitTerms({"a_name_that_needs_memory", "B"}, "0x6",
+                                                          false, false));
+        Kq_BoolEquationImp copy(equation);
+        bool hasFailed = false;
+        try {
+            const FailingAllocation armed(failing);
+            equation.GetRoot();
+        } catch (const std::bad_alloc&) {
+            hasFailed = true;
+        }
+        if (!hasFailed)
+            break;
+        ++numFailures;
+        // As it was, for copies and assignments too.
+        EXPECT_FALSE(!equation);
+        EXPECT_EQ("0x6", Std(equation.GetEquationAsHexInitValue(false)));
+        EXPECT_EQ(0u, copy.Eval());
+        EXPECT_EQ("0x6", Std(copy.GetEquation(false)));
+        if (failing % 2 == 0)
+            equation = Kq_BoolEquationImp();
+        EXPECT_EQ(expected, Std(copy.GetEquationAlt1(false)));
+        EXPECT_EQ(copy.GetRoot(), Kq_BoolEquationImp(copy).GetRoot());
+        copy.Clear();
+        EXPECT_EQ(failing % 2 == 0 ? "" : expected, Std(equation.GetEquationAlt1(false)));
+    }
+    EXPECT_EQ(numLive, memory::NumLive());
+    EXPECT_LT(3u, numFailures) << "the list, the block, and long texts in nodes";
+}
+
+TEST(Allocation, InitValueAnswersWithoutNodes)
+{
+    std::vector<String> names;
+    for (const char* name : {"A", "B", "C", "D", "E", "F"})
+        names.push_back(name);
+    Kq_BoolEquationImp equation;
+    ASSERT_TRUE(equation.SetEquationWithExplicitTerms(names, "0x123456789abcdef0", true, false));
+    const Kq_BoolEquationImp copy(equation);
+    equation.DefineVariable("G", 1);
+    equation.Eval();
+    equation.GetEquation(true);
+    equation.GetEquationAsHexInitValue(true);
+    equation.GetEquationAsBinaryInitValue();
+    equation.GetTruthTable();
+    EXPECT_EQ(33u, equation.GetVariableHandle("F").size());
+    EXPECT_FALSE(equation.IsExpression());
+    EXPECT_FALSE(copy == Kq_BoolEquationImp());
+    std::vector<uint64_t> words;
+    EXPECT_TRUE(equation.GetColumn(words));
+    // Making the nodes takes memory, so there were none yet; once they are there, none is taken.
+    const size_t numBefore = memory::NumAllocations();
+    ASSERT_NE(nullptr, copy.GetRoot());
+    EXPECT_LT(numBefore, memory::NumAllocations());
+    const size_t numAfter = memory::NumAllocations();
+    ASSERT_NE(nullptr, equation.GetRoot());
+    EXPECT_EQ(numAfter, memory::NumAllocations());
+}
+
 } // namespace

@@ -15,7 +15,7 @@ import sys
 
 # Overloads that are private, of names that are public too.
 PRIVATE = {
-    "Kq_BoolEquation::Handle::Handle(std::vector<unsigned int, std::allocator<unsigned int> > const&)",
+    "Kq_BoolEquation::Handle::Handle(std::vector<unsigned int, std::allocator<unsigned int> >)",
     "Kq_BoolEquationImp::Node::Dbg(int) const",
 }
 CLASS = re.compile(r"class KQ_EXPORT ([\w:]+) \{")

@@ -20,7 +20,7 @@ std::vector<String> FirstNames(size_t numNames)
 std::string Digits(std::mt19937& random, size_t numDigits)
 {
     std::string text = "0b";
-    const unsigned int density = random() % 9;
+    const size_t density = random() % 9;
     for (size_t digit = 0; digit < numDigits; ++digit)
         text += random() % 8 < density ? '1' : '0';
     return text;
@@ -101,7 +101,7 @@ TEST(OwedTree, ResultsComeFromTheDigits)
             ASSERT_TRUE(expression.GetTruthTable() == value.GetTruthTable()) << text;
             for (int assignment = 0; assignment < 20; ++assignment) {
                 for (const auto& variable : expression.GetVariables()) {
-                    const unsigned int isSet = random() % 2;
+                    const unsigned int isSet = random() % 2 != 0 ? 1 : 0;
                     expression.SetVariable(variable.first, isSet);
                     value.SetVariable(variable.first, isSet);
                 }

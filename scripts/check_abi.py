@@ -5,26 +5,52 @@ usage: check_abi.py LIBRARY HEADERS BASELINE [--update]
 
 LIBRARY carries debug information, HEADERS is the folder of the public headers, BASELINE the text
 that --update writes. What programs built before rely on must stay: functions, their arguments and
-results, sizes and layouts of public classes. Types that are only declared in HEADERS do not count.
-Additions are printed and allowed.
+results, sizes and layouts of public classes. Private member functions and types that are only
+declared in HEADERS do not count: no inline function of the headers calls them. Additions are
+printed and allowed.
 Exit status: 1 when something was removed or changed.
 """
 import argparse
 import pathlib
-import re
 import subprocess
 import sys
 import tempfile
+from xml.etree import ElementTree
 
 ABIDW = ["abidw", "--exported-interfaces-only", "--no-parameter-names", "--no-write-default-sizes",
          "--drop-private-types", "--no-comp-dir-path", "--no-corpus-path", "--no-show-locs"]
 
 
+def internal_functions(root):
+    """Symbols of member functions that are private, or of classes that headers only declare."""
+    for each in root.iter("class-decl"):
+        is_internal = each.get("is-declaration-only") == "yes"
+        for member in each.findall("member-function"):
+            if is_internal or member.get("access") == "private":
+                yield from (function.get("mangled-name") for function in member)
+
+
 def read_interface(library, headers):
     text = subprocess.run([*ABIDW, "--headers-dir", headers, library], stdout=subprocess.PIPE,
                           text=True, check=True).stdout
+    root = ElementTree.fromstring(text)
+    internal = set(internal_functions(root))
+    # A constructor has several symbols, one of which names the others as its aliases.
+    for symbol in root.iter("elf-symbol"):
+        names = {symbol.get("name"), *filter(None, symbol.get("alias", "").split(","))}
+        if names & internal:
+            internal |= names
+    for parent in list(root.iter()):
+        for child in list(parent):
+            functions = list(child) if child.tag == "member-function" else [child]
+            if any((function.tag == "function-decl" and function.get("mangled-name") in internal) or
+                   (function.tag == "elf-symbol" and function.get("name") in internal)
+                   for function in functions):
+                parent.remove(child)
     # Where the sources lie is no part of the interface.
-    return re.sub(r" path='[^']*/([^'/]*)'", r" path='\1'", text)
+    for unit in root.iter("abi-instr"):
+        unit.set("path", unit.get("path").rpartition("/")[2])
+    return ElementTree.tostring(root, encoding="unicode") + "\n"
 
 
 def compare(*arguments):

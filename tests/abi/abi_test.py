@@ -21,12 +21,17 @@ class Value {
     std::vector<unsigned int> Get(unsigned int index) const;
     bool Set(unsigned int value);
   private:
+    void Check() const;
+    Value(unsigned int value, int);
     Hidden* m_hidden;
     unsigned int m_value;
 };
 """
 SOURCE = """#include "value.h"
-struct Value::Hidden { int m_first = 1; };
+struct Value::Hidden { int m_first = 1; void Use(); };
+void Value::Hidden::Use() {}
+void Value::Check() const { m_hidden->Use(); }
+Value::Value(unsigned int value, int) : m_value(value) {}
 Value::Value() : m_hidden(new Hidden), m_value(0) {}
 Value::~Value() { delete m_hidden; }
 std::vector<unsigned int> Value::Get(unsigned int index) const
@@ -86,6 +91,12 @@ class Abi(unittest.TestCase):
     def test_type_that_headers_do_not_define(self):
         self.assertEqual(self.changed("int m_first = 1;", "long m_first = 1; int m_more = 2;"),
                          (0, ""))
+        self.assertEqual(self.changed("Use()", "Use2()"), (0, ""))
+
+    def test_private_members(self):
+        self.assertEqual(self.changed("Check()", "Check2()"), (0, ""))
+        self.assertEqual(self.changed("Value(unsigned int value, int)",
+                                      "Value(unsigned int value, long)"), (0, ""))
 
     def test_removal(self):
         self.build(HEADER.replace("bool Set(unsigned int value);", ""),

@@ -151,6 +151,14 @@ const std::vector<Operation> kOfEngine = {
          EXPECT_TRUE(o.engine.GetColumn(words));
      }},
     {"Kq_BoolEquationImp::GetTruthTable() const", [](Objects& o) { o.engine.GetTruthTable(); }},
+    {"Kq_BoolEquationImp::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
+     "const",
+     [](Objects& o) {
+         std::vector<uint64_t> words;
+         o.engine.GetColumn(words);
+         o.other.SetEquation("0x4b");
+         o.other.GetColumn(words);
+     }},
     {"Kq_BoolEquationImp::GetRoot() const", [](Objects& o) { Ask(o.engine.GetRoot()); }},
     {"Kq_BoolEquationImp::Dbg() const", [](Objects& o) { o.engine.Dbg(); }},
     {"Kq_BoolEquationImp::GetInternalDebugMode()",

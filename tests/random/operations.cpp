@@ -87,6 +87,12 @@ const std::vector<Operation> kOfEquation = {
      [](Objects& o) { o.a.GetEquationAsBinaryInitValue(); }},
     {"Kq_BoolEquation::GetInitValueTermEquation() const",
      [](Objects& o) { o.a.GetInitValueTermEquation(); }},
+    {"Kq_BoolEquation::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
+     "const",
+     [](Objects& o) {
+         std::vector<uint64_t> words;
+         o.a.GetColumn(words);
+     }},
     {"Kq_BoolEquation::operator!() const", [](Objects& o) { Ask(!o.a); }},
     {"Kq_BoolEquation::operator Kq_PtrTester*() const",
      [](Objects& o) { Ask(static_cast<Kq_PtrTester*>(o.a)); }},

@@ -144,12 +144,6 @@ const std::vector<Operation> kOfEngine = {
      [](Objects& o) { o.handle = o.engine.GetVariableHandle("C"); }},
     {"Kq_BoolEquationImp::GetNumVariables() const", [](Objects& o) { o.engine.GetNumVariables(); }},
     {"Kq_BoolEquationImp::GetVariables() const", [](Objects& o) { Ask(o.engine.GetVariables()); }},
-    {"Kq_BoolEquationImp::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
-     "const",
-     [](Objects& o) {
-         std::vector<uint64_t> words;
-         EXPECT_TRUE(o.engine.GetColumn(words));
-     }},
     {"Kq_BoolEquationImp::GetTruthTable() const", [](Objects& o) { o.engine.GetTruthTable(); }},
     {"Kq_BoolEquationImp::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
      "const",

@@ -126,12 +126,6 @@ const std::vector<Operation> kOfEquation = {
      [](Objects& o) { o.handle = o.a.GetVariableHandle("C"); }},
     {"Kq_BoolEquation::GetNumVariables() const", [](Objects& o) { o.a.GetNumVariables(); }},
     {"Kq_BoolEquation::GetVariables() const", [](Objects& o) { Ask(o.a.GetVariables()); }},
-    {"Kq_BoolEquation::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
-     "const",
-     [](Objects& o) {
-         std::vector<uint64_t> words;
-         EXPECT_TRUE(o.a.GetColumn(words));
-     }},
     {"Kq_BoolEquation::GetTruthTable() const", [](Objects& o) { o.a.GetTruthTable(); }},
     {"Kq_BoolEquation::GetImp() const", [](Objects& o) { o.a.GetImp(); }},
     {"Kq_BoolEquation::Dbg() const", [](Objects& o) { o.a.Dbg(); }},

@@ -53,6 +53,11 @@ void RunPlain(const KqCode* codes, size_t numCodes, bool isInverted, size_t numW
     RunTiles<Vectors<16>, 8>(codes, numCodes, isInverted, numWords, stack, words);
 }
 
+void JoinPlain(const KqJoin& join, uint64_t* words)
+{
+    JoinValues<Vectors<16>>(join, words);
+}
+
 bool IsAlwaysSupported()
 {
     return true;
@@ -70,21 +75,27 @@ bool IsAvx512Supported()
 }
 #endif
 
-const KqNamedKernel kKernels[] = {{"plain", RunPlain, IsAlwaysSupported},
+const KqNamedKernel kKernels[] = {{"plain", RunPlain, JoinPlain, IsAlwaysSupported},
 #if defined(KQ_HAS_X86_KERNELS)
-                                  {"avx2", KqRunAvx2, IsAvx2Supported},
-                                  {"avx512", KqRunAvx512, IsAvx512Supported}
+                                  {"avx2", KqRunAvx2, KqJoinAvx2, IsAvx2Supported},
+                                  {"avx512", KqRunAvx512, KqJoinAvx512, IsAvx512Supported}
 #endif
 };
 
-KqKernel ChooseKernel()
+const KqNamedKernel& ChooseKernel()
 {
-    KqKernel best = RunPlain;
+    const KqNamedKernel* best = kKernels;
     for (const KqNamedKernel& kernel : kKernels) {
         if (kernel.isSupported())
-            best = kernel.run;
+            best = &kernel;
     }
-    return best;
+    return *best;
+}
+
+const KqNamedKernel& GetKernel()
+{
+    static const KqNamedKernel& kernel = ChooseKernel();
+    return kernel;
 }
 
 } // namespace
@@ -96,11 +107,10 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels)
 }
 
 KqColumn::KqColumn(const Node* root, unsigned int numVariables)
-    : m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1)
+    : m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1),
+      m_kernel(GetKernel().run), m_joiner(GetKernel().join)
 {
     assert(numVariables <= kKqMaxColumnVariables);
-    static const KqKernel kernel = ChooseKernel();
-    m_kernel = kernel;
     KqProgram program = KqCompile(root, numVariables, true);
     m_codes.swap(program.codes);
     m_num_codes = program.numCodes;
@@ -160,7 +170,9 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
         if (CopyWritten(rest, ownLevel, words))
             return Repeat(NumWords(ownLevel), NumWords(level), words);
         RunKernel(rest, ownLevel, words);
-    } else if (!CopyWritten(rest, ownLevel, words)) {
+    } else if (!CopyWritten(rest, ownLevel, words) &&
+               !m_joiner.Fill(m_codes.data() + rest.first, rest.numCodes, rest.isInverted, ownLevel,
+                              words)) {
         ExpandHalves(rest, ownLevel, words);
     }
     m_written[rest.hash % kNumWritten] = Written{rest, ownLevel, m_generation, words};

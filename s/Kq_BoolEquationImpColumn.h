@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "Kq_BoolEquationImpColumnJoin.h"
 #include "Kq_BoolEquationImpProgram.h"
 
 // Deliberate: 30 variables are tabulated, 31 are not; row numbers stay within 32 bits.
@@ -26,6 +27,7 @@ typedef void (*KqKernel)(const KqCode* codes, size_t numCodes, bool isInverted, 
 struct KqNamedKernel {
     const char* name;
     KqKernel run;
+    KqJoinKernel join;
     bool (*isSupported)(); // by this processor
 };
 
@@ -92,6 +94,7 @@ class KqColumn {
 
     uint64_t m_num_words;
     KqKernel m_kernel;
+    KqJoiner m_joiner;
     std::vector<KqCode> m_codes; // the program, then what is left of it
     size_t m_num_codes = 0;      // of m_codes that are in use
     Rest m_whole;

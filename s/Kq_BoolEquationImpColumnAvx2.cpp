@@ -7,3 +7,8 @@ void KqRunAvx2(const KqCode* codes, size_t numCodes, bool isInverted, size_t num
 {
     RunTiles<Vectors<32>, 8>(codes, numCodes, isInverted, numWords, stack, words);
 }
+
+void KqJoinAvx2(const KqJoin& join, uint64_t* words)
+{
+    JoinValues<Vectors<32>>(join, words);
+}

@@ -7,3 +7,8 @@ void KqRunAvx512(const KqCode* codes, size_t numCodes, bool isInverted, size_t n
 {
     RunTiles<Vectors<64>, 8>(codes, numCodes, isInverted, numWords, stack, words);
 }
+
+void KqJoinAvx512(const KqJoin& join, uint64_t* words)
+{
+    JoinValues<Vectors<64>>(join, words);
+}

@@ -255,6 +255,62 @@ TEST(Column, EveryKernelGivesWhatThePlainOneGives)
     }
 }
 
+// Blocks made by joins against the plain kernel, with the joins of each processor by name; trees in
+// which every operand has few variables, so that joins are taken.
+TEST(Column, JoinsOfEveryKernelGiveWhatThePlainKernelGives)
+{
+    size_t numKernels = 0;
+    const KqNamedKernel* kernels = KqGetKernels(&numKernels);
+    std::mt19937 random(20267);
+    std::vector<uint64_t> stack(kKqMaxStack * kKqTileWords);
+    size_t numTaken = 0;
+    for (unsigned int count = 0; count < 400; ++count) {
+        const unsigned int numVariables = 12 + count % 6;
+        const std::string text = RandomGroups(random, numVariables, 1 + count % 24);
+        const Engine engine = MakeEngine(text, numVariables);
+        const KqProgram program = KqCompile(engine.GetRoot(), numVariables, true);
+        std::vector<uint64_t> plain(size_t(1) << (numVariables - 6), 1);
+        kernels[0].run(program.codes.data(), program.numCodes, program.isInverted, plain.size(),
+                       stack.data(), plain.data());
+        for (size_t index = 0; index < numKernels; ++index) {
+            std::vector<uint64_t> words(plain.size(), 2);
+            KqJoiner joiner(kernels[index].join);
+            if (!kernels[index].isSupported())
+                continue;
+            if (!joiner.Fill(program.codes.data(), program.numCodes, program.isInverted,
+                             numVariables, words.data())) {
+                EXPECT_EQ(std::vector<uint64_t>(plain.size(), 2), words) << "nothing is written";
+                continue;
+            }
+            ASSERT_TRUE(plain == words) << kernels[index].name << ": " << text;
+            ++numTaken;
+        }
+    }
+    EXPECT_GT(numTaken, 300u);
+}
+
+TEST(Column, LargeTreesAreRightWhereverTheirBlocksComeFrom)
+{
+    std::mt19937 random(20268);
+    for (unsigned int count = 0; count < 24; ++count) {
+        const unsigned int numVariables = 20 + count % 4;
+        const std::string text = RandomGroups(random, numVariables, 2 * numVariables);
+        const Engine engine = MakeEngine(text, numVariables);
+        const std::vector<uint64_t> words = WholeColumn(engine);
+        ExpectColumn(engine, words, text);
+        // In pieces, as texts are written.
+        KqColumn column(engine.GetRoot(), numVariables);
+        std::vector<uint64_t> piece(2048);
+        for (uint64_t first = words.size(); first > 0; first -= piece.size()) {
+            column.Fill(first - piece.size(), piece.size(), piece.data());
+            ASSERT_TRUE(
+                std::equal(piece.begin(), piece.end(),
+                           words.begin() + static_cast<std::ptrdiff_t>(first - piece.size())))
+                << text;
+        }
+    }
+}
+
 TEST(Program, HasNeitherGroupsNorConstants)
 {
     const KqProgram constant =

@@ -31,7 +31,7 @@ bool IsBinary(const Node* node)
     case Node::RP:
     case Node::TRUTH_TABLE:
     case Node::SENTINEL:
-        return false;
+        break;
     }
     return false;
 }
@@ -90,6 +90,7 @@ struct Operator {
     uint32_t inversion;
 };
 
+// Requires: a binary operator.
 Operator OperatorOf(Node::TYPE type)
 {
     constexpr KqCode invertBoth = kKqInvertLower | kKqInvertUpper;
@@ -102,10 +103,9 @@ Operator OperatorOf(Node::TYPE type)
         return {kKqAnd | invertBoth, 1};
     case Node::NOR:
         return {kKqAnd | invertBoth, 0};
-    case Node::XOR:
-        return {kKqXor, 0};
     case Node::NXOR:
         return {kKqXor, 1};
+    case Node::XOR:
     case Node::ZERO:
     case Node::ONE:
     case Node::ID:
@@ -116,7 +116,6 @@ Operator OperatorOf(Node::TYPE type)
     case Node::SENTINEL:
         break;
     }
-    assert(false && "a binary operator");
     return {kKqXor, 0};
 }
 

@@ -173,7 +173,7 @@ class Scanner {
             return ScanQuotedName();
         case REFUSED:
         case DIGIT_OF_NAME:
-            return false;
+            break;
         }
         return false;
     }

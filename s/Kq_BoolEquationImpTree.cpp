@@ -4,6 +4,7 @@
 // Cost: O(nodes); a walk up is paid for by the nodes that then lie below the new operator.
 #include <Kq_BoolEquationImp.h>
 
+#include <cassert>
 #include <unordered_map>
 
 #include "Kq_BoolEquationImpStore.h"
@@ -95,11 +96,13 @@ class TreeBuilder {
             m_holders.erase(operand);
     }
 
+    // Requires: 'child' is a child of 'parent'.
     static void ReplaceChild(Node* parent, const Node* child, Node* replacement)
     {
+        assert(parent->GetLeftChild() == child || parent->GetRightChild() == child);
         if (parent->GetLeftChild() == child)
             parent->SetLeftChild(replacement);
-        else if (parent->GetRightChild() == child)
+        else
             parent->SetRightChild(replacement);
     }
 
@@ -123,8 +126,6 @@ bool TreeBuilder::Place(Node* node)
         return PlaceOperand(node);
     case Node::RP:
         return PlaceRightParen(node);
-    case Node::SENTINEL:
-        return false;
     case Node::AND:
     case Node::NAND:
     case Node::NOR:
@@ -132,6 +133,7 @@ bool TreeBuilder::Place(Node* node)
     case Node::OR:
     case Node::TRUTH_TABLE:
     case Node::XOR:
+    case Node::SENTINEL: // no token makes one
         break;
     }
     return m_cursor->IsNot() ? PlaceNegatedOperator(node) : PlaceOperator(node);
@@ -202,18 +204,13 @@ bool TreeBuilder::PlaceOperator(Node* node)
     return true;
 }
 
-// A binary operator whose 'anchor' is no operator: the operator becomes the anchor's child in the
-// cursor's place.
+// A binary operator whose 'anchor' is no operator: the operator becomes the anchor's left child in
+// the cursor's place. The right one is never an operand: operands go right below operators only.
 bool TreeBuilder::PlaceInGroup(Node* node, Node* anchor)
 {
     if (anchor->GetLeftChild() == m_cursor) {
         anchor->SetLeftChild(node);
         TakeLeft(node, m_cursor);
-    } else if (anchor->GetRightChild() == m_cursor) {
-        // Deliberate: the operand goes right, and the next one fills the left slot.
-        anchor->SetRightChild(node);
-        node->SetRightChild(m_cursor);
-        m_cursor->SetParent(node);
     } else {
         if (!anchor->IsLp())
             return false;
@@ -280,9 +277,8 @@ bool HasAllowedChildren(const Node& node)
     case Node::OR:
     case Node::TRUTH_TABLE:
     case Node::XOR:
-        return left && right;
-    case Node::SENTINEL:
-        return false;
+    case Node::SENTINEL: // no token makes one
+        break;
     }
     return left && right;
 }

@@ -71,6 +71,20 @@ TEST_F(Messages, AreFormattedAsPrintfDoes)
     EXPECT_EQ(m_texts.back(), "   7 ab    |005\n");
 }
 
+// A wide character that no byte sequence stands for cannot be printed; a null format says nothing.
+TEST_F(Messages, WhatCannotBeFormattedIsNotIssued)
+{
+    Port_MsgManData::setSink(Collect());
+    Port_MsgManData& object = Port_MsgManData::createObject("", "", 0, "");
+    const wchar_t wide[] = {static_cast<wchar_t>(0x7fffffff), 0};
+    object.issueStatus("%ls", wide);
+    const char* const format = nullptr;
+    object.issueStatus(format);
+    EXPECT_TRUE(m_texts.empty());
+    object.issueStatus("%s", "text");
+    EXPECT_EQ(m_texts, std::vector<std::string>{"text"});
+}
+
 TEST_F(Messages, NullOriginsCountAsEmpty)
 {
     std::string origin = "not called";

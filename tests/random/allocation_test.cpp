@@ -113,6 +113,14 @@ TEST(Allocation, SettingIsSafeWhateverFails)
     ExpectSafe("many names", [](Objects& o) {
         o.a.SetEquation("a+b+c+d+e+f+g+h+i+j+k+l+m+n+o+p+q+r+s+t+u+v+w+x+y+z+a1+b1+c1+d1");
     });
+    // Walks keep a few nodes without the heap; this text needs more.
+    ExpectSafe("long chain", [](Objects& o) {
+        std::string chain = "P";
+        for (unsigned int count = 0; count < 150; ++count)
+            chain += "&P";
+        Kq_BoolEquationImp::SetInternalDebugMode(false); // traces grow with the square
+        o.a.SetEquation(chain.c_str());
+    });
     ExpectSafe("own name", [](Objects& o) { o.a.SetEquation(o.a.GetVariables()[0].first); });
 }
 

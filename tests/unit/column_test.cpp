@@ -201,6 +201,24 @@ TEST(Column, ManyTermsOverFewVariables)
     ExpectColumn(MakeEngine(text, 12), WholeColumn(MakeEngine(text, 12)), "5000 operators");
 }
 
+// What fixing a variable leaves is kept while there is room; these leave more.
+TEST(Column, ManyOperatorsOverManyVariables)
+{
+    std::mt19937 random(20268);
+    const Engine engine = MakeEngine(RandomGroups(random, 20, 2500), 20);
+    ExpectColumn(engine, WholeColumn(engine), "2500 operators");
+}
+
+// Blocks too large to be copied: each half of x0 ^ ... is the complement of the other.
+TEST(Column, LargestBlocksAreExpandedAgain)
+{
+    std::string text = "x0";
+    for (unsigned int variable = 1; variable < 22; ++variable)
+        text += " ^ x" + std::to_string(variable);
+    const Engine engine = MakeEngine(text, 22);
+    ExpectColumn(engine, WholeColumn(engine), text);
+}
+
 TEST(Column, DeepTreesOfEitherSideNeedLittle)
 {
     for (const bool isRightNested : {false, true}) {

@@ -1,4 +1,4 @@
-// The input is an expression over up to 14 variables, and pieces of its column. The whole column,
+// The input is an expression over up to 17 variables, and pieces of its column. The whole column,
 // the pieces, every kernel and evaluation, by nodes and compiled, give what plain operations on
 // columns of bits give while the expression is written.
 #include <algorithm>
@@ -17,7 +17,8 @@ namespace {
 
 typedef std::vector<uint64_t> Column;
 
-const unsigned int kMaxVariables = 14;
+// Blocks above the rows of 14 variables are split.
+const unsigned int kMaxVariables = 17;
 // A kernel works on tiles of 64 words, the rows of 12 variables.
 const unsigned int kMinKernelVariables = 12;
 const size_t kMaxOperators = 200;
@@ -50,10 +51,17 @@ size_t NumWords(unsigned int numVariables)
 // than six variables repeat up to the end of the word.
 Operand Variable(unsigned int variable, unsigned int numVariables)
 {
+    static const uint64_t kPatterns[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu,
+                                          0xf0f0f0f0f0f0f0f0u, 0xff00ff00ff00ff00u,
+                                          0xffff0000ffff0000u, 0xffffffff00000000u};
     const unsigned int bit = numVariables - 1 - variable;
     Operand operand = {"x" + std::to_string(variable), Column(NumWords(numVariables), 0)};
-    for (size_t row = 0; row < operand.column.size() * 64; ++row)
-        operand.column[row / 64] |= uint64_t(row >> bit & 1u) << (row % 64);
+    for (size_t word = 0; word < operand.column.size(); ++word) {
+        if (bit < 6)
+            operand.column[word] = kPatterns[bit];
+        else if ((word >> (bit - 6) & 1u) != 0)
+            operand.column[word] = ~uint64_t(0);
+    }
     return operand;
 }
 
@@ -134,8 +142,9 @@ Case Read(const std::string& input)
     const size_t numWords = NumWords(given.numVariables);
     given.firstRow = bytes.Next() * 257;
     for (size_t count = bytes.Below(kMaxPieces); count > 0; --count) {
-        const size_t first = bytes.Next() % numWords;
-        given.pieces.push_back(Piece{first, 1 + bytes.Next() % (numWords - first)});
+        const size_t first = bytes.Next() * 256 % numWords + bytes.Next() % numWords;
+        const size_t limit = numWords - first % numWords;
+        given.pieces.push_back(Piece{first % numWords, 1 + bytes.Next() * 16 % limit});
     }
     given.expression = ReadExpression(bytes, given.numVariables);
     return given;

@@ -4,6 +4,7 @@
 // well.
 #include <algorithm>
 #include <array>
+#include <cstdint>
 
 #include "fuzz/bytes.h"
 #include "fuzz/target.h"
@@ -32,6 +33,7 @@ enum Action {
     AskExpression,
     AskAlternative,
     AskTable,
+    AskColumn,
     AskKind,
     AskVariables,
     AskEqual,
@@ -43,11 +45,11 @@ enum Action {
     kNumActions
 };
 
-const char* const kActionNames[] = {"Eval",        "hex init value", "binary init value",
-                                    "GetEquation", "as expression",  "alternative",
-                                    "truth table", "kind",           "variables",
-                                    "equality",    "read back",      "SetVariable",
-                                    "Define",      "copy from",      "Clear"};
+const char* const kActionNames[] = {
+    "Eval",          "hex init value", "binary init value", "GetEquation",
+    "as expression", "alternative",    "truth table",       "column",
+    "kind",          "variables",      "equality",          "read back",
+    "SetVariable",   "Define",         "copy from",         "Clear"};
 
 struct Step {
     Action action;
@@ -216,6 +218,7 @@ class Objects {
   private:
     std::string PlayQuestion(const Step& step);
     std::string CompareTable(size_t object) const;
+    std::string CompareColumn(size_t object) const;
     std::string CompareVariables(size_t object) const;
     std::string CompareReadBack(size_t object) const;
     void Change(const Step& step);
@@ -312,6 +315,8 @@ std::string Objects::PlayQuestion(const Step& step)
                     InSyntax(flag ? 1 : 2, expected.Expression()));
     case AskTable:
         return CompareTable(step.object);
+    case AskColumn:
+        return CompareColumn(step.object);
     case AskKind:
         return Told(!equation != expected.isSet && !equation.IsExpression() &&
                     equation.IsHexInitValue() == isHex &&
@@ -343,6 +348,23 @@ std::string Objects::CompareTable(size_t object) const
             number = number * 2 + value;
         if (actual.GetResultValue() != column[row] || number != row)
             return "row " + std::to_string(row) + " differs";
+    }
+    return "";
+}
+
+std::string Objects::CompareColumn(size_t object) const
+{
+    const Expected& expected = m_expected[object];
+    std::vector<uint64_t> words(1, 1);
+    if (m_objects[object].GetColumn(words) != expected.isSet)
+        return "has a column or not";
+    const std::vector<unsigned int> column =
+        expected.isSet ? expected.Column() : std::vector<unsigned int>();
+    if (words.size() != (column.size() + 63) / 64)
+        return "column of another size";
+    for (size_t row = 0; row < column.size(); ++row) {
+        if ((words[row / 64] >> (row % 64) & 1u) != column[row])
+            return "row " + std::to_string(row) + " of the column differs";
     }
     return "";
 }

@@ -36,7 +36,8 @@ import sys
 
 FOLDERS = ["cmake", "include", "port", "s", "scripts", "tests"]
 FILES = ["CMakeLists.txt", "README.md"]
-CONFIGURE = ["-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug", "-DCMAKE_CXX_FLAGS_DEBUG=-O1",
+CONFIGURE = ["-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
+             "-DCMAKE_CXX_FLAGS_DEBUG=-O1 -D_GLIBCXX_ASSERTIONS",
              "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", "-DKQ_BUILD_TOOLS=OFF"]
 LIBRARY = "kq_boolequation"
 
@@ -223,8 +224,7 @@ class Tree:
     def __init__(self, root, work):
         self.source, self.build = work / "tree", work / "build"
         self.copy(root)
-        if not (self.build / "build.ninja").exists():
-            self.run(["cmake", "-S", self.source, "-B", self.build, *CONFIGURE])
+        self.run(["cmake", "-S", self.source, "-B", self.build, *CONFIGURE])
         targets = [LIBRARY, *sorted({pathlib.Path(name).name for name, _ in self.tests()})]
         self.run(["ninja", "-C", self.build, "-j1", *targets])
         self.objects = {}  # by source or header: [(command, object)]

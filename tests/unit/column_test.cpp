@@ -116,6 +116,25 @@ TEST(Column, FewVariablesRepeatUpToTheEndOfTheWord)
     EXPECT_EQ(~uint64_t(0), WholeColumn(MakeEngine("1", 3))[0]);
 }
 
+TEST(Column, FewVariablesAreOneWord)
+{
+    for (unsigned int numVariables = 1; numVariables <= 8; ++numVariables) {
+        const Engine engine = MakeEngine("x0", numVariables);
+        EXPECT_EQ(numVariables <= 6 ? 1u : 1u << (numVariables - 6),
+                  KqColumn(engine.GetRoot(), numVariables).GetNumWords());
+    }
+}
+
+// A block that is met again is copied only while it is small.
+TEST(Column, LargeBlocksThatAreMetAgain)
+{
+    std::string rest = "x21";
+    for (unsigned int index = 21; index-- > 1;)
+        rest = "(" + rest + (index % 3 != 0 ? ") ^ ~x" : ") | x") + std::to_string(index);
+    const Engine engine = MakeEngine("(" + rest + ") ^ x0", 22);
+    ExpectColumn(engine, WholeColumn(engine), rest);
+}
+
 TEST(Column, MissingTreeIsZeroAndForeignVariablesAreZero)
 {
     uint64_t word = 1;

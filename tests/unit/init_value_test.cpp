@@ -49,6 +49,22 @@ TEST(InitValue, WidthFollowsTheNumberOfVariables)
     EXPECT_EQ("0b1" + std::string(65535, '0'), BinaryOf("A&B&C&D&E&F&G&H&I&J&K&L&M&N&O&P"));
 }
 
+TEST(InitValue, DebugModeGivesTheSameDigits)
+{
+    std::string text = "~v1";
+    for (int number = 2; number <= 9; ++number) {
+        text = "(" + text + (number % 2 != 0 ? ") ^ v" : ") | ~v") + std::to_string(number);
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquation(text.c_str()));
+        const std::string hex = Std(engine.GetEquationAsHexInitValue(true));
+        const std::string binary = Std(engine.GetEquationAsBinaryInitValue());
+        const Messages messages;
+        const DebugMode debugMode;
+        EXPECT_EQ(hex, Std(engine.GetEquationAsHexInitValue(true))) << text;
+        EXPECT_EQ(binary, Std(engine.GetEquationAsBinaryInitValue())) << text;
+    }
+}
+
 TEST(InitValue, ConstantsHaveNoDigitsOfTheirOwn)
 {
     // Deliberate: the constant 1 as well, and no digit at all in the binary form.

@@ -196,6 +196,24 @@ TEST(TruthTable, EveryRowIsWhatEvalGives)
     }
 }
 
+// More rows than are computed at a time.
+TEST(TruthTable, ManyRowsAreWhatEvalGives)
+{
+    std::string text = "v0";
+    for (int number = 1; number < 16; ++number)
+        text = "(" + text + (number % 3 != 0 ? ") ^ v" : ") | ~v") + std::to_string(number);
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation(text.c_str()));
+    std::vector<std::pair<String, unsigned int>> values = engine.GetVariables();
+    const Table table = engine.GetTruthTable();
+    ASSERT_EQ(65536u, table.GetRows().size());
+    for (const Table::Row& row : table.GetRows()) {
+        for (size_t column = 0; column < values.size(); ++column)
+            values[column].second = row.GetVariableValues()[column];
+        ASSERT_EQ(engine.GetRoot()->Eval(values), row.GetResultValue());
+    }
+}
+
 // The column as the library gives it must be the rows of the truth table.
 void ExpectColumnIsTheRows(const Engine& engine)
 {

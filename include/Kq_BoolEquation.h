@@ -1,7 +1,7 @@
 // Boolean equations: text in, tree, values, truth table and look-up-table init values out.
 // The class that callers hold; it owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: equations and everything made from them belong to one thread at a time, process-wide.
+// Threads: one at a time for all calls in the process, with synchronisation in between; see README.
 #ifndef KQ_BOOLEQUATION_H
 #define KQ_BOOLEQUATION_H
 

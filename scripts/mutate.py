@@ -93,7 +93,8 @@ TOKEN = re.compile(r"""
   | (?P<blank>\s+)
 """, re.X | re.M | re.S)
 
-Mutant = collections.namedtuple("Mutant", "path line begin end before after")
+# What to put between two places of a file; the line there, before and after, blanks closed up.
+Mutant = collections.namedtuple("Mutant", "path line begin end after old new")
 
 
 # --- what to change -----------------------------------------------------------------------------
@@ -170,17 +171,10 @@ def mutants_of(path, root):
         if index in skipped or any(pattern.search(lines[line - 1]) for pattern in SPEED_ONLY):
             continue
         for begin, end, after in changes(tokens, source, index):
-            yield Mutant(path, line, begin, end, source[begin:end], after)
-
-
-def described(mutant, root):
-    """The line, before and after, blanks closed up: what the list of equivalent mutants holds."""
-    source = (root / mutant.path).read_text()
-    first = source.rfind("\n", 0, mutant.begin) + 1
-    last = source.find("\n", mutant.end)
-    before = source[first:last]
-    after = source[first:mutant.begin] + mutant.after + source[mutant.end:last]
-    return " ".join(before.split()), " ".join(after.split())
+            first, last = source.rfind("\n", 0, begin) + 1, source.find("\n", end)
+            changed = source[first:begin] + after + source[end:last]
+            yield Mutant(path, line, begin, end, after, " ".join(source[first:last].split()),
+                         " ".join(changed.split()))
 
 
 def read_equivalent(path):
@@ -368,8 +362,7 @@ def campaign(trees, mutants, count, report):
             batch = mutants[position:position + min(4 * len(trees), count - len(results))]
             position += len(batch)
             for mutant, result in pool.map(work, batch):
-                before, after = described(mutant, trees[0].source)
-                print(f"{mutant.path}:{mutant.line}: {result}\n- {before}\n+ {after}",
+                print(f"{mutant.path}:{mutant.line}: {result}\n- {mutant.old}\n+ {mutant.new}",
                       file=report, flush=True)
                 if result.startswith(("killed", "survived")):
                     results.append((mutant, result))
@@ -398,26 +391,24 @@ def main():
     mutants = choose(root, arguments.seed, arguments.only)
     if arguments.list:
         for mutant in mutants:
-            before, after = described(mutant, root)
-            print(f"{mutant.path}:{mutant.line}\n- {before}\n+ {after}")
+            print(f"{mutant.path}:{mutant.line}\n- {mutant.old}\n+ {mutant.new}")
         print(f"{len(mutants)} mutants")
         return 0
 
     equivalent = read_equivalent(root / "scripts" / "mutants_equivalent.txt")
     mutants = [mutant for mutant in mutants
-               if (mutant.path, *described(mutant, root)) not in equivalent]
+               if (mutant.path, mutant.old, mutant.new) not in equivalent]
     if arguments.survivors:
         survived = read_survivors(arguments.work / "report.txt")
         mutants = [mutant for mutant in mutants
-                   if (mutant.path, *described(mutant, root)) in survived]
+                   if (mutant.path, mutant.old, mutant.new) in survived]
     trees = [Tree(root, arguments.work.resolve() / str(job)) for job in range(arguments.jobs)]
     with open(arguments.work / "report.txt", "w", encoding="utf-8") as report:
         print(f"seed {arguments.seed}, sources {digest(root)}", file=report)
         results = campaign(trees, mutants, arguments.count, report)
     survivors = [mutant for mutant, result in results if result == "survived"]
     for mutant in sorted(survivors):
-        before, after = described(mutant, trees[0].source)
-        print(f"{mutant.path}:{mutant.line}\n- {before}\n+ {after}")
+        print(f"{mutant.path}:{mutant.line}\n- {mutant.old}\n+ {mutant.new}")
     killed = len(results) - len(survivors)
     print(f"{killed} of {len(results)} mutants killed"
           f" ({100 * killed / max(1, len(results)):.1f} %); {arguments.work}/report.txt has all")

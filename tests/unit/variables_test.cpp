@@ -27,6 +27,21 @@ TEST(Variables, IllegalNamesAreRefused)
     EXPECT_EQ(0u, engine.GetNumVariables());
 }
 
+TEST(Variables, EveryByteIsALegalFirstOrLaterOneOrNone)
+{
+    const std::string letters = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz_";
+    const std::string digits = "0123456789";
+    for (int code = 1; code < 256; ++code) {
+        const char byte = static_cast<char>(code);
+        const bool isLetter = letters.find(byte) != std::string::npos;
+        const bool isDigit = digits.find(byte) != std::string::npos;
+        Engine engine;
+        EXPECT_EQ(isLetter, engine.DefineVariable(std::string(1, byte).c_str(), 0)) << code;
+        EXPECT_EQ(isLetter || isDigit, engine.DefineVariable((std::string("a") + byte).c_str(), 0))
+            << code;
+    }
+}
+
 TEST(Variables, SpellingIsCheckedUpToANulAndComparedInFull)
 {
     Engine engine;

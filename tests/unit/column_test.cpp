@@ -135,6 +135,20 @@ TEST(Column, LargeBlocksThatAreMetAgain)
     ExpectColumn(engine, WholeColumn(engine), rest);
 }
 
+// A program that stays long while variables are fixed: what is left of it is given up in between.
+TEST(Column, LongProgramsOverManyVariables)
+{
+    std::mt19937 random(20268);
+    std::string text = "x0";
+    for (unsigned int term = 0; term < 2000; ++term) {
+        text += " ^ (x" + std::to_string(random() % 19);
+        text += " & x" + std::to_string(random() % 19);
+        text += " & x" + std::to_string(random() % 19) + ")";
+    }
+    const Engine engine = MakeEngine(text, 19);
+    ExpectColumn(engine, WholeColumn(engine), "long");
+}
+
 TEST(Column, MissingTreeIsZeroAndForeignVariablesAreZero)
 {
     uint64_t word = 1;

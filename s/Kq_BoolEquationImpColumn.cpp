@@ -8,6 +8,7 @@
 #include <cstring>
 
 #include "Kq_BoolEquationImpColumnKernel.h"
+#include "Kq_BoolEquationImpJoinKernel.h"
 #include "Kq_BoolEquationImpWriter.h"
 
 typedef Kq_BoolEquationImp::Node Node;

@@ -1,6 +1,8 @@
-// The kernel of the result column for processors with AVX-512: 512 rows to a vector. Compiled for
+// The kernels of the result column for processors with AVX-512: 512 rows to a vector. Compiled for
 // them, so nothing here may be called before the processor is known to be one.
 #include "Kq_BoolEquationImpColumnKernel.h"
+
+#include "Kq_BoolEquationImpJoinKernel.h"
 
 void KqRunAvx512(const KqCode* codes, size_t numCodes, bool isInverted, size_t numWords,
                  uint64_t* stack, uint64_t* words)

@@ -49,7 +49,7 @@ KqJoiner::Value KqJoiner::VariableValue(uint32_t variable)
 bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int level,
                             size_t& numWords)
 {
-    uint32_t stack[kKqMaxStack];
+    uint32_t stack[kKqMaxStack] = {};
     uint32_t* top = stack;
     uint32_t hand = 0;
     size_t numGranules = 0;

@@ -147,4 +147,32 @@ TEST(Large, InitValueOfSixteenVariablesReadsBack)
     EXPECT_TRUE(value == Std(engine.GetEquationAsHexInitValue(false)));
 }
 
+// 2^24 rows; the tree would have 500 million nodes.
+TEST(Large, InitValueOfManyRowsNeedsNoTree)
+{
+    std::vector<String> names;
+    for (int number = 0; number < 24; ++number)
+        names.push_back(("v" + std::to_string(number)).c_str());
+    std::string text = "0x" + std::string(size_t(1) << 22, '0');
+    text[2] = '8';
+    text[text.size() - 1] = '1';
+    text[text.size() - 2] = '4';
+    for (const bool termOrderFlag : {false, true}) {
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquationWithExplicitTerms(names, text.c_str(), termOrderFlag, false));
+        EXPECT_EQ(1u, engine.Eval());
+        engine.SetVariable(termOrderFlag ? "v1" : "v22", 1);
+        EXPECT_EQ(0u, engine.Eval());
+        engine.SetVariable(termOrderFlag ? "v2" : "v21", 1);
+        EXPECT_EQ(1u, engine.Eval()) << "row 6 has a digit of its own";
+        // Two "+" between three terms; in the first term every name is negated.
+        const Kq_BoolEquation::Handle handle = engine.GetVariableHandle("v0");
+        const std::vector<unsigned int> positions(handle.begin(), handle.end());
+        EXPECT_EQ((std::vector<unsigned int>{0, 28, 28 + 73, 28 + 73 + 71 - 1}), positions);
+        if (!termOrderFlag) {
+            EXPECT_EQ(text, Std(engine.GetEquationAsHexInitValue(false)));
+        }
+    }
+}
+
 } // namespace

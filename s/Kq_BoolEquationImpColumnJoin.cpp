@@ -101,9 +101,12 @@ bool KqJoiner::Fill(const KqCode* codes, size_t numCodes, bool isInverted, unsig
     if (numCodes < 2 || level > kKqGranuleLevel + kKqMaxJoinLevels ||
         !IsWorthwhile(codes, numCodes, level, numWords))
         return false;
-    if (m_words.size() < numWords)
-        m_words.resize(numWords);
-    uint64_t* free = m_words.data();
+    if (m_num_words < numWords) {
+        m_num_words = 0;
+        m_words.reset(new uint64_t[numWords]);
+        m_num_words = numWords;
+    }
+    uint64_t* free = m_words.get();
     Value stack[kKqMaxStack];
     Value* top = stack;
     Value hand = {0, nullptr, 0};

@@ -6,7 +6,7 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <vector>
+#include <memory>
 
 #include "Kq_BoolEquationImpProgram.h"
 
@@ -35,7 +35,6 @@ struct KqJoin {
     KqJoinOperand upper;
 };
 
-// 'words' may be those of an operand that has all variables of the result.
 typedef void (*KqJoinKernel)(const KqJoin& join, uint64_t* words);
 
 class KqJoiner {
@@ -65,7 +64,8 @@ class KqJoiner {
     static Value VariableValue(uint32_t variable);
 
     KqJoinKernel m_kernel;
-    std::vector<uint64_t> m_words; // of the values on the way
+    std::unique_ptr<uint64_t[]> m_words; // of the values on the way, unset at first
+    size_t m_num_words = 0;
 };
 
 #endif

@@ -8,7 +8,7 @@
 #include <port/Port_MsgManData.h>
 
 #include "refusal.h"
-#include "text.h"
+#include "core/text.h"
 
 namespace {
 

@@ -3,6 +3,9 @@
 #include <cerrno>
 #include <cstring>
 
+#include <sys/stat.h>
+
+#include "core/text.h"
 #include "output.h"
 
 namespace booleq {
@@ -13,7 +16,22 @@ constexpr size_t kBufferBytes = 65536;
 
 } // namespace
 
-LineReader::LineReader(std::FILE* stream) : m_stream(stream), m_buffer(kBufferBytes) {}
+LineReader::LineReader(const std::string& path)
+    : m_name(path == "-" ? "standard input" : Visible(path)),
+      m_stream(path == "-" ? stdin : std::fopen(path.c_str(), "rb")), m_buffer(kBufferBytes)
+{
+    if (!m_stream)
+        throw IoError("cannot open " + m_name, errno);
+    struct stat status;
+    if (fstat(fileno(m_stream), &status) == 0 && S_ISREG(status.st_mode))
+        m_size = static_cast<uint64_t>(status.st_size);
+}
+
+LineReader::~LineReader()
+{
+    if (m_stream != stdin)
+        std::fclose(m_stream);
+}
 
 bool LineReader::Next(std::string& line)
 {
@@ -41,7 +59,8 @@ bool LineReader::Fill()
     m_position = 0;
     m_end = std::fread(m_buffer.data(), 1, m_buffer.size(), m_stream);
     if (m_end == 0 && std::ferror(m_stream))
-        throw IoError("cannot read standard input", errno);
+        throw IoError("cannot read " + m_name, errno);
+    m_num_read += m_end;
     return m_end > 0;
 }
 

@@ -1,7 +1,8 @@
-// Lines of any length from a stream; only memory bounds them.
+// Lines of any length from a file or standard input; only memory bounds them.
 #ifndef BOOLEQ_LINES_H
 #define BOOLEQ_LINES_H
 
+#include <cstdint>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -11,16 +12,29 @@ namespace booleq {
 // Invariant: the bytes from m_position on are read from the stream but not yet given out.
 class LineReader {
   public:
-    explicit LineReader(std::FILE* stream);
+    // Reads the file, "-" being standard input.
+    // Fails: IoError when it cannot be opened.
+    explicit LineReader(const std::string& path);
+    ~LineReader();
+    LineReader(const LineReader&) = delete;
+    LineReader& operator=(const LineReader&) = delete;
+
     // The next line without its line feed; a last line needs none. NUL bytes and carriage returns
     // are handed on.
     // Fails: false behind the last line; IoError when the stream cannot be read.
     bool Next(std::string& line);
 
+    // Bytes read so far, and in all; 0 in all when nobody knows (a pipe).
+    uint64_t GetPosition() const { return m_num_read - (m_end - m_position); }
+    uint64_t GetSize() const { return m_size; }
+
   private:
     bool Fill();
 
+    std::string m_name; // for complaints
     std::FILE* m_stream;
+    uint64_t m_size = 0;
+    uint64_t m_num_read = 0;
     std::vector<char> m_buffer;
     size_t m_position = 0;
     size_t m_end = 0;

@@ -1,5 +1,5 @@
-// booleq: shows Boolean equations on a terminal or in a pipe.
-// Command line or lines of standard input in; answers on standard output, complaints on standard
+// booleq: explains and compares Boolean equations on a terminal or in a pipe.
+// Command line, file or standard input in; answers on standard output, complaints on standard
 // error, one of the statuses of status.h out.
 #include <csignal>
 #include <new>
@@ -7,12 +7,11 @@
 
 #include <port/Port_MsgManData.h>
 
-#include "lines.h"
+#include "core/text.h"
 #include "options.h"
 #include "output.h"
-#include "show.h"
+#include "progress.h"
 #include "status.h"
-#include "text.h"
 
 namespace booleq {
 
@@ -41,44 +40,23 @@ void WarnAboutInputs(const Reading& reading, Output& output)
         Complain(output, "warning: --inputs: " + Excerpt(name) + " is listed again: counts once");
 }
 
-bool ShowLines(const Options& options, Output& output)
-{
-    LineReader reader(stdin);
-    std::string line;
-    size_t lineNumber = 0;
-    size_t numTexts = 0;
-    bool allAccepted = true;
-    while (reader.Next(line)) {
-        ++lineNumber;
-        if (IsBlank(line))
-            continue;
-        ++numTexts;
-        allAccepted = ShowText(line, lineNumber, options, output) && allAccepted;
-    }
-    if (numTexts == 0)
-        Complain(output, "warning: no equation on standard input");
-    return allAccepted;
-}
-
 int Run(const std::vector<std::string>& arguments, Output& output)
 {
-    const Options options = ParseOptions(arguments);
-    if (!options.answer.empty()) {
-        output.Put(options.answer);
+    const CommandLine line = ParseCommandLine(arguments);
+    if (!line.answer.empty()) {
+        output.Put(line.answer);
         return kDone;
     }
-    if (!options.debug)
+    if (!line.request.debug)
         Diagnostics<Port_MsgManData>::Drop();
-    WarnAboutInputs(options.reading, output);
-    const bool accepted = options.equation == "-" ? ShowLines(options, output)
-                                                  : ShowText(options.equation, 0, options, output);
-    return accepted ? kDone : kRefused;
+    WarnAboutInputs(line.request.reading, output);
+    return line.request.command->run(line.request, output);
 }
 
-int Fail(int status, const char* message, const char* more = "")
+int Fail(const char* message, const char* more = "")
 {
     std::fprintf(stderr, "booleq: %s%s\n", message, more);
-    return status;
+    return kWrongUsage;
 }
 
 } // namespace
@@ -90,6 +68,7 @@ int main(int argc, char** argv)
     using namespace booleq;
     // A reader that has gone is an error like a full disk, with a message and a status.
     std::signal(SIGPIPE, SIG_IGN);
+    HandleInterrupts();
     try {
         Output output(stdout);
         const std::vector<std::string> arguments(argv + (argc > 0 ? 1 : 0), argv + argc);
@@ -97,10 +76,10 @@ int main(int argc, char** argv)
         output.Flush();
         return status;
     } catch (const UsageError& error) {
-        return Fail(kWrongUsage, error.what(), "\nTry 'booleq --help'.");
+        return Fail(error.what(), "\nTry 'booleq --help'.");
     } catch (const std::bad_alloc&) {
-        return Fail(kUnfinished, "out of memory");
+        return Fail("out of memory");
     } catch (const std::exception& error) {
-        return Fail(kUnfinished, error.what());
+        return Fail(error.what());
     }
 }

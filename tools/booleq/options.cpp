@@ -5,63 +5,66 @@
 
 #include <CLI/CLI.hpp>
 
-#include "text.h"
+#include "core/text.h"
+#include "help.h"
 
 namespace booleq {
 
 namespace {
 
-constexpr char kDescription[] =
-    "Show what a Boolean equation is: its renderings, inputs, init values and truth table.";
-
-constexpr char kFooter[] =
-    "Operators: & * .AND.   | + .OR.   ^ @ .XOR.   ~ ! .NOT.   ~& ~| ~^ .NAND. .NOR. .NXOR.\n"
-    "All binary operators have one precedence and group from the left: a | b & c is (a | b) & c.\n"
-    "\n"
-    "The first word may be the command 'show', which changes nothing: 'booleq show show' shows\n"
-    "the equation that is a variable called show. With '-' every line of standard input is an\n"
-    "equation; blank lines are skipped.\n"
-    "\n"
-    "Exit status: 0 done, 2 wrong usage, 3 an equation was refused, 4 reading or writing failed.\n"
-    "\n"
-    "Examples:\n"
-    "  booleq 'A & ~B'\n"
-    "  booleq --inputs A,B,D 'A & B'\n"
-    "  booleq --inputs A,B 0x8\n"
-    "  booleq - < equations.txt\n"
-    "  booleq --version\n";
-
-uint64_t ParseRows(const std::string& text)
+bool IsOptionWord(const std::string& word)
 {
-    if (text == "all")
-        return std::numeric_limits<uint64_t>::max();
-    const bool isNumber = !text.empty() && text.size() <= 18 &&
-                          text.find_first_not_of("0123456789") == std::string::npos;
-    if (!isNumber)
-        throw UsageError("--rows takes a number or 'all', not '" + Visible(text) + "'");
-    return std::stoull(text);
+    return word.size() > 1 && word[0] == '-' && (word[1] < '0' || word[1] > '9');
 }
 
-// What the parser could not place: a mistyped option, or an equation that the shell took apart.
-void RefuseExtras(std::vector<std::string> extras)
+// What the parser left over: the operands, or a mistyped option. They are no positional option of
+// the parser because that would take "[A]" and "%%" for lists.
+std::vector<std::string> TakeOperands(std::vector<std::string> extras)
 {
-    // Behind "--" every word is an equation, whatever it begins with.
+    // Behind "--" every word is an operand, whatever it begins with.
     const auto separator = std::find(extras.begin(), extras.end(), "--");
-    const auto isOption = [](const std::string& word) { return word.size() > 1 && word[0] == '-'; };
-    const auto option = std::find_if(extras.begin(), separator, isOption);
+    const auto option = std::find_if(extras.begin(), separator, IsOptionWord);
     if (option != separator)
         throw UsageError("there is no option " + Visible(*option));
     if (separator != extras.end())
         extras.erase(separator);
-    if (!extras.empty())
-        throw UsageError("more than one equation, '" + Excerpt(extras.front()) +
-                         "' is the second: put quotes around a whole equation ('A & B'), or give "
-                         "many as lines with '-'");
+    return extras;
 }
 
-void CheckInputOptions(Options& options, const CLI::Option& inputs, const std::string& list)
+void CheckOperands(Request& request, bool hasFile)
 {
-    Reading& reading = options.reading;
+    const Command& command = *request.command;
+    std::vector<std::string>& operands = request.operands;
+    const size_t numGiven = operands.size() + (hasFile ? 1 : 0);
+    const std::string usage = std::string("booleq ") + command.name + " " + command.operands;
+    if (operands.empty() && !hasFile)
+        throw UsageError(command.maxOperands == 1
+                             ? "no equation: give one ('A & B'), or '-' for lines of standard input"
+                             : "no equation: " + usage);
+    if (numGiven < command.minOperands)
+        throw UsageError("too few words: " + usage);
+    if (numGiven > command.maxOperands && hasFile)
+        throw UsageError("--file stands in place of the equation, so '" +
+                         Excerpt(operands[command.maxOperands - 1]) + "' is one word too many");
+    if (numGiven > command.maxOperands && command.maxOperands == 1)
+        throw UsageError("more than one equation, '" + Excerpt(operands[1]) +
+                         "' is the second: put quotes around a whole equation ('A & B'), or give "
+                         "many as lines with '-'");
+    if (numGiven > command.maxOperands)
+        throw UsageError("'" + Excerpt(operands[command.maxOperands]) +
+                         "' is one word too many: " + usage);
+    if (hasFile) {
+        request.hasLines = true;
+    } else if (operands[0] == "-") {
+        request.hasLines = true;
+        request.file = "-";
+        operands.erase(operands.begin());
+    }
+}
+
+void CheckInputOptions(Request& request, const CLI::Option& inputs, const std::string& list)
+{
+    Reading& reading = request.reading;
     reading.hasInputs = inputs.count() > 0;
     if (!reading.hasInputs && (reading.lsbFirst || reading.reverse))
         throw UsageError("--lsb-first and --reverse say how --inputs is read: give --inputs");
@@ -74,58 +77,110 @@ void CheckInputOptions(Options& options, const CLI::Option& inputs, const std::s
         throw UsageError("--inputs has a single quote that is not closed: " + Excerpt(list));
 }
 
+// One option of the table in the parser; its value goes to the request when it is given.
+struct ParsedOption {
+    const Option* option = nullptr;
+    std::string value;
+    bool isSet = false;
+    const CLI::Option* parsed = nullptr;
+};
+
+void AddOption(CLI::App& app, ParsedOption& entry)
+{
+    const Option& option = *entry.option;
+    if (option.value)
+        entry.parsed = app.add_option(option.name, entry.value, option.text)
+                           ->type_name(option.value)
+                           ->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
+    else
+        entry.parsed = app.add_flag(option.name, entry.isSet, option.text);
+}
+
+void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
+{
+    const CLI::Option* inputs = nullptr;
+    std::string list;
+    bool hasFile = false;
+    for (const ParsedOption& entry : entries) {
+        const std::string name = entry.option->name;
+        if (entry.parsed->count() > 1 && entry.option->value)
+            throw UsageError(name + " is given twice");
+        if (name == "--inputs") {
+            inputs = entry.parsed;
+            list = entry.value;
+        }
+        if (entry.parsed->count() == 0)
+            continue;
+        if (name == "--file") {
+            hasFile = true;
+            request.file = entry.value;
+        }
+        request.values[name] = entry.value;
+    }
+    request.json = request.Has("--json");
+    request.debug = request.Has("--debug");
+    request.reading.lsbFirst = request.Has("--lsb-first");
+    request.reading.reverse = request.Has("--reverse");
+    CheckOperands(request, hasFile);
+    CheckInputOptions(request, *inputs, list);
+}
+
 } // namespace
 
-Options ParseOptions(const std::vector<std::string>& arguments)
+CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
 {
-    Options options;
-    std::string list;
-    std::string rows;
-    CLI::App app(kDescription, "booleq [show]");
-    app.footer(kFooter);
-    app.allow_extras();
-    app.set_version_flag("--version", "booleq " BOOLEQ_VERSION);
-    const CLI::Option* equation = app.add_option("EQUATION", options.equation,
-                                                 "The equation, an init value (0x8, 0b1000), or -");
-    const CLI::Option* inputs =
-        app.add_option("--inputs", list, "The inputs, most significant first; 'a,b' is one name")
-            ->type_name("A,B,C")
-            ->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
-    app.add_flag("--lsb-first", options.reading.lsbFirst,
-                 "Init value: its first input is bit 0 of the row number");
-    app.add_flag("--reverse", options.reading.reverse,
-                 "Init value: take --inputs from the last to the first");
-    const CLI::Option* rowsOption = app.add_option("--rows", rows, "Truth-table rows to print (64)")
-                                        ->type_name("N|all")
-                                        ->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
-    app.add_flag("--whole", options.wholeInit, "Print init values whole, also over 10 inputs");
-    app.add_flag("--debug", options.debug, "Let the library's diagnostics go to standard error");
-
+    CommandLine line;
+    Request& request = line.request;
     // The first word only, so that a variable called like a command stays an equation elsewhere.
-    const bool hasCommand = !arguments.empty() && arguments.front() == "show";
+    const Command* named = arguments.empty() ? nullptr : FindCommand(arguments.front());
+    request.command = named ? named : &Commands().front();
+    if (!named && AnswerForTool(arguments, line.answer))
+        return line;
+
+    std::vector<ParsedOption> entries(request.command->options.size() + CommonOptions().size());
+    for (size_t index = 0; index < entries.size(); ++index) {
+        const size_t numOwn = request.command->options.size();
+        entries[index].option =
+            index < numOwn ? &request.command->options[index] : &CommonOptions()[index - numOwn];
+    }
+    CLI::App app;
+    app.allow_extras();
+    app.set_help_flag(); // the help is made from the table
+    bool wantsHelp = false;
+    app.add_flag("-h,--help", wantsHelp);
+    for (ParsedOption& entry : entries)
+        AddOption(app, entry);
+
     // The parser takes its words from the back.
-    std::vector<std::string> words(arguments.rbegin(), arguments.rend() - (hasCommand ? 1 : 0));
+    std::vector<std::string> words(arguments.rbegin(), arguments.rend() - (named ? 1 : 0));
     try {
         app.parse(std::move(words));
-    } catch (const CLI::CallForHelp&) {
-        options.answer = app.help();
-        return options;
-    } catch (const CLI::CallForVersion& version) {
-        options.answer = std::string(version.what()) + "\n";
-        return options;
     } catch (const CLI::ParseError& error) {
         throw UsageError(error.what());
     }
-    RefuseExtras(app.remaining());
-    if (equation->count() == 0)
-        throw UsageError("no equation: give one ('A & B'), or '-' for lines of standard input");
-    for (const CLI::Option* option : {inputs, rowsOption})
-        if (option->count() > 1)
-            throw UsageError(option->get_name() + " is given twice");
-    if (rowsOption->count() > 0)
-        options.maxRows = ParseRows(rows);
-    CheckInputOptions(options, *inputs, list);
-    return options;
+    if (wantsHelp) {
+        line.answer = named ? CommandHelp(*named) : ToolHelp();
+        return line;
+    }
+    request.operands = TakeOperands(app.remaining());
+    FillRequest(request, entries);
+    return line;
+}
+
+uint64_t ParseRows(const std::string& text)
+{
+    if (text == "all")
+        return std::numeric_limits<uint64_t>::max();
+    const bool isNumber = !text.empty() && text.size() <= 18 &&
+                          text.find_first_not_of("0123456789") == std::string::npos;
+    if (!isNumber)
+        throw UsageError("--rows takes a number or 'all', not '" + Visible(text) + "'");
+    return std::stoull(text);
+}
+
+std::string Count(uint64_t number, const std::string& noun)
+{
+    return std::to_string(number) + " " + noun + (number == 1 ? "" : "s");
 }
 
 } // namespace booleq

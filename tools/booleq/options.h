@@ -1,33 +1,29 @@
-// Command line in, what to do out.
+// Command line in, what to do out; the help texts.
 #ifndef BOOLEQ_OPTIONS_H
 #define BOOLEQ_OPTIONS_H
 
 #include <cstdint>
-#include <stdexcept>
 #include <string>
 #include <vector>
 
-#include "reading.h"
+#include "command.h"
 
 namespace booleq {
 
-// The command line makes no sense; the text says why and what to write.
-class UsageError : public std::runtime_error {
-  public:
-    using std::runtime_error::runtime_error;
-};
-
-struct Options {
-    std::string answer;   // not empty: the text of --help or --version, and nothing else to do
-    std::string equation; // "-": the lines of standard input
-    Reading reading;
-    uint64_t maxRows = 64;  // truth-table rows to print
-    bool wholeInit = false; // init values of any length
-    bool debug = false;     // the library's diagnostics are let through
+// The words of a command line, understood: either an answer that is ready, or a request.
+struct CommandLine {
+    std::string answer; // not empty: the text of --help or --version, and nothing else to do
+    Request request;
 };
 
 // Fails: UsageError.
-Options ParseOptions(const std::vector<std::string>& arguments);
+CommandLine ParseCommandLine(const std::vector<std::string>& arguments);
+
+// A number of --rows: "all" is the highest.  Fails: UsageError.
+uint64_t ParseRows(const std::string& text);
+
+// "1 input", "2 inputs".
+std::string Count(uint64_t number, const std::string& noun);
 
 } // namespace booleq
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cstring>
 
-#include "text.h"
+#include "core/text.h"
 
 namespace booleq {
 
@@ -51,7 +51,7 @@ std::string ExplainInitValue(const std::string& text, const Reading& reading)
         " read over exactly " + std::to_string(numNeeded) + (numNeeded == 1 ? " input" : " inputs");
     if (!reading.hasInputs)
         return needs + ": name them with --inputs, the most significant first";
-    const size_t numUsable = CheckInputs(reading.inputs).numUsable;
+    const size_t numUsable = CheckInputs(reading.inputs).usable.size();
     if (numUsable == numNeeded)
         return std::string();
     return needs + ", --inputs gives " + std::to_string(numUsable);

@@ -4,7 +4,7 @@
 
 #include <string>
 
-#include "reading.h"
+#include "core/reading.h"
 
 namespace booleq {
 

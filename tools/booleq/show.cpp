@@ -1,20 +1,17 @@
-#include "show.h"
-
-#include "refusal.h"
+// The command 'show': everything the library answers about one equation.
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+#include "options.h"
 #include "table.h"
-#include "text.h"
 
 namespace booleq {
 
 namespace {
 
-constexpr size_t kLabelWidth = 16;
-constexpr unsigned int kMaxShownInitInputs = 10; // 256 hexadecimal and 1024 binary digits
+typedef std::vector<std::string> Notes;
 
-void PutField(Output& output, const std::string& label, const std::string& value)
-{
-    output.Put(label + std::string(kLabelWidth - label.size(), ' ') + value + "\n");
-}
+constexpr unsigned int kMaxShownInitInputs = 10; // 256 hexadecimal and 1024 binary digits
 
 bool IsInitValue(const Kq_BoolEquation& equation)
 {
@@ -89,7 +86,7 @@ void PutMissingTable(const Kq_BoolEquation& equation, Output& output)
 // Straight from the library's text: with 30 inputs these are 256 MB and 1 GB.
 void PutDigits(Output& output, const std::string& label, const Port::StringBase<char>& digits)
 {
-    output.Put(label + std::string(kLabelWidth - label.size(), ' '));
+    PutLabel(output, label);
     output.Put(digits.c_str(), digits.length());
     output.Put("\n");
 }
@@ -118,24 +115,23 @@ unsigned int HighestRow(Kq_BoolEquation& equation)
 }
 
 // What a given init value leaves open, and where the printed one counts in another way.
-void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Output& output)
+void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& notes)
 {
     if (equation.GetNumVariables() == 0) {
-        PutField(output, "note", "an init value over no inputs is an empty group, which is 0");
+        notes.push_back("an init value over no inputs is an empty group, which is 0");
         return;
     }
     const size_t numDigits = equation.GetEquation(false).length() - 2;
     const uint64_t numGiven = uint64_t(numDigits) * (equation.IsHexInitValue() ? 4 : 1);
     const unsigned int numInputs = equation.GetNumVariables();
     if (numInputs <= kMaxTableInputs && numGiven < uint64_t(1) << numInputs)
-        PutField(output, "note",
-                 "the value given has " + std::to_string(numGiven) +
-                     " rows, the table more: the others read as " +
-                     std::to_string(HighestRow(equation)));
+        notes.push_back("the value given has " + std::to_string(numGiven) +
+                        " rows, the table more: the others read as " +
+                        std::to_string(HighestRow(equation)));
     if (reading.lsbFirst && numInputs > 1)
-        PutField(output, "note",
-                 "what is printed takes the first input as the most significant; that init value "
-                 "reads back without --lsb-first");
+        notes.push_back(
+            "what is printed takes the first input as the most significant; that init value "
+            "reads back without --lsb-first");
 }
 
 // Renderings write no parentheses of their own, so some trees cannot be read back from them.
@@ -145,88 +141,129 @@ bool ReadsBack(const Kq_BoolEquation& equation, const Reading& reading)
     return SetFromText(again, ToStd(equation.GetEquationAlt1(true)), reading) && again == equation;
 }
 
-void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Output& output)
+void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Notes& notes)
 {
     if (reading.lsbFirst || reading.reverse)
-        PutField(output, "note",
-                 "--lsb-first and --reverse say how an init value is read; this is an expression");
-    const size_t numListed = reading.hasInputs ? CheckInputs(reading.inputs).numUsable : 0;
+        notes.push_back(
+            "--lsb-first and --reverse say how an init value is read; this is an expression");
+    const size_t numListed = reading.hasInputs ? CheckInputs(reading.inputs).usable.size() : 0;
     if (reading.hasInputs && equation.GetNumVariables() > numListed) {
         std::string names = InputName(equation, numListed);
         for (size_t index = numListed + 1; index < equation.GetNumVariables(); ++index)
             names += ", " + InputName(equation, index);
-        PutField(output, "note", "not in --inputs, so behind them: " + names);
+        notes.push_back("not in --inputs, so behind them: " + names);
     }
     if (!ReadsBack(equation, reading))
-        PutField(output, "note",
-                 "read again, the texts above do not give this equation: keep the one you have");
+        notes.push_back(
+            "read again, the texts above do not give this equation: keep the one you have");
 }
 
-void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Output& output)
+void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Notes& notes)
 {
     if (!IsPrintable(ToStd(equation.GetInitValueTermEquation())))
-        PutField(output, "note", "bytes that are not printable ASCII are shown as \\xNN");
+        notes.push_back("bytes that are not printable ASCII are shown as \\xNN");
     if (hasTable && HasNumberedColumn(equation))
-        PutField(output, "note", "column #k of the table is the k-th input");
+        notes.push_back("column #k of the table is the k-th input");
 }
 
-void ShowEquation(Kq_BoolEquation& equation, const Options& options, Output& output)
+Notes NotesFor(Kq_BoolEquation& equation, const Reading& reading, bool hasTable)
 {
-    const Reading& reading = options.reading;
-    PutRenderings(equation, reading, output);
+    Notes notes;
+    if (IsInitValue(equation))
+        NoteInitValue(equation, reading, notes);
+    else
+        NoteExpression(equation, reading, notes);
+    if (equation.GetNumVariables() == 1)
+        notes.push_back("over one input only the binary init value reads back");
+    NoteNames(equation, hasTable, notes);
+    return notes;
+}
+
+void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t maxRows,
+                  Output& output)
+{
+    PutRenderings(equation, request.reading, output);
     PutInputs(equation, output);
     const unsigned int numInputs = equation.GetNumVariables();
     const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
     if (hasTable) {
-        PutInitValues(equation, options.wholeInit, output);
+        PutInitValues(equation, request.Has("--whole"), output);
         PutField(output, "truth table", std::to_string(uint64_t(1) << numInputs) + " rows");
     } else {
         PutMissingTable(equation, output);
     }
-    if (IsInitValue(equation))
-        NoteInitValue(equation, reading, output);
-    else
-        NoteExpression(equation, reading, output);
-    if (numInputs == 1)
-        PutField(output, "note", "over one input only the binary init value reads back");
-    NoteNames(equation, hasTable, output);
+    for (const std::string& note : NotesFor(equation, request.reading, hasTable))
+        PutField(output, "note", note);
     if (hasTable)
-        PrintTable(equation, options.maxRows, output);
+        PrintTable(equation, maxRows, output);
 }
 
-// Empty when the equation is set, otherwise the text and the reason.
-std::string SetOrExplain(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
+// Init values are null where the text answer leaves them out.
+Json ShowAsJson(Kq_BoolEquation& equation, const Request& request)
 {
-    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
-    const size_t nul = text.find('\0');
-    if (nul != std::string::npos)
-        return Excerpt(text) + "\n  a NUL byte at character " + std::to_string(nul + 1) +
-               "; this is no plain text";
-    if (SetFromText(equation, text, reading))
-        return std::string();
-    if (IsBlank(text))
-        return "an empty equation";
-    return Excerpt(text) + "\n  " + ExplainRefusal(text, reading);
+    const unsigned int numInputs = equation.GetNumVariables();
+    const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
+    Json json;
+    json["equation"] = ToStd(equation.GetEquation(true));
+    json["kind"] = !IsInitValue(equation)      ? "expression"
+                   : equation.IsHexInitValue() ? "hexadecimal init value"
+                                               : "binary init value";
+    json["syntax1"] = ToStd(equation.GetEquationAlt1(true));
+    json["syntax2"] = ToStd(equation.GetEquationAlt2(true));
+    json["syntax3"] = ToStd(equation.GetEquationAlt3(true));
+    json["inputs"] = Json::array();
+    for (const auto& variable : equation.GetVariables())
+        json["inputs"].push_back(ToStd(variable.first));
+    json["rows"] = hasTable ? uint64_t(1) << numInputs : 0;
+    json["hex"] = nullptr;
+    json["binary"] = nullptr;
+    if (hasTable && (numInputs <= kMaxShownInitInputs || request.Has("--whole"))) {
+        json["hex"] = ToStd(equation.GetEquationAsHexInitValue(false));
+        json["binary"] = ToStd(equation.GetEquationAsBinaryInitValue());
+    }
+    if (numInputs == 0)
+        json["value"] = equation.Eval();
+    json["notes"] = NotesFor(equation, request.reading, hasTable);
+    return json;
+}
+
+int RunShow(const Request& request, Output& output)
+{
+    const uint64_t maxRows = request.Has("--rows") ? ParseRows(request.Get("--rows")) : 64;
+    return ForEachText(request, output, [&](const Text& text) {
+        Kq_BoolEquation equation;
+        if (!SetEquation(text, request, output, equation))
+            return kRefused;
+        if (request.json) {
+            PutJson(text, request, "done", ShowAsJson(equation, request), output);
+            return kDone;
+        }
+        if (text.line > 0)
+            PutField(output, "line", std::to_string(text.line));
+        ShowEquation(equation, request, maxRows, output);
+        if (text.line > 0)
+            output.Put("\n");
+        return kDone;
+    });
 }
 
 } // namespace
 
-bool ShowText(const std::string& text, size_t lineNumber, const Options& options, Output& output)
+Command ShowCommand()
 {
-    Kq_BoolEquation equation;
-    const std::string refusal = SetOrExplain(equation, text, options.reading);
-    if (!refusal.empty()) {
-        const std::string place =
-            lineNumber > 0 ? "line " + std::to_string(lineNumber) + ": " : std::string();
-        Complain(output, place + "refused: " + refusal);
-        return false;
-    }
-    if (lineNumber > 0)
-        PutField(output, "line", std::to_string(lineNumber));
-    ShowEquation(equation, options, output);
-    if (lineNumber > 0)
-        output.Put("\n");
-    return true;
+    return {
+        "show",
+        "EQUATION",
+        1,
+        1,
+        "Show renderings, inputs, init values and truth table",
+        "Everything the library answers about one equation or init value. Of a line the answer\n"
+        "begins with its number and ends with an empty line.\n",
+        {{"--rows", "N|all", "Truth-table rows to print (64)"},
+         {"--whole", nullptr, "Print init values whole, also over 10 inputs"}},
+        {"booleq 'A & ~B'", "booleq --inputs A,B,D 'A & B'", "booleq --inputs A,B 0x8",
+         "booleq - < equations.txt"},
+        RunShow};
 }
 
 } // namespace booleq

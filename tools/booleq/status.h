@@ -1,13 +1,14 @@
-// Exit statuses of the tool; scripts rely on these numbers.
+// Exit statuses of the tool; scripts rely on these numbers. Where lines are answered one by one,
+// the highest status of any line is the tool's.
 #ifndef BOOLEQ_STATUS_H
 #define BOOLEQ_STATUS_H
 
 namespace booleq {
 
-constexpr int kDone = 0;
-constexpr int kWrongUsage = 2;
-constexpr int kRefused = 3;    // at least one equation was refused; the others were answered
-constexpr int kUnfinished = 4; // reading or writing failed, or memory ran out
+constexpr int kDone = 0;       // done, or the answer is yes
+constexpr int kFindings = 1;   // the answer is no, or there are findings
+constexpr int kWrongUsage = 2; // wrong usage; reading or writing failed, or memory ran out
+constexpr int kRefused = 3;    // a text was refused; the others were answered
 
 } // namespace booleq
 

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "text.h"
+#include "core/text.h"
 
 namespace booleq {
 

@@ -1,6 +1,6 @@
 // Text for people: what may go to a terminal, and how much of it.
-#ifndef BOOLEQ_TEXT_H
-#define BOOLEQ_TEXT_H
+#ifndef BOOLEQ_CORE_TEXT_H
+#define BOOLEQ_CORE_TEXT_H
 
 #include <string>
 

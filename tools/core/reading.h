@@ -1,6 +1,6 @@
 // How a text becomes an equation: with or without listed inputs.
-#ifndef BOOLEQ_READING_H
-#define BOOLEQ_READING_H
+#ifndef BOOLEQ_CORE_READING_H
+#define BOOLEQ_CORE_READING_H
 
 #include <string>
 #include <vector>
@@ -25,9 +25,9 @@ bool SplitInputs(const std::string& list, std::vector<std::string>& inputs);
 
 // Sorts out what the library would skip without a word.
 struct InputCheck {
+    std::vector<std::string> usable;   // each once, in the order listed
     std::vector<std::string> illegal;  // no names; they become no inputs
     std::vector<std::string> repeated; // listed again; they count once
-    size_t numUsable = 0;
 };
 InputCheck CheckInputs(const std::vector<std::string>& inputs);
 

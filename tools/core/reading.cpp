@@ -54,10 +54,11 @@ InputCheck CheckInputs(const std::vector<std::string>& inputs)
         Kq_BoolEquation probe; // the library itself says what a legal name is
         if (!probe.DefineVariable(input.c_str(), 0))
             check.illegal.push_back(input);
-        else if (!known.insert(input).second)
+        else if (known.insert(input).second)
+            check.usable.push_back(input);
+        else
             check.repeated.push_back(input);
     }
-    check.numUsable = known.size();
     return check;
 }
 

@@ -1,0 +1,156 @@
+#include "answer.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "core/text.h"
+#include "lines.h"
+#include "progress.h"
+#include "refusal.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr size_t kLabelWidth = 16;
+
+Json Envelope(const Text& text, const Request& request, const char* status)
+{
+    Json json;
+    json["command"] = request.command->name;
+    if (text.line > 0)
+        json["line"] = text.line;
+    json["text"] = text.text;
+    json["status"] = status;
+    return json;
+}
+
+void SayRefusal(const Text& text, const Request& request, Output& output, const std::string& reason)
+{
+    if (request.json) {
+        Json json = Envelope(text, request, "refused");
+        json["refusal"]["reason"] = reason;
+        output.Put(JsonLine(json) + "\n");
+        return;
+    }
+    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
+    Complain(output, place + "refused: " + reason);
+}
+
+// An init value is read over the usable inputs in the order that the request gives.
+std::vector<std::string> UsableInputs(const Reading& reading)
+{
+    std::vector<std::string> inputs = CheckInputs(reading.inputs).usable;
+    if (reading.reverse)
+        std::reverse(inputs.begin(), inputs.end());
+    return inputs;
+}
+
+} // namespace
+
+int ForEachText(const Request& request, Output& output,
+                const std::function<int(const Text&)>& answer)
+{
+    if (!request.hasLines)
+        return answer({request.operands.front(), 0});
+    LineReader reader(request.file);
+    Progress progress("reading", reader.GetSize());
+    Text text;
+    size_t numTexts = 0;
+    int status = kDone;
+    while (reader.Next(text.text)) {
+        ++text.line;
+        if (IsBlank(text.text))
+            continue;
+        ++numTexts;
+        status = std::max(status, answer(text));
+        progress.Show(reader.GetPosition());
+    }
+    if (numTexts == 0)
+        Complain(output,
+                 "warning: no equation " +
+                     (request.file == "-" ? "on standard input" : "in " + Visible(request.file)));
+    return status;
+}
+
+bool SetEquation(const Text& text, const Request& request, Output& output,
+                 Kq_BoolEquation& equation)
+{
+    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
+    const size_t nul = text.text.find('\0');
+    if (nul == std::string::npos && SetFromText(equation, text.text, request.reading))
+        return true;
+    if (nul != std::string::npos)
+        SayRefusal(text, request, output,
+                   Excerpt(text.text) + "\n  a NUL byte at character " + std::to_string(nul + 1) +
+                       "; this is no plain text");
+    else if (IsBlank(text.text))
+        SayRefusal(text, request, output, "an empty equation");
+    else
+        SayRefusal(text, request, output,
+                   Excerpt(text.text) + "\n  " + ExplainRefusal(text.text, request.reading));
+    return false;
+}
+
+bool SetFunction(const Text& text, const Request& request, Output& output, Function& function)
+{
+    if (request.reading.hasInputs) {
+        const std::vector<std::string> inputs = UsableInputs(request.reading);
+        if (inputs.size() <= kMaxFunctionInputs &&
+            FunctionFromInit(text.text, inputs, request.reading.lsbFirst, function).fault ==
+                InitFault::kNone)
+            return true;
+    }
+    Kq_BoolEquation equation;
+    if (!SetEquation(text, request, output, equation))
+        return false;
+    if (FunctionOf(equation, function))
+        return true;
+    Refuse(text, request, output,
+           std::to_string(equation.GetNumVariables()) + " inputs: at most " +
+               std::to_string(kMaxFunctionInputs) + " have a truth table");
+    return false;
+}
+
+void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason)
+{
+    SayRefusal(text, request, output, request.json ? reason : Excerpt(text.text) + "\n  " + reason);
+}
+
+void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
+             Output& output)
+{
+    Json json = Envelope(text, request, status);
+    json["result"] = result;
+    output.Put(JsonLine(json) + "\n");
+}
+
+std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,
+                                                    const char* status, const Json& result)
+{
+    Json json = Envelope(text, request, status);
+    json["result"] = result;
+    const std::string line = JsonLine(json) + "\n";
+    // The array is the last thing but for the two objects' ends.
+    const size_t middle = line.rfind("[]") + 1;
+    return {line.substr(0, middle), line.substr(middle)};
+}
+
+std::string JsonLine(const Json& json)
+{
+    return json.dump(-1, ' ', false, Json::error_handler_t::replace);
+}
+
+void PutLabel(Output& output, const std::string& label)
+{
+    output.Put(label +
+               std::string(label.size() < kLabelWidth ? kLabelWidth - label.size() : 1, ' '));
+}
+
+void PutField(Output& output, const std::string& label, const std::string& value)
+{
+    PutLabel(output, label);
+    output.Put(value + "\n");
+}
+
+} // namespace booleq

@@ -1,0 +1,63 @@
+// How every command takes its texts and answers: one text or lines, refusals said in one way, and
+// answers as JSON in one envelope, an object on a line of its own for each text:
+//   {"command":...,"line":...,"text":...,"status":...,"result":{...}}
+#ifndef BOOLEQ_ANSWER_H
+#define BOOLEQ_ANSWER_H
+
+#include <functional>
+#include <string>
+
+#include <nlohmann/json.hpp>
+
+#include <Kq_BoolEquation.h>
+
+#include "command.h"
+#include "core/function.h"
+#include "output.h"
+#include "status.h"
+
+namespace booleq {
+
+typedef nlohmann::ordered_json Json; // keys stay in the order that the documentation gives
+
+// One text to answer, and where it stands.
+struct Text {
+    std::string text;
+    size_t line = 0; // 0: it stands on the command line
+};
+
+// Calls 'answer' for the text of the command line, or for every line that is not blank, and gives
+// back the highest status. Shows how far a file is read, on a terminal.
+// Fails: IoError, for a missing file too.
+int ForEachText(const Request& request, Output& output,
+                const std::function<int(const Text&)>& answer);
+
+// Sets 'equation' from the text as the request says (--inputs, --lsb-first, --reverse).
+// Fails: false, and the refusal has been said or, with --json, answered: return kRefused.
+bool SetEquation(const Text& text, const Request& request, Output& output,
+                 Kq_BoolEquation& equation);
+// The same, and the function over the equation's inputs in their order. Init values over listed
+// inputs do not take the way through an expression, so 30 inputs are no trouble.
+// Fails: false as above, also for more than 30 inputs.
+bool SetFunction(const Text& text, const Request& request, Output& output, Function& function);
+
+// Refuses a text for a reason of the command's own; the way the refusals of SetEquation are said.
+void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason);
+
+// The envelope around 'result'. 'status' is "done", "yes", "no" or "findings".
+void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
+             Output& output);
+// The same object in two halves, for a result whose last member is written piece by piece between
+// them: 'result' ends with an empty array, and the pieces are its elements.
+std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,
+                                                    const char* status, const Json& result);
+// A text or name for JSON: bytes that are no UTF-8 become U+FFFD when they are written.
+std::string JsonLine(const Json& json);
+
+// "label           value"; values of one answer stand below each other.
+void PutLabel(Output& output, const std::string& label);
+void PutField(Output& output, const std::string& label, const std::string& value);
+
+} // namespace booleq
+
+#endif

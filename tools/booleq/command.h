@@ -1,0 +1,75 @@
+// What a command is, and what it was asked to do. Commands stand in one table (commands.cpp); the
+// parser, the help, the man page and the completion are all made from it.
+#ifndef BOOLEQ_COMMAND_H
+#define BOOLEQ_COMMAND_H
+
+#include <map>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "core/reading.h"
+#include "output.h"
+
+namespace booleq {
+
+// The command line makes no sense; the text says why and what to write.
+class UsageError : public std::runtime_error {
+  public:
+    using std::runtime_error::runtime_error;
+};
+
+struct Option {
+    const char* name;  // "--rows"
+    const char* value; // what stands for its value in the help ("N|all"); null for a flag
+    const char* text;  // one sentence without a full stop
+};
+
+struct Command;
+
+struct Request {
+    const Command* command = nullptr;
+    // With lines, the operands behind the text; otherwise the text is the first.
+    std::vector<std::string> operands;
+    bool hasLines = false; // "-" or --file: texts are the lines of 'file'
+    std::string file;      // "-" is standard input
+    Reading reading;
+    bool json = false;
+    bool debug = false;                        // the library's diagnostics are let through
+    std::map<std::string, std::string> values; // of the command's own options that were given
+
+    bool Has(const std::string& option) const { return values.count(option) != 0; }
+    // Empty for an option that was not given.
+    std::string Get(const std::string& option) const
+    {
+        const auto found = values.find(option);
+        return found == values.end() ? std::string() : found->second;
+    }
+};
+
+struct Command {
+    const char* name;
+    const char* operands; // "EQUATION NAME=VALUE..."
+    size_t minOperands;   // the text included
+    size_t maxOperands;
+    const char* summary; // one line without a full stop
+    const char* text;    // what else there is to know, in lines of at most 90 characters
+    std::vector<Option> options;
+    std::vector<const char*> examples; // whole command lines
+    // Answers on 'output', complaints on standard error; the exit status out.
+    // Fails: UsageError; IoError.
+    int (*run)(const Request& request, Output& output);
+};
+
+constexpr size_t kAnyNumber = static_cast<size_t>(-1);
+
+// In the order of the help; the first one is meant where no command is named.
+const std::vector<Command>& Commands();
+// Null for a word that is no command.
+const Command* FindCommand(const std::string& word);
+// Options that every command takes.
+const std::vector<Option>& CommonOptions();
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,13 @@
+// The commands, each in a file of its own name; commands.cpp puts them into the table.
+#ifndef BOOLEQ_COMMANDS_H
+#define BOOLEQ_COMMANDS_H
+
+#include "command.h"
+
+namespace booleq {
+
+Command ShowCommand();
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,234 @@
+#include "help.h"
+
+#include <algorithm>
+
+namespace booleq {
+
+namespace {
+
+constexpr char kSummary[] =
+    "Boolean equations and look-up-table init values, explained and compared";
+
+constexpr char kSyntax[] =
+    "Operators: & * .AND.   | + .OR.   ^ @ .XOR.   ~ ! .NOT.   ~& ~| ~^ .NAND. .NOR. .NXOR.\n"
+    "All binary operators have one precedence and group from the left: a | b & c is (a | b) & c.\n"
+    "Init values: 0x... or 0b..., row k is bit k; the first input is the most significant bit of "
+    "k.\n";
+
+constexpr char kStatuses[] =
+    "Exit status: 0 done or yes, 1 no or findings, 2 wrong usage or reading or writing failed,\n"
+    "3 a text was refused.\n";
+
+// Options of the tool itself.
+const std::vector<Option>& ToolOptions()
+{
+    static const std::vector<Option> options = {
+        {"--help", nullptr, "Print this help; behind a command, the command's"},
+        {"--version", nullptr, "Print the version"},
+        {"--man-page", nullptr, "Print the man page (roff)"},
+        {"--completion", nullptr, "Print the completion for bash"},
+    };
+    return options;
+}
+
+std::string Spelling(const Option& option)
+{
+    return option.value ? std::string(option.name) + " " + option.value : option.name;
+}
+
+std::string Aligned(const std::string& left, const std::string& right)
+{
+    constexpr size_t kWidth = 22;
+    return "  " + left + std::string(left.size() < kWidth ? kWidth - left.size() : 2, ' ') + right +
+           "\n";
+}
+
+std::string Lines(const std::vector<Option>& options)
+{
+    std::string text;
+    for (const Option& option : options)
+        text += Aligned(Spelling(option), option.text);
+    return text;
+}
+
+// Text for roff: nothing in it is a request or an escape.
+std::string Roff(const std::string& text)
+{
+    std::string roff;
+    for (size_t position = 0; position < text.size(); ++position) {
+        const char character = text[position];
+        const bool startsLine = position == 0 || text[position - 1] == '\n';
+        if (startsLine && (character == '.' || character == '\''))
+            roff += "\\&";
+        if (character == '\\')
+            roff += "\\e";
+        else if (character == '-')
+            roff += "\\-";
+        else if (character == '\'')
+            roff += "\\(aq";
+        else if (character == '^')
+            roff += "\\(ha";
+        else if (character == '~')
+            roff += "\\(ti";
+        else if (character == '`')
+            roff += "\\(ga";
+        else
+            roff += character;
+    }
+    return roff;
+}
+
+std::string RoffOptions(const std::vector<Option>& options)
+{
+    std::string roff;
+    for (const Option& option : options) {
+        roff += ".TP\n\\fB" + Roff(option.name) + "\\fR";
+        if (option.value)
+            roff += " \\fI" + Roff(option.value) + "\\fR";
+        roff += "\n" + Roff(option.text) + ".\n";
+    }
+    return roff;
+}
+
+std::string RoffVerbatim(const std::string& text)
+{
+    return ".nf\n" + Roff(text) + ".fi\n";
+}
+
+std::string RoffCommand(const Command& command)
+{
+    std::string roff = ".SS booleq " + Roff(command.name) + " " + Roff(command.operands) + "\n";
+    roff += Roff(command.summary) + ".\n.PP\n" + Roff(command.text);
+    roff += RoffOptions(command.options);
+    roff += ".PP\nExamples:\n.PP\n";
+    std::string examples;
+    for (const char* example : command.examples)
+        examples += std::string("    ") + example + "\n";
+    return roff + RoffVerbatim(examples);
+}
+
+std::string Names(const std::vector<Option>& options)
+{
+    std::string names;
+    for (const Option& option : options)
+        names += (names.empty() ? "" : " ") + std::string(option.name);
+    return names;
+}
+
+// The fixed values of an option, "text|csv" as "text csv"; empty when any value will do.
+std::string Choices(const Option& option)
+{
+    std::string choices = option.value ? option.value : "";
+    const auto isOpen = [](char character) {
+        return character != '|' && (character < 'a' || character > 'z') &&
+               (character < '0' || character > '9');
+    };
+    if (choices.find('|') == std::string::npos ||
+        std::any_of(choices.begin(), choices.end(), isOpen))
+        return std::string();
+    std::replace(choices.begin(), choices.end(), '|', ' ');
+    return choices;
+}
+
+} // namespace
+
+bool AnswerForTool(const std::vector<std::string>& arguments, std::string& answer)
+{
+    if (arguments.size() != 1)
+        return false;
+    const std::string& word = arguments.front();
+    if (word == "--help" || word == "-h")
+        answer = ToolHelp();
+    else if (word == "--version")
+        answer = "booleq " BOOLEQ_VERSION "\n";
+    else if (word == "--man-page")
+        answer = ManPage();
+    else if (word == "--completion")
+        answer = BashCompletion();
+    return !answer.empty();
+}
+
+std::string ToolHelp()
+{
+    std::string text = std::string("booleq: ") + kSummary + "\n\n";
+    text += "Usage: booleq [COMMAND] [OPTION...] EQUATION...\n\nCommands:\n";
+    for (const Command& command : Commands())
+        text += Aligned(command.name, command.summary);
+    text += "\nOptions of every command:\n" + Lines(CommonOptions());
+    text += "\nOptions instead of a command:\n" + Lines(ToolOptions());
+    text += std::string("\n") + kSyntax;
+    text += "\n'booleq COMMAND --help' says more. Without a command, 'show' is meant; 'booleq show "
+            "table' shows\nthe equation that is a variable called table.\n";
+    return text + "\n" + kStatuses;
+}
+
+std::string CommandHelp(const Command& command)
+{
+    std::string text = std::string("booleq ") + command.name + ": " + command.summary + "\n\n";
+    text +=
+        std::string("Usage: booleq ") + command.name + " [OPTION...] " + command.operands + "\n";
+    text += std::string("\n") + command.text;
+    if (!command.options.empty())
+        text += "\nOptions:\n" + Lines(command.options);
+    text += "\nOptions of every command:\n" + Lines(CommonOptions());
+    text += "\nExamples:\n";
+    for (const char* example : command.examples)
+        text += std::string("  ") + example + "\n";
+    return text + "\n" + kStatuses;
+}
+
+std::string ManPage()
+{
+    std::string roff = ".TH BOOLEQ 1 \"\" \"booleq " BOOLEQ_VERSION "\" \"User Commands\"\n";
+    roff += ".SH NAME\nbooleq \\- " + Roff(kSummary) + "\n";
+    roff += ".SH SYNOPSIS\n.B booleq\n[\\fICOMMAND\\fR] [\\fIOPTION\\fR...] \\fIEQUATION\\fR...\n";
+    roff += ".SH DESCRIPTION\n" + RoffVerbatim(kSyntax);
+    roff += ".SH OPTIONS\nEvery command takes:\n" + RoffOptions(CommonOptions());
+    roff += ".PP\nInstead of a command:\n" + RoffOptions(ToolOptions());
+    roff += ".SH COMMANDS\nWithout a command, the first one is meant.\n";
+    for (const Command& command : Commands())
+        roff += RoffCommand(command);
+    return roff + ".SH EXIT STATUS\n" + Roff(kStatuses);
+}
+
+std::string BashCompletion()
+{
+    std::string commands;
+    std::string cases;
+    std::string choices;
+    for (const Command& command : Commands()) {
+        commands += (commands.empty() ? "" : " ") + std::string(command.name);
+        cases += std::string("    ") + command.name + ") options+=\" " + Names(command.options) +
+                 "\" ;;\n";
+        for (const Option& option : command.options)
+            if (!Choices(option).empty())
+                choices += std::string("    ") + command.name + "," + option.name + ") words=\"" +
+                           Choices(option) + "\" ;;\n";
+    }
+    return "# bash completion for booleq; made by booleq --completion\n"
+           "_booleq() {\n"
+           "    local word=${COMP_WORDS[COMP_CWORD]} before=${COMP_WORDS[COMP_CWORD-1]}\n"
+           "    local command=${COMP_WORDS[1]} words=\n"
+           "    local options=\"--help " +
+           Names(CommonOptions()) +
+           "\"\n"
+           "    case $command in\n" +
+           cases +
+           "    esac\n"
+           "    if [ \"$before\" = --file ] || [ \"$command\" = batch ] && [[ $word != -* ]]; "
+           "then\n"
+           "        mapfile -t COMPREPLY < <(compgen -f -- \"$word\")\n"
+           "        return\n"
+           "    fi\n"
+           "    case $command,$before in\n" +
+           choices + "    *) [ \"$COMP_CWORD\" -gt 1 ] || words=\"" + commands + " " +
+           Names(ToolOptions()) +
+           "\"\n"
+           "       [[ $word != -* ]] || words+=\" $options\" ;;\n"
+           "    esac\n"
+           "    mapfile -t COMPREPLY < <(compgen -W \"$words\" -- \"$word\")\n"
+           "}\n"
+           "complete -F _booleq booleq\n";
+}
+
+} // namespace booleq

@@ -24,6 +24,7 @@ const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
         ShowCommand(),
+        ConvertCommand(),
     };
     return commands;
 }

@@ -7,6 +7,7 @@
 namespace booleq {
 
 Command ShowCommand();
+Command ConvertCommand();
 
 } // namespace booleq
 

@@ -1,0 +1,122 @@
+// The command 'convert': an equation as text of another notation, proved equal before it is printed.
+#include "core/convert.h"
+
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+
+namespace booleq {
+
+namespace {
+
+Target ParseTarget(const std::string& word)
+{
+    std::string known;
+    for (const char* name : TargetNames())
+        known += (known.empty() ? "" : ", ") + std::string(name);
+    if (word.empty())
+        throw UsageError("convert needs --to with one of: " + known);
+    Target target = Target::Primary;
+    if (!FindTarget(word, target))
+        throw UsageError("--to takes one of " + known + ", not '" + Visible(word) + "'");
+    return target;
+}
+
+// A word that every target takes for the name of what is put around an expression.
+std::string ParseUnit(const Request& request, Target target)
+{
+    const std::string name = request.Get("--name");
+    if (!request.Has("--unit") && !request.Has("--name"))
+        return std::string();
+    if (WrappingOf(target) == Wrapping::Never)
+        throw UsageError("--unit and --name are for other targets: --to " + request.Get("--to") +
+                         " has no modules");
+    const bool isWord = !name.empty() && name.find_first_not_of("abcdefghijklmnopqrstuvwxyz"
+                                                                "ABCDEFGHIJKLMNOPQRSTUVWXYZ"
+                                                                "0123456789_") == std::string::npos;
+    const bool startsWell = !name.empty() && name[0] != '_' && (name[0] < '0' || name[0] > '9');
+    const bool isVhdlName = name.find("__") == std::string::npos && (name.empty() || name.back() != '_');
+    if (request.Has("--name") && !(isWord && startsWell && isVhdlName))
+        throw UsageError("--name takes letters, digits and single '_', a letter first, not '" +
+                         Visible(name) + "'");
+    return name.empty() ? "f" : name;
+}
+
+Json ToJson(const Expression& expression, const Request& request, const Conversion& conversion)
+{
+    Json json;
+    json["to"] = request.Get("--to");
+    json["text"] = conversion.text;
+    json["unit"] = conversion.unit.empty() ? Json(nullptr) : Json(conversion.unit);
+    json["output"] = conversion.output.empty() ? Json(nullptr) : Json(conversion.output);
+    json["inputs"] = Json::array();
+    for (size_t input = 0; input < conversion.names.size(); ++input)
+        json["inputs"].push_back(
+            {{"input", expression.names[input]}, {"name", conversion.names[input]}});
+    json["comparedAssignments"] = conversion.numAssignments;
+    json["comparedAll"] = conversion.isExhaustive;
+    return json;
+}
+
+void PutText(const Expression& expression, const Conversion& conversion, Output& output)
+{
+    // Around it there is room for the names; an expression alone must stay one.
+    if (conversion.unit.empty())
+        for (const auto& change : ChangedNames(expression, conversion))
+            Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
+    if (!conversion.isExhaustive)
+        Complain(output, "note: too large to compare all assignments; " +
+                             std::to_string(conversion.numAssignments) + " were compared");
+    output.Put(conversion.text);
+}
+
+int RunConvert(const Request& request, Output& output)
+{
+    const Target target = ParseTarget(request.Get("--to"));
+    std::string unit = ParseUnit(request, target);
+    return ForEachText(request, output, [&](const Text& text) {
+        Kq_BoolEquation equation;
+        if (!SetEquation(text, request, output, equation))
+            return kRefused;
+        const Expression expression = ToExpression(equation);
+        std::string ownUnit = unit;
+        if (text.line > 0 && WrappingOf(target) != Wrapping::Never &&
+            (!unit.empty() || WrappingOf(target) == Wrapping::Always))
+            ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
+        const Conversion conversion = Convert(expression, target, ownUnit);
+        if (!conversion.fault.empty()) {
+            Refuse(text, request, output, conversion.fault);
+            return kRefused;
+        }
+        if (request.json)
+            PutJson(text, request, "done", ToJson(expression, request, conversion), output);
+        else
+            PutText(expression, conversion, output);
+        return kDone;
+    });
+}
+
+} // namespace
+
+Command ConvertCommand()
+{
+    return {"convert",
+            "EQUATION",
+            1,
+            1,
+            "Write an equation in another notation, with the parentheses it needs there",
+            "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
+            "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
+            "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
+            "the answer says how. Before it is printed the text is read again and compared.\n"
+            "Of lines, each module gets its line's number behind its name.\n",
+            {{"--to", "TARGET", "What to write"},
+             {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
+             {"--name", "NAME", "The name of that, or of the model of a blif file (f)"}},
+            {"booleq convert 'a | b & c' --to verilog",
+             "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",
+             "booleq convert --inputs A,B 0x6 --to python"},
+            RunConvert};
+}
+
+} // namespace booleq

@@ -60,8 +60,8 @@ Json ToJson(const Expression& expression, const Request& request, const Conversi
 
 void PutText(const Expression& expression, const Conversion& conversion, Output& output)
 {
-    // Around it there is room for the names; an expression alone must stay one.
-    if (conversion.unit.empty())
+    // An expression alone must stay one, without a comment.
+    if (!conversion.saysNames)
         for (const auto& change : ChangedNames(expression, conversion))
             Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
     if (!conversion.isExhaustive)

@@ -174,11 +174,12 @@ std::string InCFunction(const std::string& text, const Conversion& conversion)
            ")\n{\n    return " + text + ";\n}\n";
 }
 
-// Inputs are 0 and 1 or truth values; the result is 0 or 1.
+// Inputs are 0 and 1 or truth values; the result is 0 or 1. No name of a built-in function stands
+// there, as an input may have it.
 std::string InPythonFunction(const std::string& text, const Conversion& conversion)
 {
     return "def " + conversion.unit + "(" + Listed(conversion.names, "", ", ") +
-           "):\n    return int(" + text + ")\n";
+           "):\n    return 1 if " + text + " else 0\n";
 }
 
 std::string InLibertyCell(const std::string& text, const Conversion& conversion)
@@ -305,9 +306,11 @@ Conversion Convert(const Expression& expression, Target target, const std::strin
     }
     conversion.isExhaustive = comparison.isExhaustive;
     conversion.numAssignments = comparison.numAssignments;
-    const bool hasUnit = !conversion.unit.empty();
-    conversion.text = (hasUnit ? NameComments(expression, target, conversion) : std::string()) +
-                      (hasUnit ? Wrapped(text, target, conversion) : text);
+    // Some readers of eqn files stumble over lines of comment.
+    conversion.saysNames = !conversion.unit.empty() && target != Target::Eqn;
+    if (conversion.saysNames)
+        conversion.text = NameComments(expression, target, conversion);
+    conversion.text += conversion.unit.empty() ? text : Wrapped(text, target, conversion);
     if (conversion.text.back() != '\n')
         conversion.text += '\n';
     return conversion;

@@ -42,6 +42,7 @@ struct Conversion {
     std::string unit;  // the name of module, entity, function, cell or model; may be empty
     std::string output;
     std::vector<std::string> names; // of the inputs, as the target spells them
+    bool saysNames = false;         // the text has comments with the names that were changed
     bool isExhaustive = false;      // all assignments were compared, or so many
     uint64_t numAssignments = 0;
 };

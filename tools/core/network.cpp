@@ -212,7 +212,7 @@ std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names)
 {
     const size_t numInputs = names.inputs.size();
     std::string text = ".i " + std::to_string(numInputs) + "\n.o 1\n.ilb" + Joined(names.inputs) +
-                       "\n.ob " + names.output + "\n.p " + std::to_string(cubes.size()) + "\n";
+                       "\n.ob " + names.output + "\n.p " + std::to_string(std::max<size_t>(cubes.size(), 1)) + "\n";
     for (const Cube& cube : cubes) {
         for (size_t input = 0; input < numInputs; ++input) {
             const bool isUsed = (cube.used >> input & 1u) != 0;
@@ -220,6 +220,9 @@ std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names)
         }
         text += " 1\n";
     }
+    // Some readers do not expect a table without rows; one whose result is 0 adds nothing.
+    if (cubes.empty())
+        text += std::string(numInputs, '-') + " 0\n";
     return text + ".e\n";
 }
 

@@ -166,7 +166,9 @@ bool ReadPla(const std::string& text, Network& network)
             Define(network, static_cast<uint32_t>(network.signals.size() - 1), std::move(sum));
             return SetOutput(network, numbers, output);
         } else if (words[0][0] != '.') {
-            if (words.size() != 2 || words[1] != "1" || !AddRow(words[0], inputs, sum))
+            if (words.size() != 2 || (words[1] != "0" && words[1] != "1"))
+                return false;
+            if (words[1] == "1" && !AddRow(words[0], inputs, sum))
                 return false;
         }
     }

@@ -148,12 +148,13 @@ constexpr const char* kPythonKeywords[] = {
     "import", "in", "is", "lambda", "nonlocal", "not", "or", "pass", "raise", "return", "try",
     "while", "with", "yield", "__debug__", nullptr};
 
+// Two inversions side by side are no expression of the language, though some tools take them.
 const Notation kVerilog = {
     "Verilog", Values::Vector, "1'b0", "1'b1", false,
     {{"~", Meaning::BitNot, 90, Chain::Any, true}, {"!", Meaning::LogicalNot, 90, Chain::Any, false},
      {"~&", Meaning::Foreign, 90, Chain::Any, false}, {"~|", Meaning::Foreign, 90, Chain::Any, false},
      {"~^", Meaning::Foreign, 90, Chain::Any, false}, {"^~", Meaning::Foreign, 90, Chain::Any, false}},
-    true, {},
+    false, {},
     {{"&", Meaning::And, 60, Chain::Any, true}, {"^", Meaning::Xor, 50, Chain::Any, true},
      {"~^", Meaning::Nxor, 50, Chain::Any, true}, {"^~", Meaning::Nxor, 50, Chain::Any, false},
      {"|", Meaning::Or, 40, Chain::Any, true}, {"*", Meaning::Multiply, 80, Chain::Any, false},
@@ -202,10 +203,11 @@ const Notation kLiberty = {
      {"+", Meaning::Or, 40, Chain::Any, false}},
     true, false, IsSimpleIdentifier, kNoKeywords, nullptr};
 
+// Readers of this format differ about two inversions side by side.
 const Notation kEqn = {
     "eqn", Values::Bits, "0", "1", true,
     {{"!", Meaning::BitNot, 90, Chain::Any, true}},
-    true, {},
+    false, {},
     {{"*", Meaning::And, 50, Chain::Any, true}, {"+", Meaning::Or, 40, Chain::Any, true}},
     false, false, IsSimpleIdentifier, kNoKeywords, nullptr};
 

@@ -24,6 +24,7 @@ class KQ_EXPORT Kq_BoolEquation {
   public:
     class Handle;
     class TruthTable;
+    struct Refusal;
 
     // No equation, no variables.
     Kq_BoolEquation();
@@ -54,6 +55,12 @@ class KQ_EXPORT Kq_BoolEquation {
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
                                       bool reverseTerms);
+
+    // Why and where SetEquation, on an object without variables, or SetEquationWithExplicitTerms
+    // over 'terms' refuses the text. Nothing is set and nothing is dumped. Cost: that of setting
+    // the equation.
+    static Refusal FindRefusal(const Port::StringBase<char>& text,
+                               const std::vector<Port::StringBase<char>>* terms = nullptr);
 
     // What the equation was set from: an expression, an init value "0x..." or one "0b...".
     bool IsExpression() const;
@@ -123,6 +130,32 @@ class KQ_EXPORT Kq_BoolEquation {
 
   private:
     Kq_BoolEquationImp* m_imp;
+};
+
+// The place where tokenizer, builder or init value gave up, and why. Bytes are counted from 0.
+struct Kq_BoolEquation::Refusal {
+    enum CODE : unsigned int {
+        NONE = 0,            // the text is accepted
+        EMPTY = 1,           // there is no token in it
+        CHARACTER = 2,       // it begins no token
+        WORD = 3,            // between dots, and no operator
+        OPEN_WORD = 4,       // a "." without a second one
+        OPEN_QUOTE = 5,      // a quote without a second one
+        OPEN_PAREN = 6,      // a "(" that nothing closes
+        RIGHT_PAREN = 7,     // a ")" that closes nothing
+        OPERAND = 8,         // it stands where an operator must
+        NO_LEFT_OPERAND = 9, // of a binary operator
+        NO_RIGHT_OPERAND = 10,
+        NO_OPERAND = 11,       // of a negation
+        NEGATED_OPERATOR = 12, // a negation apart from its operator, with no operand to take
+        INIT_PREFIX = 13,      // over terms a text that begins with 0 is "0x..." or "0b..."
+        INIT_DIGIT = 14,       // not of the base
+        INIT_WIDTH = 15,       // so many digits are read over another number of variables
+        INIT_NAME = 16         // a term's name is no single token
+    };
+    CODE code = NONE;
+    size_t offset = 0;
+    size_t length = 0;
 };
 
 // A variable found once by name. Element 0 is the variable index, the others are the positions of

@@ -39,6 +39,9 @@ class KQ_EXPORT Kq_BoolEquationImp {
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
                                       bool reverseTerms);
+    static Kq_BoolEquation::Refusal
+    FindRefusal(const Port::StringBase<char>& text,
+                const std::vector<Port::StringBase<char>>* terms = nullptr);
     unsigned int Eval() const;
 
     // Equal lists in length and equal trees, node by node; variables do not count.
@@ -107,7 +110,10 @@ class KQ_EXPORT Kq_BoolEquationImp {
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
 
     static StringMgr& GetNamePool();
-    static bool ScanTokens(const char* text, Tokens& tokens);
+    static bool ScanTokens(const char* text, Tokens& tokens,
+                           Kq_BoolEquation::Refusal* refusal = nullptr);
+    static void LocateToken(const char* text, size_t position, Kq_BoolEquation::Refusal& refusal);
+    Kq_BoolEquation::Refusal::CODE FindTreeRefusal(size_t& position) const;
     static std::vector<Variable> ListTerms(const std::vector<Port::StringBase<char>>& terms,
                                            bool reverseTerms);
 

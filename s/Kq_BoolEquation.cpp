@@ -82,6 +82,12 @@ bool Kq_BoolEquation::SetEquationWithExplicitTerms(const std::vector<String>& te
     return m_imp->SetEquationWithExplicitTerms(terms, equation, termOrderFlag, reverseTerms);
 }
 
+Kq_BoolEquation::Refusal Kq_BoolEquation::FindRefusal(const String& text,
+                                                      const std::vector<String>* terms)
+{
+    return Kq_BoolEquationImp::FindRefusal(text, terms);
+}
+
 bool Kq_BoolEquation::IsExpression() const
 {
     return m_imp->IsExpression();

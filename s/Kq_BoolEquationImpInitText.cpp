@@ -153,6 +153,18 @@ KqInitText::KqInitText(const String& text, const Variables& inputs, bool isFirst
         m_names.push_back(input.first);
 }
 
+size_t KqInitText::FindBadDigit(const String& text)
+{
+    const unsigned int bitsPerDigit = BitsPerDigit(text);
+    if (bitsPerDigit == 0)
+        return 0;
+    size_t position = kPrefixLength;
+    while (position < text.length() &&
+           kDigitValues.of[static_cast<unsigned char>(text.c_str()[position])] < 1u << bitsPerDigit)
+        ++position;
+    return position;
+}
+
 std::unique_ptr<KqInitText> KqInitText::Read(const String& text, const Variables& inputs,
                                              bool isFirstLowest)
 {

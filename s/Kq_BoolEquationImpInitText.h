@@ -43,6 +43,11 @@ class KqInitText {
     static std::unique_ptr<KqInitText> Read(const String& text, const Variables& inputs,
                                             bool isFirstLowest);
 
+    // Where a text that Read refuses has a byte that is no digit of its base: its length when there
+    // is none, 0 for an unknown prefix.
+    // Requires: IsCandidate(text).
+    static size_t FindBadDigit(const String& text);
+
     // As given.
     const String& GetText() const { return m_text; }
     const std::vector<String>& GetNames() const { return m_names; }

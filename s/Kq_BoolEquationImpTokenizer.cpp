@@ -11,6 +11,7 @@
 
 typedef Kq_BoolEquationImp::Node Node;
 typedef Port::StringBase<char> String;
+typedef Kq_BoolEquation::Refusal Refusal;
 
 namespace {
 
@@ -141,15 +142,71 @@ class Scanner {
     bool ScanText(const char* text)
     {
         m_next = text;
+        m_text = text;
         while (*m_next) {
             if (!ScanToken())
                 return false;
         }
         // Only the totals are compared: ")A(" is left for the tree builder to refuse.
-        return m_num_opened == m_num_closed;
+        return m_num_opened == m_num_closed || RefuseParens();
     }
 
+    // Scans up to the token at 'position' in an accepted text and puts its place into 'refusal'.
+    void Locate(const char* text, size_t position, Refusal& refusal)
+    {
+        m_next = text;
+        const char* start = text;
+        while (m_tokens.GetSize() <= position) {
+            start = m_next;
+            ScanToken();
+        }
+        refusal.offset = static_cast<size_t>(start - text);
+        refusal.length = static_cast<size_t>(m_next - start);
+    }
+
+    // Why ScanText was false.
+    const Refusal& GetRefusal() const { return m_refusal; }
+
   private:
+    // Records why the text is refused at the place reached, for whoever asks.
+    bool Refuse(Refusal::CODE code, size_t length)
+    {
+        m_refusal.code = code;
+        m_refusal.offset = static_cast<size_t>(m_next - m_text);
+        m_refusal.length = length;
+        return false;
+    }
+
+    // The first ")" that closes nothing, otherwise the last "(" that nothing closes, is to blame.
+    bool RefuseParens()
+    {
+        size_t numOpen = 0;
+        for (size_t position = 0; position < m_tokens.GetSize(); ++position) {
+            const Node::TYPE type = m_tokens.begin()[position].type;
+            if (type == Node::RP && numOpen == 0)
+                return RefuseToken(Refusal::RIGHT_PAREN, position);
+            numOpen += type == Node::LP ? 1u : 0u;
+            numOpen -= type == Node::RP ? 1u : 0u;
+        }
+        size_t numClosed = 0;
+        for (size_t position = m_tokens.GetSize(); position-- > 0;) {
+            const Node::TYPE type = m_tokens.begin()[position].type;
+            if (type == Node::LP && numClosed == 0)
+                return RefuseToken(Refusal::OPEN_PAREN, position);
+            numClosed += type == Node::RP ? 1u : 0u;
+            numClosed -= type == Node::LP ? 1u : 0u;
+        }
+        return false;
+    }
+
+    bool RefuseToken(Refusal::CODE code, size_t position)
+    {
+        m_refusal.code = code;
+        Kq_BoolEquationImp::Tokens again(0);
+        Scanner(m_names, again).Locate(m_text, position, m_refusal);
+        return false;
+    }
+
     bool ScanToken()
     {
         const Character& first = kCharacters[*m_next];
@@ -175,7 +232,7 @@ class Scanner {
         case DIGIT_OF_NAME:
             break;
         }
-        return false;
+        return Refuse(Refusal::CHARACTER, 1);
     }
 
     bool ScanName()
@@ -191,7 +248,7 @@ class Scanner {
     {
         const char* end = EndOfMarked(m_next, '\'');
         if (!end)
-            return false;
+            return Refuse(Refusal::OPEN_QUOTE, 1);
         AppendName(end);
         return true;
     }
@@ -200,11 +257,11 @@ class Scanner {
     {
         const char* end = EndOfMarked(m_next, '.');
         if (!end)
-            return false;
+            return Refuse(Refusal::OPEN_WORD, 1);
         const size_t length = static_cast<size_t>(end - m_next);
         const KqSpelling::Id id = KeywordSpelling(m_next, length);
         if (id == KqSpelling::kOwnToken)
-            return false;
+            return Refuse(Refusal::WORD, length);
         AppendSpelling(id, length);
         return true;
     }
@@ -249,6 +306,8 @@ class Scanner {
     Kq_BoolEquationImp::Tokens& m_tokens;
     const String* m_spellings = KqSpelling::GetTexts();
     const char* m_next = nullptr;
+    const char* m_text = nullptr; // where the text starts
+    Refusal m_refusal;
     size_t m_num_opened = 0;
     size_t m_num_closed = 0;
     std::string m_name; // scratch: the name being handed to the pool
@@ -256,10 +315,23 @@ class Scanner {
 
 } // namespace
 
-// The tokens of 'text'; false when it is refused. Tokens do not point into the text.
-bool Kq_BoolEquationImp::ScanTokens(const char* text, Tokens& tokens)
+// The tokens of 'text'; false when it is refused, and 'refusal', unless null, tells why. Tokens do
+// not point into the text.
+bool Kq_BoolEquationImp::ScanTokens(const char* text, Tokens& tokens, Refusal* refusal)
 {
-    return Scanner(GetNamePool(), tokens).ScanText(text);
+    Scanner scanner(GetNamePool(), tokens);
+    const bool isRead = scanner.ScanText(text);
+    if (!isRead && refusal)
+        *refusal = scanner.GetRefusal();
+    return isRead;
+}
+
+// Tokens do not know their places, because only a refusal asks.
+// Requires: 'text' is accepted by ScanTokens and has more than 'position' tokens.
+void Kq_BoolEquationImp::LocateToken(const char* text, size_t position, Refusal& refusal)
+{
+    Tokens tokens(0);
+    Scanner(GetNamePool(), tokens).Locate(text, position, refusal);
 }
 
 void Kq_BoolEquationImp::TokenizeNodes(const char* text)

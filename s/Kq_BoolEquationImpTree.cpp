@@ -10,6 +10,7 @@
 #include "Kq_BoolEquationImpStore.h"
 
 typedef Kq_BoolEquationImp::Node Node;
+typedef Kq_BoolEquation::Refusal Refusal;
 
 namespace {
 
@@ -58,6 +59,10 @@ class TreeBuilder {
     // The node to dump after a failure; null when nothing is to be dumped.
     const Node* GetBrokenNode() const { return m_broken; }
 
+    // Why there is no tree, and the token in text order that is to blame.
+    Refusal::CODE GetRefusal() const { return m_refusal; }
+    size_t GetRefusedPosition() const { return m_refused_position; }
+
   private:
     bool Place(Node* node);
     bool PlaceOperand(Node* node);
@@ -66,6 +71,10 @@ class TreeBuilder {
     bool PlaceInGroup(Node* node, Node* anchor);
     bool PlaceNegatedOperator(Node* node);
     Node* FindRoot();
+
+    bool Refuse(Refusal::CODE code, const Node* node, size_t numBehind = 0);
+    bool RefuseRightParen(const Node* node);
+    bool RefuseChildren(const Node* node);
 
     // The node that has 'node' as a child, null at the top. All walks up go this way, so they
     // end: it follows child links backwards, and those form a tree (invariants 1 and 2).
@@ -110,6 +119,8 @@ class TreeBuilder {
     Node* m_cursor;
     const Node* m_broken = nullptr;
     bool m_has_passed = false;
+    Refusal::CODE m_refusal = Refusal::NONE;
+    size_t m_refused_position = 0;
     // The top NOT of a negated operator inside something keeps its parent link to the operator's
     // first operand; this remembers the node that has it as a child.
     std::unordered_map<const Node*, Node*> m_holders;
@@ -146,7 +157,7 @@ bool TreeBuilder::PlaceOperand(Node* node)
     else if (!m_cursor->GetRightChild())
         m_cursor->SetRightChild(node);
     else
-        return false;
+        return Refuse(Refusal::OPERAND, node);
     node->SetParent(m_cursor);
     m_cursor = node;
     return true;
@@ -164,7 +175,7 @@ bool TreeBuilder::PlaceRightParen(Node* node)
         group = parent && isOpen(parent) ? parent : Up(group);
     }
     if (!group)
-        return false;
+        return RefuseRightParen(node);
     group->SetRightChild(node);
     node->SetParent(group);
     m_cursor = group;
@@ -213,7 +224,7 @@ bool TreeBuilder::PlaceInGroup(Node* node, Node* anchor)
         TakeLeft(node, m_cursor);
     } else {
         if (!anchor->IsLp())
-            return false;
+            return RefuseChildren(anchor);
         Node* operand = m_cursor;
         for (Node* above = Up(operand); above && above->IsNot(); above = Up(operand))
             operand = above;
@@ -237,7 +248,7 @@ bool TreeBuilder::PlaceNegatedOperator(Node* node)
     // An operand whose first slot was taken before ("A & ~ | B") has no place to give.
     if (!operand || operand->GetLeftChild() != chainTop) {
         m_broken = m_cursor;
-        return false;
+        return Refuse(Refusal::NEGATED_OPERATOR, m_cursor);
     }
     Node* holder = operand->GetParent();
     m_cursor->SetLeftChild(node);
@@ -253,6 +264,44 @@ bool TreeBuilder::PlaceNegatedOperator(Node* node)
     }
     m_cursor = node;
     return true;
+}
+
+// Records what is to blame, for whoever asks: the token 'numBehind' behind the node in text order.
+bool TreeBuilder::Refuse(Refusal::CODE code, const Node* node, size_t numBehind)
+{
+    // The first token is placed unseen, and a ")" there is the fault whatever follows from it.
+    const Node* first = m_nodes[0];
+    m_refusal = first->IsRp() ? Refusal::RIGHT_PAREN : code;
+    // Nodes lie side by side in text order.
+    m_refused_position = first->IsRp() ? 0 : static_cast<size_t>(node - first) + numBehind;
+    return false;
+}
+
+// A ")" that finds no open group. Where a "(" is open, the operator right behind it, perhaps
+// with a negation apart from it, has taken it for its operand and is to blame.
+bool TreeBuilder::RefuseRightParen(const Node* node)
+{
+    for (const Node* earlier = m_nodes[0]; earlier != node; ++earlier) {
+        if (!earlier->IsLp() || earlier->GetRightChild())
+            continue;
+        const Node* taker = earlier + 1;
+        while (taker->IsNot() && taker[1].IsNot())
+            ++taker;
+        return Refuse(taker->IsNot() ? Refusal::NEGATED_OPERATOR : Refusal::NO_LEFT_OPERAND, taker);
+    }
+    return Refuse(Refusal::RIGHT_PAREN, node);
+}
+
+// A node whose children are not those that its type allows.
+bool TreeBuilder::RefuseChildren(const Node* node)
+{
+    // Whatever hangs below a name or constant was written right behind it.
+    if (node->IsId() || node->IsConst())
+        return Refuse(Refusal::OPERAND, node, 1);
+    if (node->IsNot())
+        return Refuse(Refusal::NO_OPERAND, node);
+    // The first token has no operand before it; it has taken the right one in its place.
+    return Refuse(node == m_nodes[0] ? Refusal::NO_LEFT_OPERAND : Refusal::NO_RIGHT_OPERAND, node);
 }
 
 bool HasAllowedChildren(const Node& node)
@@ -291,6 +340,7 @@ Node* TreeBuilder::FindRoot()
         const bool isSecondRoot = root && !node->GetParent();
         if (isSecondRoot || !HasAllowedChildren(*node)) {
             m_broken = node;
+            RefuseChildren(node);
             return nullptr;
         }
         if (!node->GetParent())
@@ -313,4 +363,14 @@ void Kq_BoolEquationImp::BuildTree()
     }
     if (!m_store->HasEquation())
         Clear();
+}
+
+// Why the listed nodes make no tree; NONE when they do. They are loose tokens again afterwards.
+// Requires: nodes, without links, in text order.
+Refusal::CODE Kq_BoolEquationImp::FindTreeRefusal(size_t& position) const
+{
+    TreeBuilder builder(m_store->GetNodes());
+    builder.Build(false);
+    position = builder.GetRefusedPosition();
+    return builder.GetRefusal();
 }

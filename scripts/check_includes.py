@@ -53,6 +53,7 @@ SOURCE_HEADERS = {  # besides the host's interfaces and the public headers
     "NodeDbg.cpp": {"Spelling.h", "Diag.h", "Walk.h"},
     "NodeEval.cpp": {"Spelling.h", "Diag.h", "Walk.h"},
     "Program.cpp": {"Program.h", "Walk.h", "Word.h", "Writer.h"},
+    "Refusal.cpp": {"InitText.h", "Store.h"},
     "Render.cpp": {"Store.h", "Walk.h"},
     "Store.cpp": {"Store.h", "Walk.h", "sys/mman.h"},  # large pages for large texts
     "StringMgr.cpp": set(),

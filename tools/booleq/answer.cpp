@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <utility>
 
+#include "core/refusal.h"
 #include "core/text.h"
 #include "lines.h"
 #include "progress.h"
-#include "refusal.h"
 
 namespace booleq {
 
@@ -25,16 +25,29 @@ Json Envelope(const Text& text, const Request& request, const char* status)
     return json;
 }
 
-void SayRefusal(const Text& text, const Request& request, Output& output, const std::string& reason)
+void SayRefusal(const Text& text, const Request& request, Output& output,
+                const RefusalReport& report)
 {
     if (request.json) {
         Json json = Envelope(text, request, "refused");
-        json["refusal"]["reason"] = reason;
+        json["refusal"] = RefusalAsJson(report);
         output.Put(JsonLine(json) + "\n");
         return;
     }
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
-    Complain(output, place + "refused: " + reason);
+    const std::string line = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
+    if (report.length == 0) {
+        Complain(output, line + "refused: " + report.reason +
+                             (IsBlank(text.text) ? "" : "\n  " + Excerpt(text.text)));
+        return;
+    }
+    std::string message = line + "refused at " + PlaceName(text.text, report.offset) + ": " +
+                          report.reason + "\n" +
+                          MarkPlace(text.text, report.offset, report.length, "  ");
+    if (report.mend.empty())
+        message.pop_back(); // the line end is Complain's
+    else
+        message += "  " + report.mend;
+    Complain(output, message);
 }
 
 // An init value is read over the usable inputs in the order that the request gives.
@@ -76,19 +89,10 @@ int ForEachText(const Request& request, Output& output,
 bool SetEquation(const Text& text, const Request& request, Output& output,
                  Kq_BoolEquation& equation)
 {
-    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
-    const size_t nul = text.text.find('\0');
-    if (nul == std::string::npos && SetFromText(equation, text.text, request.reading))
+    if (text.text.find('\0') == std::string::npos &&
+        SetFromText(equation, text.text, request.reading))
         return true;
-    if (nul != std::string::npos)
-        SayRefusal(text, request, output,
-                   Excerpt(text.text) + "\n  a NUL byte at character " + std::to_string(nul + 1) +
-                       "; this is no plain text");
-    else if (IsBlank(text.text))
-        SayRefusal(text, request, output, "an empty equation");
-    else
-        SayRefusal(text, request, output,
-                   Excerpt(text.text) + "\n  " + ExplainRefusal(text.text, request.reading));
+    SayRefusal(text, request, output, ExplainRefusal(text.text, request.reading));
     return false;
 }
 
@@ -114,7 +118,21 @@ bool SetFunction(const Text& text, const Request& request, Output& output, Funct
 
 void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason)
 {
-    SayRefusal(text, request, output, request.json ? reason : Excerpt(text.text) + "\n  " + reason);
+    RefusalReport report;
+    report.code = "unsuitable";
+    report.reason = reason;
+    SayRefusal(text, request, output, report);
+}
+
+Json RefusalAsJson(const RefusalReport& report)
+{
+    Json json;
+    json["code"] = report.code;
+    json["offset"] = report.offset;
+    json["length"] = report.length;
+    json["reason"] = report.reason;
+    json["mend"] = report.mend.empty() ? Json() : Json(report.mend);
+    return json;
 }
 
 void PutJson(const Text& text, const Request& request, const char* status, const Json& result,

@@ -13,6 +13,7 @@
 
 #include "command.h"
 #include "core/function.h"
+#include "core/refusal.h"
 #include "output.h"
 #include "status.h"
 
@@ -44,6 +45,8 @@ bool SetFunction(const Text& text, const Request& request, Output& output, Funct
 // Refuses a text for a reason of the command's own; the way the refusals of SetEquation are said.
 void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason);
 
+// A refusal as it stands in the envelope of a refused text, in place of the result.
+Json RefusalAsJson(const RefusalReport& report);
 // The envelope around 'result'. 'status' is "done", "yes", "no" or "findings".
 void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
              Output& output);

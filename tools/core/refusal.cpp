@@ -1,0 +1,318 @@
+#include "refusal.h"
+
+#include <algorithm>
+#include <cstring>
+
+#include "function.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+typedef Kq_BoolEquation::Refusal Refusal;
+
+constexpr char kOperators[] = "&*|+^@";
+constexpr char kWords[] = "the words are .AND. .OR. .XOR. .NOT. .NAND. .NOR. .NXOR.";
+
+bool IsOneOf(const char* characters, char character)
+{
+    return character != '\0' && std::strchr(characters, character) != nullptr;
+}
+
+bool IsNamePart(char character)
+{
+    return (character >= 'A' && character <= 'Z') || (character >= 'a' && character <= 'z') ||
+           (character >= '0' && character <= '9') || character == '_';
+}
+
+std::string Quoted(const std::string& text)
+{
+    return "'" + Excerpt(text) + "'";
+}
+
+// The refused text around its place.
+class Context {
+  public:
+    Context(const std::string& text, const Refusal& refusal) : m_text(text), m_refusal(refusal) {}
+
+    std::string Token() const { return m_text.substr(m_refusal.offset, m_refusal.length); }
+    // The character so far behind the token's first one, NUL outside the text.
+    char At(size_t distance) const
+    {
+        const size_t position = m_refusal.offset + distance;
+        return position < m_text.size() ? m_text[position] : '\0';
+    }
+    char Before() const { return m_refusal.offset > 0 ? m_text[m_refusal.offset - 1] : '\0'; }
+    // The name that ends right before the place.
+    std::string NameBefore() const
+    {
+        size_t start = m_refusal.offset;
+        while (start > 0 && IsNamePart(m_text[start - 1]))
+            --start;
+        return m_text.substr(start, m_refusal.offset - start);
+    }
+    // The operator character behind a lone negation and blanks, NUL when there is none.
+    char OperatorBehindNegation() const
+    {
+        const size_t next = m_text.find_first_not_of(" \t\n", m_refusal.offset + 1);
+        const bool isSplit = next != std::string::npos && next > m_refusal.offset + 1;
+        return isSplit && IsOneOf(kOperators, m_text[next]) ? m_text[next] : '\0';
+    }
+    // Name and all that follows up to a blank, an operator or a parenthesis: "A[0]", "3B".
+    std::string WholeName() const
+    {
+        const std::string before = NameBefore();
+        const size_t start = m_refusal.offset - before.size();
+        size_t end = m_refusal.offset;
+        while (end < m_text.size() && !IsOneOf(" \t\r\n&*|+^@~!()'", m_text[end]))
+            ++end;
+        return m_text.substr(start, end - start);
+    }
+
+  private:
+    const std::string& m_text;
+    const Refusal& m_refusal;
+};
+
+void ExplainCharacter(const Context& context, RefusalReport& report)
+{
+    const char character = context.At(0);
+    if (character == '\r') {
+        report.reason = "a carriage return is no blank";
+        report.mend = "remove it (DOS line ends: tr -d '\\r')";
+        return;
+    }
+    report.reason = Quoted(context.Token()) + " is not part of the syntax";
+    if (character >= '2' && character <= '9')
+        report.reason =
+            Quoted(context.Token()) + " is no constant, 0 and 1 are, and begins no name";
+    const std::string name = context.WholeName();
+    if (character == '=')
+        report.mend = "leave out what is assigned to, up to the '='";
+    else if (name.size() > 1 && IsPrintable(name))
+        report.mend = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
+    else
+        report.mend = "a name with such a character needs single quotes";
+}
+
+void ExplainWord(const Context& context, RefusalReport& report)
+{
+    const std::string word = context.Token();
+    report.reason = Excerpt(word) + " is no operator; " + kWords;
+    std::string upper = word;
+    std::transform(upper.begin(), upper.end(), upper.begin(), [](char character) {
+        return character >= 'a' && character <= 'z' ? static_cast<char>(character - 32) : character;
+    });
+    if (upper == ".XNOR." || upper == ".NXOR.")
+        report.mend = "write .NXOR.";
+    else if (upper != word && std::strstr(kWords, upper.c_str()))
+        report.mend = "write " + upper;
+}
+
+void ExplainOperand(const Context& context, const std::string& text, const Reading& reading,
+                    RefusalReport& report)
+{
+    const std::string token = context.Token();
+    report.reason = Quoted(token) + " stands where an operator must: it follows an operand";
+    const bool looksLikeInit = text.size() > 2 && text[0] == '0' && IsOneOf("xXbB", text[1]) &&
+                               report.offset == 1 && !reading.hasInputs;
+    const char behindNegation = context.OperatorBehindNegation();
+    if (looksLikeInit)
+        report.mend = "for an init value name its inputs with --inputs, the most significant first";
+    else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
+        report.mend = "write '" + token + behindNegation + "' without a blank in it";
+    else if (token[0] == '\'' && !context.NameBefore().empty())
+        report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+    else
+        report.mend = "put an operator before it, & or |";
+}
+
+void ExplainOperator(const Context& context, const char* side, RefusalReport& report)
+{
+    const std::string token = context.Token();
+    report.reason = "the operator " + Quoted(token) + " has no operand on its " + side;
+    if (token.size() == 1 && context.At(1) == token[0])
+        report.mend = "write '" + token + "' for '" + token + token + "'";
+}
+
+void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalReport& report)
+{
+    const InitText init = ReadInitText(text, 0);
+    const bool isHex = (text[1] | 0x20) == 'x';
+    const size_t numGiven = CheckInputs(reading.inputs).usable.size();
+    report.reason = std::to_string(text.size() - 2) + (isHex ? " hexadecimal" : " binary") +
+                    (text.size() == 3 ? " digit is" : " digits are") + " read over exactly " +
+                    std::to_string(init.numInputs) + (init.numInputs == 1 ? " input" : " inputs") +
+                    ", and " + std::to_string(numGiven) +
+                    (numGiven == 1 ? " is listed" : " are listed");
+    if (isHex && text.size() == 3 && numGiven == 1)
+        report.mend = "over one input write the two bits as 0b...";
+}
+
+void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& report)
+{
+    switch (code) {
+    case Refusal::OPEN_PAREN:
+        report.reason = "nothing closes this '('";
+        report.mend = "add a ')' behind the group, or leave it out";
+        return;
+    case Refusal::RIGHT_PAREN:
+        report.reason = "this ')' closes no '('";
+        report.mend = "leave it out, or add a '(' before the group";
+        return;
+    case Refusal::NO_OPERAND:
+        report.reason = "the negation " + Quoted(context.Token()) + " has no operand behind it";
+        return;
+    case Refusal::NEGATED_OPERATOR:
+        report.reason = "the negation " + Quoted(context.Token()) +
+                        " stands before an operator and has no single operand before it to take";
+        return;
+    default:
+        return;
+    }
+}
+
+struct Named {
+    Refusal::CODE code;
+    const char* name;
+};
+
+const char* CodeName(Refusal::CODE code)
+{
+    static constexpr Named kNames[] = {
+        {Refusal::EMPTY, "empty"},
+        {Refusal::CHARACTER, "character"},
+        {Refusal::WORD, "word"},
+        {Refusal::OPEN_WORD, "open-word"},
+        {Refusal::OPEN_QUOTE, "open-quote"},
+        {Refusal::OPEN_PAREN, "open-parenthesis"},
+        {Refusal::RIGHT_PAREN, "right-parenthesis"},
+        {Refusal::OPERAND, "operand"},
+        {Refusal::NO_LEFT_OPERAND, "no-left-operand"},
+        {Refusal::NO_RIGHT_OPERAND, "no-right-operand"},
+        {Refusal::NO_OPERAND, "no-operand"},
+        {Refusal::NEGATED_OPERATOR, "negated-operator"},
+        {Refusal::INIT_PREFIX, "init-prefix"},
+        {Refusal::INIT_DIGIT, "init-digit"},
+        {Refusal::INIT_WIDTH, "init-width"},
+        {Refusal::INIT_NAME, "init-name"},
+    };
+    for (const Named& named : kNames)
+        if (named.code == code)
+            return named.name;
+    return nullptr;
+}
+
+void ExplainCode(const std::string& text, const Reading& reading, const Refusal& refusal,
+                 RefusalReport& report)
+{
+    const Context context(text, refusal);
+    switch (refusal.code) {
+    case Refusal::NONE:
+        return;
+    case Refusal::EMPTY:
+        report.reason = "an empty equation";
+        return;
+    case Refusal::CHARACTER:
+        return ExplainCharacter(context, report);
+    case Refusal::WORD:
+        return ExplainWord(context, report);
+    case Refusal::OPEN_WORD:
+        report.reason = std::string("the '.' has no second '.'; ") + kWords;
+        return;
+    case Refusal::OPEN_QUOTE:
+        report.reason = "nothing closes this quote";
+        if (!context.NameBefore().empty())
+            report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+        else if (context.Before() == ')')
+            report.mend = "the negation of a group stands before it: ~( )";
+        return;
+    case Refusal::OPERAND:
+        return ExplainOperand(context, text, reading, report);
+    case Refusal::NO_LEFT_OPERAND:
+        return ExplainOperator(context, "left", report);
+    case Refusal::NO_RIGHT_OPERAND:
+        return ExplainOperator(context, "right", report);
+    case Refusal::OPEN_PAREN:
+    case Refusal::RIGHT_PAREN:
+    case Refusal::NO_OPERAND:
+    case Refusal::NEGATED_OPERATOR:
+        return ExplainBuild(context, refusal.code, report);
+    case Refusal::INIT_PREFIX:
+        report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... or "
+                        "0b...";
+        report.mend = "put an expression that begins so in parentheses";
+        return;
+    case Refusal::INIT_DIGIT:
+        report.reason = Quoted(context.Token()) + " is no " +
+                        ((text[1] | 0x20) == 'x' ? "hexadecimal" : "binary") + " digit";
+        return;
+    case Refusal::INIT_WIDTH:
+        return ExplainInitWidth(text, reading, report);
+    case Refusal::INIT_NAME:
+        report.reason =
+            "an input's name has more behind its second quote, and no init value can be "
+            "read over it";
+        return;
+    }
+}
+
+} // namespace
+
+RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
+{
+    RefusalReport report;
+    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
+    const size_t nul = text.find('\0');
+    if (nul != std::string::npos) {
+        report.code = "nul-byte";
+        report.offset = nul;
+        report.length = 1;
+        report.reason = "a NUL byte; this is no plain text";
+        return report;
+    }
+    std::vector<Port::StringBase<char>> terms;
+    for (const std::string& input : reading.inputs)
+        terms.push_back(input.c_str());
+    const Refusal refusal =
+        Kq_BoolEquation::FindRefusal(text.c_str(), reading.hasInputs ? &terms : nullptr);
+    report.code = CodeName(refusal.code);
+    report.offset = refusal.offset;
+    report.length = refusal.length;
+    ExplainCode(text, reading, refusal, report);
+    return report;
+}
+
+std::string MarkPlace(const std::string& text, size_t offset, size_t length,
+                      const std::string& indent)
+{
+    constexpr size_t kBefore = 40;
+    constexpr size_t kShown = 60;
+    const size_t lineFeed = offset == 0 ? std::string::npos : text.rfind('\n', offset - 1);
+    const size_t lineStart = lineFeed == std::string::npos ? 0 : lineFeed + 1;
+    const size_t lineEnd = std::min(text.find('\n', offset), text.size());
+    const size_t start = std::max(lineStart, offset > kBefore ? offset - kBefore : 0);
+    const size_t end = std::min(lineEnd, start + kShown);
+    const std::string left = (start > lineStart ? "..." : "") +
+                             Visible(text.substr(start, std::min(offset, end) - start));
+    const size_t markEnd = std::max(offset, std::min(end, offset + length));
+    const std::string marked = Visible(text.substr(offset, markEnd - offset));
+    const std::string right = Visible(text.substr(markEnd, std::max(end, markEnd) - markEnd)) +
+                              (end < lineEnd ? "..." : "");
+    return indent + left + marked + right + "\n" + indent + std::string(left.size(), ' ') +
+           std::string(std::max<size_t>(1, marked.size()), '^') + "\n";
+}
+
+std::string PlaceName(const std::string& text, size_t offset)
+{
+    const auto lineFeeds = std::count(text.begin(), text.begin() + static_cast<long>(offset), '\n');
+    const size_t lineFeed = offset == 0 ? std::string::npos : text.rfind('\n', offset - 1);
+    const size_t column = lineFeed == std::string::npos ? offset : offset - lineFeed - 1;
+    const std::string character = "character " + std::to_string(column + 1);
+    return text.find('\n') == std::string::npos
+               ? character
+               : "line " + std::to_string(lineFeeds + 1) + ", " + character;
+}
+
+} // namespace booleq

@@ -3,8 +3,6 @@
 
 #include <algorithm>
 
-#include "commands.h"
-
 namespace booleq {
 
 const std::vector<Option>& CommonOptions()
@@ -23,8 +21,8 @@ const std::vector<Option>& CommonOptions()
 const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
-        ShowCommand(),
-        ConvertCommand(),
+        ShowCommand(),  CheckCommand(),   EvalCommand(), TableCommand(), InitCommand(),
+        EqualCommand(), ConvertCommand(), TreeCommand(), KmapCommand(),
     };
     return commands;
 }

@@ -7,6 +7,13 @@
 namespace booleq {
 
 Command ShowCommand();
+Command CheckCommand();
+Command EvalCommand();
+Command TableCommand();
+Command InitCommand();
+Command EqualCommand();
+Command TreeCommand();
+Command KmapCommand();
 Command ConvertCommand();
 
 } // namespace booleq

@@ -1,4 +1,5 @@
-// The command 'convert': an equation as text of another notation, proved equal before it is printed.
+// The command 'convert': an equation as text of another notation, proved equal before it is
+// printed.
 #include "core/convert.h"
 
 #include "answer.h"
@@ -35,7 +36,8 @@ std::string ParseUnit(const Request& request, Target target)
                                                                 "ABCDEFGHIJKLMNOPQRSTUVWXYZ"
                                                                 "0123456789_") == std::string::npos;
     const bool startsWell = !name.empty() && name[0] != '_' && (name[0] < '0' || name[0] > '9');
-    const bool isVhdlName = name.find("__") == std::string::npos && (name.empty() || name.back() != '_');
+    const bool isVhdlName =
+        name.find("__") == std::string::npos && (name.empty() || name.back() != '_');
     if (request.Has("--name") && !(isWord && startsWell && isVhdlName))
         throw UsageError("--name takes letters, digits and single '_', a letter first, not '" +
                          Visible(name) + "'");
@@ -100,23 +102,24 @@ int RunConvert(const Request& request, Output& output)
 
 Command ConvertCommand()
 {
-    return {"convert",
-            "EQUATION",
-            1,
-            1,
-            "Write an equation in another notation, with the parentheses it needs there",
-            "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
-            "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
-            "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
-            "the answer says how. Before it is printed the text is read again and compared.\n"
-            "Of lines, each module gets its line's number behind its name.\n",
-            {{"--to", "TARGET", "What to write"},
-             {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
-             {"--name", "NAME", "The name of that, or of the model of a blif file (f)"}},
-            {"booleq convert 'a | b & c' --to verilog",
-             "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",
-             "booleq convert --inputs A,B 0x6 --to python"},
-            RunConvert};
+    return {
+        "convert",
+        "EQUATION",
+        1,
+        1,
+        "Write an equation in another notation, with the parentheses it needs there",
+        "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
+        "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
+        "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
+        "the answer says how. Before it is printed the text is read again and compared.\n"
+        "Of lines, each module gets its line's number behind its name.\n",
+        {{"--to", "TARGET", "What to write"},
+         {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
+         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"}},
+        {"booleq convert 'a | b & c' --to verilog",
+         "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",
+         "booleq convert --inputs A,B 0x6 --to python"},
+        RunConvert};
 }
 
 } // namespace booleq

@@ -3,7 +3,7 @@
 #include "commands.h"
 #include "core/text.h"
 #include "options.h"
-#include "table.h"
+#include "rows.h"
 
 namespace booleq {
 
@@ -162,7 +162,7 @@ void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Notes& notes)
 {
     if (!IsPrintable(ToStd(equation.GetInitValueTermEquation())))
         notes.push_back("bytes that are not printable ASCII are shown as \\xNN");
-    if (hasTable && HasNumberedColumn(equation))
+    if (hasTable && HasNumberedColumn(InputNames(equation)))
         notes.push_back("column #k of the table is the k-th input");
 }
 

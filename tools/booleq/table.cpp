@@ -1,101 +1,104 @@
-#include "table.h"
-
+// The command 'table': the truth table in several formats, streamed.
 #include <algorithm>
+#include <limits>
 
+#include "answer.h"
+#include "commands.h"
 #include "core/text.h"
+#include "options.h"
+#include "rows.h"
 
 namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxHeaderName = 16;
-
-std::vector<std::string> ColumnNames(const Kq_BoolEquation& equation)
+RowFormat ParseFormat(const Request& request)
 {
-    std::vector<std::string> names;
-    for (const auto& variable : equation.GetVariables()) {
-        const std::string name = ToStd(variable.first);
-        const bool fits = name.size() <= kMaxHeaderName && IsPrintable(name);
-        names.push_back(fits ? name : "#" + std::to_string(names.size() + 1));
-    }
-    return names;
+    const std::string format = request.Get("--format");
+    if (request.json && format != "json" && request.Has("--format"))
+        throw UsageError("--json and --format " + Visible(format) + " are two formats: give one");
+    if (format == "markdown")
+        return RowFormat::kMarkdown;
+    if (format == "csv")
+        return RowFormat::kCsv;
+    if (format == "json" || request.json)
+        return RowFormat::kJson;
+    if (format == "text" || !request.Has("--format"))
+        return RowFormat::kText;
+    throw UsageError("--format is text, markdown, csv or json, not '" + Visible(format) + "'");
 }
 
-std::string RightAligned(const std::string& text, size_t width)
+// Nobody fills a disk unawares.
+void AnnounceSize(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format,
+                  Output& output)
 {
-    return std::string(width - std::min(width, text.size()), ' ') + text;
+    constexpr uint64_t kMuch = 10000000;
+    const uint64_t numBytes = EstimateBytes(names, maxRows, format);
+    if (numBytes < kMuch)
+        return;
+    const uint64_t numRows = std::min(maxRows, uint64_t(1) << names.size());
+    Complain(output, std::to_string(numRows) + " rows, about " +
+                         std::to_string(numBytes / 1000000) + " MB");
 }
 
-// Results by row number, from whichever source costs less for the rows that are wanted.
-class Results {
-  public:
-    Results(Kq_BoolEquation& equation, uint64_t numRows, uint64_t numWanted) : m_equation(equation)
-    {
-        // The packed column takes about the work of one evaluation for 64 rows.
-        if (numWanted >= numRows / 64) {
-            m_hex = equation.GetEquationAsHexInitValue(false);
-            return;
-        }
-        for (const auto& variable : equation.GetVariables())
-            m_handles.push_back(equation.GetVariableHandle(variable.first));
+void PutRows(const Text& text, const Request& request, const Function& function, RowFormat format,
+             Output& output)
+{
+    const std::vector<std::string>& names = function.Inputs();
+    const uint64_t maxRows = request.Has("--rows") ? ParseRows(request.Get("--rows"))
+                                                   : std::numeric_limits<uint64_t>::max();
+    AnnounceSize(names, maxRows, format, output);
+    const auto valueAt = [&function](uint64_t row) { return function.At(row); };
+    if (format != RowFormat::kJson) {
+        PrintRows(names, maxRows, format, valueAt, output);
+        return;
     }
+    Json result;
+    result["inputs"] = names;
+    result["num_rows"] = function.NumRows();
+    result["rows"] = Json::array();
+    const auto around = JsonAroundArray(text, request, "done", result);
+    output.Put(around.first);
+    PrintRows(names, maxRows, format, valueAt, output);
+    output.Put(around.second);
+}
 
-    unsigned int At(uint64_t row)
-    {
-        if (m_hex.length() > 0) {
-            const char digit = m_hex.c_str()[m_hex.length() - 1 - row / 4];
-            const int value = digit <= '9' ? digit - '0' : digit - 'a' + 10;
-            return (static_cast<unsigned int>(value) >> (row % 4)) & 1u;
-        }
-        for (size_t column = 0; column < m_handles.size(); ++column) // shift: below 30
-            m_equation.SetVariable(m_handles[column],
-                                   (row >> (m_handles.size() - 1 - column)) & 1u);
-        return m_equation.Eval();
-    }
-
-  private:
-    Kq_BoolEquation& m_equation;
-    Port::StringBase<char> m_hex; // digit k from the end holds rows 4k to 4k + 3
-    std::vector<Kq_BoolEquation::Handle> m_handles;
-};
+int RunTable(const Request& request, Output& output)
+{
+    const RowFormat format = ParseFormat(request);
+    if (request.Has("--rows"))
+        ParseRows(request.Get("--rows")); // wrong usage shows before any answer
+    Request asJson = request;             // refusals are answered in the format asked for
+    asJson.json = format == RowFormat::kJson;
+    return ForEachText(asJson, output, [&](const Text& text) {
+        Function function;
+        if (!SetFunction(text, asJson, output, function))
+            return kRefused;
+        if (text.line > 0 && format != RowFormat::kJson)
+            output.Put("# line " + std::to_string(text.line) + "\n");
+        PutRows(text, asJson, function, format, output);
+        return kDone;
+    });
+}
 
 } // namespace
 
-bool HasNumberedColumn(const Kq_BoolEquation& equation)
+Command TableCommand()
 {
-    const std::vector<std::string> names = ColumnNames(equation);
-    return std::any_of(names.begin(), names.end(),
-                       [](const std::string& name) { return name[0] == '#'; });
-}
-
-void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
-{
-    const std::vector<std::string> names = ColumnNames(equation);
-    const uint64_t numRows = uint64_t(1) << names.size(); // at most 30 names
-    const uint64_t numPrinted = std::min(numRows, maxRows);
-    if (numPrinted == 0)
-        return;
-    const size_t rowWidth = std::max<size_t>(3, std::to_string(numPrinted - 1).size());
-
-    std::string header = "\n  " + RightAligned("row", rowWidth) + " ";
-    for (const std::string& name : names)
-        header += " " + name;
-    output.Put(header + " | result\n");
-
-    Results results(equation, numRows, numPrinted);
-    std::string line;
-    for (uint64_t row = 0; row < numPrinted; ++row) {
-        line = "  " + RightAligned(std::to_string(row), rowWidth) + " ";
-        for (size_t column = 0; column < names.size(); ++column) {
-            line.append(names[column].size(), ' ');
-            line += ((row >> (names.size() - 1 - column)) & 1u) ? '1' : '0';
-        }
-        line += results.At(row) ? " | 1\n" : " | 0\n";
-        output.Put(line);
-    }
-    if (numPrinted < numRows)
-        output.Put("  rows not shown: " + std::to_string(numRows - numPrinted) +
-                   "; --rows all prints them all\n");
+    return {
+        "table",
+        "EQUATION",
+        1,
+        1,
+        "Print the truth table as text, Markdown, CSV or JSON",
+        "Row k assigns the binary digits of k to the inputs, the first input most significant.\n"
+        "Up to 30 inputs; rows are written as they are made, and how much it will be is said\n"
+        "before more than 10 MB. Of a line the table begins with '# line N'.\n",
+        {{"--format", "text|markdown|csv|json", "How to print it (text)"},
+         {"--rows", "N|all", "Rows to print (all)"}},
+        {"booleq table 'A & ~B'", "booleq table --format csv 'A ^ B ^ C'",
+         "booleq table --inputs A,B 0x6 --format markdown"},
+        RunTable};
 }
 
 } // namespace booleq

@@ -22,8 +22,8 @@ Comparison Compare(const WordFunction& left, const WordFunction& right, unsigned
     uint64_t numWords = kNumSampleWords;
     if (numInputs <= kMaxExhaustiveInputs)
         numWords = numInputs > 6 ? uint64_t(1) << (numInputs - 6) : 1;
-    result.isExhaustive =
-        numInputs <= kMaxExhaustiveInputs && numWords <= kMaxOperations / std::max<uint64_t>(cost, 1);
+    result.isExhaustive = numInputs <= kMaxExhaustiveInputs &&
+                          numWords <= kMaxOperations / std::max<uint64_t>(cost, 1);
     if (!result.isExhaustive)
         numWords = std::min(numWords, kNumSampleWords);
     const uint64_t rowsPerWord = numInputs < 6 ? uint64_t(1) << numInputs : 64;

@@ -18,8 +18,8 @@ struct Comparison {
     std::vector<bool> first;     // values of the inputs where they differ; empty when equal
 };
 
-// Rows are tried in ascending order, so 'first' is the first row that differs, or, in a sample, some
-// row that does. 'cost' is what a word takes, in operations; it decides what is too many.
+// Rows are tried in ascending order, so 'first' is the first row that differs, or, in a sample,
+// some row that does. 'cost' is what a word takes, in operations; it decides what is too many.
 Comparison Compare(const WordFunction& left, const WordFunction& right, unsigned int numInputs,
                    uint64_t cost);
 

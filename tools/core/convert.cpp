@@ -131,8 +131,8 @@ std::string WriteNetwork(const Expression& expression, Target target, const Conv
     if (target == Target::Eqn)
         return WriteEqn(expression, names);
     if (expression.names.size() > kMaxCoverInputs || expression.names.empty()) {
-        fault = "a pla is written for 1 to " + std::to_string(kMaxCoverInputs) + " inputs; this has " +
-                std::to_string(expression.names.size());
+        fault = "a pla is written for 1 to " + std::to_string(kMaxCoverInputs) +
+                " inputs; this has " + std::to_string(expression.names.size());
         return std::string();
     }
     return WritePla(FindCover(Bits(ToFunction(expression))), names);
@@ -249,9 +249,9 @@ void NameEverything(const Expression& expression, Target target, const std::stri
 
 const std::vector<const char*>& TargetNames()
 {
-    static const std::vector<const char*> kNames = {"primary", "alt1", "alt2",    "alt3", "paren",
-                                                    "verilog", "vhdl", "c",       "python",
-                                                    "liberty", "blif", "pla",     "eqn"};
+    static const std::vector<const char*> kNames = {"primary", "alt1", "alt2", "alt3",   "paren",
+                                                    "verilog", "vhdl", "c",    "python", "liberty",
+                                                    "blif",    "pla",  "eqn"};
     return kNames;
 }
 
@@ -297,9 +297,9 @@ Conversion Convert(const Expression& expression, Target target, const std::strin
     };
     Comparison comparison;
     if (isRead)
-        comparison = Compare(original, reread.function,
-                             static_cast<unsigned int>(expression.names.size()),
-                             expression.nodes.size() + reread.cost);
+        comparison =
+            Compare(original, reread.function, static_cast<unsigned int>(expression.names.size()),
+                    expression.nodes.size() + reread.cost);
     if (!isRead || !comparison.isEqual) {
         conversion.fault = "the text written does not read back as this function";
         return conversion;

@@ -1,6 +1,6 @@
-// Functions as sums of products, found by Minato's and Morreale's recursion: each product is a prime
-// and none can be left out. That is not always the fewest products, but it is found at once, and
-// for a function that no input makes both rise and fall it is the only such sum.
+// Functions as sums of products, found by Minato's and Morreale's recursion: each product is a
+// prime and none can be left out. That is not always the fewest products, but it is found at once,
+// and for a function that no input makes both rise and fall it is the only such sum.
 #ifndef BOOLEQ_CORE_COVER_H
 #define BOOLEQ_CORE_COVER_H
 
@@ -11,8 +11,8 @@
 
 namespace booleq {
 
-// A product of inputs: input k takes part where bit k of 'used' is set, and must then have the value
-// of bit k of 'values'.
+// A product of inputs: input k takes part where bit k of 'used' is set, and must then have the
+// value of bit k of 'values'.
 struct Cube {
     uint32_t used;
     uint32_t values;

@@ -12,7 +12,7 @@ typedef Kq_BoolEquationImp::Node LibraryNode;
 
 // By operator, from And on; then by style.
 constexpr const char* kBinarySpellings[][3] = {
-    {"&", "*", ".AND."},    {"|", "+", ".OR."},   {"^", "@", ".XOR."},
+    {"&", "*", ".AND."},    {"|", "+", ".OR."},    {"^", "@", ".XOR."},
     {"~&", "~*", ".NAND."}, {"~|", "~+", ".NOR."}, {"~^", "~@", ".NXOR."},
 };
 constexpr uint8_t kBang = 4;

@@ -19,8 +19,8 @@ std::string Sanitized(const std::string& content)
 {
     std::string name;
     for (const char character : content) {
-        const bool isLetter = (character >= 'a' && character <= 'z') ||
-                              (character >= 'A' && character <= 'Z');
+        const bool isLetter =
+            (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
         const bool isDigit = character >= '0' && character <= '9';
         if (name.empty() && !isLetter)
             name = "n";

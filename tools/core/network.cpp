@@ -13,7 +13,8 @@ namespace {
 // Names for signals inside, "n1" and on, that no input has.
 class FreshNames {
   public:
-    explicit FreshNames(const NetworkNames& names) : m_used(names.inputs.begin(), names.inputs.end())
+    explicit FreshNames(const NetworkNames& names)
+        : m_used(names.inputs.begin(), names.inputs.end())
     {
         m_used.insert(names.output);
     }
@@ -175,8 +176,8 @@ class EqnWriter {
 
 std::string WriteBlif(const Expression& expression, const NetworkNames& names)
 {
-    std::string text = ".model " + names.model + "\n.inputs" + Joined(names.inputs) + "\n.outputs " +
-                       names.output + "\n";
+    std::string text = ".model " + names.model + "\n.inputs" + Joined(names.inputs) +
+                       "\n.outputs " + names.output + "\n";
     FreshNames fresh(names);
     std::vector<std::string> operands;
     for (size_t node = 0; node < expression.nodes.size(); ++node) {
@@ -212,7 +213,8 @@ std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names)
 {
     const size_t numInputs = names.inputs.size();
     std::string text = ".i " + std::to_string(numInputs) + "\n.o 1\n.ilb" + Joined(names.inputs) +
-                       "\n.ob " + names.output + "\n.p " + std::to_string(std::max<size_t>(cubes.size(), 1)) + "\n";
+                       "\n.ob " + names.output + "\n.p " +
+                       std::to_string(std::max<size_t>(cubes.size(), 1)) + "\n";
     for (const Cube& cube : cubes) {
         for (size_t input = 0; input < numInputs; ++input) {
             const bool isUsed = (cube.used >> input & 1u) != 0;

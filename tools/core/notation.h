@@ -63,7 +63,7 @@ struct Notation {
     bool ignoresCase;
     bool (*isPlainName)(const std::string& name); // a name as it may stand, keywords apart
     const char* const* keywords;                  // ended by null
-    std::string (*escape)(const std::string&);    // any other name, empty when it cannot be; or null
+    std::string (*escape)(const std::string&); // any other name, empty when it cannot be; or null
 };
 
 const Notation& VerilogNotation();

@@ -227,8 +227,7 @@ bool Reader::ReadName()
 bool Reader::AddName(const std::string& name)
 {
     const std::string canonical = CanonicalName(m_notation, name);
-    const auto found =
-        m_numbers.emplace(canonical, static_cast<uint32_t>(m_tree.names.size()));
+    const auto found = m_numbers.emplace(canonical, static_cast<uint32_t>(m_tree.names.size()));
     if (found.second)
         m_tree.names.push_back(canonical);
     Add(Meaning::Input, found.first->second, 0, nullptr);

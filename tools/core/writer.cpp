@@ -189,8 +189,8 @@ class Writer {
 
     Form FormOf(const Expression::Node& node) const
     {
-        return m_syntax.FormOf(IsInversion(node) ? Expression::Node{Operator::Not, node.spelling, 0, 0}
-                                                 : node);
+        return m_syntax.FormOf(
+            IsInversion(node) ? Expression::Node{Operator::Not, node.spelling, 0, 0} : node);
     }
 
     bool InversionNeeds(const Form& inversion, const Expression::Node& operand) const
@@ -211,8 +211,8 @@ class Writer {
             return true;
         if (form.level != own.level || !isLeft)
             return form.level <= own.level;
-        const bool chains = own.chain == Chain::Any ||
-                            (own.chain == Chain::Same && node.op == operand.op);
+        const bool chains =
+            own.chain == Chain::Any || (own.chain == Chain::Same && node.op == operand.op);
         return !chains || form.chain == Chain::None;
     }
 

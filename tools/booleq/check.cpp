@@ -1,0 +1,60 @@
+// The command 'check': accepted, or the refusal that every command gives.
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+#include "options.h"
+#include "rows.h"
+
+namespace booleq {
+
+namespace {
+
+std::string Kind(const Kq_BoolEquation& equation)
+{
+    if (equation.IsHexInitValue())
+        return "hexadecimal init value";
+    return equation.IsBinaryInitValue() ? "binary init value" : "expression";
+}
+
+int RunCheck(const Request& request, Output& output)
+{
+    return ForEachText(request, output, [&](const Text& text) {
+        Kq_BoolEquation equation;
+        if (!SetEquation(text, request, output, equation))
+            return kRefused;
+        const std::vector<std::string> names = InputNames(equation);
+        if (request.json) {
+            Json result;
+            result["kind"] = Kind(equation);
+            result["inputs"] = names;
+            PutJson(text, request, "yes", result, output);
+            return kDone;
+        }
+        std::string list;
+        for (const std::string& name : names)
+            list += (list.empty() ? ": " : ", ") + Visible(name);
+        const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
+        output.Put(place + "accepted: " + Kind(equation) + " over " +
+                   (names.empty() ? "no inputs" : Count(names.size(), "input")) + list + "\n");
+        return kDone;
+    });
+}
+
+} // namespace
+
+Command CheckCommand()
+{
+    return {
+        "check",
+        "EQUATION",
+        1,
+        1,
+        "Tell whether a text is accepted, and where and why not",
+        "A refusal, here and in all commands, marks the place, gives the reason and, where the\n"
+        "text shows what was meant, the mend. Status 0: accepted, 3: refused.\n",
+        {},
+        {"booleq check 'A && B'", "booleq check \"A'\"", "booleq check --file equations.txt"},
+        RunCheck};
+}
+
+} // namespace booleq

@@ -1,0 +1,103 @@
+// The command 'eval': the value for one assignment.
+#include <set>
+
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+#include "rows.h"
+
+namespace booleq {
+
+namespace {
+
+struct Assignment {
+    std::string name;
+    unsigned int value = 0;
+};
+
+// "A=1"; the name may have a '=' inside quotes.  Fails: UsageError.
+Assignment ParseAssignment(const std::string& word)
+{
+    const size_t sign = word.rfind('=');
+    const std::string value = sign == std::string::npos ? std::string() : word.substr(sign + 1);
+    if (sign == 0 || (value != "0" && value != "1"))
+        throw UsageError("'" + Excerpt(word) + "' is no assignment: write NAME=0 or NAME=1");
+    return {word.substr(0, sign), value == "1" ? 1u : 0u};
+}
+
+std::vector<Assignment> ParseAssignments(const Request& request)
+{
+    std::vector<Assignment> assignments;
+    std::set<std::string> names;
+    for (size_t index = request.hasLines ? 0 : 1; index < request.operands.size(); ++index) {
+        assignments.push_back(ParseAssignment(request.operands[index]));
+        if (!names.insert(assignments.back().name).second)
+            throw UsageError(Excerpt(assignments.back().name) + " is assigned twice");
+    }
+    return assignments;
+}
+
+// What keeps the assignments from being one value for each input; empty when nothing does.
+std::string Assign(Kq_BoolEquation& equation, const std::vector<Assignment>& assignments)
+{
+    for (const Assignment& assignment : assignments)
+        if (!equation.SetVariable(assignment.name.c_str(), assignment.value))
+            return "there is no input " + Excerpt(assignment.name);
+    std::set<std::string> assigned;
+    for (const Assignment& assignment : assignments)
+        assigned.insert(assignment.name);
+    for (const std::string& name : InputNames(equation))
+        if (assigned.count(name) == 0)
+            return "no value for " + Excerpt(name) + ": write " + Excerpt(name) + "=0 or " +
+                   Excerpt(name) + "=1";
+    return std::string();
+}
+
+int RunEval(const Request& request, Output& output)
+{
+    const std::vector<Assignment> assignments = ParseAssignments(request);
+    return ForEachText(request, output, [&](const Text& text) {
+        Kq_BoolEquation equation;
+        if (!SetEquation(text, request, output, equation))
+            return kRefused;
+        const std::string fault = Assign(equation, assignments);
+        if (!fault.empty() && text.line == 0)
+            throw UsageError(fault);
+        if (!fault.empty()) {
+            Refuse(text, request, output, fault);
+            return kWrongUsage;
+        }
+        const unsigned int value = equation.Eval();
+        if (request.json) {
+            Json result;
+            for (const Assignment& assignment : assignments)
+                result["assignment"][assignment.name] = assignment.value;
+            result["value"] = value;
+            PutJson(text, request, "done", result, output);
+        } else if (text.line > 0) {
+            PutField(output, "line " + std::to_string(text.line), std::to_string(value));
+        } else {
+            output.Put(std::to_string(value) + "\n");
+        }
+        return kDone;
+    });
+}
+
+} // namespace
+
+Command EvalCommand()
+{
+    return {"eval",
+            "EQUATION [NAME=VALUE...]",
+            1,
+            kAnyNumber,
+            "Print the value for one assignment",
+            "Every input needs a value, 0 or 1. The answer is the status 0 and the value printed,\n"
+            "0 or 1; a missing value or an unknown name is wrong usage.\n",
+            {},
+            {"booleq eval 'A & ~B' A=1 B=0", "booleq eval --inputs A,B 0x6 A=1 B=1",
+             "booleq eval --file equations.txt A=1 B=0"},
+            RunEval};
+}
+
+} // namespace booleq

@@ -1,0 +1,207 @@
+// The command 'kmap': the Karnaugh map of up to six inputs, as text and as SVG. Rows and columns
+// stand in Gray code: neighbours differ in one input.
+#include <algorithm>
+
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr size_t kMaxMapInputs = 6;
+
+uint64_t GrayCode(uint64_t place)
+{
+    return place ^ (place >> 1);
+}
+
+std::string Bits(uint64_t value, size_t width)
+{
+    std::string bits;
+    for (size_t bit = width; bit-- > 0;)
+        bits += (value >> bit & 1u) ? '1' : '0';
+    return bits;
+}
+
+// The first half of the inputs, rounded down, numbers the rows, the others the columns.
+struct Map {
+    explicit Map(const Function& map)
+        : function(map), numRowInputs(map.NumInputs() / 2),
+          numColumnInputs(map.NumInputs() - numRowInputs)
+    {
+    }
+
+    uint64_t NumRows() const { return uint64_t(1) << numRowInputs; }
+    uint64_t NumColumns() const { return uint64_t(1) << numColumnInputs; }
+    std::string RowLabel(uint64_t row) const { return Bits(GrayCode(row), numRowInputs); }
+    std::string ColumnLabel(uint64_t column) const
+    {
+        return Bits(GrayCode(column), numColumnInputs);
+    }
+    bool At(uint64_t row, uint64_t column) const
+    {
+        return function.At(GrayCode(row) << numColumnInputs | GrayCode(column));
+    }
+    std::string RowNames() const { return Names(0, numRowInputs); }
+    std::string ColumnNames() const { return Names(numRowInputs, function.NumInputs()); }
+    std::string Names(size_t from, size_t to) const
+    {
+        std::string names;
+        for (size_t index = from; index < to; ++index)
+            names += (index == from ? "" : " ") + Visible(function.Inputs()[index]);
+        return names;
+    }
+
+    const Function& function;
+    size_t numRowInputs;
+    size_t numColumnInputs;
+};
+
+void PutText(const Map& map, Output& output)
+{
+    const std::string rowNames = map.RowNames();
+    const size_t width = std::max(rowNames.size(), map.numRowInputs);
+    output.Put(std::string(width, ' ') + "  " + map.ColumnNames() + "\n");
+    output.Put(rowNames + std::string(width - rowNames.size(), ' '));
+    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+        output.Put("  " + map.ColumnLabel(column));
+    output.Put("\n");
+    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+        const std::string label = map.RowLabel(row);
+        output.Put(label + std::string(width - label.size(), ' '));
+        for (uint64_t column = 0; column < map.NumColumns(); ++column)
+            output.Put("  " + std::string(map.numColumnInputs - 1, ' ') +
+                       (map.At(row, column) ? "1" : "0"));
+        output.Put("\n");
+    }
+}
+
+std::string XmlText(const std::string& text)
+{
+    std::string xml;
+    for (const char character : text) {
+        if (character == '<')
+            xml += "&lt;";
+        else if (character == '>')
+            xml += "&gt;";
+        else if (character == '&')
+            xml += "&amp;";
+        else
+            xml += character;
+    }
+    return xml;
+}
+
+std::string SvgText(size_t x, size_t y, const char* anchor, const std::string& text)
+{
+    return "<text x=\"" + std::to_string(x) + "\" y=\"" + std::to_string(y) + "\" text-anchor=\"" +
+           anchor + "\">" + XmlText(text) + "</text>\n";
+}
+
+void PutSvg(const Map& map, Output& output)
+{
+    constexpr size_t kCell = 40;
+    constexpr size_t kTop = 60;
+    constexpr size_t kCharacter = 9; // of the font, about
+    const size_t left = 40 + kCharacter * std::max(map.RowNames().size(), map.numRowInputs);
+    const size_t width =
+        left + std::max(kCell * map.NumColumns(), kCharacter * map.ColumnNames().size()) + 20;
+    const size_t height = kTop + kCell * map.NumRows() + 20;
+    output.Put("<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + std::to_string(width) +
+               "\" height=\"" + std::to_string(height) +
+               "\" font-family=\"monospace\" font-size=\"15\">\n");
+    output.Put("<rect width=\"100%\" height=\"100%\" fill=\"white\"/>\n");
+    output.Put(SvgText(left, 20, "start", map.ColumnNames()));
+    output.Put(SvgText(left - 20, kTop - 12, "end", map.RowNames()));
+    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+        output.Put(SvgText(left + kCell * column + kCell / 2, kTop - 12, "middle",
+                           map.ColumnLabel(column)));
+    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+        const size_t y = kTop + kCell * row;
+        output.Put(SvgText(left - 20, y + kCell / 2 + 5, "end", map.RowLabel(row)));
+        for (uint64_t column = 0; column < map.NumColumns(); ++column) {
+            const size_t x = left + kCell * column;
+            const bool value = map.At(row, column);
+            output.Put("<rect x=\"" + std::to_string(x) + "\" y=\"" + std::to_string(y) +
+                       "\" width=\"" + std::to_string(kCell) + "\" height=\"" +
+                       std::to_string(kCell) + "\" stroke=\"black\" fill=\"" +
+                       (value ? "#cde8ff" : "white") + "\"/>\n");
+            output.Put(SvgText(x + kCell / 2, y + kCell / 2 + 5, "middle", value ? "1" : "0"));
+        }
+    }
+    output.Put("</svg>\n");
+}
+
+Json AsJson(const Map& map)
+{
+    const std::vector<std::string>& names = map.function.Inputs();
+    const auto middle = names.begin() + static_cast<std::ptrdiff_t>(map.numRowInputs);
+    Json result;
+    result["row_inputs"] = std::vector<std::string>(names.begin(), middle);
+    result["column_inputs"] = std::vector<std::string>(middle, names.end());
+    result["row_labels"] = Json::array();
+    result["column_labels"] = Json::array();
+    result["cells"] = Json::array();
+    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+        result["column_labels"].push_back(map.ColumnLabel(column));
+    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+        result["row_labels"].push_back(map.RowLabel(row));
+        Json cells = Json::array();
+        for (uint64_t column = 0; column < map.NumColumns(); ++column)
+            cells.push_back(map.At(row, column) ? 1 : 0);
+        result["cells"].push_back(cells);
+    }
+    return result;
+}
+
+int RunMap(const Request& request, Output& output)
+{
+    if (request.json && request.Has("--svg"))
+        throw UsageError("--json and --svg are two formats: give one");
+    return ForEachText(request, output, [&](const Text& text) {
+        Function function;
+        if (!SetFunction(text, request, output, function))
+            return kRefused;
+        if (function.NumInputs() == 0 || function.NumInputs() > kMaxMapInputs) {
+            Refuse(text, request, output,
+                   "a map has 1 to 6 inputs, and this equation " +
+                       (function.NumInputs() == 0
+                            ? "none: it is always " + std::string(function.At(0) ? "1" : "0")
+                            : "has " + std::to_string(function.NumInputs())));
+            return kRefused;
+        }
+        const Map map(function);
+        if (request.json) {
+            PutJson(text, request, "done", AsJson(map), output);
+            return kDone;
+        }
+        if (request.Has("--svg")) {
+            PutSvg(map, output);
+            return kDone;
+        }
+        if (text.line > 0)
+            output.Put("line " + std::to_string(text.line) + "\n");
+        PutText(map, output);
+        return kDone;
+    });
+}
+
+} // namespace
+
+Command KmapCommand()
+{
+    return {"kmap",
+            "EQUATION",
+            1,
+            1,
+            "Print the Karnaugh map of up to six inputs",
+            "The first half of the inputs numbers the rows, the others the columns, both in Gray\n"
+            "code: neighbours differ in one input, the first and the last one too.\n",
+            {{"--svg", nullptr, "Print a picture"}},
+            {"booleq kmap 'A & B | ~C & D'", "booleq kmap --svg 'A ^ B ^ C' > map.svg"},
+            RunMap};
+}
+
+} // namespace booleq

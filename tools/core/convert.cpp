@@ -206,12 +206,12 @@ std::string NameComments(const Expression& expression, Target target, const Conv
 {
     std::string text;
     for (const auto& change : ChangedNames(expression, conversion)) {
-        const std::string line = Visible(change.first) + " is " + change.second;
+        std::string line = Visible(change.first) + " is " + change.second;
         // A mark inside a name must not end the comment.
-        if (target != Target::Liberty)
-            text += CommentStart(target) + line + "\n";
-        else if (line.find("*/") == std::string::npos)
-            text += "/* " + line + " */\n";
+        for (size_t mark = line.find("*/"); mark != std::string::npos; mark = line.find("*/"))
+            line.replace(mark, 2, "*\\x2f");
+        text += target == Target::Liberty ? "/* " + line + " */\n"
+                                          : CommentStart(target) + line + "\n";
     }
     return text;
 }

@@ -21,8 +21,9 @@ const std::vector<Option>& CommonOptions()
 const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
-        ShowCommand(),  CheckCommand(),   EvalCommand(), TableCommand(), InitCommand(),
-        EqualCommand(), ConvertCommand(), TreeCommand(), KmapCommand(),
+        ShowCommand(),  CheckCommand(),   EvalCommand(),    TableCommand(), InitCommand(),
+        EqualCommand(), ExplainCommand(), PermuteCommand(), MatchCommand(), ConvertCommand(),
+        LintCommand(),  TreeCommand(),    KmapCommand(),
     };
     return commands;
 }

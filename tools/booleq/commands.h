@@ -14,7 +14,11 @@ Command InitCommand();
 Command EqualCommand();
 Command TreeCommand();
 Command KmapCommand();
+Command ExplainCommand();
+Command PermuteCommand();
+Command MatchCommand();
 Command ConvertCommand();
+Command LintCommand();
 
 } // namespace booleq
 

@@ -55,8 +55,8 @@ Json ToJson(const Expression& expression, const Request& request, const Conversi
     for (size_t input = 0; input < conversion.names.size(); ++input)
         json["inputs"].push_back(
             {{"input", expression.names[input]}, {"name", conversion.names[input]}});
-    json["comparedAssignments"] = conversion.numAssignments;
-    json["comparedAll"] = conversion.isExhaustive;
+    json["compared_assignments"] = conversion.numAssignments;
+    json["compared_all"] = conversion.isExhaustive;
     return json;
 }
 

@@ -46,12 +46,13 @@ const Notation* NotationOf(Target target)
 std::string WriteForLibrary(const Expression& expression, Target target)
 {
     if (target == Target::Primary)
-        return WriteOwn(expression, OwnSyntax::AsTyped, false);
+        return WriteOwn(expression, OwnSyntax::AsTyped, Parentheses::Needed);
     if (target == Target::Alt2)
-        return WriteOwn(expression, OwnSyntax::Second, false);
+        return WriteOwn(expression, OwnSyntax::Second, Parentheses::Needed);
     if (target == Target::Alt3)
-        return WriteOwn(expression, OwnSyntax::Third, false);
-    return WriteOwn(expression, OwnSyntax::First, target == Target::Paren);
+        return WriteOwn(expression, OwnSyntax::Third, Parentheses::Needed);
+    return WriteOwn(expression, OwnSyntax::First,
+                    target == Target::Paren ? Parentheses::Whole : Parentheses::Needed);
 }
 
 // What a reading gives: the function, and what evaluating it takes; or nothing.
@@ -210,8 +211,8 @@ std::string NameComments(const Expression& expression, Target target, const Conv
         // A mark inside a name must not end the comment.
         for (size_t mark = line.find("*/"); mark != std::string::npos; mark = line.find("*/"))
             line.replace(mark, 2, "*\\x2f");
-        text += target == Target::Liberty ? "/* " + line + " */\n"
-                                          : CommentStart(target) + line + "\n";
+        text +=
+            target == Target::Liberty ? "/* " + line + " */\n" : CommentStart(target) + line + "\n";
     }
     return text;
 }

@@ -259,12 +259,14 @@ class Explainer {
             std::vector<std::string> literals;
             for (const unsigned int input : m_support)
                 if ((cube.used >> input & 1u) != 0)
-                    literals.push_back(Literal(input, ((cube.values >> input & 1u) != 0) == isOrAnd));
+                    literals.push_back(
+                        Literal(input, ((cube.values >> input & 1u) != 0) == isOrAnd));
             const std::string group = Listed(literals, isOrAnd ? " | " : " & ");
             groups.emplace_back(literals.size(), literals.size() > 1 ? "(" + group + ")" : group);
         }
-        std::stable_sort(groups.begin(), groups.end(),
-                         [](const auto& left, const auto& right) { return left.first > right.first; });
+        std::stable_sort(groups.begin(), groups.end(), [](const auto& left, const auto& right) {
+            return left.first > right.first;
+        });
         std::string sizes;
         std::vector<std::string> texts;
         for (const auto& group : groups) {
@@ -274,8 +276,8 @@ class Explainer {
         std::string text = Listed(texts, isOrAnd ? " & " : " | ");
         if (hasInvertedOutput)
             text = "~(" + text + ")";
-        const std::string kind = std::string(isOrAnd ? "or-and" : "and-or") +
-                                 (hasInvertedOutput ? "-invert" : "");
+        const std::string kind =
+            std::string(isOrAnd ? "or-and" : "and-or") + (hasInvertedOutput ? "-invert" : "");
         const std::string shape =
             std::string(isOrAnd ? "OA" : "AO") + (hasInvertedOutput ? "I" : "") + sizes;
         return Say(kind, kind + " (" + shape + "): " + text);

@@ -97,7 +97,8 @@ uint32_t FirstInput(const Formula& formula)
 
 Operator Negated(Operator op)
 {
-    return op == Operator::And ? Operator::Nand : (op == Operator::Or ? Operator::Nor : Operator::Nxor);
+    return op == Operator::And ? Operator::Nand
+                               : (op == Operator::Or ? Operator::Nor : Operator::Nxor);
 }
 
 uint32_t Append(const Formula& formula, Expression& expression)
@@ -118,9 +119,10 @@ uint32_t Append(const Formula& formula, Expression& expression)
     std::vector<const Formula*> operands;
     for (const Formula& operand : inner->operands)
         operands.push_back(&operand);
-    std::stable_sort(operands.begin(), operands.end(), [](const Formula* left, const Formula* right) {
-        return FirstInput(*left) < FirstInput(*right);
-    });
+    std::stable_sort(operands.begin(), operands.end(),
+                     [](const Formula* left, const Formula* right) {
+                         return FirstInput(*left) < FirstInput(*right);
+                     });
     uint32_t node = Append(*operands[0], expression);
     for (size_t operand = 1; operand < operands.size(); ++operand) {
         const uint32_t right = Append(*operands[operand], expression);

@@ -127,7 +127,8 @@ Function Apply(const Matching& matching, const Function& first,
     for (uint64_t row = 0; row < first.NumRows(); ++row) {
         uint64_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
-            const bool value = ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
+            const bool value =
+                ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
             from |= uint64_t(value ? 1 : 0) << (numInputs - 1 - matching.sources[place]);
         }
         if (first.At(from) != matching.isInverted)

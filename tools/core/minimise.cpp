@@ -12,9 +12,9 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxProducts = 1000;          // more are no expression for people
-constexpr unsigned int kMaxSplitInputs = 10;   // two sets of these are tried each way
-constexpr unsigned int kMaxExpandInputs = 10;  // expansions by each of these are compared
+constexpr size_t kMaxProducts = 1000;         // more are no expression for people
+constexpr unsigned int kMaxSplitInputs = 10;  // two sets of these are tried each way
+constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of these are compared
 
 // Some input of 'inputs' being 1 or 0 makes it 1 (isSome), or both do.
 Bits Quantify(const Bits& function, const std::vector<unsigned int>& inputs, bool isSome)
@@ -194,7 +194,8 @@ class Search {
             const size_t lowLiterals = CountLiterals(FindCover(low));
             const size_t highLiterals = CountLiterals(FindCover(high));
             const size_t changeLiterals = CountLiterals(FindCover(low ^ high));
-            const size_t counts[3] = {lowLiterals + highLiterals + 2, lowLiterals + changeLiterals + 1,
+            const size_t counts[3] = {lowLiterals + highLiterals + 2,
+                                      lowLiterals + changeLiterals + 1,
                                       highLiterals + changeLiterals + 1};
             for (int kind = 0; kind < 3; ++kind) {
                 if (counts[kind] >= leastLiterals)

@@ -1,10 +1,10 @@
 // A short expression for a function.
 //
-// Up to four inputs that matter, all expressions are tried (shortest.h), so nothing is shorter. With
-// more, the function is taken apart: where it is an AND, OR or exclusive OR of functions without a
-// common input, by these, which is found by quantifying over one side; otherwise by the best of a
-// factored sum of products (cover.h) of it or its inversion and an expansion by one input. That is
-// greedy, and need not end at the shortest.
+// Up to four inputs that matter, all expressions are tried (shortest.h), so nothing is shorter.
+// With more, the function is taken apart: where it is an AND, OR or exclusive OR of functions
+// without a common input, by these, which is found by quantifying over one side; otherwise by the
+// best of a factored sum of products (cover.h) of it or its inversion and an expansion by one
+// input. That is greedy, and need not end at the shortest.
 #ifndef BOOLEQ_CORE_MINIMISE_H
 #define BOOLEQ_CORE_MINIMISE_H
 

@@ -65,6 +65,13 @@ class Reader {
         return false;
     }
 
+    // The character that cannot be read, and its place.
+    std::string Here() const
+    {
+        return InQuotes(m_text.substr(m_position, 1)) + " at character " +
+               std::to_string(m_position + 1);
+    }
+
     void SkipBlanks()
     {
         while (m_position < m_text.size() && IsBlankCharacter(m_text[m_position]))
@@ -216,8 +223,7 @@ bool Reader::ReadName()
     while (m_position < m_text.size() && IsNameCharacter(m_text[m_position]))
         ++m_position;
     if (m_position == start)
-        return Refuse("what stands at character " + std::to_string(start + 1) +
-                      " is no operand there");
+        return Refuse(Here() + " is no operand there");
     const std::string name = m_text.substr(start, m_position - start);
     if (!IsPlain(m_notation, name))
         return Refuse(InQuotes(name) + " is no name there");
@@ -254,8 +260,7 @@ bool Reader::ReadBehindOperand()
         for (const OperatorForm& form : m_notation.binaries)
             if (form.meaning == Meaning::And)
                 return ReadBinary(form);
-    return Refuse("what stands at character " + std::to_string(m_position + 1) +
-                  " does not join two operands there");
+    return Refuse(Here() + " does not join two operands there");
 }
 
 bool Reader::ReadBinary(const OperatorForm& form)

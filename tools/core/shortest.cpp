@@ -17,63 +17,79 @@ Column Normal(Column column)
     return static_cast<Column>(column & 1u ? ~column : column);
 }
 
-// How a column was found first, which is with the fewest literals.
+// What a formula weighs: literals first, then exclusive ORs, which are harder to read. Both add up
+// over operands, and a formula has fewer exclusive ORs than literals.
+constexpr size_t kLiteralWeight = 32;
+constexpr size_t kXorWeight = 1;
+
+// How a column was found first, which is with the least weight.
 struct Origin {
-    uint8_t numLiterals = 0; // 0: not found yet
-    Operator op = Operator::Zero;
-    Column left = 0; // as they are joined, so perhaps inverted
+    Operator op = Operator::Zero; // Zero: not found yet
+    Column left = 0;              // as they are joined, so perhaps inverted
     Column right = 0;
 };
 
 class ShortestTable {
   public:
-    ShortestTable() : m_origins(kNumColumns), m_by_literals(1)
+    ShortestTable() : m_origins(kNumColumns), m_by_weight(kLiteralWeight)
     {
-        m_by_literals.emplace_back();
+        m_by_weight.emplace_back();
         for (const Column column : kInputColumns) {
-            m_origins[column] = {1, Operator::Input, column, 0};
-            m_by_literals[1].push_back(column);
+            m_origins[column] = {Operator::Input, column, 0};
+            m_by_weight.back().push_back(column);
         }
     }
 
     // Requires: not a constant.
     Formula Find(Column column)
     {
-        while (m_origins[Normal(column)].numLiterals == 0)
-            AddLevel();
+        while (m_origins[Normal(column)].op == Operator::Zero)
+            AddWeight();
         return Make(column);
     }
 
   private:
-    void AddLevel()
+    // All columns whose least weight is the next one.
+    void AddWeight()
     {
-        const size_t numLiterals = m_by_literals.size();
-        m_by_literals.emplace_back();
-        for (size_t numLeft = 1; numLeft <= numLiterals / 2; ++numLeft)
-            for (const Column left : m_by_literals[numLeft])
-                for (const Column right : m_by_literals[numLiterals - numLeft])
-                    AddPair(left, right, numLiterals);
+        const size_t weight = m_by_weight.size();
+        m_by_weight.emplace_back();
+        for (size_t left = kLiteralWeight; left < weight; ++left) {
+            AddPairs(left, weight - left, false);
+            if (left < weight - kXorWeight)
+                AddPairs(left, weight - kXorWeight - left, true);
+        }
     }
 
-    void AddPair(Column left, Column right, size_t numLiterals)
+    void AddPairs(size_t leftWeight, size_t rightWeight, bool isXor)
     {
-        const auto notLeft = static_cast<Column>(~left);
-        const auto notRight = static_cast<Column>(~right);
-        Add(Operator::And, left, right, static_cast<Column>(left & right), numLiterals);
-        Add(Operator::And, left, notRight, static_cast<Column>(left & notRight), numLiterals);
-        Add(Operator::And, notLeft, right, static_cast<Column>(notLeft & right), numLiterals);
-        Add(Operator::Or, left, right, static_cast<Column>(left | right), numLiterals);
-        Add(Operator::Xor, left, right, static_cast<Column>(left ^ right), numLiterals);
+        if (rightWeight < leftWeight || rightWeight >= m_by_weight.size())
+            return;
+        // The last list grows, but it is no operand's: operands weigh less.
+        for (const Column left : m_by_weight[leftWeight]) {
+            for (const Column right : m_by_weight[rightWeight]) {
+                const auto notLeft = static_cast<Column>(~left);
+                const auto notRight = static_cast<Column>(~right);
+                if (isXor) {
+                    Add(Operator::Xor, left, right, static_cast<Column>(left ^ right));
+                    continue;
+                }
+                Add(Operator::And, left, right, static_cast<Column>(left & right));
+                Add(Operator::And, left, notRight, static_cast<Column>(left & notRight));
+                Add(Operator::And, notLeft, right, static_cast<Column>(notLeft & right));
+                Add(Operator::Or, left, right, static_cast<Column>(left | right));
+            }
+        }
     }
 
     // Row 0 of both operands is 0 unless inverted, and so is that of every result.
-    void Add(Operator op, Column left, Column right, Column result, size_t numLiterals)
+    void Add(Operator op, Column left, Column right, Column result)
     {
         Origin& origin = m_origins[result];
-        if (result == 0 || origin.numLiterals != 0)
+        if (result == 0 || origin.op != Operator::Zero)
             return;
-        origin = {static_cast<uint8_t>(numLiterals), op, left, right};
-        m_by_literals.back().push_back(result);
+        origin = {op, left, right};
+        m_by_weight.back().push_back(result);
     }
 
     // The depth is at most the number of literals.
@@ -94,7 +110,7 @@ class ShortestTable {
     }
 
     std::vector<Origin> m_origins;
-    std::vector<std::vector<Column>> m_by_literals;
+    std::vector<std::vector<Column>> m_by_weight;
 };
 
 // The inputs of four become those that matter.

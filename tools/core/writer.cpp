@@ -95,8 +95,8 @@ class ForeignSyntax : public Syntax {
 
 class LibrarySyntax : public Syntax {
   public:
-    LibrarySyntax(const std::vector<std::string>& names, OwnSyntax syntax, bool isWhole)
-        : m_names(names), m_syntax(syntax), m_is_whole(isWhole)
+    LibrarySyntax(const std::vector<std::string>& names, OwnSyntax syntax, Parentheses parentheses)
+        : m_names(names), m_syntax(syntax), m_parentheses(parentheses)
     {
     }
 
@@ -109,11 +109,14 @@ class LibrarySyntax : public Syntax {
         const std::string text = SpellOperator(node.op, Style(node));
         if (node.op == Operator::Not)
             return {text.size() > 1 ? text + " " : text, kLeafLevel - 1, Chain::Any};
-        return {" " + text + " ", 1, Chain::Any};
+        Chain chain = Chain::Any;
+        if (m_parentheses == Parentheses::Clear)
+            chain = node.op >= Operator::Nand ? Chain::None : Chain::Same;
+        return {" " + text + " ", 1, chain};
     }
 
     bool Has(Operator) const override { return true; }
-    bool IsWhole() const override { return m_is_whole; }
+    bool IsWhole() const override { return m_parentheses == Parentheses::Whole; }
 
   private:
     uint8_t Style(const Expression::Node& node) const
@@ -127,7 +130,7 @@ class LibrarySyntax : public Syntax {
 
     const std::vector<std::string>& m_names;
     OwnSyntax m_syntax;
-    bool m_is_whole;
+    Parentheses m_parentheses;
 };
 
 // The operator inside an inversion, for those that have one.
@@ -253,10 +256,10 @@ std::string Write(const Expression& expression, const Notation& notation,
     return Writer(expression, ForeignSyntax(notation, names)).Write();
 }
 
-std::string WriteOwn(const Expression& expression, OwnSyntax syntax, bool isWhole)
+std::string WriteOwn(const Expression& expression, OwnSyntax syntax, Parentheses parentheses)
 {
     const std::string text =
-        Writer(expression, LibrarySyntax(expression.names, syntax, isWhole)).Write();
+        Writer(expression, LibrarySyntax(expression.names, syntax, parentheses)).Write();
     return text.size() > 2 && text[0] == '0' ? "(" + text + ")" : text;
 }
 

@@ -1,0 +1,173 @@
+// The command 'lint': who reads the text as another function, and where the library surprises.
+#include "core/lint.h"
+
+#include "answer.h"
+#include "commands.h"
+#include "core/text.h"
+
+namespace booleq {
+
+namespace {
+
+// The parts of a difference as lines, the same for notations that read alike.
+std::string DifferenceText(const LintReport& report, const ForeignReading& reading)
+{
+    const auto line = [](const std::string& label, const std::string& value) {
+        return "  " + label + std::string(14 - label.size(), ' ') + Visible(value) + "\n";
+    };
+    std::string text =
+        line("first at", AssignmentText(report.inputs, reading.comparison.first) + ": " +
+                             (reading.valueHere ? "1 here, 0 there" : "0 here, 1 there"));
+    text += line("here", report.grouping);
+    text += line("there", reading.grouping);
+    text += line("because", reading.reason);
+    text += line("write there", reading.textThere);
+    if (!reading.textHere.empty())
+        text += line("or here", reading.textHere + ", if the other is meant");
+    return text;
+}
+
+void PutDifferences(const LintReport& report, Output& output)
+{
+    std::vector<std::pair<std::string, std::string>> groups; // notations, and their lines
+    for (const ForeignReading& reading : report.readings) {
+        if (!reading.isRead || reading.comparison.isEqual)
+            continue;
+        const std::string text = DifferenceText(report, reading);
+        bool isKnown = false;
+        for (auto& group : groups) {
+            if (group.second != text)
+                continue;
+            group.first += std::string(", ") + reading.notation;
+            isKnown = true;
+        }
+        if (!isKnown)
+            groups.emplace_back(reading.notation, text);
+    }
+    for (const auto& group : groups)
+        output.Put("another function in " + group.first + "\n" + group.second);
+}
+
+void PutFindings(const LintReport& report, Output& output)
+{
+    for (const Finding& finding : report.findings) {
+        output.Put(Visible(finding.message) + "\n");
+        for (const auto& detail : finding.details)
+            output.Put("  " + detail.first +
+                       std::string(detail.first.size() < 16 ? 16 - detail.first.size() : 1, ' ') +
+                       Visible(detail.second) + "\n");
+    }
+}
+
+void PutOthers(const LintReport& report, Output& output)
+{
+    std::string same;
+    for (const ForeignReading& reading : report.readings)
+        if (reading.isRead && reading.comparison.isEqual)
+            same += std::string(same.empty() ? "" : ", ") + reading.notation +
+                    (reading.comparison.isExhaustive
+                         ? ""
+                         : " (" + std::to_string(reading.comparison.numAssignments) +
+                               " assignments tried)");
+    if (!same.empty())
+        PutField(output, "the same in", same);
+    for (const ForeignReading& reading : report.readings)
+        if (!reading.isRead)
+            PutField(output, "refused by",
+                     std::string(reading.notation) + ": " + Visible(reading.fault));
+}
+
+Json DifferenceJson(const LintReport& report, const ForeignReading& reading)
+{
+    Json json;
+    json["assignment"] = Json::object();
+    for (size_t input = 0; input < report.inputs.size(); ++input)
+        json["assignment"][report.inputs[input]] = reading.comparison.first[input] ? 1 : 0;
+    json["here"] = reading.valueHere ? 1 : 0;
+    json["grouping"] = reading.grouping;
+    json["reason"] = reading.reason;
+    json["write_there"] = reading.textThere;
+    json["write_here"] = reading.textHere.empty() ? Json(nullptr) : Json(reading.textHere);
+    return json;
+}
+
+Json ToJson(const LintReport& report)
+{
+    Json json;
+    json["inputs"] = report.inputs;
+    json["grouping"] = report.grouping;
+    json["readers"] = Json::array();
+    for (const ForeignReading& reading : report.readings) {
+        Json reader;
+        reader["notation"] = reading.notation;
+        reader["reads"] = reading.isRead;
+        reader["refusal"] = reading.isRead ? Json(nullptr) : Json(reading.fault);
+        reader["same"] = reading.isRead ? Json(reading.comparison.isEqual) : Json(nullptr);
+        reader["compared_all"] =
+            reading.isRead ? Json(reading.comparison.isExhaustive) : Json(nullptr);
+        reader["hex"] = reading.hex.empty() ? Json(nullptr) : Json(reading.hex);
+        reader["difference"] = reading.isRead && !reading.comparison.isEqual
+                                   ? DifferenceJson(report, reading)
+                                   : Json(nullptr);
+        json["readers"].push_back(reader);
+    }
+    json["findings"] = Json::array();
+    for (const Finding& finding : report.findings) {
+        Json details = Json::object();
+        for (const auto& detail : finding.details)
+            details[detail.first] = detail.second;
+        json["findings"].push_back(
+            {{"code", finding.code}, {"message", finding.message}, {"details", details}});
+    }
+    return json;
+}
+
+int RunLint(const Request& request, Output& output)
+{
+    return ForEachText(request, output, [&](const Text& text) {
+        Kq_BoolEquation equation;
+        if (!SetEquation(text, request, output, equation))
+            return kRefused;
+        const LintReport report = Lint(text.text, equation, request.reading);
+        const int status = report.IsClean() ? kDone : kFindings;
+        if (request.json) {
+            PutJson(text, request, status == kDone ? "done" : "findings", ToJson(report), output);
+            return status;
+        }
+        if (text.line > 0)
+            PutField(output, "line", std::to_string(text.line));
+        if (status == kDone)
+            output.Put("no findings\n");
+        PutDifferences(report, output);
+        PutFindings(report, output);
+        PutOthers(report, output);
+        if (text.line > 0)
+            output.Put("\n");
+        return status;
+    });
+}
+
+} // namespace
+
+Command LintCommand()
+{
+    return {
+        "lint",
+        "EQUATION",
+        1,
+        1,
+        "Find what others read differently, and what surprises here",
+        "Reads the text as Verilog, C, Liberty, VHDL and Python would, inputs being single bits, "
+        "or\n"
+        "0 and 1, and compares the functions. For each that differs: the first assignment, both\n"
+        "groupings, and the text to write there instead, or here if the other was meant. Also:\n"
+        "blanks inside negated operators, renderings that do not read back, a text that begins\n"
+        "with 0, listed inputs that are skipped or missing, init values that are too short.\n"
+        "Status 0: no findings, 1: findings.\n",
+        {},
+        {"booleq lint 'a | b & c'", "booleq lint 'P & X ~ | Y'",
+         "booleq lint --inputs A,B 'A & C'"},
+        RunLint};
+}
+
+} // namespace booleq

@@ -17,6 +17,7 @@ Command KmapCommand();
 Command ExplainCommand();
 Command PermuteCommand();
 Command MatchCommand();
+Command BatchCommand();
 Command ConvertCommand();
 Command LintCommand();
 

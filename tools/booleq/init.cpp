@@ -65,7 +65,7 @@ void PutBoth(const char* label, const Order& msb, const Order& lsb, size_t width
     {
         const std::string first = (msb.column.*digits)();
         output.Put(first);
-        output.Put(std::string(width - first.size() + 2, ' '));
+        output.Put(std::string(std::max(width, first.size()) - first.size() + 2, ' '));
     }
     output.Put((lsb.column.*digits)());
     output.Put("\n");
@@ -75,7 +75,9 @@ void PutDigits(const Order& msb, const Order& lsb, Output& output)
 {
     const std::string name = Visible(msb.column.Inputs().front());
     const std::string first = name + " most significant";
-    const size_t width = std::max<size_t>(first.size(), 2 + msb.column.NumRows());
+    // Longer digits are not aligned.
+    const size_t width =
+        std::max<size_t>(first.size(), std::min<uint64_t>(34, 2 + msb.column.NumRows()));
     PutLabel(output, "");
     output.Put(first + std::string(width - first.size() + 2, ' ') + name +
                " least (--lsb-first)\n");

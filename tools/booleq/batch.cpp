@@ -17,6 +17,7 @@ namespace booleq {
 
 namespace {
 
+constexpr int kMaxJsonDepth = 100;
 constexpr size_t kNoColumn = static_cast<size_t>(-1);
 
 // Fields of one line of CSV. A line end inside a field is not accepted: one stray quote would
@@ -169,9 +170,17 @@ class JsonFormat : public Format {
 
     BatchResult ReadRow(const std::string& line, BatchRow& row) override
     {
-        m_json = Json::parse(line, nullptr, false);
+        // The writer of JSON goes as deep as its reader was led.
+        bool isDeep = false;
+        const auto keep = [&isDeep](int depth, Json::parse_event_t, Json&) {
+            isDeep = isDeep || depth > kMaxJsonDepth;
+            return depth <= kMaxJsonDepth;
+        };
+        m_json = Json::parse(line, keep, false);
+        if (isDeep)
+            m_json = Json();
         if (!m_json.is_object())
-            return Refused("this is no JSON object");
+            return Refused(isDeep ? "this is nested too deep" : "this is no JSON object");
         std::string list;
         if (!TakeText("equation", row.equation) || !TakeText("init", row.init))
             return Refused("equation and init are texts");

@@ -215,7 +215,7 @@ std::string BashCompletion()
            "    case $command in\n" +
            cases +
            "    esac\n"
-           "    if [ \"$before\" = --file ] || [ \"$command\" = batch ] && [[ $word != -* ]]; "
+           "    if [ \"$before\" = --file ] || [[ $command = batch && $word != -* && $before != --* ]]; "
            "then\n"
            "        mapfile -t COMPREPLY < <(compgen -f -- \"$word\")\n"
            "        return\n"

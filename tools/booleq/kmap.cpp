@@ -166,10 +166,10 @@ int RunMap(const Request& request, Output& output)
             return kRefused;
         if (function.NumInputs() == 0 || function.NumInputs() > kMaxMapInputs) {
             Refuse(text, request, output,
-                   "a map has 1 to 6 inputs, and this equation " +
+                   "a map has 1 to 6 inputs, and this equation has " +
                        (function.NumInputs() == 0
                             ? "none: it is always " + std::string(function.At(0) ? "1" : "0")
-                            : "has " + std::to_string(function.NumInputs())));
+                            : std::to_string(function.NumInputs())));
             return kRefused;
         }
         const Map map(function);

@@ -37,16 +37,17 @@ void CheckOperands(Request& request, bool hasFile)
     std::vector<std::string>& operands = request.operands;
     const size_t numGiven = operands.size() + (hasFile ? 1 : 0);
     const std::string usage = std::string("booleq ") + command.name + " " + command.operands;
+    const bool isPlain = usage == std::string("booleq ") + command.name + " EQUATION";
     if (operands.empty() && !hasFile)
-        throw UsageError(command.maxOperands == 1
-                             ? "no equation: give one ('A & B'), or '-' for lines of standard input"
-                             : "no equation: " + usage);
+        throw UsageError(isPlain ? "no equation: give one ('A & B'), or '-' for lines of standard "
+                                   "input"
+                                 : "too few words: " + usage);
     if (numGiven < command.minOperands)
         throw UsageError("too few words: " + usage);
     if (numGiven > command.maxOperands && hasFile)
         throw UsageError("--file stands in place of the equation, so '" +
                          Excerpt(operands[command.maxOperands - 1]) + "' is one word too many");
-    if (numGiven > command.maxOperands && command.maxOperands == 1)
+    if (numGiven > command.maxOperands && isPlain)
         throw UsageError("more than one equation, '" + Excerpt(operands[1]) +
                          "' is the second: put quotes around a whole equation ('A & B'), or give "
                          "many as lines with '-'");

@@ -1,0 +1,147 @@
+#!/usr/bin/env python3
+# Bad input to every command that the tool's help lists: a message, the right exit status, and
+# nothing on standard output that looks like a result. With --json a refusal is the one object.
+import argparse
+import json
+import os
+import re
+import subprocess
+import sys
+import tempfile
+
+DONE, WRONG_USAGE, REFUSED = 0, 2, 3
+
+# The words around the text, for each command.
+WORDS = {
+    "show": ([], []), "check": ([], []), "table": ([], []), "init": ([], []),
+    "tree": ([], []), "kmap": ([], []), "eval": ([], ["A=1"]), "equal": ([], ["A"]),
+}
+NAMES31 = ["v%d" % number for number in range(31)]
+COLUMNS = {"table", "init", "kmap", "equal"}  # no more than 30 inputs
+
+
+class Checker:
+    def __init__(self, tool):
+        self.tool = tool
+        self.count = 0
+        self.failures = 0
+
+    def run(self, command, arguments, what, **options):
+        self.count += 1
+        words = [os.fsencode(word) for word in [self.tool, command, *arguments]]
+        options.setdefault("stdin", subprocess.DEVNULL)
+        options.setdefault("stdout", subprocess.PIPE)
+        done = subprocess.run(words, stderr=subprocess.PIPE, timeout=120, check=False, **options)
+        self.what = f"{command}: {what}"
+        return done
+
+    def expect(self, holds, done, reason):
+        if not holds:
+            self.failures += 1
+            print(f"{self.what}: {reason}: status {done.returncode}\n"
+                  f"  out {(done.stdout or b'')[:300]}\n  err {done.stderr[:300]}")
+
+    def complains(self, done, status):
+        self.expect(done.returncode == status, done, f"status {status} expected")
+        self.expect(not done.stdout, done, "there is output")
+        self.expect(done.stderr.startswith(b"booleq: "), done, "there is no message")
+        self.expect(all(32 <= byte < 127 or byte == 10 for byte in done.stderr), done,
+                    "the message is not printable")
+
+    def refuses(self, command, text, what, options=()):
+        before, behind = WORDS[command]
+        words = [*options, *before, "--", text, *behind]
+        self.complains(self.run(command, words, what), REFUSED)
+        done = self.run(command, ["--json", *words], what + " as JSON")
+        self.expect(done.returncode == REFUSED, done, "status 3 expected")
+        lines = done.stdout.decode().splitlines()
+        self.expect(len(lines) == 1, done, "one object expected")
+        answer = json.loads(lines[0])
+        self.expect(answer["command"] == command and answer["status"] == "refused" and
+                    answer["refusal"]["reason"] and "result" not in answer, done, "no refusal")
+
+
+def check_texts(checker, command):
+    for text, what in (("", "empty"), (" \t", "blank"), ("A &", "half an equation"),
+                       (b"\x80\xff\x01", "binary"), ("(" * 100000 + "A", "huge"),
+                       ("A" * 100000 + " B", "a huge name"), ("%n %s {}", "formats"),
+                       ("0x8", "an init value without inputs")):
+        checker.refuses(command, text, what)
+    for text, what in (("0x88", "wrong width"), ("0b1", "too narrow"), ("0x8g", "no digit"),
+                       ("0 | A", "an expression that begins with 0")):
+        checker.refuses(command, text, what, ["--inputs", "A,B"])
+    if command in COLUMNS:
+        checker.refuses(command, "&".join(NAMES31), "31 inputs")
+        checker.refuses(command, "A", "31 listed inputs", ["--inputs", ",".join(NAMES31)])
+
+
+def check_usage(checker, command):
+    before, behind = WORDS[command]
+    words = [*before, "A", *behind]
+    for arguments, what in ((["--no-such-option", *words], "an unknown option"),
+                            (["--inputs", *words[:1]], "no equation"),
+                            (["--inputs", "", *words], "no names"),
+                            (["--inputs", "'A", *words], "an open quote"),
+                            (["--lsb-first", *words], "an order without inputs"),
+                            ([], "no words"),
+                            (["--file", "no/such/file", *before, *behind], "a missing file"),
+                            (["--file", "/", *before, *behind], "a directory")):
+        checker.complains(checker.run(command, arguments, what), WRONG_USAGE)
+
+
+def check_lines(checker, command):
+    before, behind = WORDS[command]
+    with tempfile.TemporaryFile() as file:
+        file.write(b"A\x00B\n\xff\n" + b"x" * 100000 + b"=\nA &\n")
+        file.seek(0)
+        done = checker.run(command, [*before, "-", *behind], "bad lines", stdin=file)
+    checker.complains(done, REFUSED)
+    checker.expect(done.stderr.count(b"booleq: line ") == 4, done, "four lines are refused")
+    done = checker.run(command, [*before, "-", *behind], "no line")
+    checker.complains(done, DONE)  # a warning
+
+
+def check_streams(checker, command):
+    before, behind = WORDS[command]
+    words = [*before, "A", *behind]
+    with open("/dev/full", "wb") as full:
+        done = checker.run(command, words, "a full disk", stdout=full)
+    checker.complains(done, WRONG_USAGE)
+    reader, writer = os.pipe()
+    os.close(reader)
+    done = checker.run(command, words, "a closed pipe", stdout=writer)
+    os.close(writer)
+    checker.complains(done, WRONG_USAGE)
+    good = checker.run(command, words, "a good text")
+    checker.expect(good.returncode in (DONE, 1) and good.stdout and not good.stderr, good,
+                   "an answer")
+
+
+def listed_commands(tool):
+    text = subprocess.run([tool, "--help"], stdout=subprocess.PIPE, text=True, check=True).stdout
+    block = re.search(r"^Commands:\n(.*?)^$", text, re.M | re.S)[1]
+    return re.findall(r"^  (\w+) ", block, re.M)
+
+
+def main():
+    parser = argparse.ArgumentParser()
+    parser.add_argument("--tool", required=True)
+    tool = os.path.abspath(parser.parse_args().tool)
+    checker = Checker(tool)
+    commands = [name for name in listed_commands(tool) if name != "batch"]  # it reads no equation
+    missing = [name for name in commands if name not in WORDS]
+    for command in commands:
+        if command in missing:
+            continue
+        check_texts(checker, command)
+        check_usage(checker, command)
+        check_lines(checker, command)
+        check_streams(checker, command)
+    if missing:
+        print("no words are known for: " + ", ".join(missing))
+    print(f"{checker.count} calls of {len(commands)} commands, {checker.failures} failures")
+    return 1 if checker.failures or missing else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

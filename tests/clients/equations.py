@@ -18,19 +18,21 @@ QUOTED_NAMES = ["'A[0]'", "'A'", "'a b'", "'1'", "''", "'x$y'", "'a\\b'", "'q\"#
 
 # Trees are tuples: ("name", text), ("const", 0 or 1), ("not", tree), (operator, left, right) and
 # ("behind", operand, operators): "X ~ op Y op2 Z", the inversion of "(X op Y) op2 Z".
-def draw(rng, names, depth):
+def draw(rng, names, depth, operators=tuple(BINARY)):
     kind = rng.random()
     if depth == 0 or kind < 0.12:
         if rng.random() < 0.06:
             return ("const", rng.randrange(2))
         return ("name", rng.choice(names))
     if kind < 0.27:
-        return ("not", draw(rng, names, depth - 1))
-    if kind < 0.37:
-        rest = [(rng.choice(list(BINARY)), draw(rng, names, depth - 1))
+        return ("not", draw(rng, names, depth - 1, operators))
+    # With few operators to draw from, a text is meant to be read elsewhere too.
+    if kind < 0.37 and len(operators) == len(BINARY):
+        rest = [(rng.choice(operators), draw(rng, names, depth - 1))
                 for _ in range(rng.randrange(1, 3))]
         return ("behind", ("name", rng.choice(names)), rest)
-    return (rng.choice(list(BINARY)), draw(rng, names, depth - 1), draw(rng, names, depth - 1))
+    return (rng.choice(operators), draw(rng, names, depth - 1, operators),
+            draw(rng, names, depth - 1, operators))
 
 
 def value(tree, values):
@@ -121,12 +123,13 @@ def operand(tree, style):
     return "(" + text(tree, style) + ")"
 
 
-def equations(seed, count, names=PLAIN_NAMES + QUOTED_NAMES, **style):
+def equations(seed, count, names=tuple(PLAIN_NAMES + QUOTED_NAMES), operators=tuple(BINARY),
+              **style):
     """(text, names, column) of 'count' random equations over at most five names each."""
     rng = random.Random(seed)
     made = []
     while len(made) < count:
-        own = rng.sample(names, rng.randrange(1, 6))
-        tree = draw(rng, own, rng.randrange(1, 5))
+        own = rng.sample(names, rng.randrange(1, 1 + min(5, len(names))))
+        tree = draw(rng, own, rng.randrange(1, 5), operators)
         made.append((text(tree, Style(rng, **style)), names_of(tree), column(tree)))
     return made

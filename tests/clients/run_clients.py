@@ -1,8 +1,10 @@
 #!/usr/bin/env python3
 # Random equations through every export of the tool and the real program that reads it: the columns
-# that it computes must be those that the equations were made with. A program that is not there is
-# skipped and counted.
+# that it computes must be those that the equations were made with. Without the program the status
+# is 77, which counts as skipped.
 import argparse
+import itertools
+import json
 import os
 import re
 import shutil
@@ -80,7 +82,7 @@ def verilog_wrappers(bench, names=None):
     return text
 
 
-def check_icarus(bench):
+def icarus_columns(bench, modules):
     bench_text = "module bench;\n"
     steps = ""
     for number, case in enumerate(bench.cases, 1):
@@ -90,11 +92,15 @@ def check_icarus(bench):
         steps += (f"    for (i{number} = 0; i{number} < {2 ** count}; i{number} = i{number} + 1)\n"
                   f"      begin #1; $write(\"%b\", y{number}); end\n    $write(\"\\n\");\n")
     bench_text += f"  initial begin\n{steps}  end\nendmodule\n"
-    source = bench.write("icarus.v", bench.convert("verilog", "--unit") +
-                         verilog_wrappers(bench) + bench_text)
+    source = bench.write("icarus.v", modules + verilog_wrappers(bench) + bench_text)
     program = os.path.join(bench.directory, "icarus.vvp")
     run(["iverilog", "-s", "bench", "-o", program, source])
-    bench.compare("verilog, Icarus Verilog", run(["vvp", "-n", program]).split())
+    return run(["vvp", "-n", program]).split()
+
+
+def check_icarus(bench):
+    bench.compare("verilog, Icarus Verilog",
+                  icarus_columns(bench, bench.convert("verilog", "--unit")))
 
 
 def yosys_columns(bench, commands):
@@ -114,13 +120,15 @@ def check_yosys(bench):
     bench.compare("verilog, Yosys", yosys_columns(bench, f"read_verilog {source}\n"))
 
 
-def check_liberty(bench):
-    cells = bench.convert("liberty", "--unit")
+def liberty_columns(bench, cells):
     names = [re.findall(r"pin \((.*)\)", cell) for cell in re.split(r"^cell ", cells, flags=re.M)[1:]]
     library = bench.write("cells.lib", "library (cells) {\n" + cells + "}\n")
     source = bench.write("liberty.v", verilog_wrappers(bench, names))
-    bench.compare("liberty, Yosys", yosys_columns(
-        bench, f"read_liberty {library}\nread_verilog {source}\n"))
+    return yosys_columns(bench, f"read_liberty {library}\nread_verilog {source}\n")
+
+
+def check_liberty(bench):
+    bench.compare("liberty, Yosys", liberty_columns(bench, bench.convert("liberty", "--unit")))
 
 
 def check_ghdl(bench):
@@ -152,18 +160,22 @@ def check_ghdl(bench):
     bench.compare("vhdl, GHDL", run(["ghdl", "-r", "bench"], cwd=bench.directory).split())
 
 
-def check_c(bench):
+def c_columns(bench, functions):
     calls = ""
     for number, case in enumerate(bench.cases, 1):
         count = num_inputs(case)
         arguments = ", ".join(f"row >> {count - 1 - place} & 1" for place in range(count))
         calls += (f"    for (int row = 0; row < {2 ** count}; ++row)\n"
                   f"        putchar('0' + f_{number}({arguments}));\n    putchar('\\n');\n")
-    source = bench.write("export.c", "#include <stdio.h>\n" + bench.convert("c", "--unit") +
+    source = bench.write("export.c", "#include <stdio.h>\n" + functions +
                          f"int main(void)\n{{\n{calls}    return 0;\n}}\n")
     program = os.path.join(bench.directory, "export")
-    run([shutil.which("cc"), "-std=c11", "-o", program, source])
-    bench.compare("c, C compiler", run([program]).split())
+    run([shutil.which("cc"), "-std=c11", "-w", "-o", program, source])
+    return run([program]).split()
+
+
+def check_c(bench):
+    bench.compare("c, C compiler", c_columns(bench, bench.convert("c", "--unit")))
 
 
 def check_python(bench):
@@ -243,18 +255,143 @@ def check_library(bench):
         bench.compare(f"{target}, read again", columns)
 
 
-CHECKS = [
-    ([], check_library),
-    (["iverilog", "vvp"], check_icarus),
-    (["yosys"], check_yosys),
-    (["yosys"], check_liberty),
-    (["ghdl"], check_ghdl),
-    (["cc"], check_c),
-    ([], check_python),
-    (["berkeley-abc"], lambda bench: check_abc(bench, "blif", ".model")),
-    (["berkeley-abc"], lambda bench: check_abc(bench, "pla", ".i ")),
-    (["berkeley-abc"], lambda bench: check_abc(bench, "eqn", "INORDER")),
-]
+# --- how lint reads texts of the library's syntax as other languages ---------------------------
+
+def lint_cases(bench, notation):
+    """Cases that lint reads in 'notation', with the column it sees, and texts that it does not."""
+    answers = subprocess.run([bench.tool, "lint", "--json", "--file", bench.texts], check=False,
+                             capture_output=True, text=True, timeout=TIMEOUT_SECONDS).stdout
+    read, refused = [], []
+    for answer, (text, names, _) in zip(answers.splitlines(), bench.cases):
+        result = json.loads(answer)["result"]
+        reader = next(one for one in result["readers"] if one["notation"] == notation)
+        if not reader["reads"]:
+            refused.append((text, names))
+            continue
+        bits = bin(int(reader["hex"], 16))[2:].zfill(2 ** len(names))[::-1]
+        read.append((text, names, [int(bit) for bit in bits]))
+    if len(read) < 50:
+        raise Failure(f"lint, {notation}: only {len(read)} texts are read")
+    return Bench(bench.tool, read, bench.directory), refused
+
+
+def verilog_module(number, text, names):
+    ports = "".join(f"input {name}, " for name in names)
+    return f"module f_{number}({ports}output y);\n  assign y = {text};\nendmodule\n"
+
+
+def verilog_modules(bench):
+    return "".join(verilog_module(number, text, names)
+                   for number, (text, names, _) in enumerate(bench.cases, 1))
+
+
+def must_refuse(what, texts, accepts):
+    accepted = [text for text in texts if accepts(text)]
+    if accepted:
+        raise Failure(f"{what} takes what lint says it refuses: {accepted[:5]}")
+    print(f"{what}: {len(texts)} texts refused by both")
+
+
+def lint_icarus(bench):
+    own, refused = lint_cases(bench, "Verilog")
+    own.compare("lint of Verilog, Icarus Verilog", icarus_columns(own, verilog_modules(own)))
+
+    def accepts(case):
+        source = bench.write("refused.v", verilog_module(1, *case))
+        return subprocess.run(["iverilog", "-t", "null", source], capture_output=True,
+                              check=False).returncode == 0
+
+    # Some tools take "~&" and "~|" between operands, which the language has not.
+    texts = [case for case in refused if not re.search(r"[~!][&|]", case[0])]
+    must_refuse("lint of Verilog, Icarus Verilog", texts[:60], accepts)
+
+
+def lint_yosys(bench):
+    own, _ = lint_cases(bench, "Verilog")
+    source = own.write("lint.v", verilog_modules(own) + verilog_wrappers(own))
+    own.compare("lint of Verilog, Yosys", yosys_columns(own, f"read_verilog {source}\n"))
+
+
+def lint_liberty(bench):
+    own, _ = lint_cases(bench, "Liberty")
+    cells = ""
+    for number, (text, names, _) in enumerate(own.cases, 1):
+        pins = "".join(f"    pin ({name}) {{\n        direction : input;\n    }}\n"
+                       for name in names)
+        cells += (f"cell (f_{number}) {{\n{pins}    pin (y) {{\n        direction : output;\n"
+                  f"        function : \"{text}\";\n    }}\n}}\n")
+    own.compare("lint of Liberty, Yosys", liberty_columns(own, cells))
+
+
+def c_function(number, text, names):
+    parameters = ", ".join(f"int {name}" for name in names) or "void"
+    return f"int f_{number}({parameters})\n{{\n    return ({text}) != 0;\n}}\n"
+
+
+def lint_c(bench):
+    own, refused = lint_cases(bench, "C")
+    own.compare("lint of C, C compiler", c_columns(own, "".join(
+        c_function(number, text, names) for number, (text, names, _) in enumerate(own.cases, 1))))
+
+    def accepts(case):
+        source = bench.write("refused.c", c_function(1, *case))
+        return subprocess.run(["cc", "-std=c11", "-w", "-fsyntax-only", source],
+                              capture_output=True, check=False).returncode == 0
+
+    must_refuse("lint of C, C compiler", refused[:60], accepts)
+
+
+def lint_python(bench):
+    own, refused = lint_cases(bench, "Python")
+    columns = []
+    for text, names, column in own.cases:
+        code = compile(text, "text", "eval")
+        columns.append("".join(
+            str(int(bool(eval(code, dict(zip(names, row)))))) for row in
+            itertools.product((0, 1), repeat=len(names))))
+    own.compare("lint of Python, Python", columns)
+
+    def accepts(case):
+        try:
+            eval(compile(case[0], "text", "eval"), {name: 1 for name in case[1]})
+            return True
+        except (SyntaxError, TypeError, AttributeError):
+            return False
+
+    must_refuse("lint of Python, Python", refused, accepts)
+
+
+# By name: the programs that it takes, and the check; it is one of lint where the name says so.
+CHECKS = {
+    "library": ([], check_library),
+    "icarus": (["iverilog", "vvp"], check_icarus),
+    "yosys": (["yosys"], check_yosys),
+    "liberty": (["yosys"], check_liberty),
+    "ghdl": (["ghdl"], check_ghdl),
+    "c": (["cc"], check_c),
+    "python": ([], check_python),
+    "blif": (["berkeley-abc"], lambda bench: check_abc(bench, "blif", ".model")),
+    "pla": (["berkeley-abc"], lambda bench: check_abc(bench, "pla", ".i ")),
+    "eqn": (["berkeley-abc"], lambda bench: check_abc(bench, "eqn", "INORDER")),
+    "lint_icarus": (["iverilog", "vvp"], lint_icarus),
+    "lint_yosys": (["yosys"], lint_yosys),
+    "lint_liberty": (["yosys"], lint_liberty),
+    "lint_c": (["cc"], lint_c),
+    "lint_python": ([], lint_python),
+}
+SKIPPED = 77
+
+
+def lint_equations(seed, count):
+    """Names and operators that other languages have too, and some that they have not."""
+    cases = []
+    for spelling in (0, 1):
+        cases += equations.equations(seed + 1 + spelling, count, names=["a", "b", "c", "d"],
+                                     operators=("and", "or", "xor"), spelling=spelling,
+                                     inversion="~" if spelling else "!")
+        cases += equations.equations(seed + 3 + spelling, count // 4, names=["a", "b", "c", "d"],
+                                     inversion="~")
+    return cases
 
 
 def main():
@@ -262,24 +399,22 @@ def main():
     parser.add_argument("--tool", required=True)
     parser.add_argument("--count", type=int, default=300)
     parser.add_argument("--seed", type=int, default=1)
+    parser.add_argument("check", choices=CHECKS)
     arguments = parser.parse_args()
-    cases = equations.equations(arguments.seed, arguments.count)
-    passed = failed = skipped = 0
-    for programs, check in CHECKS:
-        missing = [program for program in programs if not shutil.which(program)]
-        if missing:
-            print(f"skipped: {' and '.join(missing)} is not installed")
-            skipped += 1
-            continue
-        with tempfile.TemporaryDirectory() as directory:
-            try:
-                check(Bench(os.path.abspath(arguments.tool), cases, directory))
-                passed += 1
-            except Failure as failure:
-                print(f"FAILED: {failure}")
-                failed += 1
-    print(f"{passed} clients passed, {failed} failed, {skipped} skipped")
-    return 1 if failed else 0
+    programs, check = CHECKS[arguments.check]
+    missing = [program for program in programs if not shutil.which(program)]
+    if missing:
+        print(f"skipped: {' and '.join(missing)} is not installed")
+        return SKIPPED
+    make = lint_equations if arguments.check.startswith("lint") else equations.equations
+    with tempfile.TemporaryDirectory() as directory:
+        try:
+            check(Bench(os.path.abspath(arguments.tool), make(arguments.seed, arguments.count),
+                        directory))
+        except Failure as failure:
+            print(f"FAILED: {failure}")
+            return 1
+    return 0
 
 
 if __name__ == "__main__":

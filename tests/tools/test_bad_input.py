@@ -15,9 +15,12 @@ DONE, WRONG_USAGE, REFUSED = 0, 2, 3
 WORDS = {
     "show": ([], []), "check": ([], []), "table": ([], []), "init": ([], []),
     "tree": ([], []), "kmap": ([], []), "eval": ([], ["A=1"]), "equal": ([], ["A"]),
+    "explain": ([], []), "permute": (["--from", "A,B", "--to", "A,B"], []), "match": ([], ["A"]),
+    "convert": (["--to", "verilog"], []), "lint": ([], []),
 }
 NAMES31 = ["v%d" % number for number in range(31)]
-COLUMNS = {"table", "init", "kmap", "equal"}  # no more than 30 inputs
+COLUMNS = {"table", "init", "kmap", "equal", "explain", "match"}  # no more than 30 inputs
+OWN_INPUTS = {"permute"}  # always lists A and B, by an option of its own
 
 
 class Checker:
@@ -64,12 +67,14 @@ class Checker:
 def check_texts(checker, command):
     for text, what in (("", "empty"), (" \t", "blank"), ("A &", "half an equation"),
                        (b"\x80\xff\x01", "binary"), ("(" * 100000 + "A", "huge"),
-                       ("A" * 100000 + " B", "a huge name"), ("%n %s {}", "formats"),
-                       ("0x8", "an init value without inputs")):
+                       ("A" * 100000 + " B", "a huge name"), ("%n %s {}", "formats")):
         checker.refuses(command, text, what)
+    if command not in OWN_INPUTS | {"match"}:  # which names the inputs A, B, C itself
+        checker.refuses(command, "0x8", "an init value without inputs")
     for text, what in (("0x88", "wrong width"), ("0b1", "too narrow"), ("0x8g", "no digit"),
                        ("0 | A", "an expression that begins with 0")):
-        checker.refuses(command, text, what, ["--inputs", "A,B"])
+        checker.refuses(command, text, what,
+                        [] if command in OWN_INPUTS else ["--inputs", "A,B"])
     if command in COLUMNS:
         checker.refuses(command, "&".join(NAMES31), "31 inputs")
         checker.refuses(command, "A", "31 listed inputs", ["--inputs", ",".join(NAMES31)])

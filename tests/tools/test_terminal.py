@@ -36,7 +36,7 @@ def check_terminal(tool):
     with subprocess.Popen([tool, *LONG], stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL,
                           stderr=side, preexec_fn=heed_interrupts) as process:
         os.close(side)
-        seen = read_until(terminal, b"rows: 1%")
+        seen = read_until(terminal, b"booleq: rows: ")
         assert b"67108864 rows, about " in seen, seen
         assert b"booleq: rows: " in seen, seen
         process.send_signal(signal.SIGINT)

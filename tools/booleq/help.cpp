@@ -215,7 +215,8 @@ std::string BashCompletion()
            "    case $command in\n" +
            cases +
            "    esac\n"
-           "    if [ \"$before\" = --file ] || [[ $command = batch && $word != -* && $before != --* ]]; "
+           "    if [ \"$before\" = --file ] || [[ $command = batch && $word != -* && $before != "
+           "--* ]]; "
            "then\n"
            "        mapfile -t COMPREPLY < <(compgen -f -- \"$word\")\n"
            "        return\n"

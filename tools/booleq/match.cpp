@@ -75,7 +75,8 @@ void PutText(const Text& text, const Function& first, const Function& second, co
     output.Put(place +
                (isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
     output.Put("  the second is the first" +
-               std::string(answer.matching.isInverted ? " inverted" : "") + ", where\n");
+               std::string(answer.matching.isInverted ? " inverted" : "") +
+               (first.NumInputs() > 0 ? ", where\n" : "\n"));
     // In the order of the first one's inputs.
     for (size_t input = 0; input < first.NumInputs(); ++input)
         for (size_t other = 0; other < second.NumInputs(); ++other)

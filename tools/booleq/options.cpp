@@ -67,7 +67,8 @@ void CheckInputOptions(Request& request, const CLI::Option& inputs, const std::s
 {
     Reading& reading = request.reading;
     reading.hasInputs = inputs.count() > 0;
-    if (!reading.hasInputs && (reading.lsbFirst || reading.reverse))
+    // --from of permute is such a list, too.
+    if (!reading.hasInputs && !request.Has("--from") && (reading.lsbFirst || reading.reverse))
         throw UsageError("--lsb-first and --reverse say how --inputs is read: give --inputs");
     if (!reading.hasInputs)
         return;

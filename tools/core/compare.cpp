@@ -10,7 +10,8 @@ namespace booleq {
 namespace {
 
 constexpr uint64_t kMaxOperations = uint64_t(1) << 28; // about a second
-constexpr uint64_t kNumSampleWords = 4096;
+constexpr uint64_t kMaxSampleWords = 4096;
+constexpr uint64_t kMinSampleWords = 16;
 constexpr unsigned int kMaxExhaustiveInputs = 30;
 
 } // namespace
@@ -19,13 +20,14 @@ Comparison Compare(const WordFunction& left, const WordFunction& right, unsigned
                    uint64_t cost)
 {
     Comparison result;
-    uint64_t numWords = kNumSampleWords;
+    uint64_t numWords = kMaxSampleWords;
     if (numInputs <= kMaxExhaustiveInputs)
         numWords = numInputs > 6 ? uint64_t(1) << (numInputs - 6) : 1;
     result.isExhaustive = numInputs <= kMaxExhaustiveInputs &&
                           numWords <= kMaxOperations / std::max<uint64_t>(cost, 1);
     if (!result.isExhaustive)
-        numWords = std::min(numWords, kNumSampleWords);
+        numWords = std::min(numWords, std::clamp(kMaxOperations / std::max<uint64_t>(cost, 1),
+                                                 kMinSampleWords, kMaxSampleWords));
     const uint64_t rowsPerWord = numInputs < 6 ? uint64_t(1) << numInputs : 64;
     std::mt19937_64 random(1);
     std::vector<uint64_t> inputs(numInputs);

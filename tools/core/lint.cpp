@@ -132,6 +132,15 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     return reading;
 }
 
+bool IsSameTree(const Expression& left, const Expression& right)
+{
+    return std::equal(left.nodes.begin(), left.nodes.end(), right.nodes.begin(), right.nodes.end(),
+                      [](const Expression::Node& own, const Expression::Node& other) {
+                          return own.op == other.op && own.left == other.left &&
+                                 own.right == other.right;
+                      });
+}
+
 bool IsInitValue(const Kq_BoolEquation& equation)
 {
     return equation.IsHexInitValue() || equation.IsBinaryInitValue();
@@ -190,6 +199,12 @@ class Linter {
             m_expression.nodes.size() + other.nodes.size());
     }
 
+    // The same tree, with parentheses wherever a reader may doubt.
+    std::string ClearText() const
+    {
+        return WriteOwn(m_expression, OwnSyntax::AsTyped, Parentheses::Clear);
+    }
+
     // "~ |" is an inversion and an operator, "~|" one operator.
     void CheckBlanks()
     {
@@ -220,7 +235,7 @@ class Linter {
         const std::string closed = m_text.substr(0, start + 1) + m_text.substr(next);
         Expression other;
         if (!ReadAgain(closed, other)) {
-            Add("blank", message).details = {{"without it", "refused"}};
+            Add("blank", message).details = {{"without it", "refused"}, {"write", ClearText()}};
             return;
         }
         const Comparison comparison = CompareWith(other);
@@ -229,7 +244,8 @@ class Linter {
         Add("blank", message).details = {
             {"first at", AssignmentText(m_expression.names, comparison.first)},
             {"with it", WriteOwn(m_expression, OwnSyntax::First, Parentheses::Whole)},
-            {"without it", WriteOwn(other, OwnSyntax::First, Parentheses::Whole)}};
+            {"without it", WriteOwn(other, OwnSyntax::First, Parentheses::Whole)},
+            {"write", ClearText()}};
     }
 
     void CheckRenderings()
@@ -248,13 +264,15 @@ class Linter {
             for (const Rendering& rendering : kRenderings) {
                 const std::string text = ToStd((m_equation.*rendering.get)(hasBlanks));
                 Expression again;
-                if (!ReadAgain(text, again) || !CompareWith(again).isEqual)
+                if (!ReadAgain(text, again) ||
+                    !(IsSameTree(again, m_expression) || CompareWith(again).isEqual))
                     finding.details.emplace_back(rendering.name, text);
             }
             if (finding.details.empty())
                 continue;
             finding.message = std::string("written ") + (hasBlanks ? "with" : "without") +
                               " blanks by the library, the equation does not read back";
+            finding.details.emplace_back("write", ClearText());
             m_report.findings.push_back(finding);
         }
     }

@@ -121,7 +121,8 @@ def check_yosys(bench):
 
 
 def liberty_columns(bench, cells):
-    names = [re.findall(r"pin \((.*)\)", cell) for cell in re.split(r"^cell ", cells, flags=re.M)[1:]]
+    names = [re.findall(r"pin \((.*)\)", cell)
+             for cell in re.split(r"^cell ", cells, flags=re.M)[1:]]
     library = bench.write("cells.lib", "library (cells) {\n" + cells + "}\n")
     source = bench.write("liberty.v", verilog_wrappers(bench, names))
     return yosys_columns(bench, f"read_liberty {library}\nread_verilog {source}\n")
@@ -385,11 +386,12 @@ SKIPPED = 77
 def lint_equations(seed, count):
     """Names and operators that other languages have too, and some that they have not."""
     cases = []
+    names = ["a", "b", "c", "d"]
     for spelling in (0, 1):
-        cases += equations.equations(seed + 1 + spelling, count, names=["a", "b", "c", "d"],
+        cases += equations.equations(seed + 1 + spelling, count * 2 // 3, names=names,
                                      operators=("and", "or", "xor"), spelling=spelling,
                                      inversion="~" if spelling else "!")
-        cases += equations.equations(seed + 3 + spelling, count // 4, names=["a", "b", "c", "d"],
+        cases += equations.equations(seed + 3 + spelling, count // 4, names=names,
                                      inversion="~")
     return cases
 

@@ -388,7 +388,7 @@ def lint_equations(seed, count):
     cases = []
     names = ["a", "b", "c", "d"]
     for spelling in (0, 1):
-        cases += equations.equations(seed + 1 + spelling, count * 2 // 3, names=names,
+        cases += equations.equations(seed + 1 + spelling, count, names=names,
                                      operators=("and", "or", "xor"), spelling=spelling,
                                      inversion="~" if spelling else "!")
         cases += equations.equations(seed + 3 + spelling, count // 4, names=names,

@@ -150,13 +150,15 @@ class Explainer {
                 std::count(data.begin(), data.end(), input) != 0)
                 return false;
             data.push_back(input);
-            std::string when;
+            literal += " for ";
             for (size_t place = 0; place < selects.size(); ++place)
-                when += (place == 0 ? "" : ", ") + m_names[selects[place]] + "=" +
-                        ((values >> place & 1u) != 0 ? "1" : "0");
-            choices.push_back(literal + " for " + when);
+                literal.append(place == 0 ? "" : ", ")
+                    .append(m_names[selects[place]])
+                    .append((values >> place & 1u) != 0 ? "=1" : "=0");
+            choices.push_back(std::move(literal));
         }
         std::vector<std::string> names;
+        names.reserve(selects.size());
         for (const unsigned int select : selects)
             names.push_back(m_names[select]);
         return Say("multiplexer",

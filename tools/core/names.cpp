@@ -50,8 +50,9 @@ std::string TargetNamer::NameOther(const std::string& wanted)
 {
     if (IsPlainName(wanted) && Claim(wanted))
         return wanted;
-    for (size_t number = 1;; ++number) {
-        const std::string name = wanted + "_" + std::to_string(number);
+    size_t& number = m_last_numbers[wanted];
+    for (;;) {
+        std::string name = wanted + "_" + std::to_string(++number);
         if (IsPlainName(name) && Claim(name))
             return name;
     }
@@ -62,7 +63,7 @@ std::string TargetNamer::Spell(const std::string& content)
     if (IsPlainName(content) && Claim(content))
         return content;
     if (m_notation && m_notation->escape) {
-        const std::string escaped = m_notation->escape(content);
+        std::string escaped = m_notation->escape(content);
         if (!escaped.empty() && Claim(escaped))
             return escaped;
     }

@@ -2,6 +2,7 @@
 #ifndef BOOLEQ_CORE_NAMES_H
 #define BOOLEQ_CORE_NAMES_H
 
+#include <map>
 #include <set>
 #include <string>
 #include <vector>
@@ -29,7 +30,8 @@ class TargetNamer {
     std::string Spell(const std::string& content);
 
     const Notation* m_notation;
-    std::set<std::string> m_used; // as the target tells names apart
+    std::set<std::string> m_used;                 // as the target tells names apart
+    std::map<std::string, size_t> m_last_numbers; // put behind a wanted name
 };
 
 } // namespace booleq

@@ -195,7 +195,7 @@ std::string WriteBlif(const Expression& expression, const NetworkNames& names)
             operands.pop_back();
         }
         if (IsBinary(own.op)) {
-            inputs = " " + operands.back() + inputs;
+            inputs.insert(0, " " + operands.back());
             operands.pop_back();
         }
         operands.push_back(isRoot ? names.output : fresh.Next());

@@ -33,8 +33,8 @@ class KQ_EXPORT Kq_BoolEquation {
     Kq_BoolEquation(const Kq_BoolEquation& other);
     ~Kq_BoolEquation();
 
-    // Three names for one operation: takes the other's equation, variables and values.
-    // Fails: std::bad_alloc, and this object is as it was.
+    // Three names for taking all of the other.  Fails: std::bad_alloc, and this object is as it
+    // was.
     Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
     void Copy(const Kq_BoolEquation& other);
     void SetEquationFromEquation(const Kq_BoolEquation& other);
@@ -43,22 +43,19 @@ class KQ_EXPORT Kq_BoolEquation {
     void Clear();
     // Sets the equation from an expression in any accepted syntax, or from an init value
     // ("0x8", "0b1000") over the variables that are defined now, the first the most significant.
-    // Every variable starts at 0, numbered by first occurrence.
-    // Fails: false, and neither equation nor variables are left.
+    // Variables start at 0, numbered by first occurrence.  Fails: false, and the object is empty.
     // Cost: in step with the text; for an init value, with the expression it stands for.
     bool SetEquation(const Port::StringBase<char>& equation);
     // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
     // text that are no terms follow them. A term that is no legal name or stands twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
-    // number instead of the highest; 'reverseTerms' defines the terms from the last to the first.
-    // Fails: false, and neither equation nor variables are left.
+    // number, not the highest; 'reverseTerms' defines terms from the last on.  Fails: as above.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
                                       bool reverseTerms);
 
-    // Why and where SetEquation, on an object without variables, or SetEquationWithExplicitTerms
-    // over 'terms' refuses the text. Nothing is set and nothing is dumped. Cost: that of setting
-    // the equation.
+    // Why and where SetEquation on an object without variables, or SetEquationWithExplicitTerms
+    // over 'terms', refuses the text. Sets and dumps nothing.  Cost: that of setting the equation.
     static Refusal FindRefusal(const Port::StringBase<char>& text,
                                const std::vector<Port::StringBase<char>>* terms = nullptr);
 
@@ -82,23 +79,20 @@ class KQ_EXPORT Kq_BoolEquation {
     // The result column as one number, row 2^n-1 first, leading zeros kept: "0x" and a digit for
     // four rows (one digit for n = 1), "0b" and a digit for each row. 1 to 30 variables.
     // Deliberate: without a truth table (a constant, no equation, over 30 variables) the texts are
-    // "0x0" and "0b", for the constant 1 as well.
-    // Cost: O(nodes * 2^n / 64).
+    // "0x0" and "0b", for the constant 1 as well.  Cost: O(nodes * 2^n / 64).
     Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     // All variable names joined with "+", the last one first; empty without variables.
     Port::StringBase<char> GetInitValueTermEquation() const;
-    // The result column, 64 rows to a word: row k is bit k % 64 of word k / 64; bits beyond the
-    // last row are 0. Without variables it has the one row of a constant. The debug mode changes
-    // nothing. Fails: false, and no words, without an equation or with more than 30 variables.
-    // Cost: O(nodes * 2^n / 64); 128 MB for 30 variables.
+    // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
+    // row without variables; the debug mode changes nothing.  Fails: false, and no words, without
+    // an equation or with over 30 variables.  Cost: O(nodes * 2^n / 64); 128 MB for 30 variables.
     bool GetColumn(std::vector<uint64_t>& words) const;
 
     // Is there no equation; is there one (null or a value that is only for testing).
     bool operator!() const;
     operator Kq_PtrTester*() const;
-    // True for the same tree: same operators, groups and names. Spelling of operators, variable
-    // tables and values do not count; two spellings of one function are not equal.
+    // True for the same operators, groups and names, however spelled; variables do not count.
     bool operator==(const Kq_BoolEquation& other) const;
     bool operator!=(const Kq_BoolEquation& other) const;
 
@@ -138,24 +132,20 @@ struct Kq_BoolEquation::Refusal {
         NONE = 0,            // the text is accepted
         EMPTY = 1,           // there is no token in it
         CHARACTER = 2,       // it begins no token
-        WORD = 3,            // between dots, and no operator
-        OPEN_WORD = 4,       // a "." without a second one
-        OPEN_QUOTE = 5,      // a quote without a second one
-        OPEN_PAREN = 6,      // a "(" that nothing closes
-        RIGHT_PAREN = 7,     // a ")" that closes nothing
-        OPERAND = 8,         // it stands where an operator must
-        NO_LEFT_OPERAND = 9, // of a binary operator
-        NO_RIGHT_OPERAND = 10,
-        NO_OPERAND = 11,       // of a negation
-        NEGATED_OPERATOR = 12, // a negation apart from its operator, with no operand to take
-        INIT_PREFIX = 13,      // over terms a text that begins with 0 is "0x..." or "0b..."
-        INIT_DIGIT = 14,       // not of the base
-        INIT_WIDTH = 15,       // so many digits are read over another number of variables
-        INIT_NAME = 16         // a term's name is no single token
+        WORD = 3,            // between dots, and no operator; a "." alone has no second one
+        QUOTE = 4,           // it has no second one
+        PAREN = 5,           // the other one of the pair is missing
+        OPERAND = 6,         // it stands where an operator must
+        NO_LEFT_OPERAND = 7, // of a binary operator
+        NO_RIGHT_OPERAND = 8,
+        NO_OPERAND = 9,        // of a negation
+        NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
+        INIT_DIGIT = 11,       // over terms: none of its base; or not the x or b behind a first 0
+        INIT_WIDTH = 12, // over terms: so many digits are read over other numbers of variables
+        INIT_NAME = 13   // over terms: one's name is no single token
     };
     CODE code = NONE;
-    size_t offset = 0;
-    size_t length = 0;
+    size_t offset = 0, length = 0;
 };
 
 // A variable found once by name. Element 0 is the variable index, the others are the positions of
@@ -205,8 +195,7 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
     bool operator!() const;
     operator Kq_PtrTester*() const;
 
-    // Copies: changing them does not change the table.
-    std::vector<Port::StringBase<char>> GetVariableNames() const;
+    std::vector<Port::StringBase<char>> GetVariableNames() const; // copies, as are the rows
     std::vector<Row> GetRows() const;
     void Dbg() const;
 

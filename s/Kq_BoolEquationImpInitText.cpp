@@ -157,7 +157,7 @@ size_t KqInitText::FindBadDigit(const String& text)
 {
     const unsigned int bitsPerDigit = BitsPerDigit(text);
     if (bitsPerDigit == 0)
-        return 0;
+        return 1;
     size_t position = kPrefixLength;
     while (position < text.length() &&
            kDigitValues.of[static_cast<unsigned char>(text.c_str()[position])] < 1u << bitsPerDigit)

@@ -43,8 +43,8 @@ class KqInitText {
     static std::unique_ptr<KqInitText> Read(const String& text, const Variables& inputs,
                                             bool isFirstLowest);
 
-    // Where a text that Read refuses has a byte that is no digit of its base: its length when there
-    // is none, 0 for an unknown prefix.
+    // Where a text that Read refuses has a byte that is no digit of its base, or 1 when that is not
+    // the x or b of a prefix; its length when there is none.
     // Requires: IsCandidate(text).
     static size_t FindBadDigit(const String& text);
 

@@ -27,8 +27,6 @@ Refusal MakeRefusal(Refusal::CODE code, size_t offset, size_t length)
 Refusal FindInitRefusal(const String& text)
 {
     const size_t position = KqInitText::FindBadDigit(text);
-    if (position == 0)
-        return MakeRefusal(Refusal::INIT_PREFIX, 0, KqInitText::kPrefixLength);
     if (position < text.length())
         return MakeRefusal(Refusal::INIT_DIGIT, position, 1);
     return MakeRefusal(Refusal::INIT_WIDTH, KqInitText::kPrefixLength,

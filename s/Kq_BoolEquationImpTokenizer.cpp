@@ -184,7 +184,7 @@ class Scanner {
         for (size_t position = 0; position < m_tokens.GetSize(); ++position) {
             const Node::TYPE type = m_tokens.begin()[position].type;
             if (type == Node::RP && numOpen == 0)
-                return RefuseToken(Refusal::RIGHT_PAREN, position);
+                return RefuseToken(Refusal::PAREN, position);
             numOpen += type == Node::LP ? 1u : 0u;
             numOpen -= type == Node::RP ? 1u : 0u;
         }
@@ -192,7 +192,7 @@ class Scanner {
         for (size_t position = m_tokens.GetSize(); position-- > 0;) {
             const Node::TYPE type = m_tokens.begin()[position].type;
             if (type == Node::LP && numClosed == 0)
-                return RefuseToken(Refusal::OPEN_PAREN, position);
+                return RefuseToken(Refusal::PAREN, position);
             numClosed += type == Node::RP ? 1u : 0u;
             numClosed -= type == Node::LP ? 1u : 0u;
         }
@@ -248,7 +248,7 @@ class Scanner {
     {
         const char* end = EndOfMarked(m_next, '\'');
         if (!end)
-            return Refuse(Refusal::OPEN_QUOTE, 1);
+            return Refuse(Refusal::QUOTE, 1);
         AppendName(end);
         return true;
     }
@@ -257,7 +257,7 @@ class Scanner {
     {
         const char* end = EndOfMarked(m_next, '.');
         if (!end)
-            return Refuse(Refusal::OPEN_WORD, 1);
+            return Refuse(Refusal::WORD, 1);
         const size_t length = static_cast<size_t>(end - m_next);
         const KqSpelling::Id id = KeywordSpelling(m_next, length);
         if (id == KqSpelling::kOwnToken)

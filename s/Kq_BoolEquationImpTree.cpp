@@ -271,7 +271,7 @@ bool TreeBuilder::Refuse(Refusal::CODE code, const Node* node, size_t numBehind)
 {
     // The first token is placed unseen, and a ")" there is the fault whatever follows from it.
     const Node* first = m_nodes[0];
-    m_refusal = first->IsRp() ? Refusal::RIGHT_PAREN : code;
+    m_refusal = first->IsRp() ? Refusal::PAREN : code;
     // Nodes lie side by side in text order.
     m_refused_position = first->IsRp() ? 0 : static_cast<size_t>(node - first) + numBehind;
     return false;
@@ -289,7 +289,7 @@ bool TreeBuilder::RefuseRightParen(const Node* node)
             ++taker;
         return Refuse(taker->IsNot() ? Refusal::NEGATED_OPERATOR : Refusal::NO_LEFT_OPERAND, taker);
     }
-    return Refuse(Refusal::RIGHT_PAREN, node);
+    return Refuse(Refusal::PAREN, node);
 }
 
 // A node whose children are not those that its type allows.

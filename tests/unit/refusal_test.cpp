@@ -41,17 +41,17 @@ TEST(Refusal, CharactersWordsAndQuotes)
     EXPECT_EQ(Expected(Refusal::CHARACTER, 5, 1), RefusalOf("A & B\r"));
     EXPECT_EQ(Expected(Refusal::CHARACTER, 0, 1), RefusalOf("2"));
     EXPECT_EQ(Expected(Refusal::WORD, 2, 6), RefusalOf("A .XNOR. B"));
-    EXPECT_EQ(Expected(Refusal::OPEN_WORD, 2, 1), RefusalOf("A .AND B"));
-    EXPECT_EQ(Expected(Refusal::OPEN_QUOTE, 1, 1), RefusalOf("A' & B"));
+    EXPECT_EQ(Expected(Refusal::WORD, 2, 1), RefusalOf("A .AND B"));
+    EXPECT_EQ(Expected(Refusal::QUOTE, 1, 1), RefusalOf("A' & B"));
 }
 
 TEST(Refusal, Parentheses)
 {
-    EXPECT_EQ(Expected(Refusal::OPEN_PAREN, 0, 1), RefusalOf("(A & B"));
-    EXPECT_EQ(Expected(Refusal::OPEN_PAREN, 4, 1), RefusalOf("A & (B | (C)"));
-    EXPECT_EQ(Expected(Refusal::RIGHT_PAREN, 5, 1), RefusalOf("A & B)"));
-    EXPECT_EQ(Expected(Refusal::RIGHT_PAREN, 0, 1), RefusalOf(")A("));
-    EXPECT_EQ(Expected(Refusal::RIGHT_PAREN, 2, 1), RefusalOf("A ) & ( B"));
+    EXPECT_EQ(Expected(Refusal::PAREN, 0, 1), RefusalOf("(A & B"));
+    EXPECT_EQ(Expected(Refusal::PAREN, 4, 1), RefusalOf("A & (B | (C)"));
+    EXPECT_EQ(Expected(Refusal::PAREN, 5, 1), RefusalOf("A & B)"));
+    EXPECT_EQ(Expected(Refusal::PAREN, 0, 1), RefusalOf(")A("));
+    EXPECT_EQ(Expected(Refusal::PAREN, 2, 1), RefusalOf("A ) & ( B"));
 }
 
 TEST(Refusal, OperandsAndOperators)
@@ -78,7 +78,7 @@ TEST(Refusal, InitValuesOverTerms)
     };
     EXPECT_EQ("", over("0x8"));
     EXPECT_EQ("", over("A & D"));
-    EXPECT_EQ(Expected(Refusal::INIT_PREFIX, 0, 2), over("0 | A"));
+    EXPECT_EQ(Expected(Refusal::INIT_DIGIT, 1, 1), over("0 | A"));
     EXPECT_EQ(Expected(Refusal::INIT_DIGIT, 3, 1), over("0b12"));
     EXPECT_EQ(Expected(Refusal::INIT_WIDTH, 2, 2), over("0x88"));
     const std::vector<String> lenient = {"'a'+b"};
@@ -112,10 +112,8 @@ bool IsTrue(const Refusal& refusal, const std::string& tokens)
     const char before = place > 0 ? tokens[place - 1] : '(';
     const char behind = place + 1 < tokens.size() ? tokens[place + 1] : ')';
     switch (refusal.code) {
-    case Refusal::OPEN_PAREN:
-        return token == '(';
-    case Refusal::RIGHT_PAREN:
-        return token == ')';
+    case Refusal::PAREN:
+        return token == '(' || token == ')';
     case Refusal::OPERAND:
         return (IsOperand(token) || token == '(' || token == '~') &&
                (IsOperand(before) || before == ')');
@@ -136,12 +134,13 @@ bool IsTrue(const Refusal& refusal, const std::string& tokens)
 bool IsCountTrue(const Refusal& refusal, const std::string& tokens)
 {
     int open = 0;
-    if (refusal.code == Refusal::RIGHT_PAREN) {
+    const bool isParen = refusal.code == Refusal::PAREN;
+    if (isParen && tokens[refusal.offset / 2] == ')') {
         for (size_t place = 0; place <= refusal.offset / 2; ++place)
             open += tokens[place] == '(' ? 1 : tokens[place] == ')' ? -1 : 0;
         return open < 0;
     }
-    if (refusal.code == Refusal::OPEN_PAREN) {
+    if (isParen) {
         for (size_t place = refusal.offset / 2; place < tokens.size(); ++place) {
             open += tokens[place] == '(' ? 1 : tokens[place] == ')' ? -1 : 0;
             if (open == 0)

@@ -166,6 +166,8 @@ class CsvFormat : public Format {
 
 class JsonFormat : public Format {
   public:
+    JsonFormat() {} // not noexcept, as an empty Json need not be
+
     bool IsHeader(const std::string&, std::string&) override { return false; }
 
     BatchResult ReadRow(const std::string& line, BatchRow& row) override

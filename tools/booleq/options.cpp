@@ -63,10 +63,11 @@ void CheckOperands(Request& request, bool hasFile)
     }
 }
 
-void CheckInputOptions(Request& request, const CLI::Option& inputs, const std::string& list)
+void CheckInputOptions(Request& request)
 {
     Reading& reading = request.reading;
-    reading.hasInputs = inputs.count() > 0;
+    const std::string list = request.Get("--inputs");
+    reading.hasInputs = request.Has("--inputs");
     // --from of permute is such a list, too.
     if (!reading.hasInputs && !request.Has("--from") && (reading.lsbFirst || reading.reverse))
         throw UsageError("--lsb-first and --reverse say how --inputs is read: give --inputs");
@@ -100,17 +101,11 @@ void AddOption(CLI::App& app, ParsedOption& entry)
 
 void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
 {
-    const CLI::Option* inputs = nullptr;
-    std::string list;
     bool hasFile = false;
     for (const ParsedOption& entry : entries) {
         const std::string name = entry.option->name;
         if (entry.parsed->count() > 1 && entry.option->value)
             throw UsageError(name + " is given twice");
-        if (name == "--inputs") {
-            inputs = entry.parsed;
-            list = entry.value;
-        }
         if (entry.parsed->count() == 0)
             continue;
         if (name == "--file") {
@@ -124,7 +119,7 @@ void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
     request.reading.lsbFirst = request.Has("--lsb-first");
     request.reading.reverse = request.Has("--reverse");
     CheckOperands(request, hasFile);
-    CheckInputOptions(request, *inputs, list);
+    CheckInputOptions(request);
 }
 
 } // namespace

@@ -99,6 +99,10 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
 void ExplainWord(const Context& context, RefusalReport& report)
 {
     const std::string word = context.Token();
+    if (word.size() == 1) {
+        report.reason = std::string("the '.' has no second '.'; ") + kWords;
+        return;
+    }
     report.reason = Excerpt(word) + " is no operator; " + kWords;
     std::string upper = word;
     std::transform(upper.begin(), upper.end(), upper.begin(), [](char character) {
@@ -153,13 +157,14 @@ void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalRe
 void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& report)
 {
     switch (code) {
-    case Refusal::OPEN_PAREN:
-        report.reason = "nothing closes this '('";
-        report.mend = "add a ')' behind the group, or leave it out";
-        return;
-    case Refusal::RIGHT_PAREN:
-        report.reason = "this ')' closes no '('";
-        report.mend = "leave it out, or add a '(' before the group";
+    case Refusal::PAREN:
+        if (context.At(0) == '(') {
+            report.reason = "nothing closes this '('";
+            report.mend = "add a ')' behind the group, or leave it out";
+        } else {
+            report.reason = "this ')' closes no '('";
+            report.mend = "leave it out, or add a '(' before the group";
+        }
         return;
     case Refusal::NO_OPERAND:
         report.reason = "the negation " + Quoted(context.Token()) + " has no operand behind it";
@@ -184,16 +189,13 @@ const char* CodeName(Refusal::CODE code)
         {Refusal::EMPTY, "empty"},
         {Refusal::CHARACTER, "character"},
         {Refusal::WORD, "word"},
-        {Refusal::OPEN_WORD, "open-word"},
-        {Refusal::OPEN_QUOTE, "open-quote"},
-        {Refusal::OPEN_PAREN, "open-parenthesis"},
-        {Refusal::RIGHT_PAREN, "right-parenthesis"},
+        {Refusal::QUOTE, "quote"},
+        {Refusal::PAREN, "parenthesis"},
         {Refusal::OPERAND, "operand"},
         {Refusal::NO_LEFT_OPERAND, "no-left-operand"},
         {Refusal::NO_RIGHT_OPERAND, "no-right-operand"},
         {Refusal::NO_OPERAND, "no-operand"},
         {Refusal::NEGATED_OPERATOR, "negated-operator"},
-        {Refusal::INIT_PREFIX, "init-prefix"},
         {Refusal::INIT_DIGIT, "init-digit"},
         {Refusal::INIT_WIDTH, "init-width"},
         {Refusal::INIT_NAME, "init-name"},
@@ -218,10 +220,7 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
         return ExplainCharacter(context, report);
     case Refusal::WORD:
         return ExplainWord(context, report);
-    case Refusal::OPEN_WORD:
-        report.reason = std::string("the '.' has no second '.'; ") + kWords;
-        return;
-    case Refusal::OPEN_QUOTE:
+    case Refusal::QUOTE:
         report.reason = "nothing closes this quote";
         if (!context.NameBefore().empty())
             report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
@@ -234,17 +233,17 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
         return ExplainOperator(context, "left", report);
     case Refusal::NO_RIGHT_OPERAND:
         return ExplainOperator(context, "right", report);
-    case Refusal::OPEN_PAREN:
-    case Refusal::RIGHT_PAREN:
+    case Refusal::PAREN:
     case Refusal::NO_OPERAND:
     case Refusal::NEGATED_OPERATOR:
         return ExplainBuild(context, refusal.code, report);
-    case Refusal::INIT_PREFIX:
-        report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... or "
-                        "0b...";
-        report.mend = "put an expression that begins so in parentheses";
-        return;
     case Refusal::INIT_DIGIT:
+        if (refusal.offset == 1) {
+            report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... "
+                            "or 0b...";
+            report.mend = "put an expression that begins so in parentheses";
+            return;
+        }
         report.reason = Quoted(context.Token()) + " is no " +
                         ((text[1] | 0x20) == 'x' ? "hexadecimal" : "binary") + " digit";
         return;

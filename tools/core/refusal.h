@@ -10,7 +10,7 @@
 namespace booleq {
 
 struct RefusalReport {
-    const char* code = nullptr; // a stable word, "operand" or "open-quote"; null: accepted
+    const char* code = nullptr; // a stable word, "operand" or "quote"; null: accepted
     size_t offset = 0;          // bytes from 0
     size_t length = 0;
     std::string reason; // one sentence without a full stop

@@ -112,7 +112,8 @@ class KQ_EXPORT Kq_BoolEquationImp {
     static StringMgr& GetNamePool();
     static bool ScanTokens(const char* text, Tokens& tokens,
                            Kq_BoolEquation::Refusal* refusal = nullptr);
-    static void LocateToken(const char* text, size_t position, Kq_BoolEquation::Refusal& refusal);
+    static void LocateToken(const char* text, const Tokens& tokens, size_t position,
+                            Kq_BoolEquation::Refusal& refusal);
     Kq_BoolEquation::Refusal::CODE FindTreeRefusal(size_t& position) const;
     static std::vector<Variable> ListTerms(const std::vector<Port::StringBase<char>>& terms,
                                            bool reverseTerms);

@@ -62,7 +62,7 @@ Refusal Kq_BoolEquationImp::FindRefusal(const String& text, const std::vector<St
         size_t position = 0;
         refusal.code = scratch.FindTreeRefusal(position);
         if (refusal.code != Refusal::NONE)
-            LocateToken(source, position, refusal);
+            LocateToken(source, tokens, position, refusal);
     }
     // The expression of an init value is our own but for the names in it.
     if (isInitValue && refusal.code != Refusal::NONE)

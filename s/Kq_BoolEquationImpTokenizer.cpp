@@ -130,6 +130,22 @@ const char* EndOfMarked(const char* start, char mark)
     return end ? end + 1 : nullptr;
 }
 
+// Puts the place of the token at 'position' into 'refusal'. Tokens do not know their places,
+// because only a refusal asks; but between them there are blanks only, and each is as long as its
+// text.
+void Locate(const char* text, const Kq_BoolEquationImp::Tokens& tokens, size_t position,
+            Refusal& refusal)
+{
+    const Kq_BoolEquationImp::Tokens::Token* token = tokens.begin();
+    size_t offset = std::strspn(text, " \t\n");
+    for (size_t left = position; left > 0; --left, ++token) {
+        offset += token->text->length();
+        offset += std::strspn(text + offset, " \t\n");
+    }
+    refusal.offset = offset;
+    refusal.length = token->text->length();
+}
+
 // Scans one text into tokens.
 class Scanner {
   public:
@@ -149,19 +165,6 @@ class Scanner {
         }
         // Only the totals are compared: ")A(" is left for the tree builder to refuse.
         return m_num_opened == m_num_closed || RefuseParens();
-    }
-
-    // Scans up to the token at 'position' in an accepted text and puts its place into 'refusal'.
-    void Locate(const char* text, size_t position, Refusal& refusal)
-    {
-        m_next = text;
-        const char* start = text;
-        while (m_tokens.GetSize() <= position) {
-            start = m_next;
-            ScanToken();
-        }
-        refusal.offset = static_cast<size_t>(start - text);
-        refusal.length = static_cast<size_t>(m_next - start);
     }
 
     // Why ScanText was false.
@@ -202,8 +205,7 @@ class Scanner {
     bool RefuseToken(Refusal::CODE code, size_t position)
     {
         m_refusal.code = code;
-        Kq_BoolEquationImp::Tokens again(0);
-        Scanner(m_names, again).Locate(m_text, position, m_refusal);
+        Locate(m_text, m_tokens, position, m_refusal);
         return false;
     }
 
@@ -326,12 +328,11 @@ bool Kq_BoolEquationImp::ScanTokens(const char* text, Tokens& tokens, Refusal* r
     return isRead;
 }
 
-// Tokens do not know their places, because only a refusal asks.
-// Requires: 'text' is accepted by ScanTokens and has more than 'position' tokens.
-void Kq_BoolEquationImp::LocateToken(const char* text, size_t position, Refusal& refusal)
+// Requires: the tokens of the text; more than 'position'.
+void Kq_BoolEquationImp::LocateToken(const char* text, const Tokens& tokens, size_t position,
+                                     Refusal& refusal)
 {
-    Tokens tokens(0);
-    Scanner(GetNamePool(), tokens).Locate(text, position, refusal);
+    Locate(text, tokens, position, refusal);
 }
 
 void Kq_BoolEquationImp::TokenizeNodes(const char* text)

@@ -33,8 +33,7 @@ class KQ_EXPORT Kq_BoolEquation {
     Kq_BoolEquation(const Kq_BoolEquation& other);
     ~Kq_BoolEquation();
 
-    // Three names for taking all of the other.  Fails: std::bad_alloc, and this object is as it
-    // was.
+    // Three names for taking all of the other.  Fails: std::bad_alloc; this object stays as it is.
     Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
     void Copy(const Kq_BoolEquation& other);
     void SetEquationFromEquation(const Kq_BoolEquation& other);

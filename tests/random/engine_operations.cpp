@@ -156,6 +156,12 @@ const std::vector<Operation> kOfEngine = {
     {"Kq_BoolEquationImp::GetNumVariables() const", [](Objects& o) { o.engine.GetNumVariables(); }},
     {"Kq_BoolEquationImp::GetVariables() const", [](Objects& o) { Ask(o.engine.GetVariables()); }},
     {"Kq_BoolEquationImp::GetTruthTable() const", [](Objects& o) { o.engine.GetTruthTable(); }},
+    {"Kq_BoolEquationImp::FindRefusal(Port::StringBase<char> const&, "
+     "std::vector<Port::StringBase<char>, std::allocator<Port::StringBase<char> > > const*)",
+     [](Objects&) {
+         Engine::FindRefusal(kText);
+         Engine::FindRefusal("P & (another_name_nobody_has_used ~ | Q) R");
+     }},
     {"Kq_BoolEquationImp::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
      "const",
      [](Objects& o) {

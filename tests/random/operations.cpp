@@ -87,6 +87,14 @@ const std::vector<Operation> kOfEquation = {
      [](Objects& o) { o.a.GetEquationAsBinaryInitValue(); }},
     {"Kq_BoolEquation::GetInitValueTermEquation() const",
      [](Objects& o) { o.a.GetInitValueTermEquation(); }},
+    {"Kq_BoolEquation::FindRefusal(Port::StringBase<char> const&, "
+     "std::vector<Port::StringBase<char>, std::allocator<Port::StringBase<char> > > const*)",
+     [](Objects&) {
+         const std::vector<String> terms = Terms();
+         EXPECT_EQ(Equation::FindRefusal(kText).code, Equation::Refusal::NONE);
+         Equation::FindRefusal("(P | a_name_nobody_has_used $) & Q", &terms);
+         Equation::FindRefusal("0x9", &terms);
+     }},
     {"Kq_BoolEquation::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&) "
      "const",
      [](Objects& o) {

@@ -95,7 +95,8 @@ TEST(Convert, TakesDeepExpressions)
     text += std::string(50000, ')');
     for (const Target target :
          {Target::Verilog, Target::C, Target::Vhdl, Target::Blif, Target::Eqn})
-        EXPECT_EQ(Convert(Parsed(text), target, "").fault, "") << TargetNames()[int(target)];
+        EXPECT_EQ(Convert(Parsed(text), target, "").fault, "")
+            << TargetNames()[static_cast<size_t>(target)];
 }
 
 // What a notation reads: the column over the tree's names, or why not.

@@ -43,7 +43,7 @@ class KQ_EXPORT Kq_BoolEquation {
     // Sets the equation from an expression in any accepted syntax, or from an init value
     // ("0x8", "0b1000") over the variables that are defined now, the first the most significant.
     // Variables start at 0, numbered by first occurrence.  Fails: false, and the object is empty.
-    // Cost: in step with the text; for an init value, with the expression it stands for.
+    // Cost: in step with the text. Of an init value only renderings and dumps take the expression.
     bool SetEquation(const Port::StringBase<char>& equation);
     // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
     // text that are no terms follow them. A term that is no legal name or stands twice is skipped.

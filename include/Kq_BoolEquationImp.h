@@ -87,7 +87,8 @@ class KQ_EXPORT Kq_BoolEquationImp {
     bool GetColumn(std::vector<uint64_t>& words) const; // see Kq_BoolEquation
 
     // The root of the tree, null without an equation. Only for reading: results are kept of the
-    // nodes, which live until the object, and every copy, is set, cleared or destroyed.
+    // nodes, which live until the object, and every copy, is set, cleared or destroyed. Of an init
+    // value the nodes are made on the first call, which can be many.  Fails: std::bad_alloc.
     const Node* GetRoot() const;
 
     void Dbg() const;

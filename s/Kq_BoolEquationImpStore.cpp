@@ -99,20 +99,14 @@ void Store::ListInPreOrder()
 {
     KqStack<Node*, 32> pending;
     pending.Push(m_root);
-    try {
-        for (Node*& position : m_nodes) {
-            Node* node = pending.Pop();
-            position = node;
-            // The right child is pushed first, so the left one is listed first.
-            if (node->GetRightChild())
-                pending.Push(node->GetRightChild());
-            if (node->GetLeftChild())
-                pending.Push(node->GetLeftChild());
-        }
-    } catch (...) {
-        for (size_t position = 0; position < m_nodes.size(); ++position)
-            m_nodes[position] = m_block + position;
-        throw;
+    for (Node*& position : m_nodes) {
+        Node* node = pending.Pop();
+        position = node;
+        // The right child is pushed first, so the left one is listed first.
+        if (node->GetRightChild())
+            pending.Push(node->GetRightChild());
+        if (node->GetLeftChild())
+            pending.Push(node->GetLeftChild());
     }
 }
 

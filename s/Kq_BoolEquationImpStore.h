@@ -119,7 +119,8 @@ struct Kq_BoolEquationImp::Store {
     // Puts the init value's own root above the tree.
     void AddTruthTableRoot(const Port::StringBase<char>& initValue);
     // Lists the tree in pre-order.
-    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the order as it was made.
+    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc; then the list is good for
+    // Clear only.
     void ListInPreOrder();
 
     // Takes an init value whose tree is owed from now on.

@@ -201,4 +201,46 @@ TEST(Tree, TopNotOfANegatedOperatorKeepsItsParentLink)
     EXPECT_EQ(nullptr, engine.GetRoot()->GetParent());
 }
 
+// A list that outlives the failure, because another object shares it, is one of loose tokens again.
+TEST(Tree, ListThatFailedCanBeBuiltAgain)
+{
+    Engine first;
+    first.TokenizeNodes("(P | A & ~ | B)");
+    Engine second(first);
+    std::string dump;
+    {
+        const Messages messages;
+        first.BuildTree();
+        dump = messages.Text();
+    }
+    EXPECT_TRUE(!first);
+    EXPECT_NE("", dump);
+    const Messages messages;
+    second.BuildTree();
+    EXPECT_TRUE(!second);
+    EXPECT_EQ(dump, messages.Text()) << "the same node broke it in the same way";
+}
+
+TEST(Tree, ListWhoseTraceWasCutShortCanBeBuiltAgain)
+{
+    struct Stop {};
+    for (int numMessages = 0; numMessages < 40; numMessages += 3) {
+        Engine engine;
+        engine.TokenizeNodes("(A | ~B) & C ^ (D ~ & E)");
+        int numLeft = numMessages;
+        const auto before =
+            Port_MsgManData::setSink([&](const char*, const char*, int, const char*, const char*) {
+                if (numLeft-- == 0)
+                    throw Stop();
+            });
+        {
+            const DebugMode debugMode;
+            EXPECT_THROW(engine.BuildTree(), Stop);
+        }
+        Port_MsgManData::setSink(before);
+        engine.BuildTree();
+        EXPECT_EQ("XOR(AND(LP(OR(A, NOT(B))), C), LP(NOT(AND(D, E))))", TreeText(engine.GetRoot()));
+    }
+}
+
 } // namespace

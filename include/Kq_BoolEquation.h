@@ -54,7 +54,7 @@ class KQ_EXPORT Kq_BoolEquation {
                                       bool reverseTerms);
 
     // Why and where SetEquation on an object without variables, or SetEquationWithExplicitTerms
-    // over 'terms', refuses the text. Sets and dumps nothing.  Cost: that of setting the equation.
+    // over 'terms' as they stand, refuses the text. Sets and dumps nothing.  Cost: that of setting.
     static Refusal FindRefusal(const Port::StringBase<char>& text,
                                const std::vector<Port::StringBase<char>>* terms = nullptr);
 
@@ -141,7 +141,7 @@ struct Kq_BoolEquation::Refusal {
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
         INIT_DIGIT = 11,       // over terms: none of its base; or not the x or b behind a first 0
         INIT_WIDTH = 12, // over terms: so many digits are read over other numbers of variables
-        INIT_NAME = 13   // over terms: one's name is no single token
+        INIT_NAME = 13   // over terms: one's name is no single token, and what it makes is refused
     };
     CODE code = NONE;
     size_t offset = 0, length = 0;

@@ -40,9 +40,7 @@ KqJoiner::Value KqJoiner::VariableValue(uint32_t variable)
 {
     if (variable < kKqGranuleLevel)
         return {0, kTilePatterns.words[variable], 0};
-    static_assert(sizeof kTilePatterns.zeros == kKqTileWords * sizeof(uint64_t),
-                  "ones follow zeros");
-    return {AboveGranule(variable), kTilePatterns.zeros, kKqTileWords};
+    return {AboveGranule(variable), kTilePatterns.zerosThenOnes, kKqTileWords};
 }
 
 // Adds up what the joins write and cost; 'numWords' becomes the size of all values but the last.
@@ -69,11 +67,11 @@ bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int l
         last = size_t(1) << KqCountBits(hand);
         numGranules += last;
         cost += last + kJoinGranules;
-        if (cost > limit + last)
+        numWords = (numGranules - last) * kKqGranuleWords;
+        if (cost > limit + last || numWords > kMaxWords)
             return false;
     }
-    numWords = (numGranules - last) * kKqGranuleWords;
-    return numWords <= kMaxWords;
+    return true;
 }
 
 void KqJoiner::Join(KqCode kind, const Value& lower, const Value& upper, uint32_t variables,

@@ -45,7 +45,8 @@ class KqJoiner {
     // row number that is their value. False, and nothing is written, when the values are so large
     // that other ways cost less.
     // Requires: a step; variables below 'level'; kKqGranuleLevel <= level.
-    // Fails: std::bad_alloc.  Cost: O(steps) to refuse, a few times the block at most to write.
+    // Fails: std::bad_alloc.  Cost: O(steps) to refuse, a few times the block, and more
+    // for each value that is stacked, to write.
     bool Fill(const KqCode* codes, size_t numCodes, bool isInverted, unsigned int level,
               uint64_t* words);
 

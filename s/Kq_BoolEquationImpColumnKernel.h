@@ -21,8 +21,7 @@ constexpr unsigned int kTileLevel = 12; // a tile has 2^12 rows
 // The columns of the variables of a tile; a variable above it is all zeros or all ones there.
 struct TilePatterns {
     uint64_t words[kTileLevel][kKqTileWords];
-    uint64_t zeros[kKqTileWords];
-    uint64_t ones[kKqTileWords];
+    uint64_t zerosThenOnes[2 * kKqTileWords];
 };
 
 constexpr TilePatterns MakeTilePatterns()
@@ -35,7 +34,7 @@ constexpr TilePatterns MakeTilePatterns()
                                                  : uint64_t(0) - (word >> (variable - 6) & 1u);
     }
     for (unsigned int word = 0; word < kKqTileWords; ++word)
-        patterns.ones[word] = ~uint64_t(0);
+        patterns.zerosThenOnes[kKqTileWords + word] = ~uint64_t(0);
     return patterns;
 }
 
@@ -121,8 +120,8 @@ inline __attribute__((always_inline)) void RunTiles(const KqCode* codes, size_t 
         operands[variable] = kTilePatterns.words[variable];
     for (size_t tile = 0; tile < numWords / kKqTileWords; ++tile) {
         for (unsigned int variable = kTileLevel; variable < kKqMaxColumnVariables; ++variable)
-            operands[variable] = (tile >> (variable - kTileLevel) & 1u) != 0 ? kTilePatterns.ones
-                                                                             : kTilePatterns.zeros;
+            operands[variable] =
+                kTilePatterns.zerosThenOnes + (tile >> (variable - kTileLevel) & 1u) * kKqTileWords;
         for (size_t offset = 0; offset < kKqTileWords; offset += kStripWords)
             RunStrip<V, kNum>(codes, numCodes, isInverted, operands, offset, stack,
                               words + tile * kKqTileWords);

@@ -240,6 +240,13 @@ bool KqInitText::IsExact() const
     return !m_names.empty() && std::all_of(m_names.begin(), m_names.end(), IsPlainName);
 }
 
+bool KqInitText::HasSymmetricTerms() const
+{
+    bool areSymmetric = true;
+    VisitTerms([&](uint64_t row) { areSymmetric = areSymmetric && ReverseBits(row) == row; });
+    return areSymmetric;
+}
+
 unsigned int KqInitText::CountNegations(uint64_t row, size_t numNames) const
 {
     const size_t numOnes = KqCountBits(row >> (m_names.size() - numNames));

@@ -39,7 +39,8 @@ class KqInitText {
     // Reads 'text' over the names of 'inputs'. 'isFirstLowest' gives the first one the lowest bit
     // of a digit's row number instead of the highest. Null when the text is none: an unknown
     // prefix, a bad digit, or digits for another number of names.
-    // Requires: IsCandidate(text).  Fails: std::bad_alloc.  Cost: O(text).
+    // Requires: IsCandidate(text).  Fails: std::bad_alloc.
+    // Cost: O(text), with 'isFirstLowest' O(text * names).
     static std::unique_ptr<KqInitText> Read(const String& text, const Variables& inputs,
                                             bool isFirstLowest);
 
@@ -84,6 +85,9 @@ class KqInitText {
                 visit(word * 64 + static_cast<uint64_t>(__builtin_ctzll(rows)));
         }
     }
+
+    // Whether the terms are the same ones with the names' bits in opposite order.
+    bool HasSymmetricTerms() const;
 
     // How many of the first 'numNames' names have a "~" in the term of 'row'.
     unsigned int CountNegations(uint64_t row, size_t numNames) const;

@@ -1,6 +1,7 @@
 // The tree of an init value, made of its results when somebody asks for it: node by node the one
 // that its expression would give. Its shape follows from the rows alone, so positions need no tree.
-// Fails: std::bad_alloc, with the tree owed as before.  Cost: O(rows + nodes).
+// Fails: std::bad_alloc, with the tree owed as before.  Cost: O(nodes), and O(rows * names)
+// for a value whose first name is the lowest bit.
 #include "Kq_BoolEquationImpStore.h"
 
 #include "Kq_BoolEquationImpSpelling.h"
@@ -127,6 +128,7 @@ void Store::AppendInitPositions(const String& name, std::vector<unsigned int>& p
         ++index;
     if (index == names.size())
         return;
+    positions.reserve(positions.size() + initText.GetNumTerms());
     // Behind the init value's own root and the operators between terms.
     size_t term = 1 + CountOperators(initText.GetNumTerms());
     initText.VisitTerms([&](uint64_t row) {

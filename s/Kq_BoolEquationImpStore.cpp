@@ -155,8 +155,8 @@ bool Store::IsSame(Store& other)
 {
     if (this == &other)
         return true;
-    // Two init values of the same text differ as their names do. With the names the same and the
-    // bits in another order, terms differ or not, and only then are the nodes asked for.
+    // Two init values of the same text differ as their names do and, with the bits in another
+    // order, as their terms do. Nodes are asked for where one of the trees was made at once.
     const String* const initValue = GetInitValue();
     const String* const otherInitValue = other.GetInitValue();
     if (!initValue != !otherInitValue || (initValue && !KqIsSameText(*initValue, *otherInitValue)))
@@ -166,15 +166,16 @@ bool Store::IsSame(Store& other)
         if (!std::equal(names.begin(), names.end(), other.m_init_text->GetNames().begin(),
                         other.m_init_text->GetNames().end(), KqIsSameText))
             return false;
-        if (m_init_text->IsFirstLowest() == other.m_init_text->IsFirstLowest())
-            return true;
+        return m_init_text->IsFirstLowest() == other.m_init_text->IsFirstLowest() ||
+               m_init_text->HasSymmetricTerms();
     }
     return GetNodes().size() == other.GetNodes().size() && IsSameTree(GetRoot(), other.GetRoot());
 }
 
 void Store::LinkVariable(const String& name, unsigned int variableIndex)
 {
-    // Nothing is missed in a tree that is owed: its names have been variables ever since.
+    if (m_init_text)
+        return; // invariant 5: its names have been variables ever since
     for (Node* node : m_nodes) {
         if (node->IsId() && KqIsSameText(node->GetToken(), name)) {
             node->SetValue(variableIndex);
@@ -185,9 +186,7 @@ void Store::LinkVariable(const String& name, unsigned int variableIndex)
 
 std::vector<unsigned int> Store::MakeHandle(const String& name, unsigned int variableIndex) const
 {
-    std::vector<unsigned int> values;
-    values.reserve(1 + (m_init_text ? m_init_text->GetNumTerms() : 0));
-    values.push_back(variableIndex);
+    std::vector<unsigned int> values(1, variableIndex);
     if (m_init_text) {
         AppendInitPositions(name, values);
         return values;

@@ -182,9 +182,10 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words) const
     if (!m_store->HasEquation() || numVariables > kKqMaxColumnVariables)
         return false;
     KqResults results(*m_store, numVariables);
-    words.resize(results.GetNumWords());
-    results.Fill(0, words.size(), words.data());
+    std::vector<uint64_t> filled(results.GetNumWords());
+    results.Fill(0, filled.size(), filled.data());
     if (numVariables < 6) // the one word repeats the rows
-        words[0] &= (uint64_t(1) << (1u << numVariables)) - 1;
+        filled[0] &= (uint64_t(1) << (1u << numVariables)) - 1;
+    words.swap(filled);
     return true;
 }

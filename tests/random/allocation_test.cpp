@@ -346,6 +346,10 @@ TEST(Allocation, InitValueAnswersWithoutNodes)
     EXPECT_EQ(33u, equation.GetVariableHandle("F").size());
     EXPECT_FALSE(equation.IsExpression());
     EXPECT_FALSE(copy == Kq_BoolEquationImp());
+    Kq_BoolEquationImp other;
+    other.SetEquationWithExplicitTerms(names, "0x123456789abcdef0", false, false);
+    EXPECT_FALSE(copy == other) << "the bits count from the other end";
+    EXPECT_EQ(1u, equation.GetVariableHandle("G").size());
     std::vector<uint64_t> words;
     EXPECT_TRUE(equation.GetColumn(words));
     // Making the nodes takes memory, so there were none yet; once they are there, none is taken.

@@ -55,12 +55,14 @@ bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int l
     size_t last = 0;
     const size_t numBlockGranules = size_t(1) << (level - kKqGranuleLevel);
     size_t limit = kMaxFactor * numBlockGranules;
+    bool isChain = true;
     for (const KqCode* next = codes; next != codes + numCodes; ++next) {
         const KqCode action = KqActionOf(*next);
         if (action < kKqCombine) {
             *top++ = hand;
             hand = AboveGranule(KqVariableOf(*next));
             limit += kStackedGranules;
+            isChain = next == codes;
             continue;
         }
         hand |= action >= kKqUnstack ? *--top : AboveGranule(KqVariableOf(*next));
@@ -71,7 +73,7 @@ bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int l
         if (cost > limit + last || numWords > kMaxWords)
             return false;
     }
-    return true;
+    return !isChain; // a chain comes down to few rests when its variables are fixed
 }
 
 void KqJoiner::Join(KqCode kind, const Value& lower, const Value& upper, uint32_t variables,

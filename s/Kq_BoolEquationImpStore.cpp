@@ -103,8 +103,10 @@ void Store::ListInPreOrder()
         Node* node = pending.Pop();
         position = node;
         // The right child is pushed first, so the left one is listed first.
-        if (node->GetRightChild())
+        if (node->GetRightChild()) {
+            __builtin_prefetch(node->GetRightChild()); // far away in a text nested to the left
             pending.Push(node->GetRightChild());
+        }
         if (node->GetLeftChild())
             pending.Push(node->GetLeftChild());
     }

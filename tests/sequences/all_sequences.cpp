@@ -34,25 +34,18 @@ struct Set {
     uint64_t numAccepted; // expected
 };
 
+const Texts kSpellings = {"&",  "*",  ".AND.", "|",     "+",  ".OR.", "^",      "@",     ".XOR.",
+                          "~&", "!&", "~*",    "!*",    "~|", "!|",   ".NAND.", "~+",    "!+",
+                          "~^", "!^", "~@",    ".NOR.", "!@", "~",    ".NXOR.", ".NOT.", "!",
+                          "(",  ")",  "0",     "1",     "A",  "_b2",  "'c d'"};
+
 // One spelling of each type of token; two names with two binary operators; all spellings, in fours,
 // so that each stands before and behind every other in many places.
 const std::vector<Set> kSets = {
     {"types", {"A", "0", "1", "~", "(", ")", "&", "|", "^", "~&", "~|", "~^"}, " ", 8, 334273},
     {"names", {"A", "B", "~", "(", ")", "&", "|"}, " ", 8, 10961},
-    {"spellings",
-     {"&",      "*",     ".AND.", "|",      "+",  ".OR.", "^",  "@",  ".XOR.", "~&",    "!&", "~*",
-      "!*",     "~|",    "!|",    ".NAND.", "~+", "!+",   "~^", "!^", "~@",    ".NOR.", "!@", "~",
-      ".NXOR.", ".NOT.", "!",     "(",      ")",  "0",    "1",  "A",  "_b2",   "'c d'"},
-     " ",
-     4,
-     6525},
-    {"spellings without blanks",
-     {"&",      "*",     ".AND.", "|",      "+",  ".OR.", "^",  "@",  ".XOR.", "~&",    "!&", "~*",
-      "!*",     "~|",    "!|",    ".NAND.", "~+", "!+",   "~^", "!^", "~@",    ".NOR.", "!@", "~",
-      ".NXOR.", ".NOT.", "!",     "(",      ")",  "0",    "1",  "A",  "_b2",   "'c d'"},
-     "",
-     4,
-     8821},
+    {"spellings", kSpellings, " ", 4, 6525},
+    {"spellings without blanks", kSpellings, "", 4, 8821},
 };
 
 // Checks every sequence of one length whose number modulo 'numWorkers' of its first three tokens

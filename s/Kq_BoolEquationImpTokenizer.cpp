@@ -191,15 +191,15 @@ class Scanner {
             numOpen += type == Node::LP ? 1u : 0u;
             numOpen -= type == Node::RP ? 1u : 0u;
         }
-        size_t numClosed = 0;
-        for (size_t position = m_tokens.GetSize(); position-- > 0;) {
+        // The numbers differ and each ")" closes a "(", so there is one that none closes.
+        size_t position = m_tokens.GetSize() - 1;
+        for (size_t numClosed = 0;; --position) {
             const Node::TYPE type = m_tokens.begin()[position].type;
             if (type == Node::LP && numClosed == 0)
                 return RefuseToken(Refusal::PAREN, position);
             numClosed += type == Node::RP ? 1u : 0u;
             numClosed -= type == Node::LP ? 1u : 0u;
         }
-        return false;
     }
 
     bool RefuseToken(Refusal::CODE code, size_t position)

@@ -84,9 +84,11 @@ class KQ_EXPORT Kq_BoolEquation {
     // All variable names joined with "+", the last one first; empty without variables.
     Port::StringBase<char> GetInitValueTermEquation() const;
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
-    // row without variables; the debug mode changes nothing.  Fails: false, and no words, without
-    // an equation or with over 30 variables.  Cost: O(nodes * 2^n / 64); 128 MB for 30 variables.
+    // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
+    // every few milliseconds; what it throws passes.  Fails: false, and no words, without an
+    // equation, with over 30 variables, or when goOn says false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
+    bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
     // Is there no equation; is there one (null or a value that is only for testing).
     bool operator!() const;
@@ -149,8 +151,7 @@ struct Kq_BoolEquation::Refusal {
 
 // A variable found once by name. Element 0 is the variable index, the others are the positions of
 // the nodes with that name, ascending. Empty: no such variable.
-// Deliberate: a handle is a cached index. Any equation whose table is long enough honours it; the
-// name is not checked again.
+// Deliberate: any equation whose table is long enough honours it; the name is not checked again.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
     Handle();
@@ -214,8 +215,7 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable::Row { // one assignment and its res
     bool operator==(const Row& other) const;
     bool operator!=(const Row& other) const;
     unsigned int GetResultValue() const;
-    // One value for each variable, in column order.
-    std::vector<unsigned int> GetVariableValues() const;
+    std::vector<unsigned int> GetVariableValues() const; // one for each variable, in column order
     void Dbg() const;
 
   private:

@@ -85,6 +85,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
 
     TruthTable GetTruthTable() const;
     bool GetColumn(std::vector<uint64_t>& words) const; // see Kq_BoolEquation
+    bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
     // The root of the tree, null without an equation. Only for reading: results are kept of the
     // nodes, which live until the object, and every copy, is set, cleared or destroyed. Of an init

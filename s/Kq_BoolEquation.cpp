@@ -228,6 +228,12 @@ bool Kq_BoolEquation::GetColumn(std::vector<uint64_t>& words) const
     return m_imp->GetColumn(words);
 }
 
+bool Kq_BoolEquation::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*),
+                                void* context) const
+{
+    return m_imp->GetColumn(words, goOn, context);
+}
+
 const Kq_BoolEquationImp* Kq_BoolEquation::GetImp() const
 {
     return m_imp;

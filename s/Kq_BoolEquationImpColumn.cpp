@@ -21,6 +21,9 @@ constexpr unsigned int kKernelLevel = 14;
 // Larger blocks are not copied but expanded again: their first copy has left the cache.
 constexpr unsigned int kMaxCopyLevel = 20;
 
+// Operations on words that take some milliseconds.
+constexpr uint64_t kPieceOperations = uint64_t(1) << 24;
+
 size_t NumWords(unsigned int level)
 {
     return size_t(1) << (level - 6);
@@ -116,6 +119,14 @@ KqColumn::KqColumn(const Node* root, unsigned int numVariables)
     m_codes.swap(program.codes);
     m_num_codes = program.numCodes;
     m_whole = Describe(0, m_num_codes, program.isInverted);
+}
+
+size_t KqColumn::GetNumPieceWords() const
+{
+    uint64_t numWords = m_num_words;
+    while (numWords > NumWords(kKernelLevel) && m_whole.numCodes * numWords > kPieceOperations)
+        numWords /= 2;
+    return numWords;
 }
 
 void KqColumn::Fill(uint64_t firstWord, size_t numWords, uint64_t* words)

@@ -50,6 +50,10 @@ class KqColumn {
     // 2^numVariables / 64, at least 1.
     uint64_t GetNumWords() const { return m_num_words; }
 
+    // Words of a piece that is filled within some milliseconds, or, with over 100,000 operators, of
+    // the smallest that is worth fixing variables for. A power of two that divides GetNumWords().
+    size_t GetNumPieceWords() const;
+
     // Writes words firstWord .. firstWord+numWords-1 of the column to 'words'. Pieces in sequence,
     // up or down, whose length is a power of two and divides firstWord are cheapest.
     // Requires: firstWord + numWords <= GetNumWords().

@@ -25,6 +25,13 @@ class KqResults {
         return m_num_variables > 6 ? uint64_t(1) << (m_num_variables - 6) : 1;
     }
 
+    // Words of a piece that is filled within some milliseconds; a power of two that divides them
+    // all.
+    size_t GetNumPieceWords() const
+    {
+        return m_init_text ? GetNumWords() : m_column->GetNumPieceWords();
+    }
+
     // As KqColumn::Fill.
     void Fill(uint64_t firstWord, size_t numWords, uint64_t* words)
     {

@@ -177,13 +177,24 @@ TruthTable Kq_BoolEquationImp::GetTruthTable() const
 
 bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words) const
 {
+    return GetColumn(words, nullptr, nullptr);
+}
+
+bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*),
+                                   void* context) const
+{
     words.clear();
     const unsigned int numVariables = GetNumVariables();
     if (!m_store->HasEquation() || numVariables > kKqMaxColumnVariables)
         return false;
     KqResults results(*m_store, numVariables);
     std::vector<uint64_t> filled(results.GetNumWords());
-    results.Fill(0, filled.size(), filled.data());
+    const size_t numPieceWords = goOn ? results.GetNumPieceWords() : filled.size();
+    for (size_t first = 0; first < filled.size(); first += numPieceWords) {
+        if (goOn && !goOn(context))
+            return false;
+        results.Fill(first, numPieceWords, filled.data() + first);
+    }
     if (numVariables < 6) // the one word repeats the rows
         filled[0] &= (uint64_t(1) << (1u << numVariables)) - 1;
     words.swap(filled);

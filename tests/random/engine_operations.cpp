@@ -170,6 +170,13 @@ const std::vector<Operation> kOfEngine = {
          o.other.SetEquation("0x4b");
          o.other.GetColumn(words);
      }},
+    {"Kq_BoolEquationImp::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&, "
+     "bool (*)(void*), void*) const",
+     [](Objects& o) {
+         std::vector<uint64_t> words;
+         const auto never = [](void*) { return false; };
+         o.engine.GetColumn(words, never, nullptr);
+     }},
     {"Kq_BoolEquationImp::GetRoot() const", [](Objects& o) { Ask(o.engine.GetRoot()); }},
     {"Kq_BoolEquationImp::Dbg() const", [](Objects& o) { o.engine.Dbg(); }},
     {"Kq_BoolEquationImp::GetInternalDebugMode()",

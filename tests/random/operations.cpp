@@ -101,6 +101,13 @@ const std::vector<Operation> kOfEquation = {
          std::vector<uint64_t> words;
          o.a.GetColumn(words);
      }},
+    {"Kq_BoolEquation::GetColumn(std::vector<unsigned long, std::allocator<unsigned long> >&, "
+     "bool (*)(void*), void*) const",
+     [](Objects& o) {
+         std::vector<uint64_t> words;
+         const auto always = [](void*) { return true; };
+         o.a.GetColumn(words, always, nullptr);
+     }},
     {"Kq_BoolEquation::operator!() const", [](Objects& o) { Ask(!o.a); }},
     {"Kq_BoolEquation::operator Kq_PtrTester*() const",
      [](Objects& o) { Ask(static_cast<Kq_PtrTester*>(o.a)); }},

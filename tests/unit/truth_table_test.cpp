@@ -1,6 +1,9 @@
 // Truth tables: rows, names, comparison, what has none.
 #include <gtest/gtest.h>
 
+#include <stdexcept>
+
+#include "support/random_text.h"
 #include "unit_support.h"
 
 namespace {
@@ -262,6 +265,84 @@ TEST(TruthTable, ColumnIsRefusedWithoutEquationAndAboveThirtyVariables)
     words.assign(1, 1);
     EXPECT_FALSE(engine.GetColumn(words));
     EXPECT_TRUE(words.empty());
+}
+
+// An exclusive or of so many products over 'numVariables' variables that the column of 19 takes
+// several pieces.
+std::string LongText(size_t numVariables)
+{
+    support::RandomText random(20);
+    const auto name = [&] { return "v" + std::to_string(random.Below(numVariables)); };
+    std::string text = "v0";
+    for (size_t number = 1; number < numVariables; ++number)
+        text += " ^ v" + std::to_string(number);
+    for (int product = 0; product < 3000; ++product)
+        text += " ^ (" + name() + " & " + (random.Chance(50) ? "~" : "") + name() + " & " + name() +
+                ")";
+    return text;
+}
+
+bool CountDown(void* context)
+{
+    int& left = *static_cast<int*>(context);
+    return left-- > 0;
+}
+
+TEST(TruthTable, ColumnInPiecesIsTheColumn)
+{
+    for (const size_t numVariables : {3, 12, 16, 19, 20}) {
+        Engine engine;
+        ASSERT_TRUE(engine.SetEquation(LongText(numVariables).c_str()));
+        std::vector<uint64_t> whole;
+        ASSERT_TRUE(engine.GetColumn(whole));
+        constexpr int kMany = 1000000;
+        int left = kMany;
+        std::vector<uint64_t> words(1, 7);
+        ASSERT_TRUE(engine.GetColumn(words, CountDown, &left));
+        EXPECT_EQ(whole, words);
+        EXPECT_EQ(numVariables >= 19, kMany - left > 1) << kMany - left << " pieces";
+    }
+}
+
+TEST(TruthTable, ColumnStopsWhenItIsTold)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation(LongText(20).c_str()));
+    for (const int numPieces : {0, 1, 3}) {
+        int left = numPieces;
+        std::vector<uint64_t> words(1, 7);
+        EXPECT_FALSE(engine.GetColumn(words, CountDown, &left));
+        EXPECT_TRUE(words.empty());
+        EXPECT_EQ(-1, left);
+    }
+    std::vector<uint64_t> words;
+    EXPECT_TRUE(engine.GetColumn(words)); // nothing is left behind
+    EXPECT_EQ(size_t(1) << 14, words.size());
+}
+
+TEST(TruthTable, ColumnOfAnInitValueIsOnePiece)
+{
+    const std::vector<String> terms = {"A", "B", "C"};
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquationWithExplicitTerms(terms, "0xca", false, false));
+    for (const int numPieces : {0, 1}) {
+        int left = numPieces;
+        std::vector<uint64_t> words;
+        EXPECT_EQ(numPieces == 1, engine.GetColumn(words, CountDown, &left));
+        EXPECT_EQ(std::vector<uint64_t>(static_cast<size_t>(numPieces), 0xca), words);
+    }
+}
+
+TEST(TruthTable, WhatColumnAsksMayThrow)
+{
+    Kq_BoolEquation equation;
+    ASSERT_TRUE(equation.SetEquation("A & ~B | C"));
+    std::vector<uint64_t> words(1, 7);
+    const auto thrower = [](void*) -> bool { throw std::runtime_error("stop"); };
+    EXPECT_THROW(equation.GetColumn(words, thrower, nullptr), std::runtime_error);
+    EXPECT_TRUE(words.empty());
+    EXPECT_TRUE(equation.GetColumn(words, nullptr, nullptr));
+    EXPECT_EQ(std::vector<uint64_t>(1, 0xba), words);
 }
 
 TEST(TruthTable, ColumnIsTheSameInDebugModeAndSilent)

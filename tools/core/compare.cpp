@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <random>
 
-#include "expression.h"
+#include "watch.h"
 
 namespace booleq {
 
@@ -32,6 +32,8 @@ Comparison Compare(const WordFunction& left, const WordFunction& right, unsigned
     std::mt19937_64 random(1);
     std::vector<uint64_t> inputs(numInputs);
     for (uint64_t word = 0; word < numWords; ++word) {
+        if (word % kWatchedWords == 0)
+            Watch();
         for (unsigned int input = 0; input < numInputs; ++input)
             inputs[input] = result.isExhaustive ? InputWord(numInputs, input, word) : random();
         uint64_t change = left(inputs) ^ right(inputs);

@@ -3,13 +3,11 @@
 #define BOOLEQ_CORE_COMPARE_H
 
 #include <cstdint>
-#include <functional>
 #include <vector>
 
-namespace booleq {
+#include "expression.h"
 
-// The values for 64 assignments: element k of the argument holds input k's values, one in each bit.
-typedef std::function<uint64_t(const std::vector<uint64_t>&)> WordFunction;
+namespace booleq {
 
 struct Comparison {
     bool isEqual = true;

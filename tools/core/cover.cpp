@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "watch.h"
+
 namespace booleq {
 
 namespace {
@@ -67,6 +69,7 @@ class CoverSearch {
     // The depth is the number of inputs.
     Words Find(const Words& needed, const Words& allowed, unsigned int numLeft, Cube prefix)
     {
+        Watch();
         const auto isZero = [](uint64_t word) { return word == 0; };
         if (std::all_of(needed.begin(), needed.end(), isZero))
             return Words(needed.size());

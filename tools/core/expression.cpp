@@ -3,6 +3,7 @@
 #include <Kq_BoolEquationImpNode.h>
 
 #include "text.h"
+#include "watch.h"
 
 namespace booleq {
 
@@ -198,20 +199,30 @@ uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word)
     return (word >> (bit - 6)) & 1u ? ~0ull : 0;
 }
 
-Function ToFunction(const Expression& expression)
+Function Tabulate(const WordFunction& function, const std::vector<std::string>& inputs)
 {
-    const auto numInputs = static_cast<unsigned int>(expression.names.size());
-    std::vector<uint64_t> column(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
-    std::vector<uint64_t> inputs(numInputs);
-    std::vector<uint64_t> stack;
-    for (size_t word = 0; word < column.size(); ++word) {
+    const auto numInputs = static_cast<unsigned int>(inputs.size());
+    std::vector<uint64_t> words(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
+    std::vector<uint64_t> values(numInputs);
+    for (size_t word = 0; word < words.size(); ++word) {
+        if (word % kWatchedWords == 0)
+            Watch();
         for (unsigned int input = 0; input < numInputs; ++input)
-            inputs[input] = InputWord(numInputs, input, word);
-        column[word] = EvaluateWord(expression, inputs, stack);
+            values[input] = InputWord(numInputs, input, word);
+        words[word] = function(values);
     }
     if (numInputs < 6)
-        column[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
-    return Function(expression.names, std::move(column));
+        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
+    return Function(inputs, std::move(words));
+}
+
+Function ToFunction(const Expression& expression)
+{
+    std::vector<uint64_t> stack;
+    const auto evaluate = [&](const std::vector<uint64_t>& values) {
+        return EvaluateWord(expression, values, stack);
+    };
+    return Tabulate(evaluate, expression.names);
 }
 
 } // namespace booleq

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -58,6 +59,16 @@ uint64_t EvaluateWord(const Expression& expression, const std::vector<uint64_t>&
 // Word 'word' of the column of input 'input' of 'numInputs': bit k is the input's value in row
 // 64 * word + k. The first input is the most significant bit of the row number.
 uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word);
+
+// The values for 64 assignments: element k of the argument holds input k's values, one in each bit.
+typedef std::function<uint64_t(const std::vector<uint64_t>&)> WordFunction;
+
+// Every how many words Watch is called where a word's cost is anybody's.
+constexpr uint64_t kWatchedWords = 16;
+
+// The function over the inputs by trying every assignment.
+// Requires: at most kMaxFunctionInputs inputs.  Cost: 2^inputs / 64 calls.
+Function Tabulate(const WordFunction& function, const std::vector<std::string>& inputs);
 
 // The function over all names, in their order.
 // Requires: at most kMaxFunctionInputs names.  Cost: O(nodes * 2^names / 64).

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "text.h"
+#include "watch.h"
 
 namespace booleq {
 
@@ -168,6 +169,7 @@ Function Function::Over(const std::vector<std::string>& inputs) const
     }
     assert(order.size() == inputs.size());
     for (size_t place = 0; place < order.size(); ++place) {
+        Watch();
         const auto found = std::find(order.begin(), order.end(), inputs[place]);
         const size_t from = static_cast<size_t>(found - order.begin());
         SwapRowBits(result.m_words, order.size() - 1 - place, order.size() - 1 - from);
@@ -201,7 +203,7 @@ bool Function::operator==(const Function& other) const
 bool FunctionOf(const Kq_BoolEquation& equation, Function& function)
 {
     std::vector<uint64_t> words;
-    if (!equation.GetColumn(words))
+    if (!equation.GetColumn(words, WatchAndGoOn, nullptr))
         return false;
     std::vector<std::string> inputs;
     for (const auto& variable : equation.GetVariables())

@@ -67,22 +67,6 @@ void Renumber(const Notation& notation, const std::vector<std::string>& names, F
     tree.names = names;
 }
 
-// The column by trying every row; for few inputs.
-Function Tabulate(const WordFunction& function, const std::vector<std::string>& names)
-{
-    const auto numInputs = static_cast<unsigned int>(names.size());
-    std::vector<uint64_t> words(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
-    std::vector<uint64_t> inputs(numInputs);
-    for (size_t word = 0; word < words.size(); ++word) {
-        for (unsigned int input = 0; input < numInputs; ++input)
-            inputs[input] = InputWord(numInputs, input, word);
-        words[word] = function(inputs);
-    }
-    if (numInputs < 6)
-        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
-    return Function(names, std::move(words));
-}
-
 // This library's text for what the other notation reads; empty for a large function that is none of
 // bits.
 std::string TextHere(const ForeignTree& tree, const WordFunction& function)

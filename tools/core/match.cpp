@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "watch.h"
+
 namespace booleq {
 
 namespace {
@@ -34,6 +36,7 @@ class MatchSearch {
             return first == m_second;
         std::vector<Rows> tried;
         for (unsigned int source = place; source < m_num_inputs; ++source) {
+            Watch();
             for (const bool isInverted : {false, true}) {
                 if (isInverted && !m_allow_inversions)
                     continue;

@@ -7,6 +7,7 @@
 #include "cover.h"
 #include "formula.h"
 #include "shortest.h"
+#include "watch.h"
 
 namespace booleq {
 
@@ -130,6 +131,7 @@ class Search {
             return false;
         const uint32_t numSets = uint32_t(1) << (support.size() - 1);
         for (uint32_t set = 1; set < numSets; ++set) {
+            Watch();
             std::vector<unsigned int> sides[2];
             sides[0].push_back(support[0]);
             for (size_t place = 1; place < support.size(); ++place)

@@ -6,7 +6,6 @@
 #include <string>
 #include <vector>
 
-#include "compare.h"
 #include "cover.h"
 #include "expression.h"
 

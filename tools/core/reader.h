@@ -5,7 +5,6 @@
 #include <string>
 #include <vector>
 
-#include "compare.h"
 #include "expression.h"
 #include "notation.h"
 

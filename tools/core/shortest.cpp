@@ -3,6 +3,8 @@
 #include <array>
 #include <memory>
 
+#include "watch.h"
+
 namespace booleq {
 
 namespace {
@@ -49,11 +51,22 @@ class ShortestTable {
     }
 
   private:
-    // All columns whose least weight is the next one.
+    // All columns whose least weight is the next one; none when that is interrupted.
     void AddWeight()
     {
-        const size_t weight = m_by_weight.size();
         m_by_weight.emplace_back();
+        try {
+            AddColumns(m_by_weight.size() - 1);
+        } catch (...) {
+            for (const Column column : m_by_weight.back())
+                m_origins[column] = Origin();
+            m_by_weight.pop_back();
+            throw;
+        }
+    }
+
+    void AddColumns(size_t weight)
+    {
         for (size_t left = kLiteralWeight; left < weight; ++left) {
             AddPairs(left, weight - left, false);
             if (left < weight - kXorWeight)
@@ -67,6 +80,7 @@ class ShortestTable {
             return;
         // The last list grows, but it is no operand's: operands weigh less.
         for (const Column left : m_by_weight[leftWeight]) {
+            Watch();
             for (const Column right : m_by_weight[rightWeight]) {
                 const auto notLeft = static_cast<Column>(~left);
                 const auto notRight = static_cast<Column>(~right);
@@ -88,8 +102,8 @@ class ShortestTable {
         Origin& origin = m_origins[result];
         if (result == 0 || origin.op != Operator::Zero)
             return;
-        origin = {op, left, right};
         m_by_weight.back().push_back(result);
+        origin = {op, left, right};
     }
 
     // The depth is at most the number of literals.

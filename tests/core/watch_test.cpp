@@ -1,0 +1,148 @@
+// Long work can be ended from outside wherever it asks, and does the same work again afterwards.
+#include <functional>
+#include <random>
+#include <stdexcept>
+
+#include <gtest/gtest.h>
+
+#include "core/convert.h"
+#include "core/explain.h"
+#include "core/lint.h"
+#include "core/match.h"
+#include "core/minimise.h"
+#include "core/shortest.h"
+#include "core/watch.h"
+
+namespace {
+
+using namespace booleq;
+
+struct Interrupt : std::runtime_error {
+    Interrupt() : std::runtime_error("interrupt") {}
+};
+
+size_t numCalls = 0;
+size_t callToEndAt = 0;
+
+void CountAndEnd()
+{
+    if (++numCalls == callToEndAt)
+        throw Interrupt();
+}
+
+// What 'work' gives is the same after it was ended at each of some calls, and it makes calls.
+void ExpectItCanBeEnded(const std::function<std::string()>& work)
+{
+    const std::string expected = work();
+    numCalls = 0;
+    callToEndAt = SIZE_MAX;
+    SetWatch(CountAndEnd);
+    EXPECT_EQ(expected, work());
+    const size_t allCalls = numCalls;
+    EXPECT_GT(allCalls, 0u);
+    for (const size_t call : {size_t(1), allCalls / 3 + 1, allCalls / 2 + 1, allCalls}) {
+        numCalls = 0;
+        callToEndAt = call;
+        EXPECT_THROW(work(), Interrupt) << "call " << call << " of " << allCalls;
+    }
+    SetWatch(nullptr);
+    EXPECT_EQ(expected, work());
+}
+
+std::vector<std::string> Names(size_t numInputs)
+{
+    std::vector<std::string> names;
+    for (size_t input = 0; input < numInputs; ++input)
+        names.push_back("i" + std::to_string(input));
+    return names;
+}
+
+Function RandomFunction(size_t numInputs, unsigned int seed)
+{
+    std::mt19937_64 random(seed);
+    std::vector<uint64_t> words(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
+    for (uint64_t& word : words)
+        word = random();
+    if (numInputs < 6)
+        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
+    return Function(Names(numInputs), words);
+}
+
+// The table behind the search grows with the first questions, so this needs a process of its own,
+// as every test has that ctest starts.
+TEST(Watch, EndsTheSearchForTheShortestAndItsTableStaysWhole)
+{
+    const Bits hard(Function(Names(4), {0x1668}));
+    size_t numEnded = 0;
+    SetWatch(CountAndEnd);
+    for (callToEndAt = 1; callToEndAt < 10000; callToEndAt += callToEndAt / 4 + 1) {
+        numCalls = 0;
+        try {
+            FindShortest(hard);
+        } catch (const Interrupt&) {
+            ++numEnded;
+        }
+        if (numCalls == 0)
+            break;
+    }
+    SetWatch(nullptr);
+    if (numEnded == 0)
+        GTEST_SKIP() << "the table is there already";
+    EXPECT_GT(numEnded, 10u);
+    // Of all functions together, as it is when nothing is interrupted.
+    size_t numLiterals = 0;
+    for (uint64_t column = 0; column < 65536; ++column)
+        numLiterals += CountLiterals(FindShortest(Bits(Function(Names(4), {column}))));
+    EXPECT_EQ(406800u, numLiterals);
+}
+
+TEST(Watch, EndsColumns)
+{
+    std::string text = "v0";
+    for (int number = 1; number < 22; ++number)
+        text += " ^ v" + std::to_string(number);
+    std::mt19937 random(1);
+    for (int number = 0; number < 500; ++number)
+        text +=
+            " ^ (v" + std::to_string(random() % 22) + " & v" + std::to_string(random() % 22) + ")";
+    Kq_BoolEquation equation(text.c_str());
+    ExpectItCanBeEnded([&] {
+        Function function;
+        EXPECT_TRUE(FunctionOf(equation, function));
+        return function.Hex();
+    });
+}
+
+TEST(Watch, EndsMinimisingMatchingAndExplaining)
+{
+    const Function function = RandomFunction(9, 7);
+    ExpectItCanBeEnded([&] {
+        const Minimised minimised = Minimise(function);
+        return std::to_string(minimised.numLiterals);
+    });
+    ExpectItCanBeEnded([&] { return Explain(function).text; });
+    const Function other = function.Over({"i3", "i1", "i8", "i0", "i2", "i4", "i7", "i5", "i6"});
+    ExpectItCanBeEnded([&] {
+        std::string text;
+        for (const unsigned int source : Match(function, other, true).sources)
+            text += std::to_string(source) + " ";
+        return text;
+    });
+}
+
+TEST(Watch, EndsComparisonsOfLintAndConvert)
+{
+    std::string text = "v0";
+    for (int number = 1; number < 14; ++number)
+        text += (number % 2 != 0 ? " | v" : " & v") + std::to_string(number);
+    const Kq_BoolEquation equation(text.c_str());
+    ExpectItCanBeEnded([&] {
+        std::string found;
+        for (const ForeignReading& reading : Lint(text, equation, Reading()).readings)
+            found += reading.grouping + reading.textHere;
+        return found;
+    });
+    ExpectItCanBeEnded([&] { return Convert(ToExpression(equation), Target::Verilog, "").text; });
+}
+
+} // namespace

@@ -206,6 +206,53 @@ class Headers(InCopy):
         self.assertEqual(self.check("struct Twice {};\n")[0], 1)
 
 
+class Version(InCopy):
+    CHANGELOG = "## [Unreleased]\n\n## [1.2.3] - 2026-01-31\n\n## [1.2.2] - 2026-01-30\n"
+    PROJECT = "project(Example VERSION 1.2.3 LANGUAGES CXX)\n"
+
+    def check(self, **texts):
+        files = {"CMakeLists.txt": self.PROJECT, "CHANGELOG.md": self.CHANGELOG,
+                 **{name.replace("_", "."): text for name, text in texts.items()}}
+        for name, text in files.items():
+            (self.copy / name).write_text(text, encoding="utf-8")
+        return run(sys.executable, ROOT / "scripts/check_version.py", "1.2.3", self.copy)
+
+    def expect(self, message, **texts):
+        status, output = self.check(**texts)
+        self.assertEqual((status, output.count("\n")), (1, 1), output)
+        self.assertIn(message, output)
+
+    def test_one_version(self):
+        self.assertEqual(self.check(other_txt="version 1.2.3.4, 11.2.3, 1.2.30\n"), (0, ""))
+
+    def test_version_in_another_file(self):
+        self.expect("other.txt:2: states the version", other_txt="\nversion 1.2.3.\n")
+
+    def test_changelog_without_the_release(self):
+        self.expect("newest release is 1.2.2",
+                    CHANGELOG_md=self.CHANGELOG.replace("## [1.2.3] - 2026-01-31", ""))
+
+    def test_release_without_a_date(self):
+        self.expect("'## [1.2.3]' is not of the form",
+                    CHANGELOG_md=self.CHANGELOG.replace(" - 2026-01-31", ""))
+
+    def test_pyproject_that_states_one(self):
+        self.expect("states a version", pyproject_toml='[project]\nversion = "1.2.4"\n[tool]\n')
+        self.expect("does not say dynamic", pyproject_toml='[project]\nname = "example"\n')
+        self.assertEqual(self.check(pyproject_toml='[project]\ndynamic = ["version"]\n'), (0, ""))
+
+    def test_installed_package_of_another_version(self):
+        self.check()
+        package = self.copy / "lib/pkgconfig/kq_boolequation.pc"
+        package.parent.mkdir(parents=True)
+        package.write_text("Name: a\nDescription: b\nVersion: 1.2.4\n", encoding="utf-8")
+        status, output = run(sys.executable, ROOT / "scripts/check_version.py", "1.2.3", self.copy,
+                             self.copy)
+        self.assertEqual(status, 1)
+        self.assertIn("pkg-config says '1.2.4', CMakeLists.txt 1.2.3\n", output)
+        self.assertIn("the CMake package is not there", output)
+
+
 if __name__ == "__main__":
     COMPILER = sys.argv.pop()
     ROOT = pathlib.Path(sys.argv.pop()).resolve()

@@ -110,9 +110,7 @@ bool SetFunction(const Text& text, const Request& request, Output& output, Funct
         return false;
     if (FunctionOf(equation, function))
         return true;
-    Refuse(text, request, output,
-           std::to_string(equation.GetNumVariables()) + " inputs: at most " +
-               std::to_string(kMaxFunctionInputs) + " have a truth table");
+    Refuse(text, request, output, NoFunctionReason(equation.GetNumVariables()));
     return false;
 }
 

@@ -9,7 +9,6 @@
 #include "core/batch.h"
 #include "core/text.h"
 #include "lines.h"
-#include "options.h"
 #include "progress.h"
 #include "rows.h"
 

@@ -2,7 +2,6 @@
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
-#include "options.h"
 #include "rows.h"
 
 namespace booleq {

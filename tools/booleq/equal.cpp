@@ -1,61 +1,50 @@
 // The command 'equal': are two equations the same function.
-#include <algorithm>
+#include "core/equality.h"
 
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
-#include "options.h"
 
 namespace booleq {
 
 namespace {
 
-std::vector<std::string> Union(const Function& left, const Function& right)
-{
-    std::vector<std::string> names = left.Inputs();
-    for (const std::string& name : right.Inputs())
-        if (std::find(names.begin(), names.end(), name) == names.end())
-            names.push_back(name);
-    return names;
-}
-
-std::string AssignmentText(const Function& function, uint64_t row)
+std::string AssignmentText(const Equality& equality)
 {
     std::string text;
-    for (size_t index = 0; index < function.NumInputs(); ++index)
-        text += (index == 0 ? "" : " ") + Visible(function.Inputs()[index]) +
-                (function.InputAt(row, index) ? "=1" : "=0");
+    for (size_t index = 0; index < equality.inputs.size(); ++index)
+        text += (index == 0 ? "" : " ") + Visible(equality.inputs[index]) +
+                (equality.InputAt(index) ? "=1" : "=0");
     return text.empty() ? "no inputs" : text;
 }
 
-Json AsJson(const Function& left, const Function& right, uint64_t row)
+Json AsJson(const Equality& equality)
 {
     Json result;
-    result["equal"] = row == Function::kNoRow;
-    result["inputs"] = left.Inputs();
+    result["equal"] = equality.IsEqual();
+    result["inputs"] = equality.inputs;
     result["first_difference"] = nullptr;
-    if (row != Function::kNoRow) {
+    if (!equality.IsEqual()) {
         Json& difference = result["first_difference"] = Json::object();
-        difference["row"] = row;
+        difference["row"] = equality.row;
         difference["assignment"] = Json::object();
-        for (size_t index = 0; index < left.NumInputs(); ++index)
-            difference["assignment"][left.Inputs()[index]] = left.InputAt(row, index) ? 1 : 0;
-        difference["values"] = {left.At(row) ? 1 : 0, right.At(row) ? 1 : 0};
+        for (size_t index = 0; index < equality.inputs.size(); ++index)
+            difference["assignment"][equality.inputs[index]] = equality.InputAt(index) ? 1 : 0;
+        difference["values"] = {equality.left ? 1 : 0, equality.right ? 1 : 0};
     }
     return result;
 }
 
-void PutText(const Text& text, const Function& left, const Function& right, uint64_t row,
-             Output& output)
+void PutText(const Text& text, const Equality& equality, Output& output)
 {
     const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
-    if (row == Function::kNoRow) {
-        output.Put(place + "equal, over " + Count(left.NumInputs(), "input") + "\n");
+    if (equality.IsEqual()) {
+        output.Put(place + "equal, over " + Count(equality.inputs.size(), "input") + "\n");
         return;
     }
-    output.Put(place + "not equal, first at row " + std::to_string(row) + " of " +
-               std::to_string(left.NumRows()) + "\n  " + AssignmentText(left, row) + ": " +
-               (left.At(row) ? "1" : "0") + " and " + (right.At(row) ? "1" : "0") + "\n");
+    output.Put(place + "not equal, first at row " + std::to_string(equality.row) + " of " +
+               std::to_string(equality.NumRows()) + "\n  " + AssignmentText(equality) + ": " +
+               (equality.left ? "1" : "0") + " and " + (equality.right ? "1" : "0") + "\n");
 }
 
 int RunEqual(const Request& request, Output& output)
@@ -68,23 +57,16 @@ int RunEqual(const Request& request, Output& output)
         Function left;
         if (!SetFunction(text, request, output, left))
             return kRefused;
-        const std::vector<std::string> names = Union(left, right);
-        if (names.size() > kMaxFunctionInputs) {
-            Refuse(text, request, output,
-                   std::to_string(names.size()) + " inputs together: at most " +
-                       std::to_string(kMaxFunctionInputs) + " are compared");
+        const Equality equality = CompareFunctions(left, right);
+        if (!equality.fault.empty()) {
+            Refuse(text, request, output, equality.fault);
             return kRefused;
         }
-        const Function wideLeft = left.Over(names);
-        const Function wideRight = right.Over(names);
-        const uint64_t row = wideLeft.FirstDifference(wideRight);
-        const bool isEqual = row == Function::kNoRow;
         if (request.json)
-            PutJson(text, request, isEqual ? "yes" : "no", AsJson(wideLeft, wideRight, row),
-                    output);
+            PutJson(text, request, equality.IsEqual() ? "yes" : "no", AsJson(equality), output);
         else
-            PutText(text, wideLeft, wideRight, row, output);
-        return isEqual ? kDone : kFindings;
+            PutText(text, equality, output);
+        return equality.IsEqual() ? kDone : kFindings;
     });
 }
 

@@ -1,11 +1,9 @@
 // The command 'explain': what a function is, and a short expression for it.
-#include "core/explain.h"
+#include "core/describe.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/minimise.h"
 #include "core/text.h"
-#include "core/writer.h"
 #include "options.h"
 #include "rows.h"
 
@@ -21,22 +19,16 @@ std::string Listed(const std::vector<std::string>& names)
     return text.empty() ? "none" : text;
 }
 
-// Written with clear parentheses in the library's first syntax.
-std::string ShortText(const Minimised& minimised)
+std::string ShortNote(const Description& description)
 {
-    return WriteOwn(minimised.expression, OwnSyntax::First, Parentheses::Clear);
-}
-
-std::string ShortNote(const Minimised& minimised)
-{
-    const std::string count = Count(minimised.numLiterals, "operand");
-    if (minimised.isMinimal)
+    const std::string count = Count(description.numOperands, "operand");
+    if (description.isMinimal)
         return count + "; no expression of & | ^ ~ and their negated forms has fewer";
     return count + "; shorter ones may exist";
 }
 
-void PutText(const Text& text, const Function& function, const Explanation& explanation,
-             const Minimised& minimised, uint64_t maxRows, Output& output)
+void PutText(const Text& text, const Function& function, const Description& description,
+             uint64_t maxRows, Output& output)
 {
     if (text.line > 0)
         PutField(output, "line", std::to_string(text.line));
@@ -45,12 +37,12 @@ void PutText(const Text& text, const Function& function, const Explanation& expl
     if (inputs.size() > 1)
         order += "; " + Visible(inputs.front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", order);
-    PutField(output, "without effect", Listed(explanation.idle));
+    PutField(output, "without effect", Listed(description.idle));
     PutField(output, "function",
-             explanation.kind.empty() ? "none with a common name" : Visible(explanation.text));
-    if (minimised.isFound) {
-        PutField(output, "expression", Visible(ShortText(minimised)));
-        PutField(output, "", ShortNote(minimised));
+             description.kind.empty() ? "none with a common name" : Visible(description.text));
+    if (!description.expression.empty()) {
+        PutField(output, "expression", Visible(description.expression));
+        PutField(output, "", ShortNote(description));
     } else {
         PutField(output, "expression", "none of bearable length was found");
     }
@@ -61,18 +53,20 @@ void PutText(const Text& text, const Function& function, const Explanation& expl
         output.Put("\n");
 }
 
-Json ToJson(const Function& function, const Explanation& explanation, const Minimised& minimised)
+Json ToJson(const Function& function, const Description& description)
 {
+    const bool isNamed = !description.kind.empty();
+    const bool hasExpression = !description.expression.empty();
     Json json;
     json["inputs"] = function.Inputs();
     json["hex"] = function.Hex();
     json["binary"] = function.Binary();
-    json["without_effect"] = explanation.idle;
-    json["kind"] = explanation.kind.empty() ? Json(nullptr) : Json(explanation.kind);
-    json["function"] = explanation.kind.empty() ? Json(nullptr) : Json(explanation.text);
-    json["expression"] = minimised.isFound ? Json(ShortText(minimised)) : Json(nullptr);
-    json["operands"] = minimised.isFound ? Json(minimised.numLiterals) : Json(nullptr);
-    json["minimal"] = minimised.isFound && minimised.isMinimal;
+    json["without_effect"] = description.idle;
+    json["kind"] = isNamed ? Json(description.kind) : Json(nullptr);
+    json["function"] = isNamed ? Json(description.text) : Json(nullptr);
+    json["expression"] = hasExpression ? Json(description.expression) : Json(nullptr);
+    json["operands"] = hasExpression ? Json(description.numOperands) : Json(nullptr);
+    json["minimal"] = description.isMinimal;
     return json;
 }
 
@@ -83,18 +77,15 @@ int RunExplain(const Request& request, Output& output)
         Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
-        if (function.NumInputs() > kMaxExplainInputs) {
-            Refuse(text, request, output,
-                   Count(function.NumInputs(), "input") + ": at most " +
-                       std::to_string(kMaxExplainInputs) + " are explained");
+        const Description description = Describe(function);
+        if (!description.fault.empty()) {
+            Refuse(text, request, output, description.fault);
             return kRefused;
         }
-        const Explanation explanation = Explain(function);
-        const Minimised minimised = Minimise(function);
         if (request.json)
-            PutJson(text, request, "done", ToJson(function, explanation, minimised), output);
+            PutJson(text, request, "done", ToJson(function, description), output);
         else
-            PutText(text, function, explanation, minimised, maxRows, output);
+            PutText(text, function, description, maxRows, output);
         return kDone;
     });
 }

@@ -3,10 +3,9 @@
 // error, one of the statuses of status.h out.
 #include <csignal>
 #include <new>
-#include <type_traits>
+#include <optional>
 
-#include <port/Port_MsgManData.h>
-
+#include "core/messages.h"
 #include "core/text.h"
 #include "options.h"
 #include "output.h"
@@ -16,20 +15,6 @@
 namespace booleq {
 
 namespace {
-
-// The library dumps the node that broke a tree; whoever types an equation gets a reason instead.
-// A host whose message manager cannot be redirected keeps its own way.
-template <class Manager, class = void>
-struct Diagnostics {
-    static void Drop() {}
-};
-template <class Manager>
-struct Diagnostics<Manager, std::void_t<decltype(Manager::setSink(typename Manager::Sink()))>> {
-    static void Drop()
-    {
-        Manager::setSink([](const char*, const char*, int, const char*, const char*) {});
-    }
-};
 
 void WarnAboutInputs(const Reading& reading, Output& output)
 {
@@ -47,8 +32,9 @@ int Run(const std::vector<std::string>& arguments, Output& output)
         output.Put(line.answer);
         return kDone;
     }
+    std::optional<NoMessages> silence; // whoever types an equation gets a reason instead
     if (!line.request.debug)
-        Diagnostics<Port_MsgManData>::Drop();
+        silence.emplace();
     WarnAboutInputs(line.request.reading, output);
     return line.request.command->run(line.request, output);
 }

@@ -4,7 +4,6 @@
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
-#include "options.h"
 
 namespace booleq {
 

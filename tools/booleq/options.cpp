@@ -175,9 +175,4 @@ uint64_t ParseRows(const std::string& text)
     return std::stoull(text);
 }
 
-std::string Count(uint64_t number, const std::string& noun)
-{
-    return std::to_string(number) + " " + noun + (number == 1 ? "" : "s");
-}
-
 } // namespace booleq

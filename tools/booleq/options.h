@@ -22,9 +22,6 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments);
 // A number of --rows: "all" is the highest.  Fails: UsageError.
 uint64_t ParseRows(const std::string& text);
 
-// "1 input", "2 inputs".
-std::string Count(uint64_t number, const std::string& noun);
-
 } // namespace booleq
 
 #endif

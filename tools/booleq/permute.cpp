@@ -1,16 +1,13 @@
 // The command 'permute': an init value for another order of the same inputs.
-#include <algorithm>
+#include "core/permute.h"
 
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
-#include "options.h"
 
 namespace booleq {
 
 namespace {
-
-constexpr size_t kMaxPermuteInputs = 24; // 16 million binary digits
 
 std::vector<std::string> ParseNames(const Request& request, const char* option)
 {
@@ -21,24 +18,13 @@ std::vector<std::string> ParseNames(const Request& request, const char* option)
     if (!SplitInputs(list, names))
         throw UsageError(std::string(option) +
                          " has a single quote that is not closed: " + Excerpt(list));
-    const InputCheck check = CheckInputs(names);
-    if (!check.illegal.empty())
-        throw UsageError(std::string(option) + ": '" + Excerpt(check.illegal.front()) +
-                         "' is no name");
-    if (!check.repeated.empty())
-        throw UsageError(std::string(option) + ": " + Excerpt(check.repeated.front()) +
-                         " is listed twice");
+    const std::string fault = OrderFault(names);
+    if (!fault.empty())
+        throw UsageError(std::string(option) + ": " + fault);
     if (names.size() > kMaxPermuteInputs)
         throw UsageError(std::string(option) + " has " + Count(names.size(), "input") +
                          ": at most " + std::to_string(kMaxPermuteInputs));
     return names;
-}
-
-void CheckSameNames(const std::vector<std::string>& from, const std::vector<std::string>& to)
-{
-    for (const std::string& name : from)
-        if (std::find(to.begin(), to.end(), name) == to.end())
-            throw UsageError("--to does not list " + Excerpt(name));
 }
 
 void PutText(const Text& text, const Function& function, Output& output)
@@ -66,15 +52,16 @@ int RunPermute(const Request& request, Output& output)
     own.reading.hasInputs = true;
     own.reading.inputs = ParseNames(request, "--from");
     const std::vector<std::string> to = ParseNames(request, "--to");
-    CheckSameNames(own.reading.inputs, to);
+    const std::string forgotten = FirstUnlisted(own.reading.inputs, to);
+    if (!forgotten.empty())
+        throw UsageError("--to does not list " + Excerpt(forgotten));
     return ForEachText(own, output, [&](const Text& text) {
         Function function;
         if (!SetFunction(text, own, output, function))
             return kRefused;
-        for (const std::string& name : function.Inputs()) {
-            if (std::find(to.begin(), to.end(), name) != to.end())
-                continue;
-            Refuse(text, own, output, Visible(name) + " is not in --from");
+        const std::string unknown = FirstUnlisted(function.Inputs(), to);
+        if (!unknown.empty()) {
+            Refuse(text, own, output, Visible(unknown) + " is not in --from");
             return kRefused;
         }
         const Function permuted = function.Over(to);

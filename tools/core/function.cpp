@@ -212,6 +212,12 @@ bool FunctionOf(const Kq_BoolEquation& equation, Function& function)
     return true;
 }
 
+std::string NoFunctionReason(size_t numInputs)
+{
+    return Count(numInputs, "input") + ": at most " + std::to_string(kMaxFunctionInputs) +
+           " have a truth table";
+}
+
 InitText ReadInitText(const std::string& text, size_t numInputs)
 {
     InitText init;

@@ -70,6 +70,8 @@ class Function {
 // The function of a set equation over its variables.
 // Fails: false without an equation or with more than kMaxFunctionInputs variables.
 bool FunctionOf(const Kq_BoolEquation& equation, Function& function);
+// "31 inputs: at most 30 have a truth table".
+std::string NoFunctionReason(size_t numInputs);
 
 enum class InitFault { kNone, kPrefix, kDigit, kWidth };
 

@@ -11,9 +11,10 @@ namespace booleq {
 
 struct Reading {
     bool hasInputs = false;
-    std::vector<std::string> inputs; // first is the most significant
-    bool lsbFirst = false;           // an init value's first input is bit 0 of the row number
-    bool reverse = false;            // an init value's inputs are defined from the last
+    std::vector<std::string> inputs;     // first is the most significant
+    bool lsbFirst = false;               // an init value's first input is bit 0 of the row number
+    bool reverse = false;                // an init value's inputs are defined from the last
+    const char* inputsName = "--inputs"; // what the caller's users write to list inputs
 };
 
 // Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.

@@ -123,7 +123,8 @@ void ExplainOperand(const Context& context, const std::string& text, const Readi
                                report.offset == 1 && !reading.hasInputs;
     const char behindNegation = context.OperatorBehindNegation();
     if (looksLikeInit)
-        report.mend = "for an init value name its inputs with --inputs, the most significant first";
+        report.mend = std::string("for an init value name its inputs with ") + reading.inputsName +
+                      ", the most significant first";
     else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
         report.mend = "write '" + token + behindNegation + "' without a blank in it";
     else if (token[0] == '\'' && !context.NameBefore().empty())

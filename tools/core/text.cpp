@@ -51,6 +51,11 @@ std::string Excerpt(const std::string& text)
            " bytes)";
 }
 
+std::string Count(uint64_t number, const std::string& noun)
+{
+    return std::to_string(number) + " " + noun + (number == 1 ? "" : "s");
+}
+
 bool IsBlank(const std::string& text)
 {
     return text.find_first_not_of(" \t\n") == std::string::npos;

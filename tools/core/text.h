@@ -2,6 +2,7 @@
 #ifndef BOOLEQ_CORE_TEXT_H
 #define BOOLEQ_CORE_TEXT_H
 
+#include <cstdint>
 #include <string>
 
 #include <port/Port_StringBase.h>
@@ -17,6 +18,8 @@ bool IsPrintable(const std::string& text);
 std::string Visible(const std::string& text);
 // Visible, cut behind 60 bytes; what was cut is counted.
 std::string Excerpt(const std::string& text);
+// "1 input", "2 inputs".
+std::string Count(uint64_t number, const std::string& noun);
 // True for a text of blanks, tabs and line feeds only; the empty text is one.
 bool IsBlank(const std::string& text);
 

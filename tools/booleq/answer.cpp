@@ -114,6 +114,12 @@ bool SetFunction(const Text& text, const Request& request, Output& output, Funct
     return false;
 }
 
+void RefuseTwoFormats(const Request& request, const std::string& option)
+{
+    if (request.json && request.Has(option))
+        throw UsageError("--json and " + option + " are two formats: give one");
+}
+
 void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason)
 {
     RefusalReport report;

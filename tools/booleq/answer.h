@@ -42,6 +42,9 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
 // Fails: false as above, also for more than 30 inputs.
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function);
 
+// Fails: UsageError, when both --json and 'option', which asks for another format, are given.
+void RefuseTwoFormats(const Request& request, const std::string& option);
+
 // Refuses a text for a reason of the command's own; the way the refusals of SetEquation are said.
 void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason);
 

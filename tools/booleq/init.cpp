@@ -4,6 +4,7 @@
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
+#include "picture.h"
 
 namespace booleq {
 
@@ -175,12 +176,116 @@ Json AsJson(const Order& msb, const Order& lsb)
     return result;
 }
 
+// The picture: the table with its rows from the top, the digits below it to the right, and an arrow
+// from each row to its digit. Arrows do not cross, as the highest row stands first in the text.
+constexpr size_t kMargin = 20;
+constexpr size_t kRowHeight = 24;
+constexpr size_t kRowNumberWidth = 64;
+constexpr size_t kResultWidth = 64;
+constexpr size_t kDigitWidth = 24;
+constexpr size_t kTableTop = 110;
+
+// Where the column of each input begins, and behind them that of the result.
+std::vector<size_t> ColumnPlaces(const Function& function)
+{
+    std::vector<size_t> places = {kMargin + kRowNumberWidth};
+    for (const std::string& name : function.Inputs())
+        places.push_back(places.back() +
+                         kCharacterWidth * std::max<size_t>(2, Visible(name).size()) +
+                         kCharacterWidth);
+    return places;
+}
+
+std::string SignificanceText(const Function& function)
+{
+    const std::string first = Visible(function.Inputs().front());
+    if (function.NumInputs() == 1)
+        return first + " is the only input";
+    return first + " is the most significant input, " + Visible(function.Inputs().back()) +
+           " the least";
+}
+
+void PutPictureTable(const Function& function, const std::vector<size_t>& places, Output& output)
+{
+    output.Put(SvgText(kMargin, kTableTop - 32, "start", "row"));
+    output.Put(SvgNote(kMargin, kTableTop - 10, "start", "weight"));
+    output.Put(SvgText(places.back() + kResultWidth / 2, kTableTop - 32, "middle", "result"));
+    for (size_t index = 0; index < function.NumInputs(); ++index) {
+        const size_t middle = (places[index] + places[index + 1]) / 2;
+        output.Put(SvgText(middle, kTableTop - 32, "middle", Visible(function.Inputs()[index])));
+        const uint64_t weight = uint64_t(1) << (function.NumInputs() - 1 - index);
+        output.Put(SvgNote(middle, kTableTop - 10, "middle", std::to_string(weight)));
+    }
+    for (uint64_t row = 0; row < function.NumRows(); ++row) {
+        const size_t y = kTableTop + kRowHeight * row;
+        const size_t base = y + kRowHeight / 2 + 5;
+        output.Put(SvgText(kMargin + 3 * kCharacterWidth, base, "end", std::to_string(row)));
+        for (size_t index = 0; index < function.NumInputs(); ++index)
+            output.Put(SvgText((places[index] + places[index + 1]) / 2, base, "middle",
+                               function.InputAt(row, index) ? "1" : "0"));
+        output.Put(SvgBox(places.back(), y, kResultWidth, kRowHeight, function.At(row),
+                          function.At(row) ? "1" : "0"));
+    }
+}
+
+// The digits of both bases below each other, from 'left' and 'top' on.
+void PutPictureDigits(const Function& function, size_t left, size_t top, Output& output)
+{
+    const uint64_t numRows = function.NumRows();
+    output.Put(SvgNote(left - kCharacterWidth, top - 8, "end", "bit"));
+    output.Put(SvgText(left - kCharacterWidth, top + kRowHeight / 2 + 5, "end", "0b"));
+    output.Put(SvgText(left - kCharacterWidth, top + 2 * kRowHeight + 5, "end", "0x"));
+    for (uint64_t place = 0; place < numRows; ++place) {
+        const uint64_t row = numRows - 1 - place;
+        const size_t x = left + kDigitWidth * place;
+        output.Put(SvgNote(x + kDigitWidth / 2, top - 8, "middle", std::to_string(row)));
+        output.Put(SvgBox(x, top, kDigitWidth, kRowHeight, function.At(row),
+                          function.At(row) ? "1" : "0"));
+    }
+    const std::string hex = function.Hex();
+    const size_t rowsOfDigit = std::min<uint64_t>(4, numRows);
+    for (size_t digit = 2; digit < hex.size(); ++digit)
+        output.Put(SvgBox(left + kDigitWidth * rowsOfDigit * (digit - 2), top + kRowHeight * 3 / 2,
+                          kDigitWidth * rowsOfDigit, kRowHeight, hex[digit] != '0',
+                          std::string(1, hex[digit])));
+}
+
+void PutPicture(const Function& function, Output& output)
+{
+    const std::vector<size_t> places = ColumnPlaces(function);
+    const size_t tableRight = places.back() + kResultWidth;
+    const size_t digitsLeft = tableRight + 2 * kMargin;
+    const size_t digitsTop = kTableTop + kRowHeight * (function.NumRows() + 2);
+    const std::string captions[] = {SignificanceText(function), "row k is bit k of the init value"};
+    const size_t width =
+        std::max(digitsLeft + kDigitWidth * function.NumRows(),
+                 kMargin + kCharacterWidth * std::max(captions[0].size(), captions[1].size()));
+    output.Put(SvgHead(width + kMargin, digitsTop + kRowHeight * 5 / 2 + kMargin));
+    output.Put(SvgText(kMargin, 25, "start", captions[0]));
+    output.Put(SvgText(kMargin, 45, "start", captions[1]));
+    PutPictureTable(function, places, output);
+    for (uint64_t row = 0; row < function.NumRows(); ++row)
+        output.Put(
+            SvgArrow(tableRight, kTableTop + kRowHeight * row + kRowHeight / 2,
+                     digitsLeft + kDigitWidth * (function.NumRows() - 1 - row) + kDigitWidth / 2,
+                     digitsTop - kRowHeight, function.At(row)));
+    PutPictureDigits(function, digitsLeft, digitsTop, output);
+    output.Put(SvgTail());
+}
+
 int RunInit(const Request& request, Output& output)
 {
+    RefuseTwoFormats(request, "--svg");
     return ForEachText(request, output, [&](const Text& text) {
         Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
+        if (request.Has("--svg")) {
+            if (!HasPicture(function, "a picture", text, request, output))
+                return kRefused;
+            PutPicture(function, output);
+            return kDone;
+        }
         const Function turned = function.Reversed();
         const Order msb = {function, false};
         const Order lsb = {turned, true};
@@ -215,9 +320,9 @@ Command InitCommand()
         "Print init values in both bit orders, and what reads back",
         "The digits are printed in full, up to 30 inputs. 'reads back' was tried: the call of the\n"
         "library shown gives the same function again.\n",
-        {},
+        {{"--svg", nullptr, "Print a picture of which row is which bit, up to six inputs"}},
         {"booleq init 'A & ~B'", "booleq init --inputs A,B,C 'A & B'",
-         "booleq init --inputs A,B --lsb-first 0x2"},
+         "booleq init --inputs A,B --lsb-first 0x2", "booleq init --svg 'A & ~B' > bits.svg"},
         RunInit};
 }
 

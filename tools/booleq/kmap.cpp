@@ -5,12 +5,11 @@
 #include "answer.h"
 #include "commands.h"
 #include "core/text.h"
+#include "picture.h"
 
 namespace booleq {
 
 namespace {
-
-constexpr size_t kMaxMapInputs = 6;
 
 uint64_t GrayCode(uint64_t place)
 {
@@ -78,41 +77,15 @@ void PutText(const Map& map, Output& output)
     }
 }
 
-std::string XmlText(const std::string& text)
-{
-    std::string xml;
-    for (const char character : text) {
-        if (character == '<')
-            xml += "&lt;";
-        else if (character == '>')
-            xml += "&gt;";
-        else if (character == '&')
-            xml += "&amp;";
-        else
-            xml += character;
-    }
-    return xml;
-}
-
-std::string SvgText(size_t x, size_t y, const char* anchor, const std::string& text)
-{
-    return "<text x=\"" + std::to_string(x) + "\" y=\"" + std::to_string(y) + "\" text-anchor=\"" +
-           anchor + "\">" + XmlText(text) + "</text>\n";
-}
-
 void PutSvg(const Map& map, Output& output)
 {
     constexpr size_t kCell = 40;
     constexpr size_t kTop = 60;
-    constexpr size_t kCharacter = 9; // of the font, about
-    const size_t left = 40 + kCharacter * std::max(map.RowNames().size(), map.numRowInputs);
+    const size_t left = 40 + kCharacterWidth * std::max(map.RowNames().size(), map.numRowInputs);
     const size_t width =
-        left + std::max(kCell * map.NumColumns(), kCharacter * map.ColumnNames().size()) + 20;
+        left + std::max(kCell * map.NumColumns(), kCharacterWidth * map.ColumnNames().size()) + 20;
     const size_t height = kTop + kCell * map.NumRows() + 20;
-    output.Put("<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + std::to_string(width) +
-               "\" height=\"" + std::to_string(height) +
-               "\" font-family=\"monospace\" font-size=\"15\">\n");
-    output.Put("<rect width=\"100%\" height=\"100%\" fill=\"white\"/>\n");
+    output.Put(SvgHead(width, height));
     output.Put(SvgText(left, 20, "start", map.ColumnNames()));
     output.Put(SvgText(left - 20, kTop - 12, "end", map.RowNames()));
     for (uint64_t column = 0; column < map.NumColumns(); ++column)
@@ -124,14 +97,10 @@ void PutSvg(const Map& map, Output& output)
         for (uint64_t column = 0; column < map.NumColumns(); ++column) {
             const size_t x = left + kCell * column;
             const bool value = map.At(row, column);
-            output.Put("<rect x=\"" + std::to_string(x) + "\" y=\"" + std::to_string(y) +
-                       "\" width=\"" + std::to_string(kCell) + "\" height=\"" +
-                       std::to_string(kCell) + "\" stroke=\"black\" fill=\"" +
-                       (value ? "#cde8ff" : "white") + "\"/>\n");
-            output.Put(SvgText(x + kCell / 2, y + kCell / 2 + 5, "middle", value ? "1" : "0"));
+            output.Put(SvgBox(x, y, kCell, kCell, value, value ? "1" : "0"));
         }
     }
-    output.Put("</svg>\n");
+    output.Put(SvgTail());
 }
 
 Json AsJson(const Map& map)
@@ -158,20 +127,13 @@ Json AsJson(const Map& map)
 
 int RunMap(const Request& request, Output& output)
 {
-    if (request.json && request.Has("--svg"))
-        throw UsageError("--json and --svg are two formats: give one");
+    RefuseTwoFormats(request, "--svg");
     return ForEachText(request, output, [&](const Text& text) {
         Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
-        if (function.NumInputs() == 0 || function.NumInputs() > kMaxMapInputs) {
-            Refuse(text, request, output,
-                   "a map has 1 to 6 inputs, and this equation has " +
-                       (function.NumInputs() == 0
-                            ? "none: it is always " + std::string(function.At(0) ? "1" : "0")
-                            : std::to_string(function.NumInputs())));
+        if (!HasPicture(function, "a map", text, request, output))
             return kRefused;
-        }
         const Map map(function);
         if (request.json) {
             PutJson(text, request, "done", AsJson(map), output);

@@ -49,8 +49,7 @@ Json AsJson(const TreeList& list)
 
 int RunTree(const Request& request, Output& output)
 {
-    if (request.json && request.Has("--dot"))
-        throw UsageError("--json and --dot are two formats: give one");
+    RefuseTwoFormats(request, "--dot");
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))

@@ -6,17 +6,12 @@
 #include "core/network.h"
 #include "core/reader.h"
 #include "core/writer.h"
+#include "core_support.h"
 
 namespace {
 
 using namespace booleq;
-
-Expression Parsed(const std::string& text)
-{
-    Kq_BoolEquation equation;
-    EXPECT_TRUE(equation.SetEquation(text.c_str())) << text;
-    return ToExpression(equation);
-}
+using namespace core_support;
 
 std::string To(Target target, const std::string& text)
 {

@@ -4,17 +4,12 @@
 #include "core/compare.h"
 #include "core/expression.h"
 #include "core/writer.h"
+#include "core_support.h"
 
 namespace {
 
 using namespace booleq;
-
-Expression Parsed(const std::string& text)
-{
-    Kq_BoolEquation equation;
-    EXPECT_TRUE(equation.SetEquation(text.c_str())) << text;
-    return ToExpression(equation);
-}
+using namespace core_support;
 
 std::string Whole(const std::string& text)
 {

@@ -8,28 +8,12 @@
 #include "core/function.h"
 #include "core/reading.h"
 #include "core/text.h"
+#include "core_support.h"
 
 namespace {
 
 using namespace booleq;
-
-std::vector<std::string> Names(size_t number)
-{
-    std::vector<std::string> names;
-    for (size_t index = 0; index < number; ++index)
-        names.push_back("v" + std::to_string(index));
-    return names;
-}
-
-Function RandomFunction(size_t numInputs, std::mt19937_64& random)
-{
-    std::vector<uint64_t> words(numInputs <= 6 ? 1 : size_t(1) << (numInputs - 6));
-    for (uint64_t& word : words)
-        word = random();
-    if (numInputs < 6)
-        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
-    return Function(Names(numInputs), words);
-}
+using namespace core_support;
 
 // The value for an assignment that is given by the row over 'inputs'.
 bool ValueFor(const Function& function, const std::vector<std::string>& inputs, uint64_t row)
@@ -70,7 +54,7 @@ TEST(Function, AnotherOrderOfInputsIsTheSameFunctionRowByRow)
     std::mt19937_64 random(1);
     for (size_t numInputs = 0; numInputs <= 9; ++numInputs) {
         for (int repeat = 0; repeat < 30; ++repeat) {
-            const Function function = RandomFunction(numInputs, random);
+            const Function function = RandomFunction(Names(numInputs), random);
             std::vector<std::string> inputs = Names(numInputs + random() % 3);
             std::shuffle(inputs.begin(), inputs.end(), random);
             const Function other = function.Over(inputs);
@@ -86,7 +70,7 @@ TEST(Function, DependsOnAnInputThatChangesSomeRow)
 {
     std::mt19937_64 random(2);
     for (size_t numInputs = 1; numInputs <= 8; ++numInputs) {
-        const Function function = RandomFunction(numInputs, random);
+        const Function function = RandomFunction(Names(numInputs), random);
         const Function wide = function.Over(Names(numInputs + 1));
         EXPECT_FALSE(wide.DependsOn(numInputs));
         for (size_t index = 0; index < numInputs; ++index) {
@@ -103,7 +87,7 @@ TEST(Function, DependsOnAnInputThatChangesSomeRow)
 TEST(Function, FirstDifferenceIsTheLowestRow)
 {
     std::mt19937_64 random(3);
-    const Function function = RandomFunction(9, random);
+    const Function function = RandomFunction(Names(9), random);
     EXPECT_EQ(Function::kNoRow, function.FirstDifference(function));
     for (const uint64_t row : {0u, 63u, 64u, 300u, 511u}) {
         std::vector<uint64_t> words = function.Words();

@@ -11,28 +11,23 @@
 #include "core/match.h"
 #include "core/minimise.h"
 #include "core/writer.h"
+#include "core_support.h"
 
 namespace {
 
 using namespace booleq;
+using namespace core_support;
 
 const std::vector<std::string> kNames = {"A", "B", "C", "D", "E", "F", "G", "H", "I", "J"};
 
-Function Make(size_t numInputs, uint64_t column)
+std::vector<std::string> FirstNames(size_t numInputs)
 {
-    return Function(std::vector<std::string>(kNames.begin(), kNames.begin() + long(numInputs)),
-                    {column});
+    return {kNames.begin(), kNames.begin() + long(numInputs)};
 }
 
-Function Random(size_t numInputs, std::mt19937_64& random)
+Function Make(size_t numInputs, uint64_t column)
 {
-    std::vector<uint64_t> words(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
-    for (uint64_t& word : words)
-        word = random() & random(); // a quarter are ones
-    if (numInputs < 6)
-        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
-    return Function(std::vector<std::string>(kNames.begin(), kNames.begin() + long(numInputs)),
-                    words);
+    return Function(FirstNames(numInputs), {column});
 }
 
 std::string Shortest(const std::string& init, const std::vector<std::string>& inputs)
@@ -109,7 +104,7 @@ TEST(Minimise, ProvesLargerFunctions)
     std::mt19937_64 random(1);
     for (size_t numInputs = 5; numInputs <= 9; ++numInputs)
         for (int count = 0; count < 20; ++count) {
-            const Function function = Random(numInputs, random);
+            const Function function = RandomFunction(FirstNames(numInputs), random, true);
             const Minimised minimised = Minimise(function);
             ASSERT_TRUE(minimised.isFound);
             ASSERT_TRUE(ToFunction(minimised.expression) == function) << function.Hex();
@@ -143,7 +138,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
     std::mt19937_64 random(2);
     for (size_t numInputs = 1; numInputs <= 8; ++numInputs)
         for (int count = 0; count < 20; ++count) {
-            const Bits function(Random(numInputs, random));
+            const Bits function(RandomFunction(FirstNames(numInputs), random, true));
             const std::vector<Cube> cubes = FindCover(function);
             const auto covers = [&](const Cube& cube, uint64_t row) {
                 for (size_t input = 0; input < numInputs; ++input)
@@ -264,7 +259,7 @@ TEST(Match, FindsShuffledFunctionsOfTenInputs)
 {
     std::mt19937_64 random(4);
     for (int count = 0; count < 5; ++count) {
-        const Function first = Random(10, random);
+        const Function first = RandomFunction(FirstNames(10), random, true);
         Matching shuffle = {true, {}, {}, count % 2 == 1};
         for (unsigned int input = 0; input < 10; ++input) {
             shuffle.sources.push_back((input * 3 + 1) % 10);

@@ -12,10 +12,12 @@
 #include "core/minimise.h"
 #include "core/shortest.h"
 #include "core/watch.h"
+#include "core_support.h"
 
 namespace {
 
 using namespace booleq;
+using namespace core_support;
 
 struct Interrupt : std::runtime_error {
     Interrupt() : std::runtime_error("interrupt") {}
@@ -47,25 +49,6 @@ void ExpectItCanBeEnded(const std::function<std::string()>& work)
     }
     SetWatch(nullptr);
     EXPECT_EQ(expected, work());
-}
-
-std::vector<std::string> Names(size_t numInputs)
-{
-    std::vector<std::string> names;
-    for (size_t input = 0; input < numInputs; ++input)
-        names.push_back("i" + std::to_string(input));
-    return names;
-}
-
-Function RandomFunction(size_t numInputs, unsigned int seed)
-{
-    std::mt19937_64 random(seed);
-    std::vector<uint64_t> words(numInputs > 6 ? size_t(1) << (numInputs - 6) : 1);
-    for (uint64_t& word : words)
-        word = random();
-    if (numInputs < 6)
-        words[0] &= (uint64_t(1) << (1u << numInputs)) - 1;
-    return Function(Names(numInputs), words);
 }
 
 // The table behind the search grows with the first questions, so this needs a process of its own,
@@ -115,13 +98,14 @@ TEST(Watch, EndsColumns)
 
 TEST(Watch, EndsMinimisingMatchingAndExplaining)
 {
-    const Function function = RandomFunction(9, 7);
+    std::mt19937_64 random(7);
+    const Function function = RandomFunction(Names(9), random);
     ExpectItCanBeEnded([&] {
         const Minimised minimised = Minimise(function);
         return std::to_string(minimised.numLiterals);
     });
     ExpectItCanBeEnded([&] { return Explain(function).text; });
-    const Function other = function.Over({"i3", "i1", "i8", "i0", "i2", "i4", "i7", "i5", "i6"});
+    const Function other = function.Over({"v3", "v1", "v8", "v0", "v2", "v4", "v7", "v5", "v6"});
     ExpectItCanBeEnded([&] {
         std::string text;
         for (const unsigned int source : Match(function, other, true).sources)

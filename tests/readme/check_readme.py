@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-# Runs what README.md shows and compares the outputs, byte for byte:
+# Runs what README.md, or another page, shows and compares the outputs, byte for byte:
 #   commands  every "$ command" of a console block, with the tool on the PATH
 #   program   the C++ example, built as the CMake block and as the pkg-config block say, against
 #             an installed tree in a path with a blank
@@ -41,7 +41,7 @@ def must_run(command, **options):
 def compare(what, expected, got):
     if expected == got:
         return 0
-    print(f"{what}\n--- README says\n{expected}--- it is\n{got}")
+    print(f"{what}\n--- the page says\n{expected}--- it is\n{got}")
     return 1
 
 
@@ -56,7 +56,7 @@ def check_commands(readme, tool):
             count += 1
             failures += compare(command, expected,
                                 run(["sh", "-c", command], env=environment)[1])
-    print(f"{count} commands of README run, {failures} differ")
+    print(f"{count} commands run, {failures} differ")
     return 1 if failures or not count else 0
 
 

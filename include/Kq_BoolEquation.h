@@ -1,7 +1,7 @@
 // Boolean equations: text in, tree, values, truth table and look-up-table init values out.
-// The class that callers hold; it owns one engine object and forwards to it.
-// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: one at a time for all calls in the process, with synchronisation in between; see README.
+
+// A comment stands for the declarations below it, up to a blank line or the next comment.
+
 #ifndef KQ_BOOLEQUATION_H
 #define KQ_BOOLEQUATION_H
 
@@ -12,43 +12,43 @@
 
 #include <port/Port_StringBase.h>
 
-#define KQ_EXPORT __attribute__((visibility("default")))
+#define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
 
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
-// Invariants:
-// 1. m_imp is owned by this object alone and comes from the engine class's own operator new.
-// 2. Copies share parsed nodes inside the engine, never variable values.
+// One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
+// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
+// Threads: one at a time for all calls in the process, with synchronisation in between.
+// Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
+// new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {
   public:
     class Handle;
     class TruthTable;
     struct Refusal;
 
-    // No equation, no variables.
-    Kq_BoolEquation();
+    Kq_BoolEquation(); // no equation, no variables
     // Sets 'equation'; a text that is refused leaves the object empty, which operator! tells.
     Kq_BoolEquation(const Port::StringBase<char>& equation);
-    Kq_BoolEquation(const Kq_BoolEquation& other);
-    ~Kq_BoolEquation();
+    Kq_BoolEquation(const Kq_BoolEquation& other); // the same equation, variables and values
+    ~Kq_BoolEquation(); // frees the engine object; nodes go with the last copy that shares them
 
     // Three names for taking all of the other.  Fails: std::bad_alloc; this object stays as it is.
     Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
     void Copy(const Kq_BoolEquation& other);
     void SetEquationFromEquation(const Kq_BoolEquation& other);
 
-    // Removes equation and variables.
-    void Clear();
+    void Clear(); // removes equation and variables
     // Sets the equation from an expression in any accepted syntax, or from an init value
-    // ("0x8", "0b1000") over the variables that are defined now, the first the most significant.
-    // Variables start at 0, numbered by first occurrence.  Fails: false, and the object is empty.
-    // Cost: in step with the text. Of an init value only renderings and dumps take the expression.
+    // ("0x8", "0b1000") over the variables defined now, the first being the most significant. The
+    // variables of an expression are numbered by first occurrence; all start at 0.
+    // Fails: false, and the object is empty.  Cost: in step with the text.
     bool SetEquation(const Port::StringBase<char>& equation);
     // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
     // text that are no terms follow them. A term that is no legal name or stands twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
-    // number, not the highest; 'reverseTerms' defines terms from the last on.  Fails: as above.
+    // number, not the highest; 'reverseTerms' defines terms from the last.  Fails: as SetEquation.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
                                       bool reverseTerms);
@@ -63,9 +63,8 @@ class KQ_EXPORT Kq_BoolEquation {
     bool IsHexInitValue() const;
     bool IsBinaryInitValue() const;
 
-    // The equation as text, each operator as it was typed (an init value as it was given), or in
-    // one of the three fixed syntaxes (& | ^ ~, * + @ ~, .AND. .OR. .XOR. ~). 'spaces' puts one
-    // blank between tokens. Empty without an equation.
+    // The equation as typed (an init value as given) or in a fixed syntax, 1: "& | ^ ~", 2: "* + @
+    // ~", 3: ".AND. .OR. .XOR. ~". 'spaces': one blank between tokens. Empty without an equation.
     // Deliberate: parentheses are written where they were typed and nowhere else, so an equation
     // with a negated operator ("A ~ | B") followed by another one need not read back the same.
     Port::StringBase<char> GetEquation(bool spaces) const;
@@ -75,14 +74,13 @@ class KQ_EXPORT Kq_BoolEquation {
     // GetEquation for an expression, GetEquationAlt1 for an init value: never "0x...".
     Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
 
-    // The result column as one number, row 2^n-1 first, leading zeros kept: "0x" and a digit for
-    // four rows (one digit for n = 1), "0b" and a digit for each row. 1 to 30 variables.
+    // The result column of n = 1 to 30 variables as one number, row 2^n-1 first, zeros kept: "0x"
+    // and a digit ('upperCase': A to F) for four rows, one for n = 1; "0b" and a digit for each.
     // Deliberate: without a truth table (a constant, no equation, over 30 variables) the texts are
     // "0x0" and "0b", for the constant 1 as well.  Cost: O(nodes * 2^n / 64).
     Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
-    // All variable names joined with "+", the last one first; empty without variables.
-    Port::StringBase<char> GetInitValueTermEquation() const;
+    Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
     // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
     // every few milliseconds; what it throws passes.  Fails: false, and no words, without an
@@ -90,10 +88,9 @@ class KQ_EXPORT Kq_BoolEquation {
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
-    // Is there no equation; is there one (null or a value that is only for testing).
-    bool operator!() const;
-    operator Kq_PtrTester*() const;
-    // True for the same operators, groups and names, however spelled; variables do not count.
+    bool operator!() const;         // is there no equation
+    operator Kq_PtrTester*() const; // null without an equation, else a value only for testing
+    // Are operators, groups and names the same, however spelled; are they not. Values do not count.
     bool operator==(const Kq_BoolEquation& other) const;
     bool operator!=(const Kq_BoolEquation& other) const;
 
@@ -103,21 +100,22 @@ class KQ_EXPORT Kq_BoolEquation {
     // and '_', not starting with a digit, or anything that starts with ' and has a second '.
     // Fails: false for a name already there (its value stays) or not legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
+    // Is there a variable of this name; one with the index that the handle holds.
     bool IsVariableDefined(const Port::StringBase<char>& name) const;
     bool IsVariableDefined(const Handle& handle) const;
-    // Fails: false when there is no such variable.
+    // Gives the variable the value 1, or 0 for 0.  Fails: false when there is no such variable.
     bool SetVariable(const Port::StringBase<char>& name, unsigned int value);
     bool SetVariable(const Handle& handle, unsigned int value);
     // The value, 0 or 1; 0 when there is no such variable.
     unsigned int GetVariable(const Port::StringBase<char>& name) const;
     unsigned int GetVariable(const Handle& handle) const;
-    // A handle that stands for the name from now on; empty when there is no such variable.
+    // A handle with the index of the name; empty when there is no such variable.
     Handle GetVariableHandle(const Port::StringBase<char>& name) const;
-    unsigned int GetNumVariables() const;
-    // The table, in order of definition; any later definition invalidates the reference.
+    unsigned int GetNumVariables() const; // how many; indices count from 0
+    // Names and values in order of indices; any later definition invalidates the reference.
     const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
 
-    // The full table of results; empty for 0 or more than 30 variables.
+    // All results, 2^n rows of n values; empty without an equation, for n = 0 and for n > 30.
     TruthTable GetTruthTable() const;
     const Kq_BoolEquationImp* GetImp() const; // the engine object, owned by this one
     // Writes everything about the equation, its truth table too, to the message manager.
@@ -129,45 +127,48 @@ class KQ_EXPORT Kq_BoolEquation {
 
 // The place where tokenizer, builder or init value gave up, and why. Bytes are counted from 0.
 struct Kq_BoolEquation::Refusal {
-    enum CODE : unsigned int {
-        NONE = 0,            // the text is accepted
-        EMPTY = 1,           // there is no token in it
-        CHARACTER = 2,       // it begins no token
-        WORD = 3,            // between dots, and no operator; a "." alone has no second one
-        QUOTE = 4,           // it has no second one
-        PAREN = 5,           // the other one of the pair is missing
-        OPERAND = 6,         // it stands where an operator must
-        NO_LEFT_OPERAND = 7, // of a binary operator
-        NO_RIGHT_OPERAND = 8,
-        NO_OPERAND = 9,        // of a negation
+    enum CODE : unsigned int { // what is wrong there; the numbers are fixed
+        NONE = 0,              // nothing: the text is accepted
+        EMPTY = 1,             // there is no token in it
+        CHARACTER = 2,         // this one begins no token
+        WORD = 3,    // it stands between dots and is no operator, or the second dot is missing
+        QUOTE = 4,   // this quote has no second one
+        PAREN = 5,   // this parenthesis has no other one
+        OPERAND = 6, // an operand where an operator must stand
+        NO_LEFT_OPERAND = 7,   // of this binary operator
+        NO_RIGHT_OPERAND = 8,  // of this binary operator
+        NO_OPERAND = 9,        // of this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
         INIT_DIGIT = 11,       // over terms: none of its base; or not the x or b behind a first 0
         INIT_WIDTH = 12, // over terms: so many digits are read over other numbers of variables
         INIT_NAME = 13   // over terms: one's name is no single token, and what it makes is refused
     };
-    CODE code = NONE;
-    size_t offset = 0, length = 0;
+    CODE code = NONE;  // why the text is refused
+    size_t offset = 0; // where: the first byte
+    size_t length = 0; // how many bytes from there
 };
 
 // A variable found once by name. Element 0 is the variable index, the others are the positions of
-// the nodes with that name, ascending. Empty: no such variable.
-// Deliberate: any equation whose table is long enough honours it; the name is not checked again.
+// the nodes with that name in the pre-order list, ascending. Empty: no such variable.
+// Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle();
+    Handle(); // empty
+    // A value: each copy has elements of its own.
     Handle(const Handle& other);
     ~Handle();
     Handle& operator=(const Handle& other);
 
+    // The first element, and behind the last one; valid until the handle is set or destroyed.
     unsigned int* begin() { return m_values.data(); }
     const unsigned int* begin() const { return m_values.data(); }
     unsigned int* end() { return m_values.data() + m_values.size(); }
     const unsigned int* end() const { return m_values.data() + m_values.size(); }
-    bool empty() const { return m_values.empty(); }
-    size_t size() const { return m_values.size(); }
-    bool operator==(const Handle& other) const;
-    bool operator!=(const Handle& other) const;
-    void Dbg() const;
+    bool empty() const { return m_values.empty(); } // no variable was found
+    size_t size() const { return m_values.size(); } // elements: 1 and the number of nodes
+    bool operator==(const Handle& other) const;     // the same elements in the same order
+    bool operator!=(const Handle& other) const;     // the opposite
+    void Dbg() const;                               // writes all elements to the message manager
 
   private:
     friend class Kq_BoolEquationImp;
@@ -181,23 +182,23 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
   public:
     class Row;
 
-    TruthTable();
+    TruthTable(); // empty
+    // A value: a deep copy, or the table of an equation as its GetTruthTable gives it.
     TruthTable(const TruthTable& other);
     TruthTable(const Kq_BoolEquation& equation);
     ~TruthTable();
     TruthTable& operator=(const TruthTable& other);
     TruthTable& operator=(const Kq_BoolEquation& equation);
 
-    // Same names in the same order and the same rows; the text is not compared.
+    // Are names, in order, and rows the same; are they not. The text is not compared.
     bool operator==(const TruthTable& other) const;
     bool operator!=(const TruthTable& other) const;
-    // Are there no variable names; are there some.
-    bool operator!() const;
-    operator Kq_PtrTester*() const;
+    bool operator!() const;         // is the table empty
+    operator Kq_PtrTester*() const; // null if it is, else a value only for testing
 
-    std::vector<Port::StringBase<char>> GetVariableNames() const; // copies, as are the rows
-    std::vector<Row> GetRows() const;
-    void Dbg() const;
+    std::vector<Port::StringBase<char>> GetVariableNames() const; // copies, in column order
+    std::vector<Row> GetRows() const; // copies of all 2^n rows, row k at index k
+    void Dbg() const;                 // writes the table to the message manager
 
   private:
     friend class Kq_BoolEquation;
@@ -208,15 +209,16 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
 
 class KQ_EXPORT Kq_BoolEquation::TruthTable::Row { // one assignment and its result
   public:
+    // A value: result and variable values as given, or a deep copy.
     Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
     Row(const Row& other);
     ~Row();
     Row& operator=(const Row& other);
-    bool operator==(const Row& other) const;
-    bool operator!=(const Row& other) const;
-    unsigned int GetResultValue() const;
-    std::vector<unsigned int> GetVariableValues() const; // one for each variable, in column order
-    void Dbg() const;
+    bool operator==(const Row& other) const;             // the same result and variable values
+    bool operator!=(const Row& other) const;             // the opposite
+    unsigned int GetResultValue() const;                 // 0 or 1
+    std::vector<unsigned int> GetVariableValues() const; // 0 or 1 for each, in column order
+    void Dbg() const;                                    // writes the row to the message manager
 
   private:
     struct Imp;

@@ -1,6 +1,7 @@
 // The engine behind Kq_BoolEquation: a shared tree of nodes and a variable table of its own.
-// Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
-// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
+
+// A comment stands for the declarations below it, up to a blank line or the next comment.
+
 #ifndef KQ_BOOLEQUATIONIMP_H
 #define KQ_BOOLEQUATIONIMP_H
 
@@ -10,6 +11,9 @@
 
 class KqInitText; // an init value as read; inside the library
 
+// One equation: nodes that its copies share, and a variable table of its own.
+// Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
+// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
 // Invariants:
 // 1. m_store is never null; its count is the number of engine objects that point at it.
 // 2. Variable names are unique; a variable's position is its index, its value is 0 or 1.
@@ -24,17 +28,18 @@ class KQ_EXPORT Kq_BoolEquationImp {
     class Tokens;
     struct Store;
 
-    Kq_BoolEquationImp();
+    Kq_BoolEquationImp(); // no equation, no variables
     // Shares the other's nodes, copies its variables.
     Kq_BoolEquationImp(const Kq_BoolEquationImp& other);
-    ~Kq_BoolEquationImp();
+    ~Kq_BoolEquationImp(); // the last object that shares the nodes frees them
+    // Two names for the same: shares the other's nodes, copies its variables.
     // Fails: std::bad_alloc, and this object is as it was.
     Kq_BoolEquationImp& operator=(const Kq_BoolEquationImp& other);
     void Copy(const Kq_BoolEquationImp& other);
 
     // Removes equation and variables; other objects that share the nodes keep them.
     void Clear();
-    // See Kq_BoolEquation.
+    // The work behind the member of this name of Kq_BoolEquation, which says the rest.
     bool SetEquation(const Port::StringBase<char>& text);
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
@@ -44,12 +49,13 @@ class KQ_EXPORT Kq_BoolEquationImp {
                 const std::vector<Port::StringBase<char>>* terms = nullptr);
     unsigned int Eval() const;
 
-    // Equal lists in length and equal trees, node by node; variables do not count.
+    // Are the lists equal in length and the trees node by node; are they not. Variables do not
+    // count.
     bool operator==(const Kq_BoolEquationImp& other) const;
     bool operator!=(const Kq_BoolEquationImp& other) const;
-    bool operator!() const;
-    operator Kq_PtrTester*() const;
-    bool IsExpression() const;
+    bool operator!() const;         // is there no equation
+    operator Kq_PtrTester*() const; // null without an equation, else a value only for testing
+    bool IsExpression() const;      // is there an equation, and not of an init value
 
     // Appends one node for each token of 'text' to the empty list; links nothing. Does nothing for
     // a null or empty text or a list that is not empty. A text that is refused clears the object.
@@ -59,19 +65,22 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // is a root or no node. A list that is no equation clears the object.
     void BuildTree();
 
-    // Renderings, init values and variables: see Kq_BoolEquation.
+    // The text in a syntax, as the member of this name of Kq_BoolEquation says.
     Port::StringBase<char> GetEquation(bool spaces) const;
     Port::StringBase<char> GetEquationAlt1(bool spaces) const;
     Port::StringBase<char> GetEquationAlt2(bool spaces) const;
     Port::StringBase<char> GetEquationAlt3(bool spaces) const;
     Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
 
+    // Init values, as the member of this name of Kq_BoolEquation says.
     bool IsHexInitValue() const;
     bool IsBinaryInitValue() const;
     Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const;
 
+    // The variable table, as the member of this name of Kq_BoolEquation says.
+    // Cost: a name is searched for from the first variable on; a handle is an index.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
     bool IsVariableDefined(const Port::StringBase<char>& name) const;
     bool IsVariableDefined(const Kq_BoolEquation::Handle& handle) const;
@@ -83,8 +92,9 @@ class KQ_EXPORT Kq_BoolEquationImp {
     unsigned int GetNumVariables() const;
     const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
 
-    TruthTable GetTruthTable() const;
-    bool GetColumn(std::vector<uint64_t>& words) const; // see Kq_BoolEquation
+    TruthTable GetTruthTable() const; // as Kq_BoolEquation::GetTruthTable
+    // The packed result column, as Kq_BoolEquation::GetColumn says.
+    bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
     // The root of the tree, null without an equation. Only for reading: results are kept of the
@@ -92,7 +102,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // value the nodes are made on the first call, which can be many.  Fails: std::bad_alloc.
     const Node* GetRoot() const;
 
-    void Dbg() const;
+    void Dbg() const; // writes texts, variables, nodes and truth table to the message manager
 
     // Exactly the size of an engine object comes from the class allocator.
     // Deliberate: another size is served by mav_malloc with the size of one engine object, so a
@@ -106,7 +116,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     static bool GetInternalDebugMode();
     static void SetInternalDebugMode(bool on);
 
-    static std::allocator<Kq_BoolEquationImp> m_kq_boolequationimp_mem;
+    static std::allocator<Kq_BoolEquationImp> m_kq_boolequationimp_mem; // serves operator new
 
   private:
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
@@ -135,8 +145,9 @@ class KQ_EXPORT Kq_BoolEquationImp {
 // A trie; it only grows.
 class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
   public:
-    StringMgr();
-    ~StringMgr();
+    StringMgr();  // no names
+    ~StringMgr(); // frees all names
+    // Not to be copied: names are known by their address.
     StringMgr(const StringMgr&) = delete;
     StringMgr& operator=(const StringMgr&) = delete;
 
@@ -159,7 +170,8 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
   public:
     class Row;
 
-    TruthTable();
+    TruthTable(); // empty
+    // A value: the table of the equation as Build makes it, or a copy.
     TruthTable(const Kq_BoolEquationImp& equation);
     TruthTable(const TruthTable& other);
     ~TruthTable();
@@ -171,15 +183,17 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
     // Fails: std::bad_alloc, with the rows appended so far.
     void Build(const Kq_BoolEquationImp& equation);
 
+    // In the order of variable indices; the reference is valid until the table is set or destroyed.
     const std::vector<Port::StringBase<char>>& GetVariableNames() const;
+    // Row k at index k; the reference is valid until the table is set or destroyed.
     const std::vector<Row>& GetRows() const;
 
-    // Same names in the same order and the same rows; the text is not compared.
+    // Are names, in order, and rows the same; are they not. The text is not compared.
     bool operator==(const TruthTable& other) const;
     bool operator!=(const TruthTable& other) const;
-    bool operator!() const;
-    operator Kq_PtrTester*() const;
-    void Dbg() const;
+    bool operator!() const;         // are there no names
+    operator Kq_PtrTester*() const; // null without names, else a value only for testing
+    void Dbg() const;               // writes the table to the message manager
 
   private:
     std::vector<Port::StringBase<char>> m_variable_names;
@@ -187,19 +201,22 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
     Port::StringBase<char> m_equation;
 };
 
-class KQ_EXPORT Kq_BoolEquationImp::TruthTable::Row {
+class KQ_EXPORT Kq_BoolEquationImp::TruthTable::Row { // one assignment and its result
   public:
+    // A value: result and variable values as given, or a copy.
     Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
     Row(const Row& other);
     ~Row();
     Row& operator=(const Row& other);
 
-    unsigned int GetResultValue() const;
+    unsigned int GetResultValue() const; // 0 or 1
+    // 0 or 1 for each name of the table, in their order; valid as long as the row.
     const std::vector<unsigned int>& GetVariableValues() const;
 
+    // Are result and variable values the same; are they not.
     bool operator==(const Row& other) const;
     bool operator!=(const Row& other) const;
-    void Dbg() const;
+    void Dbg() const; // writes the row to the message manager
 
   private:
     std::vector<unsigned int> m_variable_values;

@@ -1,11 +1,15 @@
-// One node of an equation: a token of the text first, an element of its tree later.
-// Links between nodes own nothing; the equation's node store owns the nodes.
-// The accessors stand in the header because every step of the library goes through them.
+// The nodes of an equation. The accessors stand in the header because every step of the library
+// goes through them.
+
+// A comment stands for the declarations below it, up to a blank line or the next comment.
+
 #ifndef KQ_BOOLEQUATIONIMPNODE_H
 #define KQ_BOOLEQUATIONIMPNODE_H
 
 #include <Kq_BoolEquationImp.h>
 
+// One node of an equation: a token of the text first, an element of its tree later.
+// Links between nodes own nothing; the equation's node store owns the nodes.
 // Shapes in a built tree:
 // 1. A binary operator has its first operand left and its second right.
 // 2. NOT and TRUTH_TABLE have their operand left and nothing right.
@@ -15,22 +19,22 @@
 //    ("P & X ~ | Y"): that link deliberately stays at the operator's first operand X.
 class KQ_EXPORT Kq_BoolEquationImp::Node {
   public:
-    // The numbers are fixed.
+    // What a node is; the numbers are fixed.
     enum TYPE : unsigned int {
-        AND = 0,
-        ZERO = 1,
-        ONE = 2,
-        ID = 3,
-        LP = 4,
-        NAND = 5,
-        NOR = 6,
-        NOT = 7,
-        NXOR = 8,
-        OR = 9,
-        RP = 10,
-        TRUTH_TABLE = 11,
-        XOR = 12,
-        SENTINEL = 13
+        AND = 0,          // binary operator: both
+        ZERO = 1,         // the constant 0
+        ONE = 2,          // the constant 1
+        ID = 3,           // a variable
+        LP = 4,           // a group, by its opening parenthesis
+        NAND = 5,         // binary operator: not both
+        NOR = 6,          // binary operator: none
+        NOT = 7,          // the operand inverted
+        NXOR = 8,         // binary operator: both alike
+        OR = 9,           // binary operator: one or both
+        RP = 10,          // the closing parenthesis of a group
+        TRUTH_TABLE = 11, // root over the expression that an init value stands for
+        XOR = 12,         // binary operator: one, not both
+        SENTINEL = 13     // nothing; never part of an equation
     };
 
     // A SENTINEL with an empty token and no links.
@@ -39,31 +43,34 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
           m_value(0)
     {
     }
+    // No links, value 0.
     Node(TYPE type, const Port::StringBase<char>& token)
         : m_type(type), m_token(token), m_parent(nullptr), m_left_child(nullptr),
           m_right_child(nullptr), m_value(0)
     {
     }
-    // Copies the links too: the copy points at the same parent and children.
+    // Links are copied as they are: the copy points at the same parent and children.
     Node(const Node& other) = default;
-    ~Node() = default;
+    ~Node() = default; // other nodes stay as they are
     Node& operator=(const Node& other) = default;
 
-    void SetType(TYPE type) { m_type = type; }
-    TYPE GetType() const { return m_type; }
+    void SetType(TYPE type) { m_type = type; } // the type alone
+    TYPE GetType() const { return m_type; }    // the type as set, a corrupt one too
+    // The token as it was parsed: an operator's spelling, an ID's name, an init value as given.
     void SetToken(const Port::StringBase<char>& token) { m_token = token; }
-    // The token as it was parsed; an ID's name.
     const Port::StringBase<char>& GetToken() const { return m_token; }
+    // Links to other nodes, null where there is none. Setting one changes no other.
     void SetParent(Node* parent) { m_parent = parent; }
     Node* GetParent() const { return m_parent; }
     void SetLeftChild(Node* leftChild) { m_left_child = leftChild; }
     Node* GetLeftChild() const { return m_left_child; }
     void SetRightChild(Node* rightChild) { m_right_child = rightChild; }
     Node* GetRightChild() const { return m_right_child; }
-    // An ID's variable index; no meaning for other types.
+    // An ID's variable index, counted from 0; no meaning for other types.
     void SetValue(unsigned int value) { m_value = value; }
     unsigned int GetValue() const { return m_value; }
 
+    // Is the node of this type, or of one of these types.
     bool Is0() const { return m_type == ZERO; }
     bool Is1() const { return m_type == ONE; }
     bool IsConst() const { return Is0() || Is1(); }
@@ -93,7 +100,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     const Port::StringBase<char>& GetTokenAlt2() const;
     const Port::StringBase<char>& GetTokenAlt3() const;
 
-    // Same type, links present in the same places, and for ID and TRUTH_TABLE the same token.
+    // Are type, places of links, and of ID and TRUTH_TABLE the token, the same; are they not.
     bool operator==(const Node& other) const;
     bool operator!=(const Node& other) const;
 
@@ -113,7 +120,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     static void* operator new(size_t size);
     static void operator delete(void* memory, size_t size);
 
-    static std::allocator<Node> m_kq_boolequationimp_node_mem;
+    static std::allocator<Node> m_kq_boolequationimp_node_mem; // serves operator new
 
   private:
     friend class Kq_BoolEquationImp;

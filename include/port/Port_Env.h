@@ -2,7 +2,7 @@
 #ifndef PORT_ENV_H
 #define PORT_ENV_H
 
-class Port_Env {
+class Port_Env { // the process environment; no objects of it are needed
   public:
     // The value of the environment variable 'name', or null when it is unset (or 'name' is null).
     // The text belongs to the environment: it is valid until the variable is changed.

@@ -5,34 +5,39 @@
 
 namespace Port {
 
-class FileInit {
+class FileInit { // start-up object of files
   public:
+    // The service is set up while an object lives; the default host's needs nothing.
     FileInit();
     ~FileInit();
 };
 
-class PathListInit {
+class PathListInit { // start-up object of lists of paths
   public:
+    // The service is set up while an object lives; the default host's needs nothing.
     PathListInit();
     ~PathListInit();
 };
 
 } // namespace Port
 
-class Port_MsgManInit {
+class Port_MsgManInit { // start-up object of the message manager
   public:
+    // The service is set up while an object lives; the default host's needs nothing.
     Port_MsgManInit();
     ~Port_MsgManInit();
 };
 
-class InstanceTableInit {
+class InstanceTableInit { // start-up object of the table of instances
   public:
+    // The service is set up while an object lives; the default host's needs nothing.
     InstanceTableInit();
     ~InstanceTableInit();
 };
 
-class FactoryInit {
+class FactoryInit { // start-up object of factories
   public:
+    // The service is set up while an object lives; the default host's needs nothing.
     FactoryInit();
     ~FactoryInit();
 };

@@ -4,6 +4,8 @@
 
 #include <functional>
 
+// Lets the compiler compare a format with the arguments behind it; positions count from 2 in a
+// member, as the object is number 1.
 #if defined(__GNUC__)
 #define PORT_PRINTF(formatIndex, firstIndex)                                                       \
     __attribute__((__format__(__printf__, formatIndex, firstIndex)))
@@ -11,7 +13,7 @@
 #define PORT_PRINTF(formatIndex, firstIndex)
 #endif
 
-class Port_MsgManData {
+class Port_MsgManData { // one report: where it comes from, and its text
   public:
     // Where texts go: message id, source path, source line, revision text, the formatted text.
     // All pointers are valid during the call only; the text has no line end but its own.

@@ -10,28 +10,30 @@
 namespace Port {
 
 template <class CharT>
-class StringBase;
+class StringBase; // only for char
 
 // A byte string of any length; bytes of value 0 may stand in it.
 // A null 'const char*' counts as the empty text.  Fails: std::bad_alloc only.
 template <>
 class StringBase<char> {
   public:
-    StringBase() = default;
-    // Implicit, so that a literal can be passed where a string is asked for.
+    StringBase() = default; // the empty text
+    // The bytes before the first 0; implicit, so that a literal can be passed for a string.
     StringBase(const char* text) : m_text(text ? text : "") {}
+    // A value: takes the other's bytes; one that is moved from may hold any text.
     StringBase(const StringBase& other) = default;
     StringBase(StringBase&& other) noexcept = default;
     ~StringBase() = default;
-
     StringBase& operator=(const StringBase& other) = default;
     StringBase& operator=(StringBase&& other) noexcept = default;
+    // Takes the bytes before the first 0.
     StringBase& operator=(const char* text)
     {
         m_text = text ? text : "";
         return *this;
     }
 
+    // Appends a text, the bytes before the first 0, or one byte; any may be part of this string.
     StringBase& operator+=(const StringBase& other)
     {
         m_text += other.m_text;

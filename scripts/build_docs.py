@@ -37,7 +37,7 @@ def filtered(root, path):
 def prepare(root, source):
     """Puts what Doxygen reads below 'source'."""
     complaints = []
-    for path in [root / "README.md", *sorted(root.glob("docs/*.md")),
+    for path in [*sorted(root.glob("*.md")), *sorted(root.glob("docs/*.md")),
                  *sorted(root.glob("include/**/*.h"))]:
         copy = source / path.relative_to(root)
         copy.parent.mkdir(parents=True, exist_ok=True)

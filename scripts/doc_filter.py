@@ -5,6 +5,7 @@ declaration with a comment behind it has that one alone. The comment that opens 
 file's. Lines keep their numbers, so that warnings name the right ones.
 Pages: headings, links between pages and pictures, as Doxygen wants them.
 """
+import collections
 import html
 import os
 import pathlib
@@ -141,6 +142,8 @@ class Header:
 
 # --- pages --------------------------------------------------------------------------------------
 
+NO_BRACKETS = str.maketrans("", "", "[]")
+HEADING_TARGET = re.compile(r"\[[^\]]+\]: \S+\.md#")  # where a heading in brackets leads: to itself
 CODE_SPAN = re.compile(r"`([^`]+)`")
 LINK = re.compile(r"(!?)\[([^\]]*)\]\(([^)\s]+)\)")
 
@@ -174,7 +177,7 @@ def code_span(match):
 
 
 def filter_page(path, lines):
-    name, fence, output = page_name(path), False, []
+    name, fence, output, anchors = page_name(path), False, [], collections.Counter()
     for line in lines:
         heading = re.match(r"(#+) (.*)", line)
         if line.startswith("```"):
@@ -183,7 +186,11 @@ def filter_page(path, lines):
             line = "```" + ("{.cpp}" if kind == "cpp" else "{.unparsed}" if kind else "")
         elif not fence and heading:
             anchor = name if len(heading[1]) == 1 else f"{name}-{slug(heading[2])}"
-            line = f"{heading[1]} {heading[2]} {{#{anchor}}}"
+            again = f"-{anchors[anchor]}" if anchors[anchor] else ""
+            anchors[anchor] += 1
+            line = f"{heading[1]} {heading[2].translate(NO_BRACKETS)} {{#{anchor}{again}}}"
+        elif not fence and HEADING_TARGET.match(line):
+            line = ""
         elif not fence:
             line = CODE_SPAN.sub(code_span, LINK.sub(lambda match: link(match, name), line))
         output.append(line)

@@ -35,7 +35,7 @@ class Documentation(unittest.TestCase):
         self.output = pathlib.Path(directory.name) / "html"
         for name in ("include", "docs", "scripts"):
             shutil.copytree(ROOT / name, self.copy / name)
-        for name in ("README.md", "CMakeLists.txt"):
+        for name in ("README.md", "CONTRIBUTING.md", "CHANGELOG.md", "CMakeLists.txt"):
             shutil.copy(ROOT / name, self.copy / name)
 
     def append(self, file, text):

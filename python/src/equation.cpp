@@ -1,0 +1,172 @@
+#include "equation.h"
+
+#include <algorithm>
+#include <functional>
+
+#include "core/expression.h"
+#include "core/messages.h"
+#include "core/permute.h"
+#include "core/text.h"
+#include "errors.h"
+#include "text.h"
+
+namespace booleq_python {
+
+namespace {
+
+constexpr size_t kMaxListedInputs = 20;
+
+// The name by which the library knows a variable, for as long as the table is long enough: a handle
+// is a cached number, so one is enough for all variables of all equations.
+Kq_BoolEquation::Handle HandleOf(size_t input)
+{
+    static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
+    Kq_BoolEquation::Handle handle = first;
+    *handle.begin() = static_cast<unsigned int>(input);
+    return handle;
+}
+
+py::object CheckNames(const py::object& inputs)
+{
+    if (inputs.is_none())
+        return inputs;
+    const py::tuple names = RequireNames(inputs);
+    const std::vector<std::string> encoded = EncodeAll(names);
+    // The library would read such a name up to the NUL.
+    for (const std::string& name : encoded)
+        if (name.find('\0') != std::string::npos)
+            throw py::value_error("inputs: '" + booleq::Excerpt(name) + "' is no name");
+    const std::string fault = booleq::OrderFault(encoded);
+    if (!fault.empty())
+        throw py::value_error("inputs: " + fault);
+    return names;
+}
+
+size_t Mix(size_t hash, size_t value)
+{
+    return (hash ^ value) * 0x9e3779b97f4a7c15u + (hash >> 29);
+}
+
+} // namespace
+
+Equation::Equation(const py::object& text, const py::object& inputs, bool lsbFirst)
+    : m_text(RequireStr(text, "text")), m_given_inputs(CheckNames(inputs)), m_lsb_first(lsbFirst)
+{
+    const std::string bytes = Encode(m_text);
+    const booleq::Reading reading = GetReading();
+    const booleq::NoMessages silence;
+    if (bytes.find('\0') != std::string::npos || !SetFromText(m_equation, bytes, reading))
+        RaiseParseError(m_text, booleq::ExplainRefusal(bytes, reading));
+    m_inputs = DecodeAll(InputBytes());
+    for (size_t input = 0; input < m_inputs.size(); ++input)
+        m_numbers[m_inputs[input]] = input;
+}
+
+booleq::Reading Equation::GetReading() const
+{
+    booleq::Reading reading;
+    reading.inputsName = "inputs=";
+    reading.lsbFirst = m_lsb_first;
+    reading.hasInputs = !m_given_inputs.is_none();
+    if (reading.hasInputs)
+        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(m_given_inputs));
+    return reading;
+}
+
+std::vector<std::string> Equation::InputBytes() const
+{
+    std::vector<std::string> names;
+    names.reserve(NumInputs());
+    for (const auto& variable : m_equation.GetVariables())
+        names.push_back(booleq::ToStd(variable.first));
+    return names;
+}
+
+size_t Equation::FindInput(const py::handle& name) const
+{
+    if (HasInput(name))
+        return m_numbers[name].cast<size_t>();
+    std::string listed;
+    for (size_t input = 0; input < std::min(NumInputs(), kMaxListedInputs); ++input)
+        listed += (input == 0 ? "" : ", ") +
+                  booleq::Excerpt(booleq::ToStd(m_equation.GetVariables()[input].first));
+    if (NumInputs() > kMaxListedInputs)
+        listed += " and " + std::to_string(NumInputs() - kMaxListedInputs) + " more";
+    const std::string shown = PyUnicode_Check(name.ptr())
+                                  ? Encode(py::reinterpret_borrow<py::str>(name))
+                                  : std::string(py::repr(name));
+    throw py::key_error("there is no input " + booleq::Excerpt(shown) +
+                        (listed.empty() ? "; there are none" : "; the inputs are " + listed));
+}
+
+bool Equation::HasInput(const py::handle& name) const
+{
+    const int found = PyDict_Contains(m_numbers.ptr(), name.ptr());
+    if (found < 0)
+        throw py::error_already_set();
+    return found != 0;
+}
+
+void Equation::SetValue(size_t input, unsigned int value)
+{
+    m_equation.SetVariable(HandleOf(input), value);
+}
+
+// Equal equations have equal trees, or equal init values; their variables may differ in order.
+size_t Equation::Hash() const
+{
+    if (m_has_hash)
+        return m_hash;
+    const std::hash<std::string> hashText;
+    size_t hash = 1;
+    if (!m_equation.IsExpression()) {
+        hash = hashText(booleq::ToStd(m_equation.GetEquation(false)));
+    } else {
+        const booleq::Expression expression = booleq::ToExpression(m_equation);
+        std::vector<size_t> names;
+        for (const std::string& name : expression.names)
+            names.push_back(hashText(name));
+        for (const booleq::Expression::Node& node : expression.nodes)
+            hash = Mix(hash, node.op == booleq::Operator::Input ? names[node.left]
+                                                                : static_cast<size_t>(node.op));
+    }
+    m_hash = hash;
+    m_has_hash = true;
+    return m_hash;
+}
+
+std::vector<uint64_t> ColumnOf(const Equation& equation)
+{
+    std::vector<uint64_t> words;
+    if (!equation.Get().GetColumn(words))
+        throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
+    return words;
+}
+
+booleq::Function FunctionOf(const Equation& equation)
+{
+    return booleq::Function(equation.InputBytes(), ColumnOf(equation));
+}
+
+unsigned int RequireBit(const py::handle& value, const py::handle& name)
+{
+    const auto fault = [&](const char* text) {
+        return "the value of " + booleq::Excerpt(Encode(py::str(name))) + text +
+               booleq::Excerpt(Encode(py::repr(value)));
+    };
+    py::object number = py::reinterpret_steal<py::object>(PyNumber_Index(value.ptr()));
+    if (!number) {
+        PyErr_Clear();
+        // NumPy's bool is no index.
+        if (!py::isinstance(value, py::module_::import("numpy").attr("bool_")))
+            throw py::type_error(fault(" must be 0 or 1, not "));
+        number = py::bool_(py::reinterpret_borrow<py::object>(value));
+    }
+    if (number.equal(py::int_(0)))
+        return 0;
+    if (number.equal(py::int_(1)))
+        return 1;
+    throw py::value_error(fault(" must be 0 or 1, not "));
+}
+
+} // namespace booleq_python

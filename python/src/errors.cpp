@@ -1,0 +1,52 @@
+#include "errors.h"
+
+#include <string>
+
+#include "text.h"
+
+namespace booleq_python {
+
+namespace {
+
+// A text of as many bytes as 'text' has characters, with the same line ends.
+std::string ByteForCharacter(const py::str& text)
+{
+    const int kind = PyUnicode_KIND(text.ptr());
+    const void* const data = PyUnicode_DATA(text.ptr());
+    std::string projected(py::len(text), 'x');
+    for (size_t index = 0; index < projected.size(); ++index)
+        if (PyUnicode_READ(kind, data, static_cast<Py_ssize_t>(index)) == '\n')
+            projected[index] = '\n';
+    return projected;
+}
+
+} // namespace
+
+void RaiseParseError(const py::str& text, const booleq::RefusalReport& report)
+{
+    const Span place = InCharacters(text, {report.offset, report.length});
+    std::string message = "refused";
+    if (report.length != 0)
+        message += " at " + booleq::PlaceName(ByteForCharacter(text), place.offset);
+    message += ": " + report.reason;
+    if (!report.mend.empty())
+        message += "; " + report.mend;
+    const py::object type = ResultClass("ParseError");
+    const py::object error = type(Decode(message), text, place.offset, place.length, report.code,
+                                  Decode(report.reason), Decode(report.mend));
+    PyErr_SetObject(type.ptr(), error.ptr());
+    throw py::error_already_set();
+}
+
+void CheckSignals()
+{
+    if (PyErr_CheckSignals() != 0)
+        throw py::error_already_set();
+}
+
+py::object ResultClass(const char* name)
+{
+    return py::module_::import("booleq._results").attr(name);
+}
+
+} // namespace booleq_python

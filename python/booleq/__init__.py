@@ -5,8 +5,6 @@
 >>> eq(A=1, B=0), eq.hex_init
 (1, '0x4')
 """
-from collections.abc import Mapping as _Mapping
-
 from ._booleq import Equation, __version__
 from ._results import (Difference, Equivalence, Explanation, Finding, LintReport, Node,
                        ParseError, Reading)
@@ -14,7 +12,6 @@ from ._results import (Difference, Equivalence, Explanation, Finding, LintReport
 __all__ = ["Difference", "Equation", "Equivalence", "Explanation", "Finding", "LintReport", "Node",
            "ParseError", "Reading", "__version__"]
 
-_Mapping.register(Equation)
 for _type in (Difference, Equivalence, Explanation, Finding, LintReport, Node, ParseError, Reading):
     _type.__module__ = __name__
 del _type

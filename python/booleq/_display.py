@@ -2,12 +2,11 @@
 import html as _html
 import shutil
 import subprocess
-from typing import TYPE_CHECKING, List, Optional
+from typing import List, Optional
 
 import numpy as np
 
-if TYPE_CHECKING:
-    from booleq import Equation
+from ._booleq import Equation
 
 MAX_ROWS = 64
 MAX_INPUTS = 30  # no truth table above
@@ -23,7 +22,7 @@ def _row(tag: str, cells: List[str]) -> str:
     return "<tr>" + "".join(f"<{tag}>{cell}</{tag}>" for cell in cells) + "</tr>"
 
 
-def html(equation: "Equation") -> str:
+def html(equation: Equation) -> str:
     text = f"<code>{_escape(equation.text)}</code>"
     inputs = equation.inputs
     if len(inputs) > MAX_INPUTS:

@@ -1,6 +1,9 @@
 """Plain values that equations answer with, and the exception of a refused text."""
+import typing
 from dataclasses import dataclass
-from typing import Any, Dict, Iterable, NamedTuple, Optional, Tuple
+from typing import Dict, Optional, Tuple
+
+from ._booleq import Equation
 
 __all__ = ["Difference", "Equivalence", "Explanation", "Finding", "LintReport", "Node",
            "ParseError", "Reading"]
@@ -31,7 +34,7 @@ class ParseError(ValueError):
         return str(self.args[0])
 
 
-class Node(NamedTuple):
+class Node(typing.NamedTuple):
     """A node of Equation.tree(); parent, left and right are ids."""
 
     id: int
@@ -114,11 +117,9 @@ class LintReport:
     is_clean: bool
 
 
-def restore(text: str, inputs: Optional[Iterable[str]], lsb_first: bool,
-            ones: Iterable[str]) -> Any:
+def restore(text: str, inputs: Optional[typing.Iterable[str]], lsb_first: bool,
+            ones: typing.Iterable[str]) -> Equation:
     """The equation that pickle was given."""
-    from booleq import Equation
-
     equation = Equation(text, inputs, lsb_first)
     for name in ones:
         equation[name] = 1

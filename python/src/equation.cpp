@@ -138,7 +138,11 @@ size_t Equation::Hash() const
 std::vector<uint64_t> ColumnOf(const Equation& equation)
 {
     std::vector<uint64_t> words;
-    if (!equation.Get().GetColumn(words))
+    const auto goOn = [](void*) {
+        CheckSignals();
+        return true;
+    };
+    if (!equation.Get().GetColumn(words, goOn, nullptr))
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
     return words;
 }

@@ -50,4 +50,5 @@ PYBIND11_MODULE(_booleq, module)
     BindMapping(type);
     BindArrays(module, type);
     BindReports(type);
+    py::module_::import("collections.abc").attr("Mapping").attr("register")(type);
 }

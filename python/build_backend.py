@@ -1,0 +1,179 @@
+"""What pip calls to build the package (PEP 517): CMake builds and installs it, this file packs it.
+
+Standard library only, so that nothing has to be fetched. The wheel holds the module, the libraries
+that it uses beside it, and metadata; the source distribution holds what building a wheel takes.
+"""
+import base64
+import hashlib
+import io
+import os
+import re
+import shutil
+import subprocess
+import sys
+import sysconfig
+import tarfile
+import tempfile
+import zipfile
+from pathlib import Path
+
+ROOT = Path(__file__).resolve().parent.parent
+NAME = "booleq"
+SUMMARY = "Boolean equations and look-up-table init values: evaluate, compare, explain, convert"
+SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
+           "include", "port", "python", "s", "tools/core"]
+DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
+
+
+def _version():
+    text = (ROOT / "CMakeLists.txt").read_text(encoding="utf-8")
+    return re.search(r"^project\(KqBoolEquation VERSION ([0-9.]+) ", text, re.MULTILINE)[1]
+
+
+def _tag():
+    if sys.implementation.name != "cpython":
+        raise SystemExit(f"{NAME} is built for CPython only, this is {sys.implementation.name}")
+    interpreter = f"cp{sys.version_info.major}{sys.version_info.minor}"
+    abi = "cp" + sysconfig.get_config_var("SOABI").split("-")[1]
+    platform = re.sub(r"[-.]", "_", sysconfig.get_platform())
+    return f"{interpreter}-{abi}-{platform}"
+
+
+def _metadata():
+    return f"""Metadata-Version: 2.1
+Name: {NAME}
+Version: {_version()}
+Summary: {SUMMARY}
+License: MIT
+License-File: LICENSE
+Classifier: License :: OSI Approved :: MIT License
+Classifier: Operating System :: POSIX :: Linux
+Classifier: Programming Language :: C++
+Classifier: Programming Language :: Python :: 3
+Classifier: Typing :: Typed
+Requires-Python: >=3.9
+Requires-Dist: numpy (>=1.20)
+Description-Content-Type: text/markdown
+
+""" + (ROOT / "docs/python.md").read_text(encoding="utf-8")
+
+
+def _wheel_information():
+    return f"""Wheel-Version: 1.0
+Generator: {NAME} build_backend
+Root-Is-Purelib: false
+Tag: {_tag()}
+"""
+
+
+def _run(*command):
+    done = subprocess.run([str(word) for word in command], stdin=subprocess.DEVNULL, check=False)
+    if done.returncode != 0:
+        raise SystemExit(f"{NAME}: {command[0]} failed, see above; on Debian 12 building takes: "
+                         "apt-get install cmake g++ make pybind11-dev python3-dev")
+
+
+def _build_and_install(prefix):
+    """Installs the package below 'prefix'; the build directory stays, for the next time."""
+    if shutil.which("cmake") is None:
+        raise SystemExit(f"{NAME} is built by CMake, and there is none; on Debian 12: "
+                         "apt-get install cmake g++ make pybind11-dev python3-dev")
+    build = ROOT / "build" / f"wheel-{_tag()}"
+    if (build / "CMakeCache.txt").exists():
+        cache = (build / "CMakeCache.txt").read_text(encoding="utf-8")
+        if f"CMAKE_HOME_DIRECTORY:INTERNAL={ROOT}\n" not in cache:
+            shutil.rmtree(build)  # the tree was moved
+    generator = ["-G", "Ninja"] if shutil.which("ninja") else []
+    _run("cmake", "-S", ROOT, "-B", build, *generator, "-DCMAKE_BUILD_TYPE=Release",
+         "-DBUILD_TESTING=OFF", "-DKQ_BUILD_TOOLS=OFF", "-DKQ_BUILD_PYTHON=ON",
+         "-DKQ_PYTHON_BUNDLE=ON", "-DKQ_PYTHON_DIR=.", f"-DPython_EXECUTABLE={sys.executable}")
+    _run("cmake", "--build", build, "--target", "_booleq", "--parallel", os.cpu_count() or 1)
+    _run("cmake", "--install", build, "--component", "python", "--prefix", prefix, "--strip")
+
+
+class _Wheel:
+    """A zip file with the list of its files and their hashes."""
+
+    def __init__(self, path, information):
+        self._file = zipfile.ZipFile(path, "w", zipfile.ZIP_DEFLATED)
+        self._information = information
+        self._records = []
+
+    def add(self, name, content, mode=0o644):
+        entry = zipfile.ZipInfo(name, DATE)
+        entry.external_attr = (0o100000 | mode) << 16
+        entry.compress_type = zipfile.ZIP_DEFLATED
+        self._file.writestr(entry, content)
+        digest = base64.urlsafe_b64encode(hashlib.sha256(content).digest()).rstrip(b"=")
+        self._records.append(f"{name},sha256={digest.decode()},{len(content)}\n")
+
+    def close(self):
+        name = f"{self._information}/RECORD"
+        self._file.writestr(zipfile.ZipInfo(name, DATE), "".join(self._records) + f"{name},,\n")
+        self._file.close()
+
+
+def _write_information(write):
+    """Calls write(name, bytes) for the files of the directory *.dist-info but RECORD."""
+    write("METADATA", _metadata().encode())
+    write("WHEEL", _wheel_information().encode())
+    write("LICENSE", (ROOT / "LICENSE").read_bytes())
+
+
+# --- the hooks --------------------------------------------------------------------------------
+
+def get_requires_for_build_wheel(config_settings=None):
+    return []
+
+
+def get_requires_for_build_sdist(config_settings=None):
+    return []
+
+
+def prepare_metadata_for_build_wheel(metadata_directory, config_settings=None):
+    directory = Path(metadata_directory) / f"{NAME}-{_version()}.dist-info"
+    directory.mkdir()
+    _write_information(lambda name, content: (directory / name).write_bytes(content))
+    return directory.name
+
+
+def build_wheel(wheel_directory, config_settings=None, metadata_directory=None):
+    information = f"{NAME}-{_version()}.dist-info"
+    file_name = f"{NAME}-{_version()}-{_tag()}.whl"
+    with tempfile.TemporaryDirectory() as prefix:
+        _build_and_install(prefix)
+        wheel = _Wheel(Path(wheel_directory) / file_name, information)
+        for path in sorted(Path(prefix).rglob("*")):
+            if path.is_file():
+                name = path.relative_to(prefix).as_posix()
+                wheel.add(name, path.read_bytes(), 0o755 if ".so" in path.name else 0o644)
+        _write_information(lambda name, content: wheel.add(f"{information}/{name}", content))
+        wheel.close()
+    return file_name
+
+
+def _source_files():
+    for source in SOURCES:
+        path = ROOT / source
+        for file in [path] if path.is_file() else sorted(path.rglob("*")):
+            if file.is_file() and "__pycache__" not in file.parts:
+                yield file
+
+
+def build_sdist(sdist_directory, config_settings=None):
+    folder = f"{NAME}-{_version()}"
+    file_name = f"{folder}.tar.gz"
+
+    def plain(entry):
+        entry.uid = entry.gid = 0
+        entry.uname = entry.gname = ""
+        return entry
+
+    with tarfile.open(Path(sdist_directory) / file_name, "w:gz", format=tarfile.PAX_FORMAT) as sdist:
+        for file in _source_files():
+            sdist.add(file, f"{folder}/{file.relative_to(ROOT).as_posix()}", filter=plain)
+        content = _metadata().encode()
+        entry = tarfile.TarInfo(f"{folder}/PKG-INFO")
+        entry.size = len(content)
+        sdist.addfile(entry, io.BytesIO(content))
+    return file_name

@@ -1,16 +1,19 @@
-# Installation: the library, its headers, the CMake package and the pkg-config file. All of it may
-# be moved to another place afterwards, except that a ready-made host library stays where it was.
+# Installation: the library, its headers, the CMake package, the pkg-config file and the documents.
+# All of it may be moved to another place afterwards, except that a ready-made host library stays
+# where it was. Every install() of this repository names its component: library, development, tool,
+# python or documentation. cmake/Packages.cmake makes a package of each.
 set(kq_package_dir "${CMAKE_INSTALL_LIBDIR}/cmake/KqBoolEquation")
 set(kq_generated_dir "${CMAKE_CURRENT_BINARY_DIR}/package")
 
 install(TARGETS kq_boolequation EXPORT KqBoolEquationTargets
-    LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
-    ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR}
-    RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
+    LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT library NAMELINK_COMPONENT development
+    ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT development
+    RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT library)
 list(TRANSFORM kq_public_headers PREPEND include/ OUTPUT_VARIABLE kq_header_files)
-install(FILES ${kq_header_files} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
+install(FILES ${kq_header_files} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} COMPONENT development)
 
-install(EXPORT KqBoolEquationTargets NAMESPACE Kq:: DESTINATION ${kq_package_dir})
+install(EXPORT KqBoolEquationTargets NAMESPACE Kq:: DESTINATION ${kq_package_dir}
+    COMPONENT development)
 configure_package_config_file(cmake/KqBoolEquationConfig.cmake.in
     "${kq_generated_dir}/KqBoolEquationConfig.cmake"
     INSTALL_DESTINATION ${kq_package_dir}
@@ -21,7 +24,7 @@ write_basic_package_version_file("${kq_generated_dir}/KqBoolEquationConfigVersio
 install(FILES
     "${kq_generated_dir}/KqBoolEquationConfig.cmake"
     "${kq_generated_dir}/KqBoolEquationConfigVersion.cmake"
-    DESTINATION ${kq_package_dir})
+    DESTINATION ${kq_package_dir} COMPONENT development)
 
 if(kq_port_is_imported)
   file(GENERATE OUTPUT "${kq_generated_dir}/KqBoolEquationHost.cmake" CONTENT
@@ -30,7 +33,8 @@ set_target_properties(Kq::Port PROPERTIES
     IMPORTED_LOCATION \"$<TARGET_FILE:kq_port>\"
     INTERFACE_INCLUDE_DIRECTORIES \"$<TARGET_PROPERTY:kq_port,INTERFACE_INCLUDE_DIRECTORIES>\")
 ")
-  install(FILES "${kq_generated_dir}/KqBoolEquationHost.cmake" DESTINATION ${kq_package_dir})
+  install(FILES "${kq_generated_dir}/KqBoolEquationHost.cmake" DESTINATION ${kq_package_dir}
+      COMPONENT development)
 endif()
 
 # The pkg-config file finds its prefix from its own place. A blank there is escaped by pkg-config
@@ -52,4 +56,8 @@ configure_file(cmake/kq_boolequation.pc.in "${kq_generated_dir}/kq_boolequation.
 file(GENERATE OUTPUT "${kq_generated_dir}/kq_boolequation.pc"
     INPUT "${kq_generated_dir}/kq_boolequation.pc.in" TARGET kq_boolequation)
 install(FILES "${kq_generated_dir}/kq_boolequation.pc"
-    DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
+    DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
+
+install(FILES README.md DESTINATION ${CMAKE_INSTALL_DOCDIR} COMPONENT documentation)
+install(DIRECTORY docs DESTINATION ${CMAKE_INSTALL_DOCDIR} COMPONENT documentation
+    FILES_MATCHING PATTERN "*.md")

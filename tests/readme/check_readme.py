@@ -2,7 +2,7 @@
 # Runs what README.md, or another page, shows and compares the outputs, byte for byte:
 #   commands  every "$ command" of a console block, with the tool on the PATH
 #   program   the C++ example, built as the CMake block and as the pkg-config block say, against
-#             an installed tree in a path with a blank
+#             an installed tree in a path with a blank, or against what the system has installed
 import argparse
 import os
 import re
@@ -71,20 +71,21 @@ def build_with_cmake(readme, directory, prefix, compiler, flags):
     with open(os.path.join(directory, "CMakeLists.txt"), "w", encoding="utf-8") as file:
         file.write(one_block(readme, "cmake"))
     build = os.path.join(directory, "build")
-    must_run(["cmake", "-S", directory, "-B", build, f"-DCMAKE_PREFIX_PATH={prefix}",
-              f"-DCMAKE_CXX_COMPILER={compiler}", f"-DCMAKE_CXX_FLAGS={flags}"])
+    where = [f"-DCMAKE_PREFIX_PATH={prefix}"] if prefix else []
+    must_run(["cmake", "-S", directory, "-B", build, *where, f"-DCMAKE_CXX_COMPILER={compiler}", f"-DCMAKE_CXX_FLAGS={flags}"])
     must_run(["cmake", "--build", build])
     return must_run([os.path.join(build, "example")])
 
 
 def build_with_pkg_config(readme, directory, prefix, compiler, flags):
     command = one_block(readme, "sh pkg-config").replace("c++ ", f"'{compiler}' {flags} ", 1)
-    # The command is for a prefix without blanks, as an unquoted $(...) is.
-    link = os.path.join(directory, "prefix")
-    os.symlink(prefix, link)
-    libraries = find_directory(link + os.sep, "libkq_boolequation.so")
-    packages = find_directory(link + os.sep, "kq_boolequation.pc")
-    environment = dict(os.environ, PKG_CONFIG_PATH=packages, LD_LIBRARY_PATH=libraries)
+    environment = dict(os.environ)
+    if prefix:
+        # The command is for a prefix without blanks, as an unquoted $(...) is.
+        link = os.path.join(directory, "prefix")
+        os.symlink(prefix, link)
+        environment["LD_LIBRARY_PATH"] = find_directory(link + os.sep, "libkq_boolequation.so")
+        environment["PKG_CONFIG_PATH"] = find_directory(link + os.sep, "kq_boolequation.pc")
     must_run(["sh", "-c", command], cwd=directory, env=environment)
     return must_run([os.path.join(directory, "example")], env=environment)
 
@@ -96,8 +97,10 @@ def check_program(readme, build, compiler, flags):
     expected = one_block(readme, "text")
     failures = 0
     with tempfile.TemporaryDirectory() as top:
-        prefix = os.path.join(top, "installed here")
-        must_run(["cmake", "--install", build, "--prefix", prefix])
+        prefix = None # the system's
+        if build:
+            prefix = os.path.join(top, "installed here")
+            must_run(["cmake", "--install", build, "--prefix", prefix])
         for how in (build_with_cmake, build_with_pkg_config):
             directory = os.path.join(top, how.__name__)
             os.mkdir(directory)
@@ -113,7 +116,7 @@ def main():
     parser = argparse.ArgumentParser()
     parser.add_argument("--readme", required=True)
     parser.add_argument("--tool")
-    parser.add_argument("--build")
+    parser.add_argument("--build", help="build tree to install; none: use what is installed")
     parser.add_argument("--compiler")
     parser.add_argument("--flags", default="")
     arguments = parser.parse_args()

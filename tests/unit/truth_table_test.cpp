@@ -290,7 +290,7 @@ bool CountDown(void* context)
 
 TEST(TruthTable, ColumnInPiecesIsTheColumn)
 {
-    for (const size_t numVariables : {3, 12, 16, 19, 20}) {
+    for (const size_t numVariables : {3u, 12u, 16u, 19u, 20u}) {
         Engine engine;
         ASSERT_TRUE(engine.SetEquation(LongText(numVariables).c_str()));
         std::vector<uint64_t> whole;

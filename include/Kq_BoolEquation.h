@@ -109,7 +109,7 @@ class KQ_EXPORT Kq_BoolEquation {
     // The value, 0 or 1; 0 when there is no such variable.
     unsigned int GetVariable(const Port::StringBase<char>& name) const;
     unsigned int GetVariable(const Handle& handle) const;
-    // A handle with the index of the name; empty when there is no such variable.
+    // The name's index as a handle, which saves searching all names; empty without such a variable.
     Handle GetVariableHandle(const Port::StringBase<char>& name) const;
     unsigned int GetNumVariables() const; // how many; indices count from 0
     // Names and values in order of indices; any later definition invalidates the reference.
@@ -130,18 +130,18 @@ struct Kq_BoolEquation::Refusal {
     enum CODE : unsigned int { // what is wrong there; the numbers are fixed
         NONE = 0,              // nothing: the text is accepted
         EMPTY = 1,             // there is no token in it
-        CHARACTER = 2,         // this one begins no token
+        CHARACTER = 2,         // this character begins no token
         WORD = 3,    // it stands between dots and is no operator, or the second dot is missing
         QUOTE = 4,   // this quote has no second one
         PAREN = 5,   // this parenthesis has no other one
         OPERAND = 6, // an operand where an operator must stand
-        NO_LEFT_OPERAND = 7,   // of this binary operator
-        NO_RIGHT_OPERAND = 8,  // of this binary operator
-        NO_OPERAND = 9,        // of this negation
+        NO_LEFT_OPERAND = 7,   // nothing on the left of this operator
+        NO_RIGHT_OPERAND = 8,  // nothing on the right of this operator
+        NO_OPERAND = 9,        // nothing behind this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
-        INIT_DIGIT = 11,       // over terms: none of its base; or not the x or b behind a first 0
-        INIT_WIDTH = 12, // over terms: so many digits are read over other numbers of variables
-        INIT_NAME = 13   // over terms: one's name is no single token, and what it makes is refused
+        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b behind a first 0
+        INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
+        INIT_NAME = 13 // over terms: one's name is no single token, and what it makes is refused
     };
     CODE code = NONE;  // why the text is refused
     size_t offset = 0; // where: the first byte

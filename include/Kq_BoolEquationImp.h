@@ -39,7 +39,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
 
     // Removes equation and variables; other objects that share the nodes keep them.
     void Clear();
-    // The work behind the member of this name of Kq_BoolEquation, which says the rest.
+    // As in Kq_BoolEquation.
     bool SetEquation(const Port::StringBase<char>& text);
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
                                       const Port::StringBase<char>& equation, bool termOrderFlag,
@@ -65,22 +65,21 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // is a root or no node. A list that is no equation clears the object.
     void BuildTree();
 
-    // The text in a syntax, as the member of this name of Kq_BoolEquation says.
+    // As in Kq_BoolEquation.
     Port::StringBase<char> GetEquation(bool spaces) const;
     Port::StringBase<char> GetEquationAlt1(bool spaces) const;
     Port::StringBase<char> GetEquationAlt2(bool spaces) const;
     Port::StringBase<char> GetEquationAlt3(bool spaces) const;
     Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
 
-    // Init values, as the member of this name of Kq_BoolEquation says.
+    // As in Kq_BoolEquation.
     bool IsHexInitValue() const;
     bool IsBinaryInitValue() const;
     Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const;
 
-    // The variable table, as the member of this name of Kq_BoolEquation says.
-    // Cost: a name is searched for from the first variable on; a handle is an index.
+    // As in Kq_BoolEquation.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
     bool IsVariableDefined(const Port::StringBase<char>& name) const;
     bool IsVariableDefined(const Kq_BoolEquation::Handle& handle) const;
@@ -92,8 +91,8 @@ class KQ_EXPORT Kq_BoolEquationImp {
     unsigned int GetNumVariables() const;
     const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
 
-    TruthTable GetTruthTable() const; // as Kq_BoolEquation::GetTruthTable
-    // The packed result column, as Kq_BoolEquation::GetColumn says.
+    // As in Kq_BoolEquation.
+    TruthTable GetTruthTable() const;
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 

@@ -1,8 +1,8 @@
 """What Doxygen reads in place of a header or a page; the files themselves stay plain.
 
 Headers: a comment stands for the declarations below it, up to a blank line or the next comment; a
-declaration with a comment behind it has that one alone. The comment that opens the file is the
-file's. Lines keep their numbers, so that warnings name the right ones.
+declaration with a comment behind it has that one alone. "As in CLASS." stands for the comment of the
+member of the same name there. The comment that opens the file is the file's. Lines keep their numbers, so that warnings name the right ones.
 Pages: headings, links between pages and pictures, as Doxygen wants them.
 """
 import collections
@@ -57,6 +57,7 @@ def as_doc(lines, subject=""):
 
 # --- headers ------------------------------------------------------------------------------------
 
+COPY = re.compile(r"/\*\* As in (\w+)\. \*/")
 TRAILING = re.compile(r"(.*[;{,}\w)]) *// (.*)")
 SCOPE = re.compile(r"\b(class|struct|enum|namespace)\b[^()]*\{$")
 UNDOCUMENTED = re.compile(r"(class|struct) \w+;|friend |(public|private|protected):|\}|#|$")
@@ -84,7 +85,9 @@ class Header:
         indent = line[:len(line) - len(line.lstrip())]
         begins = not self.statement and not UNDOCUMENTED.match(line.strip())
         if begins and comment:
-            line = indent + as_doc(comment) + " " + line.strip()
+            name = re.search(r"(\w+) *\(", " ".join(self.lines[index:index + 2]))
+            doc = COPY.sub(lambda match: f"/** @copydoc {match[1]}::{name[1]} */", as_doc(comment))
+            line = f"{indent}{doc} {line.strip()}"
         elif begins and self.in_enum:
             self.bare_enumerators.append(index + 1)
         self.output[index] = line

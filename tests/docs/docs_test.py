@@ -89,6 +89,11 @@ class Documentation(unittest.TestCase):
         line = self.add_members("    // Lorem.\n    bool First() const;\n\n    bool Second() const;\n")
         self.expect(f"{HEADER}:{line + 3}: error: Member Second() const")
 
+    def test_comment_of_the_same_name_elsewhere(self):
+        self.assertEqual(build(self.copy, self.output), (0, ""))
+        for name in ("classKq__BoolEquation.html", "classKq__BoolEquationImp.html"):
+            self.assertIn("false when there is no such variable", self.page(name))
+
     def test_comments_are_plain_text(self):
         self.add_members("    // Plain <b>, @see, \\ref, 100%, a*b*c, #x, ~y & \"z | ~ @\" of 'it'.\n"
                          "    bool First(bool it) const;\n")

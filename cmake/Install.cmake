@@ -58,6 +58,7 @@ file(GENERATE OUTPUT "${kq_generated_dir}/kq_boolequation.pc"
 install(FILES "${kq_generated_dir}/kq_boolequation.pc"
     DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
 
-install(FILES README.md CHANGELOG.md DESTINATION ${CMAKE_INSTALL_DOCDIR} COMPONENT documentation)
+install(FILES README.md CHANGELOG.md CONTRIBUTING.md DESTINATION ${CMAKE_INSTALL_DOCDIR}
+    COMPONENT documentation)
 install(DIRECTORY docs DESTINATION ${CMAKE_INSTALL_DOCDIR} COMPONENT documentation
-    FILES_MATCHING PATTERN "*.md")
+    FILES_MATCHING PATTERN "*.md" PATTERN "*.svg")

@@ -15,24 +15,6 @@ namespace booleq_python {
 
 namespace {
 
-constexpr uint64_t kWorkBetweenSignals = uint64_t(1) << 22; // operations, some milliseconds
-
-// Lets signals in after so much work.
-class SignalClock {
-  public:
-    void Add(uint64_t work)
-    {
-        m_work += work;
-        if (m_work < kWorkBetweenSignals)
-            return;
-        m_work = 0;
-        CheckSignals();
-    }
-
-  private:
-    uint64_t m_work = 0;
-};
-
 // A packed column that an array shows.
 struct Words {
     std::vector<uint64_t> words;
@@ -76,11 +58,10 @@ py::buffer RequireAssignments(const Equation& equation, const py::object& assign
 
 // Packs all rows and hands each block to 'answer', which gives back the block's results as a word.
 template <class Answer>
-void ForEachBlock(const Table& table, const py::object& array, uint64_t workPerBlock,
-                  uint8_t* results, const Answer& answer)
+void ForEachBlock(const Table& table, const py::object& array, uint8_t* results,
+                  const Answer& answer)
 {
     RowPacker packer(table);
-    SignalClock clock;
     for (size_t row = 0; row < table.numRows; row += RowPacker::kBlockRows) {
         if (!packer.Pack(row)) {
             const TableFault& fault = packer.Fault();
@@ -91,7 +72,7 @@ void ForEachBlock(const Table& table, const py::object& array, uint64_t workPerB
                                   std::string(py::str(value)));
         }
         UnpackBits(answer(packer), packer.NumRows(), results + row);
-        clock.Add(workPerBlock);
+        CheckSignals();
     }
 }
 
@@ -102,11 +83,10 @@ void EvalByWords(const Equation& equation, const Table& table, const py::object&
     const booleq::Expression expression = booleq::ToExpression(equation.Get());
     std::vector<uint64_t> inputs;
     std::vector<uint64_t> stack;
-    ForEachBlock(table, array, expression.nodes.size() + 8 * table.numColumns, results,
-                 [&](const RowPacker& packer) {
-                     packer.ToWords(inputs);
-                     return EvaluateWord(expression, inputs, stack);
-                 });
+    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
+        packer.ToWords(inputs);
+        return EvaluateWord(expression, inputs, stack);
+    });
 }
 
 // Row by row, from the column.
@@ -114,7 +94,7 @@ void EvalByColumn(const Equation& equation, const Table& table, const py::object
                   uint8_t* results)
 {
     const std::vector<uint64_t> column = ColumnOf(equation);
-    ForEachBlock(table, array, 64 + 8 * table.numColumns, results, [&](const RowPacker& packer) {
+    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
         uint64_t word = 0;
         for (size_t row = 0; row < packer.NumRows(); ++row) {
             const uint64_t number = packer.RowNumber(row);
@@ -129,7 +109,7 @@ void EvalByRows(const Equation& equation, const Table& table, const py::object& 
                 uint8_t* results)
 {
     Equation copy(equation);
-    ForEachBlock(table, array, 64 * 8 * table.numColumns, results, [&](const RowPacker& packer) {
+    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
         uint64_t word = 0;
         for (size_t row = 0; row < packer.NumRows(); ++row) {
             for (size_t column = 0; column < table.numColumns; ++column)
@@ -178,13 +158,13 @@ py::object TruthTable(const Equation& equation)
     const py::buffer_info info = py::buffer(table).request(true);
     const std::vector<uint64_t> column = ColumnOf(equation);
     uint8_t* byte = DataOf(info);
-    SignalClock clock;
     for (uint64_t row = 0; row < numRows; ++row) {
         // The first input is the highest bit of the row number.
         for (size_t input = 0; input < numInputs; ++input)
             *byte++ = static_cast<uint8_t>(row >> (numInputs - 1 - input) & 1u);
         *byte++ = static_cast<uint8_t>(column[row / 64] >> (row % 64) & 1u);
-        clock.Add(numInputs + 1);
+        if (row % 4096 == 0)
+            CheckSignals();
     }
     return table;
 }
@@ -195,10 +175,9 @@ py::object Column(const Equation& equation)
     const uint64_t numRows = uint64_t(1) << equation.NumInputs();
     const py::object column = NewArray(py::make_tuple(numRows));
     const py::buffer_info info = py::buffer(column).request(true);
-    SignalClock clock;
     for (uint64_t row = 0; row < numRows; row += 64) {
         UnpackBits(words[row / 64], std::min<uint64_t>(64, numRows - row), DataOf(info) + row);
-        clock.Add(64);
+        CheckSignals();
     }
     return column;
 }

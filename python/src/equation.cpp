@@ -7,6 +7,7 @@
 #include "core/messages.h"
 #include "core/permute.h"
 #include "core/text.h"
+#include "core/watch.h"
 #include "errors.h"
 #include "text.h"
 
@@ -26,10 +27,15 @@ Kq_BoolEquation::Handle HandleOf(size_t input)
     return handle;
 }
 
-py::object CheckNames(const py::object& inputs)
+size_t Mix(size_t hash, size_t value)
 {
-    if (inputs.is_none())
-        return inputs;
+    return (hash ^ value) * 0x9e3779b97f4a7c15u + (hash >> 29);
+}
+
+} // namespace
+
+py::tuple RequireInputs(const py::object& inputs)
+{
     const py::tuple names = RequireNames(inputs);
     const std::vector<std::string> encoded = EncodeAll(names);
     // The library would read such a name up to the NUL.
@@ -42,15 +48,9 @@ py::object CheckNames(const py::object& inputs)
     return names;
 }
 
-size_t Mix(size_t hash, size_t value)
-{
-    return (hash ^ value) * 0x9e3779b97f4a7c15u + (hash >> 29);
-}
-
-} // namespace
-
 Equation::Equation(const py::object& text, const py::object& inputs, bool lsbFirst)
-    : m_text(RequireStr(text, "text")), m_given_inputs(CheckNames(inputs)), m_lsb_first(lsbFirst)
+    : m_text(RequireStr(text, "text")),
+      m_given_inputs(inputs.is_none() ? inputs : RequireInputs(inputs)), m_lsb_first(lsbFirst)
 {
     const std::string bytes = Encode(m_text);
     const booleq::Reading reading = GetReading();
@@ -138,11 +138,7 @@ size_t Equation::Hash() const
 std::vector<uint64_t> ColumnOf(const Equation& equation)
 {
     std::vector<uint64_t> words;
-    const auto goOn = [](void*) {
-        CheckSignals();
-        return true;
-    };
-    if (!equation.Get().GetColumn(words, goOn, nullptr))
+    if (!equation.Get().GetColumn(words, booleq::WatchAndGoOn, nullptr))
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
     return words;
 }
@@ -158,13 +154,16 @@ unsigned int RequireBit(const py::handle& value, const py::handle& name)
         return "the value of " + booleq::Excerpt(Encode(py::str(name))) + text +
                booleq::Excerpt(Encode(py::repr(value)));
     };
-    py::object number = py::reinterpret_steal<py::object>(PyNumber_Index(value.ptr()));
-    if (!number) {
-        PyErr_Clear();
+    py::object number = py::reinterpret_borrow<py::object>(value);
+    if (!PyLong_Check(value.ptr())) {
         // NumPy's bool is no index.
-        if (!py::isinstance(value, py::module_::import("numpy").attr("bool_")))
+        if (py::isinstance(value, py::module_::import("numpy").attr("bool_")))
+            number = py::bool_(number);
+        number = py::reinterpret_steal<py::object>(PyNumber_Index(number.ptr()));
+        if (!number) {
+            PyErr_Clear();
             throw py::type_error(fault(" must be 0 or 1, not "));
-        number = py::bool_(py::reinterpret_borrow<py::object>(value));
+        }
     }
     if (number.equal(py::int_(0)))
         return 0;

@@ -18,6 +18,10 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
+// The names of an iterable as a tuple of plain str.
+// Fails: TypeError, and ValueError for what is no legal name or is listed twice.
+py::tuple RequireInputs(const py::object& inputs);
+
 // Invariants:
 // 1. The equation is set, and only values of its variables change.
 // 2. A given list of inputs is a tuple of plain str, legal names, none twice.

@@ -44,9 +44,14 @@ void AddItem(const Equation& equation, const py::handle& name, const py::handle&
     assignment.emplace_back(input, RequireBit(value, name));
 }
 
-unsigned int Call(Equation& equation, const py::object& values, const py::kwargs& named)
+// The one argument by position is taken by hand, so that every name may be an input's.
+unsigned int Call(Equation& equation, const py::args& arguments, const py::kwargs& named)
 {
+    if (arguments.size() > 1)
+        throw py::type_error("values are one mapping, or named: " +
+                             booleq::Count(arguments.size(), "mapping") + " given");
     Assignment assignment;
+    const py::object values = arguments.empty() ? py::none() : py::object(arguments[0]);
     if (!values.is_none()) {
         if (PyUnicode_Check(values.ptr()) || !PyMapping_Check(values.ptr()) ||
             !py::hasattr(values, "items"))
@@ -139,7 +144,7 @@ void BindMapping(EquationClass& type)
 {
     BindItems(type);
     BindViews(type);
-    type.def("__call__", &Call, py::arg("values") = py::none(), py::pos_only(),
+    type.def("__call__", &Call,
              R"doc(__call__($record, self, values=None, /, **named)
 --
 

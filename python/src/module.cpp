@@ -3,6 +3,8 @@
 #include <pybind11/pybind11.h>
 
 #include "bind.h"
+#include "core/watch.h"
+#include "errors.h"
 
 namespace {
 
@@ -46,6 +48,8 @@ PYBIND11_MODULE(_booleq, module)
 
     EquationClass type(module, "Equation", py::is_final(), kEquationDoc);
     type.attr("__module__") = "booleq"; // where it is imported from, for help() and pickles
+    booleq::SetWatch(CheckSignals);     // interrupts end long calls
+
     BindTexts(type);
     BindMapping(type);
     BindArrays(module, type);

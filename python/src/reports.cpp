@@ -39,8 +39,7 @@ py::list Tree(const Equation& equation)
         const booleq::TreeList::Entry& entry = list.Entries()[index];
         nodes.append(node(index, Decode(list.TypeName(index)), Decode(list.Token(index)),
                           Link(entry.parent), Link(entry.left), Link(entry.right)));
-        if (index % 4096 == 0)
-            CheckSignals();
+        CheckSignals();
     }
     return nodes;
 }
@@ -48,7 +47,10 @@ py::list Tree(const Equation& equation)
 std::string TreeDot(const booleq::TreeList& list)
 {
     std::string dot;
-    PutDot(list, [&dot](const std::string& piece) { dot += piece; });
+    PutDot(list, [&dot](const std::string& piece) {
+        dot += piece;
+        CheckSignals();
+    });
     return dot;
 }
 
@@ -82,11 +84,8 @@ py::object Equivalent(const Equation& equation, const Equation& other)
 
 Equation Permute(const Equation& equation, const py::object& inputs)
 {
-    const py::tuple names = RequireNames(inputs);
+    const py::tuple names = RequireInputs(inputs);
     const std::vector<std::string> order = EncodeAll(names);
-    const std::string fault = booleq::OrderFault(order);
-    if (!fault.empty())
-        throw py::value_error("inputs: " + fault);
     if (order.size() > booleq::kMaxPermuteInputs)
         throw py::value_error("inputs has " + booleq::Count(order.size(), "input") + ": at most " +
                               std::to_string(booleq::kMaxPermuteInputs));

@@ -1,0 +1,13 @@
+#!/usr/bin/env bash
+# Types: the tests, which use every member, against the stubs; the stubs against the module.
+# usage: check_types.sh PYTHON CONFIGURATION CACHE TESTS, PYTHONPATH being where the package is
+set -euo pipefail
+
+python=$1
+configuration=$2
+cache=$3
+tests=$4
+mkdir -p -- "$cache"
+cd -- "$cache" # stubtest keeps its cache where it stands
+MYPYPATH=$PYTHONPATH "$python" -m mypy --config-file "$configuration" --cache-dir "$cache" "$tests"
+"$python" -m mypy.stubtest booleq --mypy-config-file "$configuration"

@@ -14,12 +14,13 @@ import sys
 import sysconfig
 import tarfile
 import tempfile
+import tomllib
 import zipfile
 from pathlib import Path
 
 ROOT = Path(__file__).resolve().parent.parent
-NAME = "booleq"
-SUMMARY = "Boolean equations and look-up-table init values: evaluate, compare, explain, convert"
+PROJECT = tomllib.loads((ROOT / "pyproject.toml").read_text(encoding="utf-8"))["project"]
+NAME = PROJECT["name"]
 SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
            "include", "port", "python", "s", "tools/core"]
 DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
@@ -40,22 +41,14 @@ def _tag():
 
 
 def _metadata():
-    return f"""Metadata-Version: 2.1
-Name: {NAME}
-Version: {_version()}
-Summary: {SUMMARY}
-License: MIT
-License-File: LICENSE
-Classifier: License :: OSI Approved :: MIT License
-Classifier: Operating System :: POSIX :: Linux
-Classifier: Programming Language :: C++
-Classifier: Programming Language :: Python :: 3
-Classifier: Typing :: Typed
-Requires-Python: >=3.9
-Requires-Dist: numpy (>=1.20)
-Description-Content-Type: text/markdown
-
-""" + (ROOT / "docs/python.md").read_text(encoding="utf-8")
+    lines = ["Metadata-Version: 2.1", f"Name: {NAME}", f"Version: {_version()}",
+             f"Summary: {PROJECT['description']}", "License: MIT",
+             f"License-File: {PROJECT['license']['file']}"]
+    lines += [f"Classifier: {name}" for name in PROJECT["classifiers"]]
+    lines.append(f"Requires-Python: {PROJECT['requires-python']}")
+    lines += [f"Requires-Dist: {name}" for name in PROJECT["dependencies"]]
+    lines.append("Description-Content-Type: text/markdown")
+    return "\n".join(lines) + "\n\n" + (ROOT / PROJECT["readme"]).read_text(encoding="utf-8")
 
 
 def _wheel_information():
@@ -117,7 +110,7 @@ def _write_information(write):
     """Calls write(name, bytes) for the files of the directory *.dist-info but RECORD."""
     write("METADATA", _metadata().encode())
     write("WHEEL", _wheel_information().encode())
-    write("LICENSE", (ROOT / "LICENSE").read_bytes())
+    write("LICENSE", (ROOT / PROJECT["license"]["file"]).read_bytes())
 
 
 # --- the hooks --------------------------------------------------------------------------------

@@ -231,12 +231,17 @@ def check_host(root, report):
 
 
 def check_users(root, report):
-    """The tool sees the public headers only; the reference model nothing of the library."""
+    """The tool sees the public headers only, the Python module the facade's and the tool's core; the
+    reference model nothing of the library."""
     for path in sorted(root.glob("tools/**/*")):
         if path.suffix in (".h", ".cpp"):
             for number, _, name in includes(read_lines(path)):
                 if "Kq_" in name and name not in PUBLIC:
                     report.add(path, number, f"{name} is internal")
+    for path in sorted(root.glob("python/src/*")):
+        for number, _, name in includes(read_lines(path)):
+            if "Kq_" in name and name != FACADE:
+                report.add(path, number, f"{name} is not the facade's header")
     for path in sorted(root.glob("tests/reference/*")):
         for number, _, name in includes(read_lines(path)):
             if "Kq_" in name:
@@ -245,7 +250,8 @@ def check_users(root, report):
 
 def check_all_ascii(root, report):
     files = [root / "dev", root / "CMakeLists.txt"]
-    for folder in ("include", "s", "port", "tools", "scripts", "cmake", "tests", "bench", "fuzz"):
+    for folder in ("include", "s", "port", "tools", "scripts", "cmake", "python", "tests", "bench",
+                   "fuzz"):
         files += [path for path in root.glob(f"{folder}/**/*")
                   if path.suffix in (".h", ".cpp", ".py", ".sh", ".txt", ".cmake")]
     for path in sorted(files):

@@ -132,7 +132,7 @@ py::object EvalMany(const Equation& equation, const py::object& assignments)
     table.columnStride = info.strides[1];
     table.itemSize = static_cast<size_t>(info.itemsize);
 
-    const py::object results = NewArray(py::make_tuple(table.numRows));
+    py::object results = NewArray(py::make_tuple(table.numRows));
     const py::buffer_info resultsInfo = py::buffer(results).request(true);
     // A column takes as much work as that many rows through the expression. Of an init value the
     // expression is large and the digits are a column that only needs copying.
@@ -154,7 +154,7 @@ py::object TruthTable(const Equation& equation)
     if (numInputs > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(numInputs));
     const uint64_t numRows = uint64_t(1) << numInputs;
-    const py::object table = NewArray(py::make_tuple(numRows, numInputs + 1));
+    py::object table = NewArray(py::make_tuple(numRows, numInputs + 1));
     const py::buffer_info info = py::buffer(table).request(true);
     const std::vector<uint64_t> column = ColumnOf(equation);
     uint8_t* byte = DataOf(info);
@@ -173,7 +173,7 @@ py::object Column(const Equation& equation)
 {
     const std::vector<uint64_t> words = ColumnOf(equation);
     const uint64_t numRows = uint64_t(1) << equation.NumInputs();
-    const py::object column = NewArray(py::make_tuple(numRows));
+    py::object column = NewArray(py::make_tuple(numRows));
     const py::buffer_info info = py::buffer(column).request(true);
     for (uint64_t row = 0; row < numRows; row += 64) {
         UnpackBits(words[row / 64], std::min<uint64_t>(64, numRows - row), DataOf(info) + row);

@@ -74,7 +74,7 @@ py::object FromInit(const py::object& type, const py::object& value, const py::o
         }
         text = BinaryDigits(number, names);
     }
-    const py::object made = type(text, names, lsbFirst);
+    py::object made = type(text, names, lsbFirst);
     if (made.cast<const Equation&>().Get().IsExpression()) {
         booleq::RefusalReport report;
         report.code = "init-digit";

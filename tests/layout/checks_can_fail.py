@@ -30,7 +30,7 @@ class InCopy(unittest.TestCase):
 class Includes(InCopy):
     def setUp(self):
         super().setUp()
-        for folder in ("include", "s", "port", "tools"):
+        for folder in ("include", "s", "port", "tools", "python"):
             shutil.copytree(ROOT / folder, self.copy / folder)
         self.before = self.check()[1]
 
@@ -127,6 +127,10 @@ class Includes(InCopy):
     def test_tool_that_uses_internals(self):
         self.append("tools/booleq/text.cpp", '#include "Kq_BoolEquationImpStore.h"\n')
         self.expect("tools/booleq/text.cpp", "is internal")
+
+    def test_python_module_that_uses_the_engine(self):
+        self.append("python/src/reports.cpp", "#include <Kq_BoolEquationImp.h>\n")
+        self.expect("python/src/reports.cpp", "is not the facade's header")
 
     def test_model_that_uses_the_library(self):
         self.append("tests/reference/model.cpp", "#include <Kq_BoolEquation.h>\n")

@@ -15,6 +15,8 @@ namespace booleq_python {
 
 namespace {
 
+constexpr size_t kNodesLikeLookUps = 40;
+
 // A packed column that an array shows.
 struct Words {
     std::vector<uint64_t> words;
@@ -77,10 +79,9 @@ void ForEachBlock(const Table& table, const py::object& array, uint8_t* results,
 }
 
 // 64 rows a word, through the expression.
-void EvalByWords(const Equation& equation, const Table& table, const py::object& array,
+void EvalByWords(const booleq::Expression& expression, const Table& table, const py::object& array,
                  uint8_t* results)
 {
-    const booleq::Expression expression = booleq::ToExpression(equation.Get());
     std::vector<uint64_t> inputs;
     std::vector<uint64_t> stack;
     ForEachBlock(table, array, results, [&](const RowPacker& packer) {
@@ -134,17 +135,24 @@ py::object EvalMany(const Equation& equation, const py::object& assignments)
 
     py::object results = NewArray(py::make_tuple(table.numRows));
     const py::buffer_info resultsInfo = py::buffer(results).request(true);
-    // A column takes as much work as that many rows through the expression. Of an init value the
-    // expression is large and the digits are a column that only needs copying.
+    uint8_t* const bytes = DataOf(resultsInfo);
     const bool hasColumn = table.numColumns <= booleq::kMaxFunctionInputs;
     const uint64_t numTableRows = hasColumn ? uint64_t(1) << table.numColumns : UINT64_MAX;
-    const bool isInit = !equation.Get().IsExpression();
-    if (numTableRows <= (isInit ? 64 : 1) * static_cast<uint64_t>(table.numRows))
-        EvalByColumn(equation, table, array, DataOf(resultsInfo));
-    else if (isInit)
-        EvalByRows(equation, table, array, DataOf(resultsInfo));
+    if (!equation.Get().IsExpression()) {
+        // The digits are a column that only needs copying; the expression would be large.
+        if (numTableRows <= 64 * static_cast<uint64_t>(table.numRows))
+            EvalByColumn(equation, table, array, bytes);
+        else
+            EvalByRows(equation, table, array, bytes);
+        return results;
+    }
+    // A column takes as much work as that many rows through the expression, and then a look-up for
+    // each row, as much as some forty nodes for 64 rows.
+    const booleq::Expression expression = booleq::ToExpression(equation.Get());
+    if (numTableRows <= table.numRows && expression.nodes.size() > kNodesLikeLookUps)
+        EvalByColumn(equation, table, array, bytes);
     else
-        EvalByWords(equation, table, array, DataOf(resultsInfo));
+        EvalByWords(expression, table, array, bytes);
     return results;
 }
 

@@ -18,6 +18,14 @@ uint64_t LoadBytes(const uint8_t* bytes)
     return word;
 }
 
+uint64_t LoadSome(const uint8_t* bytes, size_t count)
+{
+    uint64_t word = 0;
+    for (size_t index = 0; index < count; ++index)
+        word |= static_cast<uint64_t>(bytes[index]) << (8 * index);
+    return word;
+}
+
 void StoreBytes(uint64_t word, uint8_t* bytes)
 {
     for (unsigned int index = 0; index < 8; ++index)
@@ -102,29 +110,35 @@ const uint8_t* RowPacker::Narrow(size_t firstRow)
 // 'end' is where the memory ends that may be read; null: nothing beyond each row.
 bool RowPacker::PackBytes(const uint8_t* rows, std::ptrdiff_t rowStride, const uint8_t* end)
 {
-    for (size_t row = 0; row < m_num_rows; ++row) {
-        const uint8_t* const bytes = rows + static_cast<std::ptrdiff_t>(row) * rowStride;
-        for (size_t group = 0; group < m_num_groups; ++group) {
-            const uint8_t* const first = bytes + 8 * group;
-            const size_t numLeft = m_table.numColumns - 8 * group;
-            uint64_t word = 0;
-            if (numLeft >= 8) {
-                word = LoadBytes(first);
-            } else if (end && end - first >= 8) {
-                word = LoadBytes(first) & ((uint64_t(1) << (8 * numLeft)) - 1);
-            } else {
-                for (size_t index = 0; index < numLeft; ++index)
-                    word |= static_cast<uint64_t>(first[index]) << (8 * index);
-            }
-            if ((word & ~kLowBits) != 0) {
-                const auto bit = static_cast<size_t>(__builtin_ctzll(word & ~kLowBits));
-                m_fault = {true, m_fault.row + row, 8 * group + bit / 8};
-                return false;
-            }
-            m_groups[kBlockRows * group + row] = HighFirst(word);
+    uint64_t bad = 0; // bits that neither 0 nor 1 has, of all rows
+    for (size_t group = 0; group < m_num_groups; ++group) {
+        const size_t numLeft = std::min<size_t>(8, m_table.numColumns - 8 * group);
+        const uint64_t mask = ~uint64_t(0) >> (64 - 8 * numLeft);
+        const uint8_t* bytes = rows + 8 * group;
+        uint8_t* const packed = &m_groups[kBlockRows * group];
+        for (size_t row = 0; row < m_num_rows; ++row, bytes += rowStride) {
+            const bool isWhole = numLeft == 8 || (end && end - bytes >= 8);
+            const uint64_t word = isWhole ? LoadBytes(bytes) & mask : LoadSome(bytes, numLeft);
+            bad |= word & ~kLowBits;
+            packed[row] = HighFirst(word);
         }
     }
-    return true;
+    if (bad != 0)
+        FindFault(rows, rowStride);
+    return bad == 0;
+}
+
+// Requires: there is one.
+void RowPacker::FindFault(const uint8_t* rows, std::ptrdiff_t rowStride)
+{
+    for (size_t row = 0; row < m_num_rows; ++row, rows += rowStride) {
+        const uint8_t* const found =
+            std::find_if(rows, rows + m_table.numColumns, [](uint8_t value) { return value > 1; });
+        if (found != rows + m_table.numColumns) {
+            m_fault = {m_fault.row + row, static_cast<size_t>(found - rows)};
+            return;
+        }
+    }
 }
 
 void RowPacker::ToWords(std::vector<uint64_t>& words) const

@@ -20,7 +20,6 @@ struct Table {
 
 // Where a table has another value than 0 and 1.
 struct TableFault {
-    bool isFound = false;
     size_t row = 0;
     size_t column = 0;
 };
@@ -48,6 +47,7 @@ class RowPacker {
 
   private:
     bool PackBytes(const uint8_t* rows, std::ptrdiff_t rowStride, const uint8_t* end);
+    void FindFault(const uint8_t* rows, std::ptrdiff_t rowStride);
     template <class Integer>
     const uint8_t* Narrow(size_t firstRow);
 

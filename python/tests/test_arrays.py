@@ -1,5 +1,6 @@
 """Many rows at once."""
 import gc
+from pathlib import Path
 from typing import Any, Callable, List
 
 import numpy as np
@@ -206,7 +207,7 @@ class TestMemory:
 
         equation = Equation("&".join(f"x{k}" for k in range(30)))
         old = resource.getrlimit(resource.RLIMIT_AS)
-        size = int(open("/proc/self/statm", encoding="ascii").read().split()[0])
+        size = int(Path("/proc/self/statm").read_text(encoding="ascii").split()[0])
         limit = size * resource.getpagesize() + 2 ** 26  # 64 MiB: half of a packed column
         resource.setrlimit(resource.RLIMIT_AS, (limit, old[1]))
         try:

@@ -1,0 +1,257 @@
+"""Nothing is kept that nobody holds: memory of the process and reference counts over many cycles,
+arrays that outlive their equation, callbacks that fail or come back in.
+
+tracemalloc does not see what C++ allocates, so the process itself is measured. Names are the same in
+each cycle: the library keeps a name for the life of the process.
+"""
+import copy
+import ctypes
+import gc
+import pathlib
+import pickle
+import resource
+import sys
+import weakref
+from typing import Any, Callable, Iterator, List, Mapping, cast
+
+import numpy as np
+import pytest
+from booleq import Equation, ParseError
+
+TEXT = "(a & b | c) ^ ~(d ~& 'e[0]') .NOR. (f & g)"
+NAMES = ["a", "b", "c", "d", "'e[0]'", "f", "g"]
+ROWS = np.zeros((200, 7), np.uint8)
+# A leak of one small object a cycle is some hundred bytes; a page more or less is noise.
+NUM_CYCLES = 4000
+MAX_GROWTH = 100 * NUM_CYCLES
+
+
+def resident_bytes() -> int:
+    pages = pathlib.Path("/proc/self/statm").read_text(encoding="ascii").split()[1]
+    return int(pages) * resource.getpagesize()
+
+
+def growth(cycle: Callable[[], object], num_cycles: int) -> int:
+    """How much the process has grown over so many cycles, the first ones not counted."""
+    trim = getattr(ctypes.CDLL(None), "malloc_trim", lambda _: 0)
+
+    def measure() -> int:
+        gc.collect()
+        trim(0)
+        return resident_bytes()
+
+    for _ in range(num_cycles // 4):
+        cycle()
+    before = measure()
+    for _ in range(num_cycles):
+        cycle()
+    return measure() - before
+
+
+def refused(action: Callable[[], object], error: Any) -> None:
+    try:
+        action()
+    except error:
+        return
+    raise AssertionError("not refused")
+
+
+class Broken(Mapping[str, int]):
+    """A mapping that fails when it is asked."""
+
+    def __getitem__(self, name: str) -> int:
+        raise ZeroDivisionError(name)
+
+    def __iter__(self) -> Iterator[str]:
+        return iter(["a"])
+
+    def __len__(self) -> int:
+        return 1
+
+
+def broken_names() -> Iterator[str]:
+    yield "a"
+    raise ZeroDivisionError
+
+
+def change(name: str) -> int:
+    EQUATION[name] = 1 - EQUATION[name]
+    return EQUATION[name]
+
+
+EQUATION = Equation(TEXT)
+INIT = Equation.from_init(0x123456789abcdef, NAMES)
+CYCLES = {
+    "construction": lambda: Equation(TEXT),
+    "construction over inputs": lambda: Equation(TEXT, NAMES[::-1], True),
+    "init value": lambda: Equation.from_init("0x123456789abcdef0123456789abcdef0", NAMES),
+    "init value of an int": lambda: Equation.from_init(2 ** 128 - 5, NAMES, lsb_first=True),
+    "tree of an init value": lambda: len(Equation.from_init("0x1234", NAMES[:4]).tree()),
+    "refused text": lambda: refused(lambda: Equation(TEXT + " &"), ParseError),
+    "refused structure": lambda: refused(lambda: Equation("(a && b) | c"), ParseError),
+    "refused NUL": lambda: refused(lambda: Equation("a\0b"), ParseError),
+    "refused surrogate": lambda: refused(lambda: Equation("\ud800"), UnicodeError),
+    "refused name": lambda: refused(lambda: Equation(TEXT, ["a", "?"]), ValueError),
+    "refused list": lambda: refused(lambda: Equation(TEXT, "abc"), TypeError),
+    "refused int": lambda: refused(lambda: Equation.from_init(2 ** 128, NAMES), ValueError),
+    "names that fail": lambda: refused(lambda: Equation(TEXT, broken_names()), ZeroDivisionError),
+    "values that fail": lambda: refused(lambda: EQUATION(Broken()), ZeroDivisionError),
+    "unknown name": lambda: refused(lambda: EQUATION["z"], KeyError),
+    "wrong value": lambda: refused(lambda: EQUATION(a=2), ValueError),
+    "value": lambda: EQUATION({"a": 1, "'e[0]'": 1}, b=1),
+    "variables": lambda: (change("a"), dict(EQUATION)),
+    "renderings": lambda: (EQUATION.primary, EQUATION.alt3, EQUATION.hex_init, repr(EQUATION)),
+    "eval_many": lambda: EQUATION.eval_many(ROWS),
+    "eval_many of an init value": lambda: INIT.eval_many(ROWS[:3]),
+    "eval_many of another order": lambda: EQUATION.eval_many(ROWS.T.astype(">i8").T),
+    "wrong rows": lambda: refused(lambda: EQUATION.eval_many(ROWS + 2), ValueError),
+    "wrong shape": lambda: refused(lambda: EQUATION.eval_many(ROWS[:, 1:]), ValueError),
+    "wrong kind": lambda: refused(lambda: EQUATION.eval_many(ROWS * 0.5), TypeError),
+    "truth table": EQUATION.truth_table,
+    "column": EQUATION.column,
+    "packed column": lambda: Equation(TEXT).packed_column()[:1].copy(),
+    "packed column, a view": lambda: Equation(TEXT).packed_column()[1:],
+    "tree": EQUATION.tree,
+    "picture as text": EQUATION.tree_dot,
+    "equality": lambda: (EQUATION == INIT, EQUATION == 3, hash(Equation(TEXT)), EQUATION in {INIT}),
+    "equivalence": lambda: EQUATION.equivalent(INIT),
+    "order": lambda: INIT.permute(NAMES[::-1]),
+    "copies": lambda: (copy.copy(EQUATION), copy.deepcopy(INIT)),
+    "pickle": lambda: pickle.loads(pickle.dumps(EQUATION)),
+    "table for people": EQUATION._repr_html_,
+}
+SLOW_CYCLES = {"lint": lambda: Equation("a | b & c").lint(),
+               "explain": lambda: Equation("s & a | (~s & b)").explain()}
+
+
+@pytest.mark.parametrize("name", CYCLES)
+def test_no_cycle_leaves_anything(name: str) -> None:
+    assert growth(CYCLES[name], NUM_CYCLES) < MAX_GROWTH
+
+
+@pytest.mark.parametrize("name", SLOW_CYCLES)
+def test_no_slow_cycle_leaves_anything(name: str) -> None:
+    assert growth(SLOW_CYCLES[name], 400) < 1000 * 400
+
+
+def test_a_leak_would_be_found() -> None:
+    """One equation a cycle, and a packed column of two words, are more than the bound."""
+    kept: List[object] = []
+    assert growth(lambda: kept.append(Equation(TEXT)), NUM_CYCLES) > MAX_GROWTH
+    column: List[object] = []
+    assert growth(lambda: column.append(EQUATION.packed_column()), NUM_CYCLES) > MAX_GROWTH
+
+
+def test_large_columns_go_with_their_arrays() -> None:
+    """8 MB each, by an array, a view of it and an exception that holds neither."""
+    equation = Equation("^".join(f"n{place}" for place in range(26)))
+    keep = equation.packed_column()
+    before = resident_bytes()
+    for _ in range(12):
+        array = equation.packed_column()
+        view = array[::2]
+        del array
+        assert int(view[1]) == int(keep[2])
+        del view
+    assert resident_bytes() - before < 3 * keep.nbytes
+
+
+def test_arrays_outlive_their_equation() -> None:
+    equation = Equation.from_init(0xfedcba9876543210, NAMES[:6])
+    packed, column, table = equation.packed_column(), equation.column(), equation.truth_table()
+    results = equation.eval_many(table[:, :-1])
+    alive = weakref.ref(equation)
+    del equation
+    assert alive() is None
+    for _ in range(1000):  # what was freed is written to again
+        Equation(TEXT).packed_column()
+    assert packed.tolist() == [0xfedcba9876543210]
+    bits = [0xfedcba9876543210 >> row & 1 for row in range(64)]
+    assert column.tolist() == results.tolist() == table[:, -1].tolist() == bits
+
+
+def test_reference_counts_stay() -> None:
+    text, names = TEXT + " ", list(NAMES)
+    array = ROWS.copy()
+    watched: List[Any] = [text, names, *names, array, array.dtype, None, True, Equation, ParseError,
+                          np.dtype("uint8"), np.dtype("uint64"), type(EQUATION.explain()), EQUATION,
+                          type(INIT.equivalent(INIT)), 1, (), ""]
+    before = [sys.getrefcount(item) for item in watched]
+    num_cycles, no_bit = 500, cast(int, None)
+    for _ in range(num_cycles):
+        equation = Equation(text, names)
+        equation[names[0]] = True
+        equation(dict.fromkeys(names, 1))
+        equation.eval_many(array)
+        equation.equivalent(EQUATION).equal
+        equation.get(names[1]), names[2] in equation, list(equation), equation.inputs
+        refused(lambda: equation.eval_many(array[:, 1:]), ValueError)
+        refused(lambda: Equation(text + "&", names), ParseError)
+        refused(lambda: Equation(text, names + names), ValueError)
+        refused(lambda: equation(a=no_bit), TypeError)
+        equation == text, equation != EQUATION, hash(equation)
+        pickle.loads(pickle.dumps(equation)), copy.deepcopy(equation)
+        equation.column(), equation.packed_column(), equation.tree()
+    del equation
+    gc.collect()
+    changes = {repr(item)[:40]: sys.getrefcount(item) - count
+               for item, count in zip(watched, before)}
+    assert all(abs(change) < num_cycles / 4 for change in changes.values()), changes
+
+
+def test_an_exception_holds_no_equation() -> None:
+    equation = Equation(TEXT)
+    alive = weakref.ref(equation)
+    try:
+        equation.eval_many(ROWS + 3)
+    except ValueError as error:
+        held = error.with_traceback(None)
+    del equation
+    assert alive() is None and "assignments[0, 0]" in str(held)
+
+
+class ComesBack:
+    """A value that uses the equation while the equation asks for it."""
+
+    def __init__(self, equation: Equation, value: int) -> None:
+        self.equation, self.value = equation, value
+
+    def __index__(self) -> int:
+        for name in self.equation:
+            self.equation[name] = 1
+        self.equation(a=0)
+        refused(lambda: Equation("x & &"), ParseError)
+        return self.value
+
+
+def test_values_that_come_back_in() -> None:
+    for value in (0, 1):
+        equation = Equation("a & b")
+        assert equation({"b": 1}, a=ComesBack(equation, value)) == value
+        equation["a"] = ComesBack(equation, value)
+        assert dict(equation) == {"a": value, "b": 1}
+        refused(lambda: equation.__setitem__("a", ComesBack(equation, 2)), ValueError)
+        assert equation["a"] == 1, "what the value itself has set"
+
+
+def test_an_array_that_comes_back_in() -> None:
+    equation = Equation("a ^ b")
+
+    class Rows:
+        def __array__(self, dtype: Any = None) -> Any:
+            equation["a"] = 1
+            assert equation.eval_many([[1, 0]]).tolist() == [1]
+            refused(lambda: Equation("x & &"), ParseError)
+            return np.array([[1, 1], [0, 1]], np.int16)
+
+    assert equation.eval_many(Rows()).tolist() == [0, 1]
+    assert equation["a"] == 1
+
+
+def test_names_that_come_back_in() -> None:
+    def names() -> Iterator[str]:
+        for name in ("a", "b"):
+            refused(lambda: Equation("x & &"), ParseError)
+            yield name if Equation(name)() == 0 else ""
+
+    assert Equation("b & a", names()).inputs == ("a", "b")

@@ -4,8 +4,8 @@
 usage: check_version.py VERSION SOURCES [PREFIX]
 
 VERSION is what CMakeLists.txt says in project(). Below SOURCES no other file may state it, but for
-CHANGELOG.md, whose newest release must be it, with a date; a pyproject.toml takes it from the build
-(dynamic). PREFIX is an installed tree: its packages for CMake and pkg-config, its libraries, its
+CHANGELOG.md, whose newest release must be it, with a date; a pyproject.toml that describes its project
+takes it from the build (dynamic). PREFIX is an installed tree: its packages for CMake and pkg-config, its libraries, its
 tool and its Python module, each where it is there, must say VERSION.
 Prints one line for each violation.  Exit status: 1 when there is one.
 """
@@ -53,7 +53,7 @@ def check_pyproject(path, text):
     lines = project[1] if project else ""
     if re.search(r"^version\s*=", lines, re.M):
         yield f"{path}: states a version; write dynamic = [\"version\"] instead"
-    elif not re.search(r"^dynamic\s*=\s*\[[^\]]*\"version\"", lines, re.M):
+    elif project and not re.search(r"^dynamic\s*=\s*\[[^\]]*\"version\"", lines, re.M):
         yield f"{path}: does not say dynamic = [\"version\"] in [project]"
 
 

@@ -243,6 +243,7 @@ class Version(InCopy):
     def test_pyproject_that_states_one(self):
         self.expect("states a version", pyproject_toml='[project]\nversion = "1.2.4"\n[tool]\n')
         self.expect("does not say dynamic", pyproject_toml='[project]\nname = "example"\n')
+        self.assertEqual(self.check(pyproject_toml="[build-system]\nrequires = []\n"), (0, ""))
         self.assertEqual(self.check(pyproject_toml='[project]\ndynamic = ["version"]\n'), (0, ""))
 
     def test_installed_package_of_another_version(self):

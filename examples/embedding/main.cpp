@@ -132,6 +132,7 @@ int Run(const Options& options)
         return 2;
     }
     int status = 0;
+    bool isTraced = false;
     Rule rule;
     std::string text;
     for (size_t number = 1; std::getline(stream, text); ++number) {
@@ -153,9 +154,13 @@ int Run(const Options& options)
         const std::vector<std::string> missing = SetSignals(rule, options.signals);
         if (!Report(rule, place, missing))
             status = std::max(status, 1);
-        if (rule.name == options.traced)
+        if (rule.name == options.traced) {
             Trace(rule, place, options.maxTraceLines);
+            isTraced = true;
+        }
     }
+    if (!options.traced.empty() && !isTraced)
+        Log("warning", options.file + ": no rule " + options.traced + " was there to be traced");
     return status;
 }
 

@@ -80,6 +80,11 @@ class Embedding(unittest.TestCase):
         self.assertEqual(output, "".join(LOG.splitlines(True)[:4]) +
                          "warning press.rules:2: trace cut: more than 3 lines\n" + REST)
 
+    def test_trace_of_a_rule_that_is_not_there(self):
+        self.assertEqual(self.with_rules("a = x\n", "x=1", "--trace", "b"),
+                         (0, "info    r:1: a holds; it changes with each of x\n"
+                             "warning r: no rule b was there to be traced\n", ""))
+
     def test_verdicts(self):
         self.assertEqual(self.with_rules("a = x & y\n", "x=1", "y=1"),
                          (0, "info    r:1: a holds; it changes with each of x, y\n", ""))

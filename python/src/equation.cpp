@@ -36,7 +36,7 @@ size_t Mix(size_t hash, size_t value)
 
 py::tuple RequireInputs(const py::object& inputs)
 {
-    const py::tuple names = RequireNames(inputs);
+    py::tuple names = RequireNames(inputs);
     const std::vector<std::string> encoded = EncodeAll(names);
     // The library would read such a name up to the NUL.
     for (const std::string& name : encoded)

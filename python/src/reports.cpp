@@ -16,7 +16,7 @@ namespace booleq_python {
 
 namespace {
 
-using py::literals::operator""_a;
+using namespace pybind11::literals; // "name"_a
 
 // A tree that is too large to look at is not drawn.
 constexpr size_t kMaxShownNodes = 300;

@@ -9,5 +9,6 @@ cache=$3
 tests=$4
 mkdir -p -- "$cache"
 cd -- "$cache" # stubtest keeps its cache where it stands
-MYPYPATH=$PYTHONPATH "$python" -m mypy --config-file "$configuration" --cache-dir "$cache" "$tests"
+MYPYPATH=$PYTHONPATH "$python" -m mypy --config-file "$configuration" --cache-dir "$cache" \
+    "$tests" "$tests/../bench"
 "$python" -m mypy.stubtest booleq --mypy-config-file "$configuration"

@@ -62,6 +62,11 @@ Equation::Equation(const py::object& text, const py::object& inputs, bool lsbFir
         m_numbers[m_inputs[input]] = input;
 }
 
+void* Equation::operator new(size_t /*size*/)
+{
+    throw py::type_error("this Equation was made without a text: Equation.__init__ did not run");
+}
+
 booleq::Reading Equation::GetReading() const
 {
     booleq::Reading reading;

@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -30,6 +31,15 @@ class Equation {
     // 'inputs' is None or an iterable of names.
     // Fails: booleq.ParseError; TypeError and ValueError for what is no text or no list of names.
     Equation(const py::object& text, const py::object& inputs, bool lsbFirst);
+
+    Equation(const Equation& other) = default;
+    Equation& operator=(const Equation& other) = delete;
+    ~Equation() = default;
+
+    // The binding asks for memory here when somebody uses an object whose __init__ never ran.
+    // Others are made by MakeEquation.  Fails: TypeError, always.
+    static void* operator new(size_t size);
+    static void operator delete(void* memory) { ::operator delete(memory); }
 
     const Kq_BoolEquation& Get() const { return m_equation; }
     const py::str& Text() const { return m_text; }
@@ -60,6 +70,13 @@ class Equation {
     mutable bool m_has_hash = false;
     mutable size_t m_hash = 0;
 };
+
+// A new one for Python to own, of the arguments of a constructor.
+template <class... Arguments>
+std::unique_ptr<Equation> MakeEquation(const Arguments&... arguments)
+{
+    return std::unique_ptr<Equation>(::new Equation(arguments...));
+}
 
 // Row k of the equation's table is bit k % 64 of word k / 64.
 // Fails: ValueError for more than 30 inputs; what a signal's handler raises.

@@ -82,7 +82,7 @@ py::object Equivalent(const Equation& equation, const Equation& other)
     return ResultClass("Equivalence")(equality.IsEqual(), counterexample, values);
 }
 
-Equation Permute(const Equation& equation, const py::object& inputs)
+std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& inputs)
 {
     const py::tuple names = RequireInputs(inputs);
     const std::vector<std::string> order = EncodeAll(names);
@@ -95,8 +95,9 @@ Equation Permute(const Equation& equation, const py::object& inputs)
     const booleq::Function function = FunctionOf(equation).Over(order);
     // A constant has no init value; over one input only the binary form reads back.
     if (order.empty())
-        return Equation(py::str(function.At(0) ? "1" : "0"), names, false);
-    return Equation(py::str(order.size() == 1 ? function.Binary() : function.Hex()), names, false);
+        return MakeEquation(py::str(function.At(0) ? "1" : "0"), names, false);
+    return MakeEquation(py::str(order.size() == 1 ? function.Binary() : function.Hex()), names,
+                        false);
 }
 
 // The text, or None where it is empty.

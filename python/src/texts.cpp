@@ -114,7 +114,7 @@ py::tuple Reduce(const Equation& equation)
 
 void BindConstruction(EquationClass& type)
 {
-    type.def(py::init<const py::object&, const py::object&, bool>(), py::arg("text"),
+    type.def(py::init(&MakeEquation<py::object, py::object, bool>), py::arg("text"),
              py::arg("inputs") = py::none(), py::arg("lsb_first").noconvert() = false,
              "__init__($record, self, text, inputs=None, lsb_first=False)\n--\n\nSee the class.");
     const py::cpp_function fromInit(&FromInit, py::name("from_init"), py::scope(type),
@@ -209,11 +209,11 @@ do not count. Whether two equations are one function is equivalent()'s matter.
 void BindCopies(EquationClass& type)
 {
     type.def(
-        "__copy__", [](const Equation& self) { return Equation(self); },
+        "__copy__", &MakeEquation<Equation>,
         "__copy__($record, self, /)\n--\n\nAn equal equation with the same values, which are its "
         "own.");
     type.def(
-        "__deepcopy__", [](const Equation& self, const py::object&) { return Equation(self); },
+        "__deepcopy__", [](const Equation& self, const py::object&) { return MakeEquation(self); },
         py::arg("memo"), "__deepcopy__($record, self, memo, /)\n--\n\nThe same as a copy.");
     type.def("__reduce__", &Reduce,
              "__reduce__($record, self, /)\n--\n\nFor pickle: text, inputs, flag and values.");

@@ -97,10 +97,7 @@ size_t Equation::FindInput(const py::handle& name) const
                   booleq::Excerpt(booleq::ToStd(m_equation.GetVariables()[input].first));
     if (NumInputs() > kMaxListedInputs)
         listed += " and " + std::to_string(NumInputs() - kMaxListedInputs) + " more";
-    const std::string shown = PyUnicode_Check(name.ptr())
-                                  ? Encode(py::reinterpret_borrow<py::str>(name))
-                                  : std::string(py::repr(name));
-    throw py::key_error("there is no input " + booleq::Excerpt(shown) +
+    throw py::key_error("there is no input " + Shown(name) +
                         (listed.empty() ? "; there are none" : "; the inputs are " + listed));
 }
 
@@ -155,9 +152,8 @@ booleq::Function FunctionOf(const Equation& equation)
 
 unsigned int RequireBit(const py::handle& value, const py::handle& name)
 {
-    const auto fault = [&](const char* text) {
-        return "the value of " + booleq::Excerpt(Encode(py::str(name))) + text +
-               booleq::Excerpt(Encode(py::repr(value)));
+    const auto fault = [&] {
+        return "the value of " + Shown(name) + " must be 0 or 1, not " + Shown(value);
     };
     py::object number = py::reinterpret_borrow<py::object>(value);
     if (!PyLong_Check(value.ptr())) {
@@ -167,14 +163,14 @@ unsigned int RequireBit(const py::handle& value, const py::handle& name)
         number = py::reinterpret_steal<py::object>(PyNumber_Index(number.ptr()));
         if (!number) {
             PyErr_Clear();
-            throw py::type_error(fault(" must be 0 or 1, not "));
+            throw py::type_error(fault());
         }
     }
     if (number.equal(py::int_(0)))
         return 0;
     if (number.equal(py::int_(1)))
         return 1;
-    throw py::value_error(fault(" must be 0 or 1, not "));
+    throw py::value_error(fault());
 }
 
 } // namespace booleq_python

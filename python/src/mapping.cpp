@@ -59,10 +59,11 @@ unsigned int Call(Equation& equation, const py::args& arguments, const py::kwarg
                                  std::string(Py_TYPE(values.ptr())->tp_name));
         const py::list items(values.attr("items")());
         for (const py::handle item : items) {
-            const auto pair = item.cast<py::tuple>();
+            if (!PyTuple_Check(item.ptr()) || py::len(item) != 2)
+                throw py::type_error("items of values must be pairs, not " + Shown(item));
+            const auto pair = py::reinterpret_borrow<py::tuple>(item);
             if (named.contains(pair[0]))
-                throw py::type_error("the value of " + booleq::Excerpt(Encode(py::str(pair[0]))) +
-                                     " is given twice");
+                throw py::type_error("the value of " + Shown(pair[0]) + " is given twice");
             AddItem(equation, pair[0], pair[1], assignment);
         }
     }

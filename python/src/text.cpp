@@ -1,6 +1,6 @@
 #include "text.h"
 
-#include <algorithm>
+#include "core/text.h"
 
 namespace booleq_python {
 
@@ -17,6 +17,15 @@ size_t NumBytes(Py_UCS4 character)
     return character < 0x10000 ? 3 : 4;
 }
 
+std::string EncodeWith(const py::str& text, const char* errors)
+{
+    const auto bytes =
+        py::reinterpret_steal<py::bytes>(PyUnicode_AsEncodedString(text.ptr(), "utf-8", errors));
+    if (!bytes)
+        throw py::error_already_set();
+    return std::string(bytes);
+}
+
 std::string TypeName(const py::handle& value)
 {
     return Py_TYPE(value.ptr())->tp_name;
@@ -26,11 +35,14 @@ std::string TypeName(const py::handle& value)
 
 std::string Encode(const py::str& text)
 {
-    const auto bytes = py::reinterpret_steal<py::bytes>(
-        PyUnicode_AsEncodedString(text.ptr(), "utf-8", "surrogateescape"));
-    if (!bytes)
-        throw py::error_already_set();
-    return std::string(bytes);
+    return EncodeWith(text, "surrogateescape");
+}
+
+std::string Shown(const py::handle& value)
+{
+    const py::str text =
+        PyUnicode_Check(value.ptr()) ? py::reinterpret_borrow<py::str>(value) : py::repr(value);
+    return booleq::Excerpt(EncodeWith(text, "backslashreplace"));
 }
 
 py::str Decode(const std::string& bytes)

@@ -53,6 +53,15 @@ class TestMapping:
         with pytest.raises(KeyError, match="there is no input A; there are none"):
             Equation("1")["A"]
 
+    def test_names_in_messages(self, equation: Equation) -> None:
+        for name, shown in [("\ud800", r"\ud800"), ("\u00fc\n", r"\xc3\xbc\x0a"),
+                            (100 * "x", 60 * "x" + "... (100 bytes)"), (b"A", "b'A'")]:
+            with pytest.raises(KeyError) as caught:
+                equation[name]  # type: ignore[index]
+            assert caught.value.args[0].startswith(f"there is no input {shown}; ")
+        with pytest.raises(ValueError, match="^the value of 'C.0.' must be 0 or 1, not 2$"):
+            equation["'C[0]'"] = 2
+
     def test_many_inputs_are_not_all_listed(self) -> None:
         many = Equation("|".join(f"x{k}" for k in range(25)))
         with pytest.raises(KeyError, match="x18, x19 and 5 more"):
@@ -143,6 +152,15 @@ class TestCall:
     def test_one_positional_argument(self, equation: Equation) -> None:
         with pytest.raises(TypeError):
             equation({}, {})  # type: ignore[call-arg]
+
+    @pytest.mark.parametrize("items", [[1], ["AB"], [("A",)], [("A", 1, 2)], [["A", 1]], 7])
+    def test_items_that_are_no_pairs(self, equation: Equation, items: Any) -> None:
+        class Odd(dict):  # type: ignore[type-arg]
+            def items(self) -> Any:
+                return items
+
+        with pytest.raises(TypeError):
+            equation(Odd())
 
     def test_constants(self) -> None:
         assert Equation("1")() == 1 and Equation("0")() == 0 and Equation("()")() == 0

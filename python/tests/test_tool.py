@@ -1,6 +1,7 @@
 """The module and the tool booleq answer alike: many texts, each command once over all of them.
 
-BOOLEQ_TOOL is the tool, or booleq on the PATH; without one the tests are skipped.
+The tool is BOOLEQ_TOOL, the one built with the module, or booleq on the PATH; without one the tests
+are skipped.
 """
 import json
 import os
@@ -10,13 +11,15 @@ import shutil
 import subprocess
 from typing import Any, Callable, Dict, List, Optional, Sequence, Tuple, TypeVar
 
+import booleq
 import pytest
 import trees
 from booleq import Equation, ParseError
 from hypothesis import given
 from hypothesis import strategies as st
 
-TOOL = shutil.which(os.environ.get("BOOLEQ_TOOL", "booleq"))
+BUILT = pathlib.Path(booleq.__file__).absolute().parents[2] / "tools/booleq/booleq"
+TOOL = os.environ.get("BOOLEQ_TOOL") or shutil.which(BUILT) or shutil.which("booleq")
 LISTED = ["S", "A", "'a,b'", "b"]
 # What a mutation puts into a text: pieces of tokens, characters of one to four bytes, stray bytes.
 PIECES = ["&", "&&", "|", "~", "!", "^", "(", ")", "()", "'", "''", ".", ".XNOR.", ".and.", ".NOT.",

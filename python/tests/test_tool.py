@@ -19,7 +19,7 @@ from hypothesis import given
 from hypothesis import strategies as st
 
 BUILT = pathlib.Path(booleq.__file__).absolute().parents[2] / "tools/booleq/booleq"
-TOOL = os.environ.get("BOOLEQ_TOOL") or shutil.which(BUILT) or shutil.which("booleq")
+TOOL = os.environ.get("BOOLEQ_TOOL") or shutil.which(str(BUILT)) or shutil.which("booleq")
 LISTED = ["S", "A", "'a,b'", "b"]
 # What a mutation puts into a text: pieces of tokens, characters of one to four bytes, stray bytes.
 PIECES = ["&", "&&", "|", "~", "!", "^", "(", ")", "()", "'", "''", ".", ".XNOR.", ".and.", ".NOT.",

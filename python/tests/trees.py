@@ -4,15 +4,14 @@ The same tree is written as a text in this library's syntax and built as a funct
 Hypothesis draws the trees; its profile is fixed, so that a run can be repeated:
 BOOLEQ_EXAMPLES=N draws N times as many, and then other ones in each run.
 """
+import importlib
 import os
 from typing import Any, Dict, List, NamedTuple, Sequence, Tuple, Union
 
 import numpy as np
 import numpy.typing as npt
-import sympy
 from hypothesis import HealthCheck, settings
 from hypothesis import strategies as st
-from sympy.logic import boolalg
 
 FACTOR = int(os.environ.get("BOOLEQ_EXAMPLES", "1"))
 NAMES = ("A", "b", "_c", "d_1", "and", "lambda", "S", "'A[0]'", "'a b'", "''", "'\u00e4\u20ac'",
@@ -139,10 +138,10 @@ def texts(draw: st.DrawFn, tree: Tree, blanks: bool = True) -> str:
     return write(tree)
 
 
-# SymPy says nothing of its types.
-symbol: Any = sympy.Symbol
-truth_table: Any = boolalg.truth_table
-sum_of_products: Any = sympy.SOPform
+# SymPy says nothing of its types, and reading all of it would take mypy long.
+sympy: Any = importlib.import_module("sympy")
+boolalg: Any = importlib.import_module("sympy.logic.boolalg")
+symbol, sum_of_products, truth_table = sympy.Symbol, sympy.SOPform, boolalg.truth_table
 SYMPY = {"AND": boolalg.And, "OR": boolalg.Or, "XOR": boolalg.Xor, "NAND": boolalg.Nand,
          "NOR": boolalg.Nor, "NXOR": boolalg.Xnor}
 

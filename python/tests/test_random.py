@@ -339,7 +339,7 @@ def test_what_is_too_large_is_refused_before_it_is_made() -> None:
     lambda equation: Equation("A").equivalent(equation), lambda equation: equation.permute(["A"])])
 def test_an_equation_that_was_never_made(question: Any) -> None:
     """__new__ alone makes none, and that is said instead of reading what is not there."""
-    with pytest.raises(TypeError):
+    with pytest.raises(TypeError, match="without a text"):
         question(Equation.__new__(Equation))
 
 

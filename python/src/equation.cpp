@@ -89,8 +89,9 @@ std::vector<std::string> Equation::InputBytes() const
 
 size_t Equation::FindInput(const py::handle& name) const
 {
-    if (HasInput(name))
-        return m_numbers[name].cast<size_t>();
+    const py::object number = FindNumber(name);
+    if (number)
+        return number.cast<size_t>();
     std::string listed;
     for (size_t input = 0; input < std::min(NumInputs(), kMaxListedInputs); ++input)
         listed += (input == 0 ? "" : ", ") +
@@ -103,10 +104,23 @@ size_t Equation::FindInput(const py::handle& name) const
 
 bool Equation::HasInput(const py::handle& name) const
 {
-    const int found = PyDict_Contains(m_numbers.ptr(), name.ptr());
-    if (found < 0)
+    return static_cast<bool>(FindNumber(name));
+}
+
+// Null for what is no input. Strs that stand for the same bytes are one name: escaped bytes that
+// together are UTF-8 are listed as the character.
+py::object Equation::FindNumber(const py::handle& name) const
+{
+    PyObject* number = PyDict_GetItemWithError(m_numbers.ptr(), name.ptr());
+    if (!number && !PyErr_Occurred() && PyUnicode_Check(name.ptr()) &&
+        !PyUnicode_IS_ASCII(name.ptr())) {
+        const py::object same = SameInBytes(py::reinterpret_borrow<py::str>(name));
+        if (same)
+            number = PyDict_GetItemWithError(m_numbers.ptr(), same.ptr());
+    }
+    if (!number && PyErr_Occurred())
         throw py::error_already_set();
-    return found != 0;
+    return py::reinterpret_borrow<py::object>(number);
 }
 
 void Equation::SetValue(size_t input, unsigned int value)

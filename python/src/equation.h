@@ -61,6 +61,8 @@ class Equation {
     size_t Hash() const;
 
   private:
+    py::object FindNumber(const py::handle& name) const;
+
     Kq_BoolEquation m_equation;
     py::str m_text;
     py::object m_given_inputs; // None without a list

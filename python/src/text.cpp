@@ -54,6 +54,17 @@ py::str Decode(const std::string& bytes)
     return py::reinterpret_steal<py::str>(text);
 }
 
+py::object SameInBytes(const py::str& text)
+{
+    try {
+        return Decode(Encode(text));
+    } catch (const py::error_already_set& error) {
+        if (!error.matches(PyExc_UnicodeEncodeError))
+            throw;
+        return {};
+    }
+}
+
 py::tuple DecodeAll(const std::vector<std::string>& names)
 {
     py::tuple decoded(names.size());

@@ -16,6 +16,8 @@ namespace py = pybind11;
 // Fails: UnicodeEncodeError for a surrogate that stands for no byte.
 std::string Encode(const py::str& text);
 py::str Decode(const std::string& bytes);
+// What Decode makes of its bytes; null for a surrogate that stands for no byte.
+py::object SameInBytes(const py::str& text);
 // Any object for a message, in printable ASCII and not too long: a str as it is, others as repr.
 std::string Shown(const py::handle& value);
 py::tuple DecodeAll(const std::vector<std::string>& names);

@@ -183,6 +183,16 @@ class TestText:
         assert equation.tree()[2].token == name
         assert eval(repr(equation)) == equation
 
+    def test_strs_of_the_same_bytes_are_one_name(self) -> None:
+        """Two escaped bytes that together are UTF-8 come back as the character."""
+        equation = Equation("A & '\udcc3\udcbc'")
+        assert equation.inputs == ("A", "'\u00fc'")
+        for name in equation.inputs[1], "'\udcc3\udcbc'":
+            assert name in equation
+            assert equation({name: 1}, A=1) == 1
+        for name in "'\udcc3'", "'\udcbc\udcc3'", "'\ud800'":
+            assert name not in equation
+
     def test_a_surrogate_that_stands_for_no_byte(self) -> None:
         with pytest.raises(UnicodeEncodeError):
             Equation("'\ud800'")

@@ -74,7 +74,7 @@ python3 (<< ${Python_VERSION_MAJOR}.${kq_next_minor})")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_NAME python3-booleq)
   set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
   set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS
-      "${kq_library_package} (>= ${PROJECT_VERSION}), ${kq_python_dependency}")
+      "${kq_library_package} (>= ${PROJECT_VERSION}), ${kq_python_dependency}, python3-numpy")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_SUGGESTS "kq-boolequation-doc")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA
       "${CMAKE_CURRENT_LIST_DIR}/packages/python/postinst"
@@ -82,7 +82,8 @@ python3 (<< ${Python_VERSION_MAJOR}.${kq_next_minor})")
   set(CPACK_COMPONENT_PYTHON_DESCRIPTION "Boolean equations and init values - module for Python 3
 ${kq_about}
 
-This package holds the module booleq for Python 3.")
+This package holds the module booleq for Python 3. Tables and columns come as
+arrays of NumPy.")
 endif()
 
 set(CPACK_DEBIAN_DOCUMENTATION_PACKAGE_NAME kq-boolequation-doc)
@@ -92,7 +93,7 @@ set(CPACK_DEBIAN_DOCUMENTATION_PACKAGE_MULTIARCH foreign)
 set(CPACK_COMPONENT_DOCUMENTATION_DESCRIPTION "Boolean equations and init values - documentation
 ${kq_about}
 
-This package holds the documents of the library and of the command-line tool
-booleq.")
+This package holds the documents of the library, of the command-line tool
+booleq, and of the module for Python, as Markdown and as HTML.")
 
 include(CPack)

@@ -186,8 +186,9 @@ tool_finds_library() {
     in_root user 60 ldconfig -p | grep -F "${library##*/} "
 }
 
-python_imports() {
-    in_root user 60 python3 -c 'import booleq; print(booleq.__file__)'
+module_answers() {
+    in_root user 60 python3 -c 'from booleq import Equation; print(Equation("A & ~B").hex_init)' |
+        grep -x 0x4
 }
 
 man_page_shows() {
@@ -242,11 +243,12 @@ test_user() {
     try "the tool answers" tool_answers
     try "the tool runs with the packaged library" tool_finds_library
     if is_ours python3-booleq; then
-        try "Python imports the module" python_imports
+        try "the module for Python answers" module_answers
     fi
 }
 
 test_developer() {
+    local document
     make_root developer
     in_root developer 300 apt-get -q update >"$logs/update.log" 2>&1 || die "no lists of packages"
     try "Debian's own packages for developers" install_tools
@@ -258,8 +260,9 @@ test_developer() {
     mount --bind -o ro "$repository" "$directory/developer/source"
     try "the man page shows" man_page_shows
     try "the completion loads" completion_loads
-    try "commands of README" readme_commands README.md
-    try "commands of docs/booleq.md" readme_commands docs/booleq.md
+    for document in $(cd -- "$repository" && grep -lx '```console' -- README.md docs/*.md); do
+        try "commands of $document" readme_commands "$document"
+    done
     try "program of README, with CMake and with pkg-config" readme_program
     umount -- "$directory/developer/source"
     rmdir -- "$directory/developer/source"

@@ -15,8 +15,9 @@ function(kq_gzip file)
 endfunction()
 
 # The licence as a copyright file that machines can read. Its first line is its name, then comes
-# the line of the copyright, then the terms.
-function(kq_copyright variable)
+# the line of the copyright, then the terms. What others made is in COMPONENT.copyright, under the
+# same terms.
+function(kq_copyright variable component)
   file(READ "${CPACK_RESOURCE_FILE_LICENSE}" text)
   if(NOT text MATCHES "^MIT License\n\nCopyright (\\(c\\) )?([0-9][^\n]*)\n\n(.*[^\n])\n*$")
     message(FATAL_ERROR "${CPACK_RESOURCE_FILE_LICENSE}: the packages' copyright files are made of "
@@ -26,17 +27,22 @@ function(kq_copyright variable)
   set(holder "${CMAKE_MATCH_2}")
   string(REGEX REPLACE "\n\n" "\n.\n" terms "${CMAKE_MATCH_3}")
   string(REGEX REPLACE "\n" "\n " terms "${terms}")
+  set(others "")
+  if(EXISTS "${CMAKE_CURRENT_LIST_DIR}/${component}.copyright")
+    file(READ "${CMAKE_CURRENT_LIST_DIR}/${component}.copyright" others)
+  endif()
   set(${variable} "Format: https://www.debian.org/doc/packaging-manuals/copyright-format/1.0/
 Upstream-Name: Kq_BoolEquation
 
 Files: *
 Copyright: ${holder}
 License: Expat
+
+${others}License: Expat
  ${terms}
 " PARENT_SCOPE)
 endfunction()
 
-kq_copyright(copyright)
 string(TIMESTAMP date "%a, %d %b %Y %H:%M:%S +0000" UTC)
 
 foreach(component IN LISTS CPACK_COMPONENTS_ALL)
@@ -51,6 +57,7 @@ foreach(component IN LISTS CPACK_COMPONENTS_ALL)
     kq_gzip("${page}")
   endforeach()
   set(documents "${tree}/share/doc/${package}")
+  kq_copyright(copyright "${component}")
   file(WRITE "${documents}/copyright" "${copyright}")
   file(WRITE "${documents}/changelog"
 "${CPACK_DEBIAN_PACKAGE_SOURCE} (${CPACK_PACKAGE_VERSION}) unstable; urgency=medium

@@ -4,9 +4,9 @@
 usage: check_version.py VERSION SOURCES [PREFIX]
 
 VERSION is what CMakeLists.txt says in project(). Below SOURCES no other file may state it, but for
-CHANGELOG.md, whose newest release must be it, with a date; a pyproject.toml that describes its project
-takes it from the build (dynamic). PREFIX is an installed tree: its packages for CMake and pkg-config, its libraries, its
-tool and its Python module, each where it is there, must say VERSION.
+CHANGELOG.md, whose newest release must be it, with a date; a pyproject.toml that describes its
+project takes it from the build (dynamic). PREFIX is an installed tree: its packages for CMake and
+pkg-config, its libraries, its tool and its Python module, each where it is there, must say VERSION.
 Prints one line for each violation.  Exit status: 1 when there is one.
 """
 import os
@@ -117,6 +117,8 @@ def check_installed(version, prefix):
 
 
 def main():
+    if len(sys.argv) not in (3, 4):
+        sys.exit(__doc__)
     version, sources, *rest = sys.argv[1:]
     found = list(check_sources(version, pathlib.Path(sources)))
     for prefix in rest:

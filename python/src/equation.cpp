@@ -48,9 +48,10 @@ py::tuple RequireInputs(const py::object& inputs)
     return names;
 }
 
-Equation::Equation(const py::object& text, const py::object& inputs, bool lsbFirst)
+Equation::Equation(const py::object& text, const py::object& inputs, const py::object& lsbFirst)
     : m_text(RequireStr(text, "text")),
-      m_given_inputs(inputs.is_none() ? inputs : RequireInputs(inputs)), m_lsb_first(lsbFirst)
+      m_given_inputs(inputs.is_none() ? inputs : RequireInputs(inputs)),
+      m_lsb_first(RequireFlag(lsbFirst, "lsb_first"))
 {
     const std::string bytes = Encode(m_text);
     const booleq::Reading reading = GetReading();

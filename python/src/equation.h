@@ -30,7 +30,7 @@ class Equation {
   public:
     // 'inputs' is None or an iterable of names.
     // Fails: booleq.ParseError; TypeError and ValueError for what is no text or no list of names.
-    Equation(const py::object& text, const py::object& inputs, bool lsbFirst);
+    Equation(const py::object& text, const py::object& inputs, const py::object& lsbFirst);
 
     Equation(const Equation& other) = default;
     Equation& operator=(const Equation& other) = delete;

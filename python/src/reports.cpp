@@ -66,8 +66,12 @@ py::object ReprSvg(const Equation& equation)
     return py::module_::import("booleq._display").attr("svg")(TreeDot(list));
 }
 
-py::object Equivalent(const Equation& equation, const Equation& other)
+py::object Equivalent(const Equation& equation, const py::object& otherObject)
 {
+    if (!py::isinstance<Equation>(otherObject))
+        throw py::type_error("other must be an Equation, not " +
+                             std::string(Py_TYPE(otherObject.ptr())->tp_name));
+    const auto& other = otherObject.cast<const Equation&>();
     const booleq::Equality equality = CompareFunctions(FunctionOf(equation), FunctionOf(other));
     if (!equality.fault.empty())
         throw py::value_error(equality.fault);
@@ -95,9 +99,9 @@ std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& in
     const booleq::Function function = FunctionOf(equation).Over(order);
     // A constant has no init value; over one input only the binary form reads back.
     if (order.empty())
-        return MakeEquation(py::str(function.At(0) ? "1" : "0"), names, false);
+        return MakeEquation(py::str(function.At(0) ? "1" : "0"), names, py::bool_(false));
     return MakeEquation(py::str(order.size() == 1 ? function.Binary() : function.Hex()), names,
-                        false);
+                        py::bool_(false));
 }
 
 // The text, or None where it is empty.

@@ -83,6 +83,14 @@ py::str RequireStr(const py::handle& value, const char* what)
     return py::reinterpret_steal<py::str>(plain);
 }
 
+bool RequireFlag(const py::handle& value, const char* what)
+{
+    if (!PyBool_Check(value.ptr()) &&
+        !py::isinstance(value, py::module_::import("numpy").attr("bool_")))
+        throw py::type_error(std::string(what) + " must be False or True, not " + TypeName(value));
+    return PyObject_IsTrue(value.ptr()) == 1;
+}
+
 py::tuple RequireNames(const py::object& names)
 {
     if (PyUnicode_Check(names.ptr()))

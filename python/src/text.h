@@ -24,6 +24,8 @@ py::tuple DecodeAll(const std::vector<std::string>& names);
 
 // 'value' as a plain str.  Fails: TypeError that begins with 'what'.
 py::str RequireStr(const py::handle& value, const char* what);
+// Fails: TypeError that begins with 'what'.
+bool RequireFlag(const py::handle& value, const char* what);
 // The names of an iterable.  Fails: TypeError for a str, which would be taken letter by letter, for
 // what is no iterable, and for an element that is no str.
 py::tuple RequireNames(const py::object& names);

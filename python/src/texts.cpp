@@ -26,12 +26,13 @@ constexpr Syntax kSyntaxes[] = {
     {"expression", &Kq_BoolEquation::GetEquationAsExpression},
 };
 
-py::str Render(const Equation& equation, const py::object& syntax, bool spaces)
+py::str Render(const Equation& equation, const py::object& syntax, const py::object& spaces)
 {
+    const bool hasBlanks = RequireFlag(spaces, "spaces");
     const std::string name = Encode(RequireStr(syntax, "syntax"));
     for (const Syntax& known : kSyntaxes)
         if (name == known.name)
-            return Decode(booleq::ToStd((equation.Get().*known.render)(spaces)));
+            return Decode(booleq::ToStd((equation.Get().*known.render)(hasBlanks)));
     throw py::value_error("there is no syntax '" + booleq::Excerpt(name) +
                           "'; there are primary, alt1, alt2, alt3, expression");
 }
@@ -61,7 +62,7 @@ py::str BinaryDigits(const py::object& value, const py::tuple& inputs)
 }
 
 py::object FromInit(const py::object& type, const py::object& value, const py::object& inputs,
-                    bool lsbFirst)
+                    const py::object& lsbFirst)
 {
     const py::tuple names = RequireNames(inputs);
     py::object text = value;
@@ -114,12 +115,12 @@ py::tuple Reduce(const Equation& equation)
 
 void BindConstruction(EquationClass& type)
 {
-    type.def(py::init(&MakeEquation<py::object, py::object, bool>), py::arg("text"),
-             py::arg("inputs") = py::none(), py::arg("lsb_first").noconvert() = false,
+    type.def(py::init(&MakeEquation<py::object, py::object, py::object>), py::arg("text"),
+             py::arg("inputs") = py::none(), py::arg("lsb_first") = false,
              "__init__($record, self, text, inputs=None, lsb_first=False)\n--\n\nSee the class.");
     const py::cpp_function fromInit(&FromInit, py::name("from_init"), py::scope(type),
                                     py::arg("cls"), py::arg("value"), py::arg("inputs"),
-                                    py::arg("lsb_first").noconvert() = false,
+                                    py::arg("lsb_first") = false,
                                     R"doc(from_init($record, cls, value, inputs, lsb_first=False)
 --
 
@@ -157,7 +158,7 @@ void BindRenderings(EquationClass& type)
     type.def_property_readonly("expression",
                                &RenderWithBlanks<&Kq_BoolEquation::GetEquationAsExpression>,
                                "primary, but alt1 for an init value: never \"0x...\".");
-    type.def("render", &Render, py::arg("syntax") = "primary", py::arg("spaces").noconvert() = true,
+    type.def("render", &Render, py::arg("syntax") = "primary", py::arg("spaces") = true,
              R"doc(render($record, self, syntax="primary", spaces=True)
 --
 

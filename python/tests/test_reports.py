@@ -67,7 +67,7 @@ class TestEquivalent:
             large.equivalent(first)
 
     def test_of_what(self) -> None:
-        with pytest.raises(TypeError):
+        with pytest.raises(TypeError, match="^other must be an Equation, not str$"):
             Equation("A").equivalent("A")  # type: ignore[arg-type]
 
 

@@ -77,9 +77,16 @@ class TestConstruction:
         with pytest.raises(ValueError, match="^inputs: B is listed twice$"):
             Equation("A", ["B", "A", "B"])
 
-    def test_lsb_first_must_be_a_bool(self) -> None:
-        with pytest.raises(TypeError):
-            Equation("A", None, "yes")  # type: ignore[arg-type]
+    def test_flags_must_be_bools(self) -> None:
+        for value in "yes", 1, None:
+            message = f"must be False or True, not {type(value).__name__}$"
+            with pytest.raises(TypeError, match=f"^lsb_first {message}"):
+                Equation("A", None, value)  # type: ignore[arg-type]
+            with pytest.raises(TypeError, match=f"^lsb_first {message}"):
+                Equation.from_init(1, ["A"], value)  # type: ignore[arg-type]
+            with pytest.raises(TypeError, match=f"^spaces {message}"):
+                Equation("A").render("alt1", value)  # type: ignore[arg-type]
+        assert Equation("0x2", ["A", "B"], np.bool_(True)).lsb_first is True  # type: ignore[arg-type]
 
     def test_arguments_are_checked(self) -> None:
         with pytest.raises(TypeError):

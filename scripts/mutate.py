@@ -34,8 +34,7 @@ import signal
 import subprocess
 import sys
 
-FOLDERS = ["cmake", "include", "port", "s", "scripts", "tests"]
-FILES = ["CMakeLists.txt", "README.md"]
+NOT_COPIED = re.compile(r"\.git|build.*")  # of the tree's root
 CONFIGURE = ["-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
              "-DCMAKE_CXX_FLAGS_DEBUG=-O1 -D_GLIBCXX_ASSERTIONS",
              "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", "-DKQ_BUILD_TOOLS=OFF"]
@@ -237,9 +236,9 @@ class Tree:
                 if name != "issue_tests" or any((self.source / "tests/issues").glob("*.cpp"))]
 
     def copy(self, root):
-        wanted = [path for folder in FOLDERS for path in (root / folder).rglob("*")
+        wanted = [path for top in root.iterdir() if not NOT_COPIED.fullmatch(top.name)
+                  for path in ([top] if top.is_file() else top.rglob("*"))
                   if path.is_file() and "__pycache__" not in path.parts]
-        wanted += [root / name for name in FILES]
         names = {path.relative_to(root) for path in wanted}
         for path in list(self.source.rglob("*")) if self.source.exists() else []:
             if path.is_file() and path.relative_to(self.source) not in names:

@@ -1,5 +1,7 @@
 // Texts far beyond the ordinary: deep, long and wide ones are set, evaluated, rendered, compared,
 // copied and freed on an ordinary stack.
+#include <string_view>
+
 #include <gtest/gtest.h>
 
 #include "unit_support.h"
@@ -145,6 +147,23 @@ TEST(Large, InitValueOfSixteenVariablesReadsBack)
     Engine engine;
     ASSERT_TRUE(engine.SetEquationWithExplicitTerms(terms, value.c_str(), false, false));
     EXPECT_TRUE(value == Std(engine.GetEquationAsHexInitValue(false)));
+}
+
+// An AND of all inputs is 1 in the last row only, whose digit comes first.
+TEST(Large, ThirtyInputsHaveAnInitValueAndThirtyOneHaveNone)
+{
+    std::string text = "v0";
+    for (int number = 1; number < 30; ++number)
+        text += "&v" + std::to_string(number);
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation(text.c_str()));
+    const String value = engine.GetEquationAsHexInitValue(false);
+    ASSERT_EQ(2 + (size_t(1) << 28), value.length());
+    EXPECT_EQ("0x8", std::string(value.c_str(), 3));
+    EXPECT_EQ(2u, std::string_view(value.c_str()).find_last_not_of('0')); // zeros behind it
+    engine.DefineVariable("v30", 0);
+    EXPECT_EQ("0x0", Std(engine.GetEquationAsHexInitValue(false)));
+    EXPECT_EQ("0b", Std(engine.GetEquationAsBinaryInitValue()));
 }
 
 // 2^24 rows; the tree would have 500 million nodes.

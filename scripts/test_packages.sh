@@ -226,11 +226,11 @@ same_bytes() {
 }
 
 newcomer_runs() {
-    in_root newcomer 1200 /work/dev run 'A & ~B' | grep -x 'init value hex  0x4'
+    in_root newcomer 1200 /repository/dev run 'A & ~B' | grep -x 'init value hex  0x4'
 }
 
 newcomer_tests() {
-    in_root newcomer 3600 /work/dev test | tee "$logs/newcomer.txt"
+    in_root newcomer 3600 /repository/dev test | tee "$logs/newcomer.txt"
     tail -n 1 -- "$logs/newcomer.txt" | grep -E '^[0-9]+ passed, 0 failed'
 }
 
@@ -282,7 +282,7 @@ test_same_bytes() {
 
 test_newcomer() {
     make_root newcomer
-    git clone -q -- "$repository" "$directory/newcomer/work"
+    git clone -q -- "$repository" "$directory/newcomer/repository"
     try "a newcomer's ./dev run" newcomer_runs
     try "a newcomer's ./dev test" newcomer_tests
 }

@@ -83,8 +83,8 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
     // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
-    // every few milliseconds; what it throws passes.  Fails: false, and no words, without an
-    // equation, with over 30 variables, or when goOn says false.  Cost: O(nodes * 2^n / 64).
+    // every few milliseconds, less often of over 100,000 operators; what it throws passes.
+    // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 

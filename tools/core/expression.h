@@ -63,9 +63,6 @@ uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word);
 // The values for 64 assignments: element k of the argument holds input k's values, one in each bit.
 typedef std::function<uint64_t(const std::vector<uint64_t>&)> WordFunction;
 
-// Every how many words Watch is called where a word's cost is anybody's.
-constexpr uint64_t kWatchedWords = 16;
-
 // The function over the inputs by trying every assignment.
 // Requires: at most kMaxFunctionInputs inputs.  Cost: 2^inputs / 64 calls.
 Function Tabulate(const WordFunction& function, const std::vector<std::string>& inputs);

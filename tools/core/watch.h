@@ -2,14 +2,20 @@
 #ifndef BOOLEQ_CORE_WATCH_H
 #define BOOLEQ_CORE_WATCH_H
 
+#include <cstdint>
+
 namespace booleq {
 
-// Called every few milliseconds by whatever takes long: columns, comparisons, searches. It may
-// throw, which ends the work; nothing is left half done.  Null: nobody watches, as at first.
+// Called by whatever takes long, columns, comparisons and searches: every few milliseconds, for
+// expressions of over 100,000 operators less often. It may throw, which ends the work; nothing is
+// left half done.  Null: nobody watches, as at first.
 typedef void (*Watcher)();
 void SetWatch(Watcher watcher);
 
 void Watch();
+
+// Every how many words Watch is called where a word's cost is anybody's.
+constexpr uint64_t kWatchedWords = 16;
 
 // Watch() for Kq_BoolEquation::GetColumn; always true.
 bool WatchAndGoOn(void* context);

@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
-#include "core/text.h"
 #include "progress.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -13,7 +13,7 @@ typedef std::vector<uint8_t> Rows; // one value each
 Rows RowsOf(const Function& function)
 {
     Rows rows(function.NumRows());
-    for (uint64_t row = 0; row < rows.size(); ++row)
+    for (size_t row = 0; row < rows.size(); ++row)
         rows[row] = function.At(row) ? 1 : 0;
     return rows;
 }
@@ -65,10 +65,10 @@ class MatchSearch {
         const unsigned int placeBit = m_num_inputs - 1 - place;
         const unsigned int sourceBit = m_num_inputs - 1 - source;
         Rows rows(first.size());
-        for (uint64_t row = 0; row < rows.size(); ++row) {
-            const uint64_t value = (row >> placeBit & 1u) ^ (isInverted ? 1u : 0u);
-            const uint64_t other = row >> sourceBit & 1u;
-            uint64_t from = row & ~(uint64_t(1) << placeBit) & ~(uint64_t(1) << sourceBit);
+        for (size_t row = 0; row < rows.size(); ++row) {
+            const size_t value = (row >> placeBit & 1u) ^ (isInverted ? 1u : 0u);
+            const size_t other = row >> sourceBit & 1u;
+            size_t from = row & ~(size_t(1) << placeBit) & ~(size_t(1) << sourceBit);
             if (place == source)
                 from |= value << placeBit;
             else
@@ -127,12 +127,12 @@ Function Apply(const Matching& matching, const Function& first,
 {
     std::vector<uint64_t> words(first.Words().size());
     const size_t numInputs = first.NumInputs();
-    for (uint64_t row = 0; row < first.NumRows(); ++row) {
-        uint64_t from = 0;
+    for (size_t row = 0; row < first.NumRows(); ++row) {
+        size_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
             const bool value =
                 ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
-            from |= uint64_t(value ? 1 : 0) << (numInputs - 1 - matching.sources[place]);
+            from |= size_t(value ? 1 : 0) << (numInputs - 1 - matching.sources[place]);
         }
         if (first.At(from) != matching.isInverted)
             words[row / 64] |= uint64_t(1) << (row % 64);

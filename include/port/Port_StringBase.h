@@ -50,6 +50,10 @@ class StringBase<char> {
         return *this;
     }
 
+    // Makes room for a text of so many bytes. A host's class need not have it: where it is there,
+    // long texts are written once instead of being moved each time they have doubled.
+    void reserve(std::size_t length) { m_text.reserve(length); }
+
     // Number of bytes, a terminating 0 not counted.
     std::size_t length() const { return m_text.length(); }
     // The bytes, followed by a 0; valid until the string changes.

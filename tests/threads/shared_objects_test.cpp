@@ -53,7 +53,7 @@ void Ask(const SharedObjects& objects, const Answers& expected, size_t numQuesti
 TEST(Threads, QuestionsToSharedObjects)
 {
     threads::CountingSink sink;
-    for (unsigned int round = 0; round < 15; ++round) {
+    for (unsigned int round = 0; round < 8; ++round) {
         const Answers expected = AskAll(SharedObjects(round));
         const SharedObjects objects(round);
         InThreads(kNumThreads, [&](size_t thread) {

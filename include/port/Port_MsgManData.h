@@ -14,11 +14,11 @@
 #endif
 
 // One report: where it comes from, and its text.
-// Threads: any may report, and exchange the sink, at any time. Texts arrive whole and one at a time:
-// a sink needs no lock of its own against other reports. While it runs, other threads that report or
-// exchange the sink wait; its own thread does not, so that it may use whatever reports, issue
-// messages, which reach it before the one at hand is done, exchange the sink and throw. It must not
-// wait for a thread that may report.
+// Threads: any may report, and exchange the sink, at any time. Texts arrive whole and one at a
+// time: a sink needs no lock of its own against other reports. While it runs, other threads that
+// report or exchange the sink wait; its own thread does not, so that it may use whatever reports,
+// issue messages, which reach it before the one at hand is done, exchange the sink and throw. It
+// must not wait for a thread that may report.
 class Port_MsgManData {
   public:
     // Where texts go: message id, source path, source line, revision text, the formatted text.

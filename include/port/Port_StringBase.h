@@ -14,6 +14,7 @@ class StringBase; // only for char
 
 // A byte string of any length; bytes of value 0 may stand in it.
 // A null 'const char*' counts as the empty text.  Fails: std::bad_alloc only.
+// Threads: different strings are independent; const members of one string may run at once.
 template <>
 class StringBase<char> {
   public:

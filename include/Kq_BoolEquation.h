@@ -96,7 +96,7 @@ class KQ_EXPORT Kq_BoolEquation {
 
     // The result, 0 or 1, for the current variable values; 0 without an equation.
     unsigned int Eval() const;
-    // Adds a variable behind the others; 'value' counts as 1 unless 0. A name is letters, digits
+    // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits
     // and '_', not starting with a digit, or anything that starts with ' and has a second '.
     // Fails: false for a name already there (its value stays) or not legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
@@ -137,9 +137,9 @@ struct Kq_BoolEquation::Refusal {
         OPERAND = 6, // an operand where an operator must stand
         NO_LEFT_OPERAND = 7,   // nothing on the left of this operator
         NO_RIGHT_OPERAND = 8,  // nothing on the right of this operator
-        NO_OPERAND = 9,        // nothing behind this negation
+        NO_OPERAND = 9,        // nothing after this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
-        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b behind a first 0
+        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b after a first 0
         INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
         INIT_NAME = 13 // over terms: one's name is no single token, and what it makes is refused
     };
@@ -159,7 +159,7 @@ class KQ_EXPORT Kq_BoolEquation::Handle {
     ~Handle();
     Handle& operator=(const Handle& other);
 
-    // The first element, and behind the last one; valid until the handle is set or destroyed.
+    // The first element, and after the last one; valid until the handle is set or destroyed.
     unsigned int* begin() { return m_values.data(); }
     const unsigned int* begin() const { return m_values.data(); }
     unsigned int* end() { return m_values.data() + m_values.size(); }

@@ -12,7 +12,9 @@
 
 #include <port/Port_StringBase.h>
 
+#ifndef KQ_EXPORT // defined by the build where that is a DLL's
 #define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
+#endif
 
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
@@ -153,9 +155,8 @@ struct Kq_BoolEquation::Refusal {
 // Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle(); // empty
-    // A value: each copy has elements of its own.
-    Handle(const Handle& other);
+    Handle();                    // empty
+    Handle(const Handle& other); // a value: each copy has elements of its own
     ~Handle();
     Handle& operator=(const Handle& other);
 

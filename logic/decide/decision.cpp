@@ -3,12 +3,12 @@
 #include <algorithm>
 #include <cassert>
 #include <random>
-#include <unordered_map>
 
 #include "cone.h"
 #include "encoder.h"
 #include "flatten.h"
 #include "gate_graph.h"
+#include "joined_inputs.h"
 #include "solver.h"
 #include "sweep.h"
 
@@ -22,27 +22,8 @@ constexpr uint64_t kRandomWork = uint64_t(1) << 20;
 constexpr uint64_t kMinRandomWords = 4;
 constexpr uint64_t kMaxRandomWords = 256;
 constexpr uint64_t kWatchedWork = uint64_t(1) << 16;
-constexpr int kFirstConflicts = 50; // for one question while gates are joined; then ten times these
+constexpr int kFirstConflicts = 2000; // of one question while gates are joined
 constexpr int kMaxSweepConflicts = 100000;
-
-// The numbers of the right expression's inputs among those of both.
-std::vector<uint32_t> JoinInputs(const std::vector<std::string>& right,
-                                 std::vector<std::string>& inputs)
-{
-    std::unordered_map<std::string, uint32_t> numbers;
-    for (const std::string& name : inputs)
-        numbers.emplace(name, static_cast<uint32_t>(numbers.size()));
-    assert(numbers.size() == inputs.size());
-    std::vector<uint32_t> places;
-    for (const std::string& name : right) {
-        const auto place = numbers.emplace(name, static_cast<uint32_t>(numbers.size())).first;
-        if (place->second == inputs.size())
-            inputs.push_back(name);
-        places.push_back(place->second);
-    }
-    assert(numbers.size() == inputs.size());
-    return places;
-}
 
 bool ValueOf(const Expression& expression, const std::vector<uint64_t>& inputs)
 {

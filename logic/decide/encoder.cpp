@@ -2,7 +2,15 @@
 
 #include <cassert>
 
+#include "watch.h"
+
 namespace booleq {
+
+namespace {
+
+constexpr size_t kWatchedGates = 4096;
+
+} // namespace
 
 int Encoder::VariableAt(uint32_t gate)
 {
@@ -45,7 +53,9 @@ int Encoder::LiteralOf(Edge edge)
 {
     m_variables.resize(m_graph.NumGates());
     const int literal = Signed(edge);
-    while (!m_pending.empty()) {
+    for (size_t numGates = 0; !m_pending.empty(); ++numGates) {
+        if (numGates % kWatchedGates == kWatchedGates - 1)
+            Watch();
         const uint32_t gate = m_pending.back();
         m_pending.pop_back();
         AddClauses(gate);

@@ -33,10 +33,10 @@ class Solver {
     // Whether this build has a solver; without one every answer is Unknown.
     static bool IsThere();
 
-    // Writes every step of the search to a file, in the binary-free format DRAT.
+    // Writes every step of the search to a file, as text in the format DRAT.
     // Requires: no clause was added.  Fails: false when the file cannot be opened.
     bool TraceTo(const std::string& path);
-    // All is written.  Fails: false when something could not be.
+    // Closes the file.  Requires: TraceTo succeeded.  Fails: false when something was not written.
     bool EndTrace();
 
     void Add(std::initializer_list<int> clause);

@@ -2,6 +2,7 @@
 #include "solver.h"
 
 #include <cassert>
+#include <cstdio>
 #include <exception>
 
 #include <cadical.hpp>
@@ -25,6 +26,7 @@ struct Solver::State : CaDiCaL::Terminator {
     const Deadline& deadline;
     std::exception_ptr thrown;
     Answer lastAnswer = Answer::Unknown;
+    std::unique_ptr<FILE, int (*)(FILE*)> trace{nullptr, fclose};
     CaDiCaL::Solver solver; // last: it goes first
 };
 
@@ -53,14 +55,16 @@ bool Solver::IsThere()
 bool Solver::TraceTo(const std::string& path)
 {
     m_state->solver.set("binary", 0);
-    return m_state->solver.trace_proof(path.c_str());
+    m_state->trace.reset(fopen(path.c_str(), "w"));
+    return m_state->trace && m_state->solver.trace_proof(m_state->trace.get(), path.c_str());
 }
 
 bool Solver::EndTrace()
 {
     m_state->solver.flush_proof_trace();
     m_state->solver.close_proof_trace();
-    return true;
+    const bool isWritten = ferror(m_state->trace.get()) == 0;
+    return fclose(m_state->trace.release()) == 0 && isWritten;
 }
 
 void Solver::Add(std::initializer_list<int> clause)

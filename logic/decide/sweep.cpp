@@ -34,7 +34,8 @@ void FillRandomly(std::mt19937_64& random, uint64_t* inputs, size_t numInputs)
 }
 
 Sweep::Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline& deadline)
-    : m_graph(graph.NumInputs()), m_deadline(deadline), m_max_conflicts(maxConflicts), m_random(1)
+    : m_graph(graph.NumInputs()), m_deadline(deadline), m_max_conflicts(maxConflicts), m_random(1),
+      m_is_asking(Solver::IsThere())
 {
     const Cone cone(graph, root);
     m_num_words = cone.Gates().size() < kManyGates ? kWords : kWordsOfMany;
@@ -61,11 +62,10 @@ Sweep::Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline
     const auto edgeOf = [&edges](Edge old) {
         return InvertedIf(edges[GateOf(old)], IsInverted(old));
     };
-    bool isAsking = Solver::IsThere();
     size_t numGates = 0;
     for (const uint32_t gate : cone.Gates()) {
         if (numGates++ % kWatchedGates == 0 && (m_deadline.IsOver() || m_work > kMaxWork))
-            isAsking = false;
+            m_is_asking = false;
         const Gate& parts = graph.At(gate);
         const Edge left = edgeOf(parts.left);
         const Edge right = edgeOf(parts.right);
@@ -73,7 +73,7 @@ Sweep::Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline
             parts.kind == GateKind::And ? m_graph.And(left, right) : m_graph.Xor(left, right);
         const bool isNew = GateOf(edge) >= m_merged.size();
         SimulateNew();
-        if (isNew && isAsking)
+        if (isNew && m_is_asking)
             m_merged[GateOf(edge)] = Merge(GateOf(edge));
         edges[gate] = InvertedIf(m_merged[GateOf(edge)], IsInverted(edge));
     }
@@ -161,6 +161,10 @@ Edge Sweep::Merge(uint32_t gate)
 // An assignment for which they do is learnt.
 Solver::Answer Sweep::AskWhetherTheyDiffer(Edge edge, Edge other)
 {
+    if (m_deadline.IsOver())
+        m_is_asking = false;
+    if (!m_is_asking)
+        return Solver::Answer::Unknown;
     if (!m_encoder || m_encoder->NumVariables() > kMaxVariables) {
         m_encoder.reset();
         m_solver.reset(new Solver(Solver::Effort::Quick, m_deadline));

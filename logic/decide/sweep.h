@@ -65,6 +65,7 @@ class Sweep {
 
     std::unique_ptr<Solver> m_solver;
     std::unique_ptr<Encoder> m_encoder;
+    bool m_is_asking;    // until a limit is reached
     uint64_t m_work = 0; // values computed again
 };
 

@@ -4,8 +4,8 @@
 usage: check_includes.py ROOT
 
 Checked: the floors (who may include whom), the own header first, no include of a .cpp file, sizes of
-files and functions, plain ASCII, the names in the host's folders, macros, foreign declarations,
-where a test model may look. Exit status: 1 when something was found.
+files and functions, plain ASCII, the names of the rooms' headers and in the host's folders, macros,
+foreign declarations, where a test model may look. Exit status: 1 when something was found.
 """
 import pathlib
 import re
@@ -231,9 +231,9 @@ def check_host(root, report):
 
 
 def check_users(root, report):
-    """The tool sees the public headers only, the Python module the facade's and the tool's core; the
+    """Tool and logic see the public headers only, the Python module the facade's and logic's; the
     reference model nothing of the library."""
-    for path in sorted(root.glob("tools/**/*")):
+    for path in sorted([*root.glob("logic/**/*"), *root.glob("tools/**/*")]):
         if path.suffix in (".h", ".cpp"):
             for number, _, name in includes(read_lines(path)):
                 if "Kq_" in name and name not in PUBLIC:
@@ -248,9 +248,26 @@ def check_users(root, report):
                 report.add(path, number, "the reference model shares no code with the library")
 
 
+def check_rooms(root, report):
+    """Headers of rooms are included by name alone, and what links them sees the folders of all: one
+    of a name that another has, or tool or module, would be taken for it."""
+    seen = {}
+    for path in sorted([*root.glob("logic/*/*.h"), *root.glob("tools/booleq/*.h"),
+                        *root.glob("python/src/*.h")]):
+        first = seen.setdefault(path.name, path)
+        if path != first and "logic" in (first.parent.parent.name, path.parent.parent.name):
+            report.add(path, 1, f"{first.relative_to(root)} has the same name")
+    for path in sorted([*root.glob("logic/*/*.h"), *root.glob("logic/*/*.cpp")]):
+        lines = read_lines(path)
+        for number, bracket, name in includes(lines):
+            if bracket == '"' and "/" in name:
+                report.add(path, number, f"{name}: rooms are not named, the links say which are seen")
+        check_sizes(path, lines, report)
+
+
 def check_all_ascii(root, report):
     files = [root / "dev", root / "CMakeLists.txt"]
-    for folder in ("include", "s", "port", "tools", "scripts", "cmake", "python", "tests", "bench",
+    for folder in ("include", "s", "port", "logic", "tools", "scripts", "cmake", "python", "tests", "bench",
                    "fuzz"):
         files += [path for path in root.glob(f"{folder}/**/*")
                   if path.suffix in (".h", ".cpp", ".py", ".sh", ".txt", ".cmake")]
@@ -269,6 +286,7 @@ def main():
     check_library(root, report)
     check_host(root, report)
     check_users(root, report)
+    check_rooms(root, report)
     check_all_ascii(root, report)
     return 1 if report.count else 0
 

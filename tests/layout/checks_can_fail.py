@@ -30,7 +30,7 @@ class InCopy(unittest.TestCase):
 class Includes(InCopy):
     def setUp(self):
         super().setUp()
-        for folder in ("include", "s", "port", "tools", "python"):
+        for folder in ("include", "s", "port", "logic", "tools", "python"):
             shutil.copytree(ROOT / folder, self.copy / folder)
         self.before = self.check()[1]
 
@@ -127,6 +127,26 @@ class Includes(InCopy):
     def test_tool_that_uses_internals(self):
         self.append("tools/booleq/text.cpp", '#include "Kq_BoolEquationImpStore.h"\n')
         self.expect("tools/booleq/text.cpp", "is internal")
+
+    def test_room_that_uses_internals(self):
+        self.append("logic/search/match.cpp", '#include "Kq_BoolEquationImpStore.h"\n')
+        self.expect("logic/search/match.cpp", "is internal")
+
+    def test_room_that_is_named(self):
+        self.append("logic/search/match.cpp", '#include "../column/bits.h"\n')
+        self.expect("logic/search/match.cpp", "rooms are not named")
+
+    def test_two_headers_of_one_name(self):
+        self.append("logic/search/bits.h", "")
+        self.expect("logic/search/bits.h", "logic/column/bits.h has the same name")
+
+    def test_header_of_the_tool_named_like_a_room_s(self):
+        self.append("tools/booleq/bits.h", "")
+        self.expect("tools/booleq/bits.h", "logic/column/bits.h has the same name")
+
+    def test_long_function_of_a_room(self):
+        self.append("logic/search/match.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
+        self.expect("logic/search/match.cpp", "function of 60 lines")
 
     def test_python_module_that_uses_the_engine(self):
         self.append("python/src/reports.cpp", "#include <Kq_BoolEquationImp.h>\n")

@@ -9,8 +9,8 @@
 #include <string>
 #include <vector>
 
+#include "deadline.h"
 #include "expression.h"
-#include "limits.h"
 
 namespace booleq {
 

@@ -25,16 +25,10 @@ constexpr uint64_t kWatchedWork = uint64_t(1) << 16;
 constexpr int kFirstConflicts = 2000; // of one question while gates are joined
 constexpr int kMaxSweepConflicts = 100000;
 
-bool ValueOf(const Expression& expression, const std::vector<uint64_t>& inputs)
-{
-    std::vector<uint64_t> stack;
-    return (EvaluateWord(expression, inputs, stack) & 1u) != 0;
-}
-
 // One decision: whether an edge, the exclusive or of both expressions, is ever 1.
 class Decider {
   public:
-    Decider(const Expression& left, const Expression& right, const Limits& limits)
+    Decider(const Side& left, const Side& right, const Limits& limits)
         : m_deadline(limits), m_left(left), m_right(right), m_graph(0)
     {
         m_decision.inputs = left.names;
@@ -50,8 +44,8 @@ class Decider {
         std::vector<Edge> rightInputs;
         for (const uint32_t place : m_right_places)
             rightInputs.push_back(m_graph.Input(place));
-        const Edge left = AddExpression(m_left, leftInputs, m_graph);
-        const Edge right = AddExpression(m_right, rightInputs, m_graph);
+        const Edge left = m_left.build(leftInputs, m_graph);
+        const Edge right = m_right.build(rightInputs, m_graph);
         m_root = m_graph.Xor(left, right);
         Decide();
         assert(m_decision.verdict == Verdict::Undecided || m_decision.reason.empty());
@@ -110,8 +104,8 @@ class Decider {
         std::vector<uint64_t> rightInputs;
         for (const uint32_t place : m_right_places)
             rightInputs.push_back(inputs[place]);
-        m_decision.left = ValueOf(m_left, inputs);
-        m_decision.right = ValueOf(m_right, rightInputs);
+        m_decision.left = (m_left.evaluate(inputs) & 1u) != 0;
+        m_decision.right = (m_right.evaluate(rightInputs) & 1u) != 0;
         assert(m_decision.left != m_decision.right);
         if (m_decision.left == m_decision.right) {
             SetUndecided("a difference was found that the expressions do not show");
@@ -293,8 +287,8 @@ class Decider {
     }
 
     Deadline m_deadline;
-    const Expression& m_left;
-    const Expression& m_right;
+    const Side& m_left;
+    const Side& m_right;
     std::vector<uint32_t> m_right_places;
     GateGraph m_graph;
     Edge m_root = kFalseEdge; // 1 where they differ
@@ -312,9 +306,26 @@ uint64_t Decision::Row() const
     return row;
 }
 
-Decision DecideEqual(const Expression& left, const Expression& right, const Limits& limits)
+Side SideOf(const Expression& expression)
+{
+    return {expression.names,
+            [&expression](const std::vector<Edge>& inputs, GateGraph& graph) {
+                return AddExpression(expression, inputs, graph);
+            },
+            [&expression](const std::vector<uint64_t>& inputs) {
+                std::vector<uint64_t> stack;
+                return EvaluateWord(expression, inputs, stack);
+            }};
+}
+
+Decision DecideEqual(const Side& left, const Side& right, const Limits& limits)
 {
     return Decider(left, right, limits).Run();
+}
+
+Decision DecideEqual(const Expression& left, const Expression& right, const Limits& limits)
+{
+    return DecideEqual(SideOf(left), SideOf(right), limits);
 }
 
 Decision DecideConstant(const Expression& expression, bool value, const Limits& limits)

@@ -13,11 +13,13 @@
 #define BOOLEQ_DECIDE_DECISION_H
 
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <vector>
 
+#include "deadline.h"
 #include "expression.h"
-#include "limits.h"
+#include "gate_graph.h"
 
 namespace booleq {
 
@@ -38,6 +40,9 @@ struct Decision {
     std::string reason;      // not empty: why it is undecided
     bool isTimeOver = false; // which is the reason
 
+    bool IsEqual() const { return verdict == Verdict::Equal; }
+    bool IsDifferent() const { return verdict == Verdict::Different; }
+
     // The assignment as a row number.  Requires: Different, at most 64 inputs.
     uint64_t Row() const;
 };
@@ -46,11 +51,22 @@ struct Decision {
 // search for it.
 constexpr size_t kMaxFirstRowInputs = 30;
 
+// What is compared, when it is not one expression: how its gates are built, and, apart from that,
+// what its values are.
+struct Side {
+    std::vector<std::string> names; // of the inputs, all different
+    // The function's edge, from those of the inputs.
+    std::function<Edge(const std::vector<Edge>&, GateGraph&)> build;
+    WordFunction evaluate;
+};
+// Requires: the expression has a node; it outlives the side.
+Side SideOf(const Expression& expression);
+
 // Inputs are the same when their names are.
-// Requires: each expression has a node, and its names are all different.
 // Fails: Undecided, when the time is over or this build has no solver and more than
 // kMaxFirstRowInputs inputs matter; what the watcher throws goes through.
 // Cost: O(n log n) for n nodes of the same operators and operands; exponential at worst.
+Decision DecideEqual(const Side& left, const Side& right, const Limits& limits);
 Decision DecideEqual(const Expression& left, const Expression& right, const Limits& limits);
 
 // Whether the expression always has the value: Different is an assignment where it has the other.

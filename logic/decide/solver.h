@@ -9,7 +9,7 @@
 #include <memory>
 #include <string>
 
-#include "limits.h"
+#include "deadline.h"
 
 namespace booleq {
 

@@ -12,9 +12,9 @@
 #include <unordered_map>
 #include <vector>
 
+#include "deadline.h"
 #include "encoder.h"
 #include "gate_graph.h"
-#include "limits.h"
 #include "solver.h"
 
 namespace booleq {

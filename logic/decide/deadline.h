@@ -1,6 +1,6 @@
 // How long a decision may take: a deadline, and the watcher of whoever embeds it.
-#ifndef BOOLEQ_DECIDE_LIMITS_H
-#define BOOLEQ_DECIDE_LIMITS_H
+#ifndef BOOLEQ_DECIDE_DEADLINE_H
+#define BOOLEQ_DECIDE_DEADLINE_H
 
 #include <chrono>
 

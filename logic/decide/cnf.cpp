@@ -35,20 +35,24 @@ class CnfWriter {
     int LiteralOf(const Expression& expression, const std::vector<uint32_t>& places)
     {
         assert(!expression.nodes.empty());
-        std::vector<int> literals;
+        std::vector<int> literals; // of operands that wait for their operator
         for (size_t index = 0; index < expression.nodes.size(); ++index) {
             if (index % kWatchedNodes == 0)
                 Watch();
             const Expression::Node& node = expression.nodes[index];
-            if (node.op == Operator::Input)
+            if (node.op == Operator::Input) {
                 literals.push_back(static_cast<int>(places[node.left]) + 1);
-            else if (node.op == Operator::Not)
-                literals.push_back(-literals[node.left]);
-            else if (IsBinary(node.op))
-                literals.push_back(Binary(node.op, literals[node.left], literals[node.right]));
-            else
+            } else if (node.op == Operator::Not) {
+                literals.back() = -literals.back();
+            } else if (IsBinary(node.op)) {
+                const int right = literals.back();
+                literals.pop_back();
+                literals.back() = Binary(node.op, literals.back(), right);
+            } else {
                 literals.push_back(node.op == Operator::One ? True() : -True());
+            }
         }
+        assert(literals.size() == 1);
         return literals.back();
     }
 

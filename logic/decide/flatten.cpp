@@ -55,23 +55,30 @@ bool IsAbsorbed(const Shape& shape, const Context& context)
            (shape.chain == Chain::Xor || shape.invertsOutput == context.isInverted);
 }
 
+// From the root down, by place as evaluation goes: back to front, a node's right operand follows it
+// and the left one comes after all of that.
 std::vector<Context> ContextsOf(const Expression& expression)
 {
-    std::vector<Context> contexts(expression.nodes.size(), {Chain::None, false});
+    std::vector<Context> contexts(expression.nodes.size());
+    std::vector<Context> waiting = {
+        {Chain::None, false}}; // those of nodes to come, the next one last
     for (size_t index = expression.nodes.size(); index-- > 0;) {
         const Expression::Node& node = expression.nodes[index];
-        const Context context = contexts[index];
+        assert(!waiting.empty());
+        const Context context = contexts[index] = waiting.back();
+        waiting.pop_back();
         if (node.op == Operator::Not)
-            contexts[node.left] = {context.chain, !context.isInverted};
+            waiting.push_back({context.chain, !context.isInverted});
         if (!IsBinary(node.op))
             continue;
         const Shape shape = ShapeOf(node.op);
         // An exclusive or that joins another one hands its inversion to one of its operands.
         const bool handsOn = shape.chain == Chain::Xor && IsAbsorbed(shape, context) &&
                              shape.invertsOutput != context.isInverted;
-        contexts[node.left] = {shape.chain, shape.invertsInputs != handsOn};
-        contexts[node.right] = {shape.chain, shape.invertsInputs};
+        waiting.push_back({shape.chain, shape.invertsInputs != handsOn});
+        waiting.push_back({shape.chain, shape.invertsInputs});
     }
+    assert(waiting.empty());
     return contexts;
 }
 

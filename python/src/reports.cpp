@@ -133,20 +133,15 @@ py::object Explain(const Equation& equation)
 
 py::object DifferenceOf(const booleq::LintReport& report, const booleq::ForeignReading& reading)
 {
-    if (!reading.isRead || reading.decision.IsEqual())
+    if (!reading.decision.IsDifferent())
         return py::none();
-    py::object assignment = py::none();
-    py::object here = py::none();
-    if (reading.decision.IsDifferent()) {
-        assignment = py::dict();
-        for (size_t input = 0; input < report.inputs.size(); ++input)
-            assignment[Decode(report.inputs[input])] = reading.decision.assignment[input] ? 1 : 0;
-        here = py::int_(reading.decision.left ? 1 : 0);
-    }
+    py::dict assignment;
+    for (size_t input = 0; input < report.inputs.size(); ++input)
+        assignment[Decode(report.inputs[input])] = reading.decision.assignment[input] ? 1 : 0;
     return ResultClass("Difference")(
-        "assignment"_a = assignment, "here"_a = here, "grouping"_a = Decode(reading.grouping),
-        "reason"_a = Decode(reading.reason), "write_there"_a = Decode(reading.textThere),
-        "write_here"_a = OrNone(reading.textHere));
+        "assignment"_a = assignment, "here"_a = reading.decision.left ? 1 : 0,
+        "grouping"_a = Decode(reading.grouping), "reason"_a = Decode(reading.reason),
+        "write_there"_a = Decode(reading.textThere), "write_here"_a = OrNone(reading.textHere));
 }
 
 py::object ReadingOf(const booleq::LintReport& report, const booleq::ForeignReading& reading)

@@ -81,8 +81,8 @@ class Rewriter {
             return Plain(Operator::Or, Plain(Operator::And, left, Not(right)),
                          Plain(Operator::And, Not(left), right));
         if ((op == Operator::And || op == Operator::Or) && Chance(3)) // De Morgan
-            return Not(Plain(op == Operator::And ? Operator::Or : Operator::And, Not(left),
-                             Not(right)));
+            return Not(
+                Plain(op == Operator::And ? Operator::Or : Operator::And, Not(left), Not(right)));
         if (op == Operator::And || op == Operator::Or || op == Operator::Xor) {
             if (Chance(2))
                 std::swap(left, right);
@@ -93,8 +93,7 @@ class Rewriter {
                 (op == Operator::And && (inner.op == Operator::Or || inner.op == Operator::Xor)) ||
                 (op == Operator::Or && inner.op == Operator::And);
             if (distributes && Chance(2) && MayCopy(left))
-                return Plain(inner.op, Plain(op, left, inner.left),
-                             Plain(op, left, inner.right));
+                return Plain(inner.op, Plain(op, left, inner.left), Plain(op, left, inner.right));
         }
         return Plain(op, left, right);
     }
@@ -173,8 +172,8 @@ Expression RandomExpression(std::mt19937_64& random, uint32_t numInputs, uint32_
             if (random() % 6 == 0)
                 tasks.push_back({0, Operator::Not});
             const auto numLeft = static_cast<uint32_t>(random() % task.numOperators);
-            static constexpr Operator kOften[] = {Operator::And, Operator::Or,   Operator::And,
-                                                  Operator::Or,  Operator::Xor,  Operator::Xor,
+            static constexpr Operator kOften[] = {Operator::And,  Operator::Or,  Operator::And,
+                                                  Operator::Or,   Operator::Xor, Operator::Xor,
                                                   Operator::Nand, Operator::Nor, Operator::Nxor};
             tasks.push_back({0, kOften[random() % 9]});
             tasks.push_back({task.numOperators - 1 - numLeft, Operator::Zero});
@@ -223,7 +222,8 @@ Pair MakePair(uint64_t number, uint32_t maxInputs)
     Pair pair;
     pair.isRewritten = random() % 2 == 0;
     pair.left = RandomExpression(random, numInputs, numOperators);
-    pair.right = Rewrite(pair.isRewritten ? pair.left : ChangeOneOperator(pair.left, random), random);
+    pair.right =
+        Rewrite(pair.isRewritten ? pair.left : ChangeOneOperator(pair.left, random), random);
     return pair;
 }
 

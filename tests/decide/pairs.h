@@ -13,7 +13,8 @@ namespace decide_pairs {
 struct Pair {
     booleq::Expression left;
     booleq::Expression right;
-    bool isRewritten; // right is left, rewritten; otherwise one operator deep inside was changed first
+    bool isRewritten; // right is left, rewritten; otherwise one operator deep inside was changed
+                      // first
 };
 
 // A tree of 'numOperators' operators of two operands, inversions apart, over inputs v0, v1, ...;
@@ -26,8 +27,7 @@ booleq::Expression RandomExpression(std::mt19937_64& random, uint32_t numInputs,
 booleq::Expression Rewrite(const booleq::Expression& expression, std::mt19937_64& random);
 
 // The same tree but for one operator, chosen among those far from the root.
-booleq::Expression ChangeOneOperator(const booleq::Expression& expression,
-                                     std::mt19937_64& random);
+booleq::Expression ChangeOneOperator(const booleq::Expression& expression, std::mt19937_64& random);
 
 // 'number' decides everything. Up to 'maxInputs' inputs, from 20 on.
 Pair MakePair(uint64_t number, uint32_t maxInputs);

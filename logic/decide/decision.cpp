@@ -2,13 +2,13 @@
 
 #include <algorithm>
 #include <cassert>
-#include <random>
 
 #include "cone.h"
 #include "encoder.h"
 #include "flatten.h"
 #include "gate_graph.h"
 #include "joined_inputs.h"
+#include "patterns.h"
 #include "solver.h"
 #include "sweep.h"
 
@@ -166,7 +166,7 @@ class Decider {
 
     bool TryRandomRows(Cone& cone)
     {
-        std::mt19937_64 random(1);
+        Patterns patterns(m_graph, cone, m_root);
         std::vector<uint64_t> inputs(cone.Inputs().size());
         const uint64_t wordWork = cone.Gates().size() + inputs.size() + 1;
         const uint64_t numWords =
@@ -176,7 +176,10 @@ class Decider {
                 SetTimeIsOver();
                 return true;
             }
-            FillRandomly(random, inputs.data(), inputs.size());
+            if (word % 2 == 0)
+                patterns.FillAtRandom(inputs);
+            else
+                patterns.FillAimed(true, inputs);
             const uint64_t ones = cone.Evaluate(inputs);
             if (ones == 0)
                 continue;

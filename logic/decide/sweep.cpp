@@ -4,6 +4,7 @@
 #include <cassert>
 
 #include "cone.h"
+#include "patterns.h"
 
 namespace booleq {
 
@@ -19,20 +20,6 @@ constexpr size_t kWatchedGates = 256;
 
 } // namespace
 
-void FillRandomly(std::mt19937_64& random, uint64_t* inputs, size_t numInputs)
-{
-    const uint64_t kind = random() % 4;
-    for (size_t input = 0; input < numInputs; ++input) {
-        uint64_t value = random();
-        if (kind >= 2) {
-            const uint64_t bias = random();
-            value &= random() & (kind == 3 ? random() : ~uint64_t(0));
-            value ^= (bias & 1u) != 0 ? ~uint64_t(0) : 0;
-        }
-        inputs[input] = value;
-    }
-}
-
 Sweep::Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline& deadline)
     : m_graph(graph.NumInputs()), m_deadline(deadline), m_max_conflicts(maxConflicts), m_random(1),
       m_is_asking(Solver::IsThere())
@@ -41,11 +28,15 @@ Sweep::Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline
     m_num_words = cone.Gates().size() < kManyGates ? kWords : kWordsOfMany;
     m_next_learnt = m_num_words / 2;
     m_values.resize(m_graph.NumGates() * m_num_words);
-    std::vector<uint64_t> inputs(graph.NumInputs());
+    Patterns patterns(graph, cone, root);
+    std::vector<uint64_t> inputs(cone.Inputs().size());
     for (size_t word = 0; word < m_num_words; ++word) {
-        FillRandomly(m_random, inputs.data(), inputs.size());
-        for (uint32_t input = 0; input < graph.NumInputs(); ++input)
-            WordsOf(input + 1)[word] = inputs[input];
+        if (word < m_num_words / 4)
+            patterns.FillAtRandom(inputs);
+        else
+            patterns.FillAimed(word % 4 == 0, inputs);
+        for (size_t place = 0; place < inputs.size(); ++place)
+            WordsOf(cone.Inputs()[place] + 1)[word] = inputs[place];
     }
     m_next.resize(m_graph.NumGates());
     for (uint32_t gate = 0; gate < m_graph.NumGates(); ++gate)

@@ -19,10 +19,6 @@
 
 namespace booleq {
 
-// Values of inputs for 64 assignments, different in each call: some inputs are mostly 0 or mostly 1
-// in some words, because gates of many operands are rarely moved by even chances.
-void FillRandomly(std::mt19937_64& random, uint64_t* inputs, size_t numInputs);
-
 class Sweep {
   public:
     // 'maxConflicts' bounds each question to the solver. Ends early, with gates left alone, when

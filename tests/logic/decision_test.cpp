@@ -123,8 +123,8 @@ TEST(Decision, FindsTheFirstRowAlsoWhereTheSolverMustHelp)
 {
     std::mt19937_64 random(3);
     size_t numDifferent = 0;
-    for (int round = 0; round < 60; ++round) {
-        const Expression left = RandomExpression(random, 20, 400);
+    for (int round = 0; round < 16; ++round) {
+        const Expression left = RandomExpression(random, 18, 400);
         const Expression right = Rewrite(ChangeOneOperator(left, random), random);
         const uint64_t row = ToFunction(left).FirstDifference(ToFunction(right));
         const Decision decision = DecideEqual(left, right, {});
@@ -135,7 +135,7 @@ TEST(Decision, FindsTheFirstRowAlsoWhereTheSolverMustHelp)
         EXPECT_TRUE(decision.isFirstRow);
         EXPECT_EQ(decision.Row(), row) << round;
     }
-    EXPECT_GT(numDifferent, 10u);
+    EXPECT_GT(numDifferent, 3u);
 }
 
 TEST(Decision, FindsTheOneRowOfThirtyInputs)

@@ -19,7 +19,7 @@ class Kq_PtrTester; // never defined: a pointer to it is only for testing in a c
 
 // One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: one at a time for all calls in the process, with synchronisation in between.
+// Threads: different objects at once; const members of one at once; changing one wants it alone.
 // Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
 // new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {

@@ -339,4 +339,28 @@ TEST(Receiver, BuildsACopyOfTheEquationThatIsBuilt)
     }
 }
 
+TEST(Receiver, ChangesTheTableThatIsBuilt)
+{
+    Engine equation;
+    ASSERT_TRUE(equation.SetEquation("A & B"));
+    const Engine::TruthTable expected(equation);
+    for (const char* text : {"", "C | D | E"}) {
+        Engine other;
+        other.SetEquation(text);
+        Engine::TruthTable table;
+        const DebugMode debugMode;
+        const Receiver receiver([&](size_t number) {
+            if (number != 3)
+                return;
+            SwitchOff(0);
+            table = other;
+            Engine::SetInternalDebugMode(true);
+        });
+        table = equation;
+        EXPECT_EQ(2u, table.GetVariableNames().size());
+        EXPECT_EQ(4u, table.GetRows().size());
+        EXPECT_TRUE(table == expected);
+    }
+}
+
 } // namespace

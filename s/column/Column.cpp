@@ -218,7 +218,7 @@ void KqColumn::RunKernel(const Rest& rest, unsigned int level, uint64_t* words)
     std::memcpy(words, tile, numWords * sizeof(uint64_t));
 }
 
-// What is left of 'rest' when 'variable' is 'value'; its codes go behind all others.
+// What is left of 'rest' when 'variable' is 'value'; its codes go after all others.
 KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value)
 {
     if (m_codes.size() < m_num_codes + rest.numCodes)

@@ -255,11 +255,8 @@ bool KqStore::HasHolder(const Watcher& watcher) const noexcept
     return watcher.holder != nullptr;
 }
 
-void KqStore::TellWatchers(const void* holder) noexcept
+void KqStore::TellEachWatcher(const void* holder) noexcept
 {
-    // Without the lock a watcher of this holder is seen: it was added before, and it stays.
-    if (!m_watchers.load(std::memory_order_relaxed))
-        return;
     const std::lock_guard<std::mutex> telling(s_sharedStores);
     for (Watcher* watcher = m_watchers.load(std::memory_order_relaxed); watcher;
          watcher = watcher->next) {

@@ -117,12 +117,18 @@ class KqStore {
     void AddWatcher(Watcher& watcher) noexcept;
     void RemoveWatcher(const Watcher& watcher) noexcept;
     bool HasHolder(const Watcher& watcher) const noexcept;
-    // The holder is about to let the store go.
-    void TellWatchers(const void* holder) noexcept;
+    // The holder lets the store go. Without the lock a watcher of this holder is seen: it was added
+    // before, and it stays.
+    void TellWatchers(const void* holder) noexcept
+    {
+        if (m_watchers.load(std::memory_order_relaxed))
+            TellEachWatcher(holder);
+    }
 
   private:
     const Node* PayTree() const;
     size_t CountNodes() const;
+    void TellEachWatcher(const void* holder) noexcept;
     unsigned int EvalOther(const Variables& variables) const;
 
     // The first three fields are what an equation is made of, in this order.

@@ -21,8 +21,7 @@ class Kq_PtrTester; // never defined: a pointer to it is only for testing in a c
 
 // One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: different objects are independent, whatever they share inside; const members of one
-// object may run at once; changing an object wants it alone. So with handles, tables and rows.
+// Threads: different objects at once; const members of one at once; changing one wants it alone.
 // Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
 // new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {
@@ -48,9 +47,8 @@ class KQ_EXPORT Kq_BoolEquation {
     // variables of an expression are numbered by first occurrence; all start at 0.
     // Fails: false, and the object is empty.  Cost: in step with the text.
     bool SetEquation(const Port::StringBase<char>& equation);
-    // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
-    // text that are not terms follow them. A term that is not a legal name or stands twice is
-    // skipped.
+    // Sets the equation over the inputs 'terms', the first being the first variable. Other names
+    // in the text follow them. A term that is not a legal name or stands twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
     // number, not the highest; 'reverseTerms' defines terms from the last.  Fails: as SetEquation.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
@@ -86,9 +84,8 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
-    // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
-    // every few milliseconds, less often of over 100,000 operators; it must not change this
-    // equation, and what it throws passes.
+    // row without variables; never traced. goOn(context), unless null, is asked every few
+    // milliseconds, less often of over 100,000 operators; it may throw, not change the equation.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;

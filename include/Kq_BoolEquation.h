@@ -12,15 +12,16 @@
 
 #include <port/Port_StringBase.h>
 
+#ifndef KQ_EXPORT // defined by the build where that is a DLL's
 #define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
+#endif
 
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
 // One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: different objects are independent, whatever they share inside; const members of one
-// object may run at once; changing an object wants it alone. So with handles, tables and rows.
+// Threads: different objects at once; const members of one at once; changing one wants it alone.
 // Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
 // new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {
@@ -156,9 +157,8 @@ struct Kq_BoolEquation::Refusal {
 // Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle(); // empty
-    // A value: each copy has elements of its own.
-    Handle(const Handle& other);
+    Handle();                    // empty
+    Handle(const Handle& other); // a value: each copy has elements of its own
     ~Handle();
     Handle& operator=(const Handle& other);
 

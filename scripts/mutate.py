@@ -71,7 +71,7 @@ SPEED_ONLY = [re.compile(text) for text in (
     r"\bhash|0x9e3779b97f4a7c15u",
     r"\w\[\d+\];",
 )]
-SKIPPED_FUNCTIONS = ("AdviseLargePages", "KqCheckStore", "RecentSlot")
+SKIPPED_FUNCTIONS = ("AdviseLargePages", "KqCheckTree")
 
 BINARY = {
     "<": ["<=", ">"], "<=": ["<"], ">": [">=", "<"], ">=": [">"], "==": ["!="], "!=": ["=="],

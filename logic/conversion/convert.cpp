@@ -4,13 +4,14 @@
 #include <unordered_map>
 
 #include "cover.h"
+#include "decision.h"
+#include "flatten.h"
 #include "foreign_tree.h"
 #include "names.h"
 #include "network.h"
 #include "notation.h"
 #include "notation_writer.h"
 #include "text.h"
-#include "word_comparison.h"
 
 namespace booleq {
 
@@ -55,10 +56,11 @@ std::string WriteForLibrary(const Expression& expression, Target target)
                     target == Target::Paren ? Parentheses::Whole : Parentheses::Needed);
 }
 
-// What a reading gives: the function, and what evaluating it takes; or nothing.
+// What a reading gives, over the inputs of what was written, in their order.
 struct Reread {
-    WordFunction function;
-    uint64_t cost = 0;
+    Expression expression; // of a text
+    Network network;       // of a file
+    bool isNetwork = false;
 };
 
 bool ReadLibrary(const std::string& text, const Expression& expression, Reread& reread)
@@ -70,12 +72,7 @@ bool ReadLibrary(const std::string& text, const Expression& expression, Reread& 
     if (!equation.SetEquationWithExplicitTerms(inputs, text.c_str(), false, false) ||
         equation.GetNumVariables() != expression.names.size())
         return false;
-    const Expression again = ToExpression(equation);
-    reread.cost = again.nodes.size();
-    reread.function = [again](const std::vector<uint64_t>& values) {
-        std::vector<uint64_t> stack;
-        return EvaluateWord(again, values, stack);
-    };
+    reread.expression = ToExpression(equation);
     return true;
 }
 
@@ -98,29 +95,37 @@ bool ReadForeign(const std::string& text, const Notation& notation,
             return false;
         node.left = found->second;
     }
-    Expression again;
-    if (!ToExpression(tree, again))
-        return false;
-    reread.cost = again.nodes.size();
-    reread.function = [again](const std::vector<uint64_t>& values) {
-        std::vector<uint64_t> stack;
-        return EvaluateWord(again, values, stack);
-    };
-    return true;
+    return ToExpression(tree, reread.expression);
 }
 
 bool ReadNetwork(const std::string& text, Target target, Reread& reread)
 {
-    Network network;
-    const bool isRead = target == Target::Blif  ? ReadBlif(text, network)
-                        : target == Target::Pla ? ReadPla(text, network)
-                                                : ReadEqn(text, network);
-    if (!isRead)
-        return false;
-    for (const Network::Definition& definition : network.definitions)
-        reread.cost += definition.expression.nodes.size();
-    reread.function = ToWordFunction(network);
-    return true;
+    reread.isNetwork = true;
+    if (target == Target::Blif)
+        return ReadBlif(text, reread.network);
+    return target == Target::Pla ? ReadPla(text, reread.network) : ReadEqn(text, reread.network);
+}
+
+// Each signal is one edge, however often it is used.
+Side SideOf(const Network& network, const std::vector<std::string>& names)
+{
+    const auto build = [&network](const std::vector<Edge>& inputs, GateGraph& graph) {
+        std::vector<Edge> signals(network.signals.size(), kFalseEdge);
+        std::copy(inputs.begin(), inputs.end(), signals.begin());
+        for (const Network::Definition& definition : network.definitions)
+            signals[definition.signal] = AddExpression(definition.expression, signals, graph);
+        return signals[network.output];
+    };
+    return {names, build, ToWordFunction(network)};
+}
+
+// Whether what was written says what was meant.
+Decision Check(const Expression& expression, Reread& reread, const Limits& limits)
+{
+    if (reread.isNetwork)
+        return DecideEqual(SideOf(expression), SideOf(reread.network, expression.names), limits);
+    reread.expression.names = expression.names; // by place: the text spells them in its own way
+    return DecideEqual(expression, reread.expression, limits);
 }
 
 std::string WriteNetwork(const Expression& expression, Target target, const Conversion& conversion,
@@ -272,7 +277,8 @@ Wrapping WrappingOf(Target target)
     return target >= Target::Blif ? Wrapping::Always : Wrapping::Optional;
 }
 
-Conversion Convert(const Expression& expression, Target target, const std::string& unit)
+Conversion Convert(const Expression& expression, Target target, const std::string& unit,
+                   const Limits& limits)
 {
     Conversion conversion;
     NameEverything(expression, target, unit, conversion);
@@ -287,26 +293,21 @@ Conversion Convert(const Expression& expression, Target target, const std::strin
         text = WriteNetwork(expression, target, conversion, conversion.fault);
         if (!conversion.fault.empty())
             return conversion;
-        isRead = ReadNetwork(text, target, reread);
+        isRead = ReadNetwork(text, target, reread) &&
+                 reread.network.numInputs == expression.names.size();
     } else {
         text = Write(expression, *notation, conversion.names);
         isRead = ReadForeign(text, *notation, conversion.names, reread);
     }
-    std::vector<uint64_t> stack;
-    const auto original = [&](const std::vector<uint64_t>& inputs) {
-        return EvaluateWord(expression, inputs, stack);
-    };
-    Comparison comparison;
+    Decision decision;
     if (isRead)
-        comparison = CompareWords(original, reread.function,
-                                  static_cast<unsigned int>(expression.names.size()),
-                                  expression.nodes.size() + reread.cost);
-    if (!isRead || !comparison.isEqual) {
+        decision = Check(expression, reread, limits);
+    if (!isRead || decision.IsDifferent()) {
         conversion.fault = "the text written does not read back as this function";
         return conversion;
     }
-    conversion.isExhaustive = comparison.isExhaustive;
-    conversion.numAssignments = comparison.numAssignments;
+    conversion.isProved = decision.IsEqual();
+    conversion.doubt = decision.reason;
     // Some readers of eqn files stumble over lines of comment.
     conversion.saysNames = !conversion.unit.empty() && target != Target::Eqn;
     if (conversion.saysNames)

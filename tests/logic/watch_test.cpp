@@ -122,11 +122,12 @@ TEST(Watch, EndsComparisonsOfLintAndConvert)
     const Kq_BoolEquation equation(text.c_str());
     ExpectItCanBeEnded([&] {
         std::string found;
-        for (const ForeignReading& reading : Lint(text, equation, Reading()).readings)
+        for (const ForeignReading& reading : Lint(text, equation, Reading(), {}).readings)
             found += reading.grouping + reading.textHere;
         return found;
     });
-    ExpectItCanBeEnded([&] { return Convert(ToExpression(equation), Target::Verilog, "").text; });
+    ExpectItCanBeEnded(
+        [&] { return Convert(ToExpression(equation), Target::Verilog, "", {}).text; });
 }
 
 } // namespace

@@ -24,8 +24,8 @@
 //    m_digits are the first variables of every holder. They never change while others hold them.
 //
 // Threads: const members at any time; they publish the owed tree and what evaluation keeps once,
-// complete. Others want the store alone, but for those that say so: what they change, loose tokens
-// and watchers, is guarded by one lock of the process. Nothing is allocated or freed under it.
+// complete. Others want the store alone, but for those that say so: the loose tokens and watchers
+// that these change are guarded by one lock of the process. Nothing is allocated or freed under it.
 class KqStore {
   public:
     typedef Kq_BoolEquationImp::Node Node;

@@ -125,11 +125,6 @@ bool IsSameTree(const Expression& left, const Expression& right)
                       });
 }
 
-bool IsInitValue(const Kq_BoolEquation& equation)
-{
-    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
-}
-
 // Looks for what this library alone is about.
 class Linter {
   public:
@@ -289,17 +284,20 @@ class Linter {
             "inputs that are not listed widen the table behind the others: " + names);
     }
 
+    // Every input at 1 is the last row, which has no digit where some have none.
     void CheckInitWidth()
     {
         const size_t numInputs = m_expression.names.size();
-        const std::string text = ToStd(m_equation.GetEquation(false));
-        const InitText init = ReadInitText(text, numInputs);
-        if (init.fault != InitFault::kNone || numInputs > kMaxFunctionInputs ||
-            init.numGivenRows >= uint64_t(1) << numInputs)
+        const InitWidth width = WidthOfInit(ToStd(m_equation.GetEquation(false)));
+        if (width.numRows == 0 || numInputs > kMaxFunctionInputs ||
+            width.numRows >= uint64_t(1) << numInputs)
             return;
-        Add("short-init", "the init value gives " + std::to_string(init.numGivenRows) +
-                              " rows of " + std::to_string(uint64_t(1) << numInputs) +
-                              "; the others read as " + (init.missingRows ? "1" : "0"));
+        std::vector<uint64_t> stack;
+        const uint64_t last =
+            EvaluateWord(m_expression, std::vector<uint64_t>(numInputs, 1), stack);
+        Add("short-init", "the init value gives " + std::to_string(width.numRows) + " rows of " +
+                              std::to_string(uint64_t(1) << numInputs) + "; the others read as " +
+                              ((last & 1u) != 0 ? "1" : "0"));
     }
 
     const std::string& m_text;

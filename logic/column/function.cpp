@@ -15,7 +15,7 @@ namespace {
 constexpr uint64_t kRowBit[6] = {0xaaaaaaaaaaaaaaaa, 0xcccccccccccccccc, 0xf0f0f0f0f0f0f0f0,
                                  0xff00ff00ff00ff00, 0xffff0000ffff0000, 0xffffffff00000000};
 
-size_t NumWordsFor(size_t numInputs)
+[[maybe_unused]] size_t NumWordsFor(size_t numInputs) // in assertions
 {
     return numInputs <= 6 ? 1 : size_t(1) << (numInputs - 6);
 }
@@ -86,35 +86,6 @@ std::string Digits(const Function& function, const char* prefix, unsigned int bi
         text += kDigits[rows & ((1u << rowsPerDigit) - 1)];
     }
     return text;
-}
-
-// 16 for no digit.
-unsigned int DigitValue(char digit)
-{
-    if (digit >= '0' && digit <= '9')
-        return static_cast<unsigned int>(digit - '0');
-    const char lower = static_cast<char>(digit | 0x20);
-    return lower >= 'a' && lower <= 'f' ? static_cast<unsigned int>(lower - 'a') + 10 : 16;
-}
-
-// Inputs that number as many rows.  Requires: numRows > 0.
-size_t NumInputsFor(uint64_t numRows)
-{
-    size_t numInputs = 0;
-    for (uint64_t highestRow = numRows - 1; highestRow > 0; highestRow /= 2)
-        ++numInputs;
-    return numInputs;
-}
-
-// Sets the rows from 'firstRow' on to 1.  Requires: firstRow <= 64 * words.size().
-void FillFrom(std::vector<uint64_t>& words, uint64_t firstRow, size_t numInputs)
-{
-    const auto firstWord = static_cast<size_t>(firstRow / 64);
-    if (firstWord < words.size())
-        words[firstWord] |= ~uint64_t(0) << (firstRow % 64);
-    for (size_t word = firstWord + 1; word < words.size(); ++word)
-        words[word] = ~uint64_t(0);
-    words.back() &= RowMask(numInputs);
 }
 
 } // namespace
@@ -219,55 +190,6 @@ std::string NoFunctionReason(size_t numInputs)
 {
     return Count(numInputs, "input") + ": at most " + std::to_string(kMaxFunctionInputs) +
            " have a truth table";
-}
-
-InitText ReadInitText(const std::string& text, size_t numInputs)
-{
-    InitText init;
-    const char kind = text.size() > 2 && text[0] == '0' ? static_cast<char>(text[1] | 0x20) : '\0';
-    if (kind != 'x' && kind != 'b') {
-        init.fault = InitFault::kPrefix;
-        return init;
-    }
-    const size_t rowsPerDigit = kind == 'x' ? 4 : 1;
-    for (size_t position = 2; position < text.size(); ++position) {
-        if (DigitValue(text[position]) < 1u << rowsPerDigit)
-            continue;
-        init.fault = InitFault::kDigit;
-        init.faultPosition = position;
-        return init;
-    }
-    const size_t numDigits = text.size() - 2;
-    init.numGivenRows = uint64_t(rowsPerDigit) * numDigits;
-    init.numInputs = NumInputsFor(init.numGivenRows);
-    if (init.numInputs != numInputs) {
-        init.fault = InitFault::kWidth;
-        return init;
-    }
-    init.words.resize(NumWordsFor(numInputs));
-    uint64_t numOnes = 0;
-    for (size_t digit = 0; digit < numDigits; ++digit) {
-        const uint64_t value = DigitValue(text[text.size() - 1 - digit]);
-        const size_t row = digit * rowsPerDigit;
-        init.words[row / 64] |= value << (row % 64);
-        numOnes += static_cast<uint64_t>(__builtin_popcountll(value));
-    }
-    const uint64_t numZeros = init.numGivenRows - numOnes;
-    init.missingRows = numZeros != 0 && (numOnes == 0 || numOnes >= numZeros);
-    if (init.missingRows && init.numGivenRows < uint64_t(1) << numInputs)
-        FillFrom(init.words, init.numGivenRows, numInputs);
-    return init;
-}
-
-InitText FunctionFromInit(const std::string& text, const std::vector<std::string>& inputs,
-                          bool lsbFirst, Function& function)
-{
-    InitText init = ReadInitText(text, inputs.size());
-    if (init.fault != InitFault::kNone)
-        return init;
-    const Function read(inputs, init.words);
-    function = lsbFirst ? read.Reversed() : read;
-    return init;
 }
 
 } // namespace booleq

@@ -80,31 +80,6 @@ bool FunctionOf(const Kq_BoolEquation& equation, Function& function);
 // "31 inputs: at most 30 have a truth table".
 std::string NoFunctionReason(size_t numInputs);
 
-enum class InitFault { kNone, kPrefix, kDigit, kWidth };
-
-// What an init value says, and what the library makes of the rows that it leaves out.
-struct InitText {
-    InitFault fault = InitFault::kNone;
-    size_t faultPosition = 0;  // of the byte that is no digit
-    uint64_t numGivenRows = 0; // rows that have a digit
-    size_t numInputs = 0;      // that so many rows are read over
-    bool missingRows = false;  // the value of the rows without a digit, if there are any
-    std::vector<uint64_t> words;
-};
-
-// Reads "0x..." or "0b..." for 'numInputs' inputs as the library does, without the expression that
-// the library makes of it: 30 inputs take a quarter of a GB.
-// Deliberate: missing rows are 0 when all digits are ones, or some are but fewer than zeros;
-// otherwise they are 1. That is what the library reads, and no padding.
-InitText ReadInitText(const std::string& text, size_t numInputs);
-
-// 'function' becomes the init value over 'inputs'; 'lsbFirst' takes the first input for bit 0 of
-// the row number, and the function is then turned so that the first input is the most significant.
-// Fails: the fault of the text; 'function' is as it was.
-// Requires: inputs all different, at most kMaxFunctionInputs.
-InitText FunctionFromInit(const std::string& text, const std::vector<std::string>& inputs,
-                          bool lsbFirst, Function& function);
-
 } // namespace booleq
 
 #endif

@@ -10,6 +10,7 @@
 
 #include "expression.h"
 #include "function.h"
+#include "listed_inputs.h"
 
 namespace logic_support {
 
@@ -27,6 +28,18 @@ inline std::vector<std::string> Names(size_t numInputs)
     for (size_t input = 0; input < numInputs; ++input)
         names.push_back("v" + std::to_string(input));
     return names;
+}
+
+// The function that the library reads an init value as.
+inline booleq::Function FromInit(const std::string& text, const std::vector<std::string>& inputs)
+{
+    booleq::Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = inputs;
+    Kq_BoolEquation equation;
+    booleq::Function function;
+    EXPECT_TRUE(SetFromText(equation, text, reading) && FunctionOf(equation, function)) << text;
+    return function;
 }
 
 // Half of the rows are ones, or, for 'isSparse', a quarter.

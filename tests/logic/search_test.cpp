@@ -32,8 +32,7 @@ Function Make(size_t numInputs, uint64_t column)
 
 std::string Shortest(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
+    const Function function = FromInit(init, inputs);
     const ShortForm shortForm = FindShortForm(function);
     EXPECT_TRUE(shortForm.isFound);
     EXPECT_TRUE(ToFunction(shortForm.expression) == function);
@@ -164,9 +163,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
 
 std::string Said(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
-    return FindKind(function).text;
+    return FindKind(FromInit(init, inputs)).text;
 }
 
 TEST(FindKind, NamesFunctions)
@@ -200,9 +197,7 @@ TEST(FindKind, NamesFunctions)
 
 TEST(FindKind, TellsIdleInputs)
 {
-    Function function;
-    FunctionFromInit("0x3c", kNames.empty() ? kNames : std::vector<std::string>{"A", "B", "C"},
-                     false, function);
+    const Function function = FromInit("0x3c", {"A", "B", "C"});
     EXPECT_EQ(FindKind(function).idle, std::vector<std::string>{"C"});
     EXPECT_EQ(FindKind(function).mattering, (std::vector<std::string>{"A", "B"}));
 }

@@ -50,15 +50,6 @@ void SayRefusal(const Text& text, const Request& request, Output& output,
     Complain(output, message);
 }
 
-// An init value is read over the usable inputs in the order that the request gives.
-std::vector<std::string> UsableInputs(const Reading& reading)
-{
-    std::vector<std::string> inputs = CheckInputs(reading.inputs).usable;
-    if (reading.reverse)
-        std::reverse(inputs.begin(), inputs.end());
-    return inputs;
-}
-
 } // namespace
 
 int ForEachText(const Request& request, Output& output,
@@ -98,13 +89,6 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
 
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function)
 {
-    if (request.reading.hasInputs) {
-        const std::vector<std::string> inputs = UsableInputs(request.reading);
-        if (inputs.size() <= kMaxFunctionInputs &&
-            FunctionFromInit(text.text, inputs, request.reading.lsbFirst, function).fault ==
-                InitFault::kNone)
-            return true;
-    }
     Kq_BoolEquation equation;
     if (!SetEquation(text, request, output, equation))
         return false;

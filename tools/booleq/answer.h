@@ -37,9 +37,8 @@ int ForEachText(const Request& request, Output& output,
 // Fails: false, and the refusal has been said or, with --json, answered: return kRefused.
 bool SetEquation(const Text& text, const Request& request, Output& output,
                  Kq_BoolEquation& equation);
-// The same, and the function over the equation's inputs in their order. Init values over listed
-// inputs do not take the way through an expression, so 30 inputs are no trouble.
-// Fails: false as above, also for more than 30 inputs.
+// The same, and the function over the equation's inputs in their order.
+// Fails: false as above, also for more than kMaxFunctionInputs inputs.
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function);
 
 // Fails: UsageError, when both --json and 'option', which asks for another format, are given.

@@ -24,11 +24,13 @@ bool SetNamed(const Text& text, const Request& request, Output& output, Function
 {
     if (request.reading.hasInputs)
         return SetFunction(text, request, output, function);
-    const InitText init = ReadInitText(text.text, 0);
-    if (init.fault != InitFault::kWidth || init.numInputs > kMaxMatchInputs)
+    const InitWidth width = WidthOfInit(text.text);
+    if (width.numRows == 0 || width.numInputs > kMaxMatchInputs)
         return SetFunction(text, request, output, function);
-    return FunctionFromInit(text.text, LetterNames(init.numInputs), false, function).fault ==
-           InitFault::kNone;
+    Request named = request;
+    named.reading.hasInputs = true;
+    named.reading.inputs = LetterNames(width.numInputs);
+    return SetFunction(text, named, output, function);
 }
 
 struct Answer {

@@ -99,7 +99,7 @@ RowShape ShapeOf(const std::vector<std::string>& names, uint64_t numPrinted, Row
 
 uint64_t NumPrinted(const std::vector<std::string>& names, uint64_t maxRows)
 {
-    return std::min(uint64_t(1) << names.size(), maxRows); // at most 30 names
+    return std::min(uint64_t(1) << names.size(), maxRows);
 }
 
 } // namespace

@@ -13,11 +13,6 @@ typedef std::vector<std::string> Notes;
 
 constexpr unsigned int kMaxShownInitInputs = 10; // 256 hexadecimal and 1024 binary digits
 
-bool IsInitValue(const Kq_BoolEquation& equation)
-{
-    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
-}
-
 std::string InputName(const Kq_BoolEquation& equation, size_t index)
 {
     return Visible(ToStd(equation.GetVariables()[index].first));
@@ -75,7 +70,7 @@ void PutMissingTable(const Kq_BoolEquation& equation, Output& output)
         reason = "none: there are no inputs";
     } else {
         reason = "none: " + std::to_string(numInputs) + " inputs, more than " +
-                 std::to_string(kMaxTableInputs);
+                 std::to_string(kMaxFunctionInputs);
     }
     PutField(output, "init value", reason);
     PutField(output, "term equation",
@@ -121,10 +116,9 @@ void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& not
         notes.push_back("an init value over no inputs is an empty group, which is 0");
         return;
     }
-    const size_t numDigits = equation.GetEquation(false).length() - 2;
-    const uint64_t numGiven = uint64_t(numDigits) * (equation.IsHexInitValue() ? 4 : 1);
+    const uint64_t numGiven = WidthOfInit(ToStd(equation.GetEquation(false))).numRows;
     const unsigned int numInputs = equation.GetNumVariables();
-    if (numInputs <= kMaxTableInputs && numGiven < uint64_t(1) << numInputs)
+    if (numInputs <= kMaxFunctionInputs && numGiven < uint64_t(1) << numInputs)
         notes.push_back("the value given has " + std::to_string(numGiven) +
                         " rows, the table more: the others read as " +
                         std::to_string(HighestRow(equation)));
@@ -185,7 +179,7 @@ void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t ma
     PutRenderings(equation, request.reading, output);
     PutInputs(equation, output);
     const unsigned int numInputs = equation.GetNumVariables();
-    const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
+    const bool hasTable = numInputs >= 1 && numInputs <= kMaxFunctionInputs;
     if (hasTable) {
         PutInitValues(equation, request.Has("--whole"), output);
         PutField(output, "truth table", std::to_string(uint64_t(1) << numInputs) + " rows");
@@ -202,7 +196,7 @@ void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t ma
 Json ShowAsJson(Kq_BoolEquation& equation, const Request& request)
 {
     const unsigned int numInputs = equation.GetNumVariables();
-    const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
+    const bool hasTable = numInputs >= 1 && numInputs <= kMaxFunctionInputs;
     Json json;
     json["equation"] = ToStd(equation.GetEquation(true));
     json["kind"] = !IsInitValue(equation)      ? "expression"

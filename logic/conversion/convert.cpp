@@ -136,7 +136,7 @@ std::string WriteNetwork(const Expression& expression, Target target, const Conv
                 " inputs; this has " + std::to_string(expression.names.size());
         return std::string();
     }
-    return WritePla(FindCover(Bits(ToFunction(expression))), names);
+    return WritePla(FindCover(ToFunction(expression).GetRows()), names);
 }
 
 std::string Listed(const std::vector<std::string>& names, const char* before, const char* between)

@@ -1,6 +1,8 @@
 #include "match.h"
 
 #include <algorithm>
+#include <cassert>
+#include <utility>
 
 #include "watch.h"
 
@@ -8,24 +10,44 @@ namespace booleq {
 
 namespace {
 
-typedef std::vector<uint8_t> Rows; // one value each
-
-Rows RowsOf(const Function& function)
+// How many ones each block of 2^log rows of a word has, each count in the bits of its block.
+// Requires: log <= 6.
+uint64_t BlockCounts(uint64_t word, unsigned int log)
 {
-    Rows rows(function.NumRows());
-    for (size_t row = 0; row < rows.size(); ++row)
-        rows[row] = function.At(row) ? 1 : 0;
-    return rows;
+    for (unsigned int bit = 0; bit < log; ++bit)
+        word = (word & ~BitPattern(bit)) + ((word >> (1u << bit)) & ~BitPattern(bit));
+    return word;
+}
+
+// Whether every cofactor by the inputs up to 'place' has as many ones in both.
+bool HasSameCounts(const Rows& left, const Rows& right, unsigned int place)
+{
+    const unsigned int log = left.NumInputs() - 1 - place; // of a cofactor's rows
+    const size_t blockWords = log > 6 ? size_t(1) << (log - 6) : 1;
+    for (size_t first = 0; first < left.Size(); first += blockWords) {
+        if (blockWords == 1) {
+            if (BlockCounts(left.Words()[first], log) != BlockCounts(right.Words()[first], log))
+                return false;
+            continue;
+        }
+        int balance = 0; // a cofactor has at most 2^15 rows
+        for (size_t word = first; word < first + blockWords; ++word)
+            balance += __builtin_popcountll(left.Words()[word]) -
+                       __builtin_popcountll(right.Words()[word]);
+        if (balance != 0)
+            return false;
+    }
+    return true;
 }
 
 class MatchSearch {
   public:
-    MatchSearch(const Rows& second, unsigned int numInputs, bool allowInversions)
-        : m_second(second), m_num_inputs(numInputs), m_allow_inversions(allowInversions)
+    MatchSearch(const Rows& second, bool allowInversions)
+        : m_second(second), m_num_inputs(second.NumInputs()), m_allow_inversions(allowInversions)
     {
-        for (unsigned int input = 0; input < numInputs; ++input)
+        for (unsigned int input = 0; input < m_num_inputs; ++input)
             m_order.push_back(input);
-        m_inverted.resize(numInputs);
+        m_inverted.resize(m_num_inputs);
     }
 
     // 'first' has its inputs in the order of m_order; those before 'place' are settled.
@@ -40,9 +62,11 @@ class MatchSearch {
             for (const bool isInverted : {false, true}) {
                 if (isInverted && !m_allow_inversions)
                     continue;
-                Rows rows = Moved(first, place, source, isInverted);
+                Rows rows = SwapInputs(first, place, source);
+                if (isInverted)
+                    rows = InvertInput(std::move(rows), place);
                 const bool isNew = std::find(tried.begin(), tried.end(), rows) == tried.end();
-                if (!isNew || !HasSameCounts(rows, place))
+                if (!isNew || !HasSameCounts(rows, m_second, place))
                     continue;
                 std::swap(m_order[place], m_order[source]);
                 m_inverted[place] = isInverted;
@@ -59,36 +83,6 @@ class MatchSearch {
     const std::vector<bool>& Inverted() const { return m_inverted; }
 
   private:
-    // The inputs at two places trade them; the one that is now at 'place' is inverted on demand.
-    Rows Moved(const Rows& first, unsigned int place, unsigned int source, bool isInverted) const
-    {
-        const unsigned int placeBit = m_num_inputs - 1 - place;
-        const unsigned int sourceBit = m_num_inputs - 1 - source;
-        Rows rows(first.size());
-        for (size_t row = 0; row < rows.size(); ++row) {
-            const size_t value = (row >> placeBit & 1u) ^ (isInverted ? 1u : 0u);
-            const size_t other = row >> sourceBit & 1u;
-            size_t from = row & ~(size_t(1) << placeBit) & ~(size_t(1) << sourceBit);
-            if (place == source)
-                from |= value << placeBit;
-            else
-                from |= value << sourceBit | other << placeBit;
-            rows[row] = first[from];
-        }
-        return rows;
-    }
-
-    // Every cofactor by the inputs up to 'place' has as many ones in both.
-    bool HasSameCounts(const Rows& rows, unsigned int place) const
-    {
-        const auto length = static_cast<std::ptrdiff_t>(uint64_t(1) << (m_num_inputs - 1 - place));
-        for (auto own = rows.begin(), other = m_second.begin(); own != rows.end();
-             own += length, other += length)
-            if (std::count(own, own + length, 1) != std::count(other, other + length, 1))
-                return false;
-        return true;
-    }
-
     const Rows& m_second;
     unsigned int m_num_inputs;
     bool m_allow_inversions;
@@ -100,23 +94,17 @@ class MatchSearch {
 
 Matching Match(const Function& first, const Function& second, bool allowInversions)
 {
-    const auto numInputs = static_cast<unsigned int>(first.NumInputs());
-    const Rows target = RowsOf(second);
+    assert(first.NumInputs() == second.NumInputs() && first.NumInputs() <= kMaxMatchInputs);
     Matching matching;
     for (const bool isInverted : {false, true}) {
         if (isInverted && !allowInversions)
             break;
-        Rows rows = RowsOf(first);
-        if (isInverted)
-            for (uint8_t& value : rows)
-                value ^= 1u;
-        const auto count = [](const Rows& counted) {
-            return std::count(counted.begin(), counted.end(), 1);
-        };
-        MatchSearch search(target, numInputs, allowInversions);
-        if (count(rows) != count(target) || !search.Find(rows, 0))
+        const Rows rows = isInverted ? ~first.GetRows() : first.GetRows();
+        MatchSearch search(second.GetRows(), allowInversions);
+        if (NumOnes(rows) != NumOnes(second.GetRows()) || !search.Find(rows, 0))
             continue;
         matching = {true, search.Order(), search.Inverted(), isInverted};
+        assert(Apply(matching, first, second.Inputs()) == second);
         break;
     }
     return matching;
@@ -125,8 +113,8 @@ Matching Match(const Function& first, const Function& second, bool allowInversio
 Function Apply(const Matching& matching, const Function& first,
                const std::vector<std::string>& inputs)
 {
-    std::vector<uint64_t> words(first.Words().size());
     const size_t numInputs = first.NumInputs();
+    Rows rows(static_cast<unsigned int>(numInputs));
     for (size_t row = 0; row < first.NumRows(); ++row) {
         size_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
@@ -134,10 +122,9 @@ Function Apply(const Matching& matching, const Function& first,
                 ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
             from |= size_t(value ? 1 : 0) << (numInputs - 1 - matching.sources[place]);
         }
-        if (first.At(from) != matching.isInverted)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+        rows.Set(row, first.At(from) != matching.isInverted);
     }
-    return Function(inputs, std::move(words));
+    return {inputs, std::move(rows)};
 }
 
 } // namespace booleq

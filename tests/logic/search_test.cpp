@@ -5,7 +5,6 @@
 
 #include <gtest/gtest.h>
 
-#include "bits.h"
 #include "cover.h"
 #include "kind.h"
 #include "logic_support.h"
@@ -27,7 +26,7 @@ std::vector<std::string> FirstNames(size_t numInputs)
 
 Function Make(size_t numInputs, uint64_t column)
 {
-    return Function(FirstNames(numInputs), {column});
+    return {FirstNames(numInputs), Rows::OfWord(static_cast<unsigned int>(numInputs), column)};
 }
 
 std::string Shortest(const std::string& init, const std::vector<std::string>& inputs)
@@ -137,7 +136,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
     std::mt19937_64 random(2);
     for (size_t numInputs = 1; numInputs <= 8; ++numInputs)
         for (int count = 0; count < 20; ++count) {
-            const Bits function(RandomFunction(FirstNames(numInputs), random, true));
+            const Rows function = RandomFunction(FirstNames(numInputs), random, true).GetRows();
             const std::vector<Cube> cubes = FindCover(function);
             const auto covers = [&](const Cube& cube, uint64_t row) {
                 for (size_t input = 0; input < numInputs; ++input)

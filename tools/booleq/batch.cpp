@@ -9,7 +9,7 @@
 #include "commands.h"
 #include "lines.h"
 #include "progress.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {

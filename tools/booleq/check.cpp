@@ -1,7 +1,7 @@
 // The command 'check': accepted, or the refusal that every command gives.
 #include "answer.h"
 #include "commands.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {

@@ -1,6 +1,6 @@
 // Truth-table rows in several formats, one by one; never held as a whole.
-#ifndef BOOLEQ_ROWS_H
-#define BOOLEQ_ROWS_H
+#ifndef BOOLEQ_TABLE_ROWS_H
+#define BOOLEQ_TABLE_ROWS_H
 
 #include <cstdint>
 #include <functional>

@@ -4,18 +4,11 @@
 
 #include "cover.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 
 namespace {
-
-std::string Listed(const std::vector<std::string>& words, const char* between)
-{
-    std::string text;
-    for (const std::string& word : words)
-        text += (text.empty() ? "" : between) + word;
-    return text;
-}
 
 // A function of the inputs that matter, with ways to ask about it.
 class Explainer {
@@ -102,7 +95,7 @@ class Explainer {
         }
         const bool isAll = numInverted == literals.size();
         const std::string kind = isAnd ? (isAll ? "NOR" : "AND") : (isAll ? "NAND" : "OR");
-        return Say(kind, kind + " of " + Listed(isAll ? plain : literals, ", "));
+        return Say(kind, kind + " of " + Join(isAll ? plain : literals, ", "));
     }
 
     bool FindParity()
@@ -114,9 +107,9 @@ class Explainer {
             names.push_back(m_names[m_support[place]]);
         }
         if (m_rows == parity)
-            return Say("XOR", "XOR of " + Listed(names, ", ") + ": 1 when an odd number is 1");
+            return Say("XOR", "XOR of " + Join(names, ", ") + ": 1 when an odd number is 1");
         if (m_rows == ~parity)
-            return Say("XNOR", "XNOR of " + Listed(names, ", ") + ": 1 when an even number is 1");
+            return Say("XNOR", "XNOR of " + Join(names, ", ") + ": 1 when an even number is 1");
         return false;
     }
 
@@ -162,7 +155,7 @@ class Explainer {
         for (const unsigned int select : selects)
             names.push_back(m_names[select]);
         return Say("multiplexer",
-                   "multiplexer, select " + Listed(names, ", ") + ": " + Listed(choices, "; "));
+                   "multiplexer, select " + Join(names, ", ") + ": " + Join(choices, "; "));
     }
 
     // For each input that matters, whether it has to be inverted for the function to rise with it.
@@ -217,7 +210,7 @@ class Explainer {
         if (values.empty())
             return false;
         const auto needed = std::find(values.begin(), values.end(), 1) - values.begin();
-        const std::string literals = Listed(Literals(inverted), ", ");
+        const std::string literals = Join(Literals(inverted), ", ");
         if (2 * needed == static_cast<std::ptrdiff_t>(m_support.size()) + 1)
             return Say("majority", "majority of " + literals);
         return Say("threshold",
@@ -233,8 +226,8 @@ class Explainer {
         for (size_t count = 0; count < values.size(); ++count)
             if (values[count] == 1)
                 counts.push_back(std::to_string(count));
-        return Say("symmetric", "1 when the number of ones among " + Listed(Literals(0), ", ") +
-                                    " is " + Listed(counts, " or "));
+        return Say("symmetric", "1 when the number of ones among " + Join(Literals(0), ", ") +
+                                    " is " + Join(counts, " or "));
     }
 
     // Products without a common input, summed: and-or; the other three forms are its inversions.
@@ -263,7 +256,7 @@ class Explainer {
                 if ((cube.used >> input & 1u) != 0)
                     literals.push_back(
                         Literal(input, ((cube.values >> input & 1u) != 0) == isOrAnd));
-            const std::string group = Listed(literals, isOrAnd ? " | " : " & ");
+            const std::string group = Join(literals, isOrAnd ? " | " : " & ");
             groups.emplace_back(literals.size(), literals.size() > 1 ? "(" + group + ")" : group);
         }
         std::stable_sort(groups.begin(), groups.end(), [](const auto& left, const auto& right) {
@@ -275,7 +268,7 @@ class Explainer {
             sizes += std::to_string(group.first);
             texts.push_back(group.second);
         }
-        std::string text = Listed(texts, isOrAnd ? " & " : " | ");
+        std::string text = Join(texts, isOrAnd ? " & " : " | ");
         if (hasInvertedOutput)
             text = "~(" + text + ")";
         const std::string kind =

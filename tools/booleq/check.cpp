@@ -29,9 +29,7 @@ int RunCheck(const Request& request, Output& output)
             PutJson(text, request, "yes", result, output);
             return kDone;
         }
-        std::string list;
-        for (const std::string& name : names)
-            list += (list.empty() ? ": " : ", ") + Visible(name);
+        const std::string list = names.empty() ? "" : ": " + Visible(Join(names, ", "));
         const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
         output.Put(place + "accepted: " + Kind(equation) + " over " +
                    (names.empty() ? "no inputs" : Count(names.size(), "input")) + list + "\n");

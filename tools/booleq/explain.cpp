@@ -13,10 +13,7 @@ namespace {
 
 std::string Listed(const std::vector<std::string>& names)
 {
-    std::string text;
-    for (const std::string& name : names)
-        text += (text.empty() ? "" : ", ") + Visible(name);
-    return text.empty() ? "none" : text;
+    return names.empty() ? "none" : Visible(Join(names, ", "));
 }
 
 std::string ShortNote(const Description& description)

@@ -43,10 +43,7 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
 
 std::string Names(const Function& function)
 {
-    std::string names;
-    for (const std::string& name : function.Inputs())
-        names += (names.empty() ? "" : ", ") + Visible(name);
-    return names;
+    return Visible(Join(function.Inputs(), ", "));
 }
 
 // The digits are printed in full once.

@@ -31,9 +31,7 @@ void PutText(const Text& text, const Function& function, Output& output)
 {
     if (text.line > 0)
         PutField(output, "line", std::to_string(text.line));
-    std::string names;
-    for (const std::string& name : function.Inputs())
-        names += (names.empty() ? "" : ", ") + Visible(name);
+    std::string names = Visible(Join(function.Inputs(), ", "));
     if (function.NumInputs() > 1)
         names +=
             "; " + Visible(function.Inputs().front()) + " is the most significant, row k is bit k";

@@ -47,10 +47,8 @@ void PutInputs(const Kq_BoolEquation& equation, Output& output)
         PutField(output, "inputs", "none");
         return;
     }
-    std::string names = std::to_string(numInputs) + ": " + InputName(equation, 0);
-    for (size_t index = 1; index < numInputs; ++index)
-        names += ", " + InputName(equation, index);
-    PutField(output, "inputs", names);
+    PutField(output, "inputs",
+             std::to_string(numInputs) + ": " + Visible(Join(InputNames(equation), ", ")));
     const std::string rows = "row k is bit k of the init value";
     if (numInputs == 1)
         PutField(output, "bit order", "one input only; " + rows);
@@ -142,10 +140,10 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
             "--lsb-first and --reverse say how an init value is read; this is an expression");
     const size_t numListed = reading.hasInputs ? CheckInputs(reading.inputs).usable.size() : 0;
     if (reading.hasInputs && equation.GetNumVariables() > numListed) {
-        std::string names = InputName(equation, numListed);
-        for (size_t index = numListed + 1; index < equation.GetNumVariables(); ++index)
-            names += ", " + InputName(equation, index);
-        notes.push_back("not in --inputs, so behind them: " + names);
+        const std::vector<std::string> names = InputNames(equation);
+        const std::vector<std::string> others(names.begin() + static_cast<long>(numListed),
+                                              names.end());
+        notes.push_back("not in --inputs, so behind them: " + Visible(Join(others, ", ")));
     }
     if (!ReadsBack(equation, reading))
         notes.push_back(

@@ -36,17 +36,6 @@ std::string ReasonOf(const ForeignTree& tree)
     return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
 }
 
-Target TargetOf(const Notation* notation)
-{
-    if (notation == &VerilogNotation())
-        return Target::Verilog;
-    if (notation == &CNotation())
-        return Target::C;
-    if (notation == &LibertyNotation())
-        return Target::Liberty;
-    return notation == &VhdlNotation() ? Target::Vhdl : Target::Python;
-}
-
 std::string WithoutLineEnd(std::string text)
 {
     if (!text.empty() && text.back() == '\n')
@@ -111,7 +100,7 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     reading.valueHere = (own(inputs) & 1u) != 0;
     reading.grouping = WriteWhole(tree, expression.names);
     reading.reason = ReasonOf(tree);
-    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(&notation), "").text);
+    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "").text);
     reading.textHere = TextHere(tree, foreign);
     return reading;
 }
@@ -277,11 +266,10 @@ class Linter {
         const size_t numListed = check.usable.size();
         if (m_expression.names.size() <= numListed)
             return;
-        std::string names;
-        for (size_t input = numListed; input < m_expression.names.size(); ++input)
-            names += (names.empty() ? "" : ", ") + m_expression.names[input];
-        Add("unlisted-input",
-            "inputs that are not listed widen the table behind the others: " + names);
+        const std::vector<std::string> unlisted(
+            m_expression.names.begin() + static_cast<long>(numListed), m_expression.names.end());
+        Add("unlisted-input", "inputs that are not listed widen the table behind the others: " +
+                                  Join(unlisted, ", "));
     }
 
     // Every input at 1 is the last row, which has no digit where some have none.

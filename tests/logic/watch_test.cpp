@@ -126,7 +126,8 @@ TEST(Watch, EndsComparisonsOfLintAndConvert)
             found += reading.grouping + reading.textHere;
         return found;
     });
-    ExpectItCanBeEnded([&] { return Convert(ToExpression(equation), Target::Verilog, "").text; });
+    ExpectItCanBeEnded(
+        [&] { return Convert(ToExpression(equation), *FindTarget("verilog"), "").text; });
 }
 
 } // namespace

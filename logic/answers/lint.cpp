@@ -71,7 +71,7 @@ std::string TextHere(const ForeignTree& tree, const WordFunction& function)
 }
 
 ForeignReading ReadAs(const Notation& notation, const std::string& text,
-                      const Expression& expression)
+                      const Expression& expression, const Limits& limits)
 {
     ForeignReading reading;
     reading.notation = notation.name;
@@ -80,28 +80,16 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     if (!reading.isRead)
         return reading;
     Renumber(notation, expression.names, tree);
-    const WordFunction foreign = ToWordFunction(tree);
-    std::vector<uint64_t> stack;
-    const auto own = [&](const std::vector<uint64_t>& inputs) {
-        return EvaluateWord(expression, inputs, stack);
-    };
-    Expression inBits;
-    const uint64_t cost = ToExpression(tree, inBits) ? 1 : 64; // a row at a time
-    const auto numInputs = static_cast<unsigned int>(expression.names.size());
-    reading.comparison =
-        CompareWords(own, foreign, numInputs, expression.nodes.size() + cost * tree.nodes.size());
-    if (numInputs <= kMaxLintHexInputs)
-        reading.hex = Tabulate(foreign, expression.names).Hex();
-    if (reading.comparison.isEqual)
+    const Side foreign = SideOf(tree);
+    reading.decision = DecideEqual(SideOf(expression), foreign, limits);
+    if (expression.names.size() <= kMaxLintHexInputs)
+        reading.hex = Tabulate(foreign.evaluate, expression.names).Hex();
+    if (reading.decision.IsEqual())
         return reading;
-    std::vector<uint64_t> inputs;
-    for (const bool value : reading.comparison.first)
-        inputs.push_back(value ? 1 : 0);
-    reading.valueHere = (own(inputs) & 1u) != 0;
     reading.grouping = WriteWhole(tree, expression.names);
     reading.reason = ReasonOf(tree);
-    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "").text);
-    reading.textHere = TextHere(tree, foreign);
+    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "", limits).text);
+    reading.textHere = TextHere(tree, foreign.evaluate);
     return reading;
 }
 
@@ -118,9 +106,9 @@ bool IsSameTree(const Expression& left, const Expression& right)
 class Linter {
   public:
     Linter(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
-           const Expression& expression, LintReport& report)
+           const Expression& expression, const Limits& limits, LintReport& report)
         : m_text(text), m_equation(equation), m_reading(reading), m_expression(expression),
-          m_report(report)
+          m_limits(limits), m_report(report)
     {
     }
 
@@ -150,21 +138,6 @@ class Linter {
             return false;
         again = ToExpression(equation);
         return again.names == m_expression.names;
-    }
-
-    Comparison CompareWith(const Expression& other) const
-    {
-        std::vector<uint64_t> ownStack;
-        std::vector<uint64_t> otherStack;
-        return CompareWords(
-            [&](const std::vector<uint64_t>& inputs) {
-                return EvaluateWord(m_expression, inputs, ownStack);
-            },
-            [&](const std::vector<uint64_t>& inputs) {
-                return EvaluateWord(other, inputs, otherStack);
-            },
-            static_cast<unsigned int>(m_expression.names.size()),
-            m_expression.nodes.size() + other.nodes.size());
     }
 
     // The same tree, with parentheses wherever a reader may doubt.
@@ -206,11 +179,16 @@ class Linter {
             Add("blank", message).details = {{"without it", "refused"}, {"write", ClearText()}};
             return;
         }
-        const Comparison comparison = CompareWith(other);
-        if (comparison.isEqual)
+        const Decision decision = DecideEqual(m_expression, other, m_limits);
+        if (decision.IsEqual())
             return;
+        const bool isDifferent = decision.IsDifferent();
         Add("blank", message).details = {
-            {"first at", AssignmentText(m_expression.names, comparison.first)},
+            {!isDifferent          ? "not decided"
+             : decision.isFirstRow ? "first at"
+                                   : "differs at",
+             isDifferent ? AssignmentText(m_expression.names, decision.assignment)
+                         : decision.reason},
             {"with it", WriteOwn(m_expression, OwnSyntax::First, Parentheses::Whole)},
             {"without it", WriteOwn(other, OwnSyntax::First, Parentheses::Whole)},
             {"write", ClearText()}};
@@ -233,7 +211,8 @@ class Linter {
                 const std::string text = ToStd((m_equation.*rendering.get)(hasBlanks));
                 Expression again;
                 if (!ReadAgain(text, again) ||
-                    !(IsSameTree(again, m_expression) || CompareWith(again).isEqual))
+                    !(IsSameTree(again, m_expression) ||
+                      DecideEqual(m_expression, again, m_limits).IsEqual()))
                     finding.details.emplace_back(rendering.name, text);
             }
             if (finding.details.empty())
@@ -292,6 +271,7 @@ class Linter {
     const Kq_BoolEquation& m_equation;
     const Reading& m_reading;
     const Expression& m_expression;
+    const Limits& m_limits;
     LintReport& m_report;
 };
 
@@ -301,11 +281,12 @@ bool LintReport::IsClean() const
 {
     return findings.empty() &&
            std::all_of(readings.begin(), readings.end(), [](const ForeignReading& reading) {
-               return !reading.isRead || reading.comparison.isEqual;
+               return !reading.isRead || reading.decision.IsEqual();
            });
 }
 
-LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading)
+LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
+                const Limits& limits)
 {
     LintReport report;
     const Expression expression = ToExpression(equation);
@@ -313,8 +294,8 @@ LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const 
     report.grouping = WriteOwn(expression, OwnSyntax::First, Parentheses::Whole);
     if (!IsInitValue(equation))
         for (const Notation* notation : ForeignNotations())
-            report.readings.push_back(ReadAs(*notation, text, expression));
-    Linter(text, equation, reading, expression, report).Run();
+            report.readings.push_back(ReadAs(*notation, text, expression, limits));
+    Linter(text, equation, reading, expression, limits, report).Run();
     return report;
 }
 

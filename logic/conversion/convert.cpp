@@ -1,10 +1,12 @@
 #include "convert.h"
 
+#include <algorithm>
 #include <cassert>
 
+#include "decision.h"
+#include "flatten.h"
 #include "names.h"
 #include "text.h"
-#include "word_comparison.h"
 
 namespace booleq {
 
@@ -39,28 +41,32 @@ std::string NameComments(const Expression& expression, const Target& target,
     return text;
 }
 
-// Whether the text says the same as the expression.
-bool ReadsBack(const Expression& expression, const Target& target, const UnitNames& names,
-               const std::string& text, Conversion& conversion)
+// Each signal is one edge, however often it is used.
+Side SideOf(const Network& network, const std::vector<std::string>& names)
 {
-    Reread reread;
-    if (!target.readAgain(text, target, names, reread))
-        return false;
-    std::vector<uint64_t> stack;
-    const auto original = [&](const std::vector<uint64_t>& inputs) {
-        return EvaluateWord(expression, inputs, stack);
+    const auto build = [&network](const std::vector<Edge>& inputs, GateGraph& graph) {
+        std::vector<Edge> signals(network.signals.size(), kFalseEdge);
+        std::copy(inputs.begin(), inputs.end(), signals.begin());
+        for (const Network::Definition& definition : network.definitions)
+            signals[definition.signal] = AddExpression(definition.expression, signals, graph);
+        return signals[network.output];
     };
-    const Comparison comparison =
-        CompareWords(original, reread.function, static_cast<unsigned int>(expression.names.size()),
-                     expression.nodes.size() + reread.cost);
-    conversion.isExhaustive = comparison.isExhaustive;
-    conversion.numAssignments = comparison.numAssignments;
-    return comparison.isEqual;
+    return {names, build, ToWordFunction(network)};
+}
+
+// Whether what was written says what was meant.
+Decision Check(const Expression& expression, Reread& reread, const Limits& limits)
+{
+    if (reread.isNetwork)
+        return DecideEqual(SideOf(expression), SideOf(reread.network, expression.names), limits);
+    reread.expression.names = expression.names; // by place: the text spells them in its own way
+    return DecideEqual(expression, reread.expression, limits);
 }
 
 } // namespace
 
-Conversion Convert(const Expression& expression, const Target& target, const std::string& unit)
+Conversion Convert(const Expression& expression, const Target& target, const std::string& unit,
+                   const Limits& limits)
 {
     Conversion conversion;
     UnitNames names;
@@ -69,10 +75,17 @@ Conversion Convert(const Expression& expression, const Target& target, const std
     const std::string text = target.write(expression, target, names, conversion.fault);
     if (!conversion.fault.empty())
         return conversion;
-    if (!ReadsBack(expression, target, names, text, conversion)) {
+    Reread reread;
+    Decision decision;
+    const bool isRead = target.readAgain(text, target, names, reread);
+    if (isRead)
+        decision = Check(expression, reread, limits);
+    if (!isRead || decision.IsDifferent()) {
         conversion.fault = "the text written does not read back as this function";
         return conversion;
     }
+    conversion.isProved = decision.IsEqual();
+    conversion.doubt = decision.reason;
     conversion.names = names.inputs;
     conversion.output = names.output;
     conversion.unit = names.unit;

@@ -15,15 +15,6 @@ namespace booleq {
 
 namespace {
 
-void SetExpression(const Expression& expression, Reread& reread)
-{
-    reread.cost = expression.nodes.size();
-    reread.function = [expression](const std::vector<uint64_t>& values) {
-        std::vector<uint64_t> stack;
-        return EvaluateWord(expression, values, stack);
-    };
-}
-
 template <OwnSyntax syntax, Parentheses parentheses>
 std::string WriteInSyntax(const Expression& expression, const Target& /*target*/,
                           const UnitNames& /*names*/, std::string& /*fault*/)
@@ -40,8 +31,7 @@ bool ReadOwn(const std::string& text, const Target& /*target*/, const UnitNames&
     Kq_BoolEquation equation;
     if (!SetFromText(equation, text, reading) || equation.GetNumVariables() != names.inputs.size())
         return false;
-    const Expression again = ToExpression(equation);
-    SetExpression(again, reread);
+    reread.expression = ToExpression(equation);
     return true;
 }
 
@@ -65,11 +55,7 @@ bool ReadForeign(const std::string& text, const Target& target, const UnitNames&
             return false;
         node.left = found->second;
     }
-    Expression again;
-    if (!ToExpression(tree, again))
-        return false;
-    SetExpression(again, reread);
-    return true;
+    return ToExpression(tree, reread.expression);
 }
 
 std::string WriteForeign(const Expression& expression, const Target& target, const UnitNames& names,
@@ -99,13 +85,8 @@ template <bool (*read)(const std::string&, Network&)>
 bool ReadFile(const std::string& text, const Target& /*target*/, const UnitNames& names,
               Reread& reread)
 {
-    Network network;
-    if (!read(text, network) || network.numInputs != names.inputs.size())
-        return false;
-    for (const Network::Definition& definition : network.definitions)
-        reread.cost += definition.expression.nodes.size();
-    reread.function = ToWordFunction(network);
-    return true;
+    reread.isNetwork = true;
+    return read(text, reread.network) && reread.network.numInputs == names.inputs.size();
 }
 
 std::string InVerilogModule(const std::string& text, const UnitNames& names)

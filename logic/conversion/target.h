@@ -8,7 +8,6 @@
 #include "expression.h"
 #include "network.h"
 #include "notation.h"
-#include "word_function.h"
 
 namespace booleq {
 
@@ -16,10 +15,11 @@ namespace booleq {
 // asked, a file in any case, or an expression only.
 enum class Wrapping { Never, Optional, Always };
 
-// What a reading gives: the function over the inputs in their order, and what evaluating it takes.
+// What a reading gives, over the inputs of what was written, in their order.
 struct Reread {
-    WordFunction function;
-    uint64_t cost = 0;
+    Expression expression; // of a text
+    Network network;       // of a file
+    bool isNetwork = false;
 };
 
 struct Target {

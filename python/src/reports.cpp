@@ -23,6 +23,8 @@ constexpr size_t kMaxShownNodes = 300;
 constexpr size_t kMaxShownText = 10000;
 constexpr size_t kMaxShownInitInputs = 5;
 
+constexpr double kLintSeconds = 10; // for each reader
+
 py::object Link(size_t index)
 {
     if (index == booleq::TreeList::kNoNode)
@@ -72,18 +74,18 @@ py::object Equivalent(const Equation& equation, const py::object& otherObject)
         throw py::type_error("other must be an Equation, not " +
                              std::string(Py_TYPE(otherObject.ptr())->tp_name));
     const auto& other = otherObject.cast<const Equation&>();
-    const booleq::Equality equality = CompareFunctions(FunctionOf(equation), FunctionOf(other));
-    if (!equality.fault.empty())
-        throw py::value_error(equality.fault);
+    const booleq::Decision decision = booleq::DecideEquations(equation.Get(), other.Get(), {});
+    if (decision.verdict == booleq::Verdict::Undecided)
+        throw py::value_error(booleq::UndecidedText(decision, {}));
     py::object counterexample = py::none();
     py::object values = py::none();
-    if (!equality.IsEqual()) {
+    if (decision.IsDifferent()) {
         counterexample = py::dict();
-        for (size_t input = 0; input < equality.inputs.size(); ++input)
-            counterexample[Decode(equality.inputs[input])] = equality.InputAt(input) ? 1 : 0;
-        values = py::make_tuple(equality.left ? 1 : 0, equality.right ? 1 : 0);
+        for (size_t input = 0; input < decision.inputs.size(); ++input)
+            counterexample[Decode(decision.inputs[input])] = decision.assignment[input] ? 1 : 0;
+        values = py::make_tuple(decision.left ? 1 : 0, decision.right ? 1 : 0);
     }
-    return ResultClass("Equivalence")(equality.IsEqual(), counterexample, values);
+    return ResultClass("Equivalence")(decision.IsEqual(), counterexample, values);
 }
 
 std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& inputs)
@@ -131,13 +133,13 @@ py::object Explain(const Equation& equation)
 
 py::object DifferenceOf(const booleq::LintReport& report, const booleq::ForeignReading& reading)
 {
-    if (!reading.isRead || reading.comparison.isEqual)
+    if (!reading.decision.IsDifferent())
         return py::none();
     py::dict assignment;
     for (size_t input = 0; input < report.inputs.size(); ++input)
-        assignment[Decode(report.inputs[input])] = reading.comparison.first[input] ? 1 : 0;
+        assignment[Decode(report.inputs[input])] = reading.decision.assignment[input] ? 1 : 0;
     return ResultClass("Difference")(
-        "assignment"_a = assignment, "here"_a = reading.valueHere ? 1 : 0,
+        "assignment"_a = assignment, "here"_a = reading.decision.left ? 1 : 0,
         "grouping"_a = Decode(reading.grouping), "reason"_a = Decode(reading.reason),
         "write_there"_a = Decode(reading.textThere), "write_here"_a = OrNone(reading.textHere));
 }
@@ -148,8 +150,10 @@ py::object ReadingOf(const booleq::LintReport& report, const booleq::ForeignRead
     py::object same = py::none();
     py::object comparedAll = py::none();
     if (reading.isRead) {
-        same = py::bool_(reading.comparison.isEqual);
-        comparedAll = py::bool_(reading.comparison.isExhaustive);
+        const bool isDecided = reading.decision.verdict != booleq::Verdict::Undecided;
+        comparedAll = py::bool_(isDecided);
+        if (isDecided)
+            same = py::bool_(reading.decision.IsEqual());
     } else {
         refusal = Decode(reading.fault);
     }
@@ -170,8 +174,8 @@ py::object FindingOf(const booleq::Finding& finding)
 
 py::object LintEquation(const Equation& equation)
 {
-    const booleq::LintReport report =
-        booleq::Lint(Encode(equation.Text()), equation.Get(), equation.GetReading());
+    const booleq::LintReport report = booleq::Lint(Encode(equation.Text()), equation.Get(),
+                                                   equation.GetReading(), {kLintSeconds});
     py::list readers;
     for (const booleq::ForeignReading& reading : report.readings)
         readers.append(ReadingOf(report, reading));

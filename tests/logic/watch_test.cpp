@@ -122,12 +122,12 @@ TEST(Watch, EndsComparisonsOfLintAndConvert)
     const Kq_BoolEquation equation(text.c_str());
     ExpectItCanBeEnded([&] {
         std::string found;
-        for (const ForeignReading& reading : Lint(text, equation, Reading()).readings)
+        for (const ForeignReading& reading : Lint(text, equation, Reading(), {}).readings)
             found += reading.grouping + reading.textHere;
         return found;
     });
     ExpectItCanBeEnded(
-        [&] { return Convert(ToExpression(equation), *FindTarget("verilog"), "").text; });
+        [&] { return Convert(ToExpression(equation), *FindTarget("verilog"), "", {}).text; });
 }
 
 } // namespace

@@ -16,10 +16,10 @@ WORDS = {
     "show": ([], []), "check": ([], []), "table": ([], []), "init": ([], []),
     "tree": ([], []), "kmap": ([], []), "eval": ([], ["A=1"]), "equal": ([], ["A"]),
     "explain": ([], []), "permute": (["--from", "A,B", "--to", "A,B"], []), "match": ([], ["A"]),
-    "convert": (["--to", "verilog"], []), "lint": ([], []),
+    "convert": (["--to", "verilog"], []), "lint": ([], []), "sat": ([], []),
 }
 NAMES31 = ["v%d" % number for number in range(31)]
-COLUMNS = {"table", "init", "kmap", "equal", "explain", "match"}  # no more than 30 inputs
+COLUMNS = {"table", "init", "kmap", "explain", "match"}  # no more than 30 inputs
 OWN_INPUTS = {"permute"}  # always lists A and B, by an option of its own
 
 

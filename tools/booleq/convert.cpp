@@ -2,13 +2,15 @@
 // printed.
 #include "convert.h"
 
-#include "answer.h"
 #include "commands.h"
+#include "decide.h"
 #include "text.h"
 
 namespace booleq {
 
 namespace {
+
+constexpr double kDefaultSeconds = 10; // for each equation
 
 const Target& ParseTarget(const std::string& word)
 {
@@ -53,8 +55,7 @@ Json ToJson(const Expression& expression, const Request& request, const Conversi
     for (size_t input = 0; input < conversion.names.size(); ++input)
         json["inputs"].push_back(
             {{"input", expression.names[input]}, {"name", conversion.names[input]}});
-    json["compared_assignments"] = conversion.numAssignments;
-    json["compared_all"] = conversion.isExhaustive;
+    json["compared_all"] = conversion.isProved;
     return json;
 }
 
@@ -64,9 +65,9 @@ void PutText(const Expression& expression, const Conversion& conversion, Output&
     if (!conversion.saysNames)
         for (const auto& change : ChangedNames(expression, conversion))
             Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
-    if (!conversion.isExhaustive)
-        Complain(output, "note: too large to compare all assignments; " +
-                             std::to_string(conversion.numAssignments) + " were compared");
+    if (!conversion.isProved)
+        Complain(output, "warning: not decided whether this reads back as the same function: " +
+                             conversion.doubt);
     output.Put(conversion.text);
 }
 
@@ -74,6 +75,7 @@ int RunConvert(const Request& request, Output& output)
 {
     const Target& target = ParseTarget(request.Get("--to"));
     std::string unit = ParseUnit(request, target);
+    const Limits limits = ParseLimits(request, kDefaultSeconds);
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
@@ -83,16 +85,17 @@ int RunConvert(const Request& request, Output& output)
         if (text.line > 0 && target.wrapping != Wrapping::Never &&
             (!unit.empty() || target.wrapping == Wrapping::Always))
             ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
-        const Conversion conversion = Convert(expression, target, ownUnit);
+        const Conversion conversion = Convert(expression, target, ownUnit, limits);
         if (!conversion.fault.empty()) {
             Refuse(text, request, output, conversion.fault);
             return kRefused;
         }
         if (request.json)
-            PutJson(text, request, "done", ToJson(expression, request, conversion), output);
+            PutJson(text, request, conversion.isProved ? "done" : "undecided",
+                    ToJson(expression, request, conversion), output);
         else
             PutText(expression, conversion, output);
-        return kDone;
+        return conversion.isProved ? kDone : kUndecided;
     });
 }
 
@@ -109,11 +112,14 @@ Command ConvertCommand()
         "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
         "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
         "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
-        "the answer says how. Before it is printed the text is read again and compared.\n"
+        "the answer says how. Before it is printed the text is read again and compared; where "
+        "that\n"
+        "takes over 10 seconds, or what --seconds says, a warning says so, and the status is 4.\n"
         "Of lines, each module gets its line's number behind its name.\n",
         {{"--to", "TARGET", "What to write"},
          {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
-         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"}},
+         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"},
+         SecondsOption()},
         {"booleq convert 'a | b & c' --to verilog",
          "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",
          "booleq convert --inputs A,B 0x6 --to python"},

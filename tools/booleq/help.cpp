@@ -17,7 +17,7 @@ constexpr char kSyntax[] =
 
 constexpr char kStatuses[] =
     "Exit status: 0 done or yes, 1 no or findings, 2 wrong usage or reading or writing failed,\n"
-    "3 a text was refused.\n";
+    "3 a text was refused, 4 not decided: a limit came first.\n";
 
 // Options of the tool itself.
 const std::vector<Option>& ToolOptions()

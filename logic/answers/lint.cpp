@@ -6,6 +6,7 @@
 #include "convert.h"
 #include "foreign_tree.h"
 #include "function.h"
+#include "lint_reason.h"
 #include "notation_writer.h"
 #include "short_form.h"
 #include "text.h"
@@ -16,25 +17,6 @@ namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
 constexpr size_t kMaxShortenedInputs = 8;
-
-bool Contains(const ForeignTree& tree, Meaning meaning)
-{
-    return std::any_of(
-        tree.nodes.begin(), tree.nodes.end(),
-        [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
-}
-
-std::string ReasonOf(const ForeignTree& tree)
-{
-    const bool isInt = tree.notation->values == Values::Int;
-    if (isInt && Contains(tree, Meaning::BitNot))
-        return "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
-    if (Contains(tree, Meaning::Add))
-        return "\"+\" adds there";
-    if (tree.notation == &LibertyNotation())
-        return "\"^\" binds tighter than \"&\" and \"*\" there, these tighter than \"|\" and \"+\"";
-    return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
-}
 
 Target TargetOf(const Notation* notation)
 {
@@ -110,7 +92,10 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
         inputs.push_back(value ? 1 : 0);
     reading.valueHere = (own(inputs) & 1u) != 0;
     reading.grouping = WriteWhole(tree, expression.names);
-    reading.reason = ReasonOf(tree);
+    const uint64_t undoneCost = expression.nodes.size() + 64 * tree.nodes.size();
+    reading.reason = FindReason(expression, tree, [&](const ForeignTree& undone) {
+        return CompareWords(own, ToWordFunction(undone), numInputs, undoneCost).isEqual;
+    });
     reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(&notation), "").text);
     reading.textHere = TextHere(tree, foreign);
     return reading;

@@ -24,8 +24,8 @@ BatchResult RefuseText(const char* what, const std::string& text, const Reading&
     const RefusalReport report = ExplainRefusal(text, reading);
     std::string message =
         std::string(what) + " refused at " + PlaceName(text, report.offset) + ": " + report.reason;
-    if (!report.mend.empty())
-        message += "; " + report.mend;
+    if (!report.hint.empty())
+        message += "; " + report.hint;
     return Fail(BatchOutcome::kTextRefused, std::move(message));
 }
 

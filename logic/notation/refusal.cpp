@@ -80,7 +80,7 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
     const char character = context.At(0);
     if (character == '\r') {
         report.reason = "a carriage return is no blank";
-        report.mend = "remove it (DOS line ends: tr -d '\\r')";
+        report.hint = "remove it (DOS line ends: tr -d '\\r')";
         return;
     }
     report.reason = Quoted(context.Token()) + " is not part of the syntax";
@@ -89,11 +89,11 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
             Quoted(context.Token()) + " is no constant, 0 and 1 are, and begins no name";
     const std::string name = context.WholeName();
     if (character == '=')
-        report.mend = "leave out what is assigned to, up to the '='";
+        report.hint = "leave out what is assigned to, up to the '='";
     else if (name.size() > 1 && IsPrintable(name))
-        report.mend = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
+        report.hint = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
     else
-        report.mend = "a name with such a character needs single quotes";
+        report.hint = "a name with such a character needs single quotes";
 }
 
 void ExplainWord(const Context& context, RefusalReport& report)
@@ -109,9 +109,9 @@ void ExplainWord(const Context& context, RefusalReport& report)
         return character >= 'a' && character <= 'z' ? static_cast<char>(character - 32) : character;
     });
     if (upper == ".XNOR." || upper == ".NXOR.")
-        report.mend = "write .NXOR.";
+        report.hint = "write .NXOR.";
     else if (upper != word && std::strstr(kWords, upper.c_str()))
-        report.mend = "write " + upper;
+        report.hint = "write " + upper;
 }
 
 void ExplainOperand(const Context& context, const std::string& text, const Reading& reading,
@@ -123,14 +123,14 @@ void ExplainOperand(const Context& context, const std::string& text, const Readi
                                report.offset == 1 && !reading.hasInputs;
     const char behindNegation = context.OperatorBehindNegation();
     if (looksLikeInit)
-        report.mend = std::string("for an init value name its inputs with ") + reading.inputsName +
+        report.hint = std::string("for an init value name its inputs with ") + reading.inputsName +
                       ", the most significant first";
     else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
-        report.mend = "write '" + token + behindNegation + "' without a blank in it";
+        report.hint = "write '" + token + behindNegation + "' without a blank in it";
     else if (token[0] == '\'' && !context.NameBefore().empty())
-        report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+        report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
     else
-        report.mend = "put an operator before it, & or |";
+        report.hint = "put an operator before it, & or |";
 }
 
 void ExplainOperator(const Context& context, const char* side, RefusalReport& report)
@@ -138,7 +138,7 @@ void ExplainOperator(const Context& context, const char* side, RefusalReport& re
     const std::string token = context.Token();
     report.reason = "the operator " + Quoted(token) + " has no operand on its " + side;
     if (token.size() == 1 && context.At(1) == token[0])
-        report.mend = "write '" + token + "' for '" + token + token + "'";
+        report.hint = "write '" + token + "' for '" + token + token + "'";
 }
 
 void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalReport& report)
@@ -152,7 +152,7 @@ void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalRe
                     ", and " + std::to_string(numGiven) +
                     (numGiven == 1 ? " is listed" : " are listed");
     if (isHex && text.size() == 3 && numGiven == 1)
-        report.mend = "over one input write the two bits as 0b...";
+        report.hint = "over one input write the two bits as 0b...";
 }
 
 void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& report)
@@ -161,10 +161,10 @@ void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& rep
     case Refusal::PAREN:
         if (context.At(0) == '(') {
             report.reason = "nothing closes this '('";
-            report.mend = "add a ')' behind the group, or leave it out";
+            report.hint = "add a ')' behind the group, or leave it out";
         } else {
             report.reason = "this ')' closes no '('";
-            report.mend = "leave it out, or add a '(' before the group";
+            report.hint = "leave it out, or add a '(' before the group";
         }
         return;
     case Refusal::NO_OPERAND:
@@ -224,9 +224,9 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
     case Refusal::QUOTE:
         report.reason = "nothing closes this quote";
         if (!context.NameBefore().empty())
-            report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+            report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
         else if (context.Before() == ')')
-            report.mend = "the negation of a group stands before it: ~( )";
+            report.hint = "the negation of a group stands before it: ~( )";
         return;
     case Refusal::OPERAND:
         return ExplainOperand(context, text, reading, report);
@@ -242,7 +242,7 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
         if (refusal.offset == 1) {
             report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... "
                             "or 0b...";
-            report.mend = "put an expression that begins so in parentheses";
+            report.hint = "put an expression that begins so in parentheses";
             return;
         }
         report.reason = Quoted(context.Token()) + " is no " +

@@ -68,7 +68,8 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
     reading.hasInputs = true;
     reading.inputs = function.Inputs();
     Function given;
-    if (FunctionFromInit(row.init, reading.inputs, false, given).fault != InitFault::kNone)
+    if (FunctionFromInit(LibraryText(row.init, reading), reading.inputs, false, given).fault !=
+        InitFault::kNone)
         return RefuseText("the init value is", row.init, reading);
     const uint64_t different = function.FirstDifference(given);
     if (different == Function::kNoRow)
@@ -90,7 +91,8 @@ BatchResult WriteEquation(BatchRow& row, const Reading& reading)
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
     Kq_BoolEquation equation;
     if (row.init.find('\0') != std::string::npos ||
-        ReadInitText(row.init, reading.inputs.size()).fault != InitFault::kNone ||
+        ReadInitText(LibraryText(row.init, reading), reading.inputs.size()).fault !=
+            InitFault::kNone ||
         !SetFromText(equation, row.init, reading))
         return RefuseText("the init value is", row.init, reading);
     row.equation = ToStd(equation.GetEquationAsExpression(true));

@@ -17,8 +17,14 @@ struct Reading {
     const char* inputsName = "--inputs"; // what the caller's users write to list inputs
 };
 
-// Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.
+// Sets 'equation' from 'text', which holds no NUL byte. Over listed inputs an init value may also
+// be one that only people write (init_literal.h).  Fails: false.
 bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+// The same without those: what the library itself reads.
+bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+
+// What the library is given for a text over these inputs; the text where it is refused.
+std::string LibraryText(const std::string& text, const Reading& reading);
 
 // Names of a list 'A,B,'c,d'': a comma inside single quotes belongs to the name, blanks around a
 // name do not.  Fails: false when a quote is not closed.

@@ -42,6 +42,17 @@ class TestConstruction:
         error = refusal("0x8")
         assert "inputs=" in error.hint and "--" not in error.hint
 
+    def test_an_init_value_may_have_a_size(self) -> None:
+        inputs = ["S", "A", "B"]
+        assert Equation("8'hca", inputs) == Equation("0xca", inputs)
+        assert Equation.from_init("8'b1100_1010", inputs).hex_init == "0xca"
+        assert Equation("0x2", ["A"])(A=1) == 1
+        assert Equation("2'h1", ["A"])(A=1) == 0
+        with pytest.raises(ParseError) as caught:
+            Equation("16'hca", inputs)
+        assert (caught.value.offset, caught.value.length, caught.value.code) == (0, 2, "init-width")
+        assert caught.value.hint == "write 8'hca, or list 4 inputs"
+
     def test_lsb_first_turns_the_bits(self) -> None:
         assert Equation("0x2", ["A", "B"]).hex_init == "0x2"
         assert Equation("0x2", ["A", "B"], lsb_first=True).hex_init == "0x4"

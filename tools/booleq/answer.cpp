@@ -101,8 +101,9 @@ bool SetFunction(const Text& text, const Request& request, Output& output, Funct
     if (request.reading.hasInputs) {
         const std::vector<std::string> inputs = UsableInputs(request.reading);
         if (inputs.size() <= kMaxFunctionInputs &&
-            FunctionFromInit(text.text, inputs, request.reading.lsbFirst, function).fault ==
-                InitFault::kNone)
+            FunctionFromInit(LibraryText(text.text, request.reading), inputs,
+                             request.reading.lsbFirst, function)
+                    .fault == InitFault::kNone)
             return true;
     }
     Kq_BoolEquation equation;

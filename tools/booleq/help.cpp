@@ -15,13 +15,12 @@ constexpr char kSyntax[] =
     "Init values: 0x... or 0b..., row k is bit k; the first input is the most significant bit of "
     "k.\n";
 
-constexpr char kStatuses[] =
-    "Exit status; of many lines the highest counts:\n"
-    "  0  done, or yes\n"
-    "  1  no, or there are findings\n"
-    "  2  wrong usage; or reading or writing failed, or memory ran out\n"
-    "  3  a text was refused; the others were answered\n"
-    "  4  not decided in the time of --seconds\n";
+constexpr char kStatuses[] = "Exit status; of many lines the highest counts:\n"
+                             "  0  done, or yes\n"
+                             "  1  no, or there are findings\n"
+                             "  2  wrong usage; or reading or writing failed, or memory ran out\n"
+                             "  3  a text was refused; the others were answered\n"
+                             "  4  not decided in the time of --seconds\n";
 
 // Options of the tool itself.
 const std::vector<Option>& ToolOptions()

@@ -34,7 +34,7 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     reading.reverse = reverse;
     Kq_BoolEquation equation;
     Function read;
-    if (!SetFromText(equation, text, reading) || !FunctionOf(equation, read))
+    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read))
         return false;
     const std::string rendered =
         ToStd(rendering[1] == 'x' ? equation.GetEquationAsHexInitValue(false)

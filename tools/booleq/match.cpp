@@ -6,6 +6,7 @@
 
 #include "answer.h"
 #include "commands.h"
+#include "init_literal.h"
 #include "options.h"
 #include "text.h"
 
@@ -23,25 +24,32 @@ std::vector<std::string> LetterNames(size_t count)
     return names;
 }
 
-// Whether the text can be an init value over so many inputs.
-bool HasWidth(const InitText& init, size_t numInputs)
+// The number of inputs of an init value that names none; kMaxFunctionInputs + 1 for another text.
+size_t WidthOf(const std::string& text)
 {
-    return init.fault == InitFault::kNone || init.numInputs == numInputs;
+    size_t numInputs = ReadInitText(text, 0).numInputs;
+    if (IsSizedLiteral(text))
+        for (numInputs = 0; numInputs <= kMaxFunctionInputs; ++numInputs)
+            if (!ReadInitLiteral(text, numInputs).code)
+                break;
+    const InitText init = ReadInitText(ReadInitLiteral(text, numInputs).text, numInputs);
+    return init.fault == InitFault::kNone ? numInputs : kMaxFunctionInputs + 1;
 }
 
 // The inputs that --inputs names, or --second-inputs for the second: an init value that is not so
 // wide, and one without listed inputs, gets letters. Anything else is read as usual.
 bool SetNamed(const Text& text, const Request& request, Output& output, Function& function)
 {
-    const std::vector<std::string> listed = CheckInputs(request.reading.inputs).usable;
-    const InitText init = ReadInitText(text.text, listed.size());
-    const bool isInit = init.fault == InitFault::kNone || init.fault == InitFault::kWidth;
-    if (!isInit || init.numInputs > kMaxFunctionInputs ||
-        (request.reading.hasInputs && HasWidth(init, listed.size())))
+    Reading reading(request.reading);
+    Kq_BoolEquation equation;
+    const size_t width = WidthOf(text.text);
+    const bool isFitting = reading.hasInputs && SetFromText(equation, text.text, reading);
+    if (width > kMaxFunctionInputs || isFitting)
         return SetFunction(text, request, output, function);
-    return FunctionFromInit(text.text, LetterNames(init.numInputs), request.reading.lsbFirst,
-                            function)
-               .fault == InitFault::kNone;
+    Request lettered(request);
+    lettered.reading.hasInputs = true;
+    lettered.reading.inputs = LetterNames(width);
+    return SetFunction(text, lettered, output, function);
 }
 
 // The same for the second, whose inputs may have names of their own.

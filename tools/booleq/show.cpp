@@ -151,7 +151,7 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
         std::string names = InputName(equation, numListed);
         for (size_t index = numListed + 1; index < equation.GetNumVariables(); ++index)
             names += ", " + InputName(equation, index);
-        notes.push_back("not in --inputs, so behind them: " + names);
+        notes.push_back("not in --inputs, so after them: " + names);
     }
     if (!ReadsBack(equation, reading))
         notes.push_back(
@@ -174,7 +174,7 @@ Notes NotesFor(Kq_BoolEquation& equation, const Reading& reading, bool hasTable)
     else
         NoteExpression(equation, reading, notes);
     if (equation.GetNumVariables() == 1)
-        notes.push_back("over one input only the binary init value reads back");
+        notes.push_back("over one input the library reads the binary init value only");
     NoteNames(equation, hasTable, notes);
     return notes;
 }

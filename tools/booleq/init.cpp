@@ -2,6 +2,7 @@
 #include <algorithm>
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "picture.h"
 #include "text.h"
@@ -55,34 +56,6 @@ std::string Call(const Function& function, const std::string& text, bool lsbFirs
     const std::string shown = text.size() <= 40 ? text : text.substr(0, 40) + "...";
     return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + shown + "\", " +
            (lsbFirst ? "true" : "false") + ", " + (reverse ? "true" : "false") + ")";
-}
-
-// Two columns; the digits of the second are made when those of the first are written.
-void PutBoth(const char* label, const Order& msb, const Order& lsb, size_t width,
-             std::string (Function::*digits)() const, Output& output)
-{
-    PutLabel(output, label);
-    {
-        const std::string first = (msb.column.*digits)();
-        output.Put(first);
-        output.Put(std::string(std::max(width, first.size()) - first.size() + 2, ' '));
-    }
-    output.Put((lsb.column.*digits)());
-    output.Put("\n");
-}
-
-void PutDigits(const Order& msb, const Order& lsb, Output& output)
-{
-    const std::string name = Visible(msb.column.Inputs().front());
-    const std::string first = name + " most significant";
-    // Longer digits are not aligned.
-    const size_t width =
-        std::max<size_t>(first.size(), std::min<uint64_t>(34, 2 + msb.column.NumRows()));
-    PutLabel(output, "");
-    output.Put(first + std::string(width - first.size() + 2, ' ') + name +
-               " least (--lsb-first)\n");
-    PutBoth("hexadecimal", msb, lsb, width, &Function::Hex, output);
-    PutBoth("binary", msb, lsb, width, &Function::Binary, output);
 }
 
 void PutTried(const Function& function, const std::string& text, bool lsbFirst, bool reverse,
@@ -142,12 +115,7 @@ void PutInit(const Order& msb, const Order& lsb, Output& output)
              names.size() == 1 ? "bit k, from the right, is row k: " + Visible(names[0]) + "=k"
                                : "bit k, from the right, is row k; bit 0 is all inputs 0, bit " +
                                      std::to_string(function.NumRows() - 1) + " all inputs 1");
-    if (names.size() == 1) {
-        PutField(output, "hexadecimal", function.Hex());
-        PutField(output, "binary", function.Binary());
-    } else {
-        PutDigits(msb, lsb, output);
-    }
+    PutBitOrders(msb.column, lsb.column, output);
     PutReadsBack(msb, lsb, output);
 }
 

@@ -19,9 +19,9 @@ class Bits {
     }
 
     unsigned int NumInputs() const { return m_num_inputs; }
-    uint64_t NumRows() const { return uint64_t(1) << m_num_inputs; }
+    size_t NumRows() const { return size_t(1) << m_num_inputs; }
     const std::vector<uint64_t>& Words() const { return m_words; }
-    bool At(uint64_t row) const { return (m_words[row / 64] >> (row % 64) & 1u) != 0; }
+    bool At(uint64_t row) const { return ValueOfRow(m_words, row); }
 
     bool IsZero() const;
     bool IsOne() const;

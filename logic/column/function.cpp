@@ -76,11 +76,11 @@ void Double(std::vector<uint64_t>& words, size_t numInputs)
 std::string Digits(const Function& function, const char* prefix, unsigned int bitsPerDigit)
 {
     static constexpr char kDigits[] = "0123456789abcdef";
-    const uint64_t numRows = function.NumRows();
-    const uint64_t rowsPerDigit = std::min<uint64_t>(bitsPerDigit, numRows);
+    const size_t numRows = function.NumRows();
+    const size_t rowsPerDigit = std::min<size_t>(bitsPerDigit, numRows);
     std::string text = prefix;
     text.reserve(text.size() + numRows / rowsPerDigit);
-    for (uint64_t row = numRows; row > 0;) {
+    for (size_t row = numRows; row > 0;) {
         row -= rowsPerDigit;
         const uint64_t rows = function.Words()[row / 64] >> (row % 64);
         text += kDigits[rows & ((1u << rowsPerDigit) - 1)];
@@ -106,11 +106,14 @@ size_t NumInputsFor(uint64_t numRows)
     return numInputs;
 }
 
-// Sets the rows from 'firstRow' on to 1.
+// Sets the rows from 'firstRow' on to 1.  Requires: firstRow <= 64 * words.size().
 void FillFrom(std::vector<uint64_t>& words, uint64_t firstRow, size_t numInputs)
 {
-    for (size_t word = firstRow / 64; word < words.size(); ++word)
-        words[word] |= word == firstRow / 64 ? ~uint64_t(0) << (firstRow % 64) : ~uint64_t(0);
+    const auto firstWord = static_cast<size_t>(firstRow / 64);
+    if (firstWord < words.size())
+        words[firstWord] |= ~uint64_t(0) << (firstRow % 64);
+    for (size_t word = firstWord + 1; word < words.size(); ++word)
+        words[word] = ~uint64_t(0);
     words.back() &= RowMask(numInputs);
 }
 
@@ -226,7 +229,7 @@ InitText ReadInitText(const std::string& text, size_t numInputs)
         init.fault = InitFault::kPrefix;
         return init;
     }
-    const uint64_t rowsPerDigit = kind == 'x' ? 4 : 1;
+    const size_t rowsPerDigit = kind == 'x' ? 4 : 1;
     for (size_t position = 2; position < text.size(); ++position) {
         if (DigitValue(text[position]) < 1u << rowsPerDigit)
             continue;
@@ -234,7 +237,8 @@ InitText ReadInitText(const std::string& text, size_t numInputs)
         init.faultPosition = position;
         return init;
     }
-    init.numGivenRows = (text.size() - 2) * rowsPerDigit;
+    const size_t numDigits = text.size() - 2;
+    init.numGivenRows = uint64_t(rowsPerDigit) * numDigits;
     init.numInputs = NumInputsFor(init.numGivenRows);
     if (init.numInputs != numInputs) {
         init.fault = InitFault::kWidth;
@@ -242,8 +246,9 @@ InitText ReadInitText(const std::string& text, size_t numInputs)
     }
     init.words.resize(NumWordsFor(numInputs));
     uint64_t numOnes = 0;
-    for (uint64_t row = 0; row < init.numGivenRows; row += rowsPerDigit) {
-        const uint64_t value = DigitValue(text[text.size() - 1 - row / rowsPerDigit]);
+    for (size_t digit = 0; digit < numDigits; ++digit) {
+        const uint64_t value = DigitValue(text[text.size() - 1 - digit]);
+        const size_t row = digit * rowsPerDigit;
         init.words[row / 64] |= value << (row % 64);
         numOnes += static_cast<uint64_t>(__builtin_popcountll(value));
     }

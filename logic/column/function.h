@@ -15,6 +15,13 @@ namespace booleq {
 
 constexpr size_t kMaxFunctionInputs = 30; // the library has no column above
 
+// The value of a row of a packed column.
+// Requires: the column holds that row, so its word has an index on a 32-bit machine too.
+inline bool ValueOfRow(const std::vector<uint64_t>& words, uint64_t row)
+{
+    return (words[static_cast<size_t>(row / 64)] >> (row % 64) & 1u) != 0;
+}
+
 // Invariants: as many words as the rows need, at least one; at most kMaxFunctionInputs inputs, all
 // different; without inputs there is the one row of a constant.
 class Function {
@@ -29,9 +36,9 @@ class Function {
     const std::vector<std::string>& Inputs() const { return m_inputs; }
     const std::vector<uint64_t>& Words() const { return m_words; }
     size_t NumInputs() const { return m_inputs.size(); }
-    uint64_t NumRows() const { return uint64_t(1) << m_inputs.size(); }
+    size_t NumRows() const { return size_t(1) << m_inputs.size(); } // at most 2^30
     // Requires: row < NumRows().
-    bool At(uint64_t row) const { return (m_words[row / 64] >> (row % 64) & 1u) != 0; }
+    bool At(uint64_t row) const { return ValueOfRow(m_words, row); }
     // The value of input 'index' in row 'row'.
     bool InputAt(uint64_t row, size_t index) const
     {

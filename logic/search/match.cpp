@@ -28,9 +28,9 @@ uint64_t Mix(uint64_t value)
 // The function over its effective inputs alone. Input k of these is bit numInputs-1-k of the row.
 std::vector<uint64_t> Reduced(const Function& function, const std::vector<unsigned int>& inputs)
 {
-    const uint64_t numRows = uint64_t(1) << inputs.size();
+    const size_t numRows = size_t(1) << inputs.size();
     std::vector<uint64_t> words(numRows > 64 ? numRows / 64 : 1);
-    for (uint64_t row = 0; row < numRows; ++row) {
+    for (size_t row = 0; row < numRows; ++row) {
         uint64_t from = 0;
         for (size_t input = 0; input < inputs.size(); ++input)
             from |= (row >> (inputs.size() - 1 - input) & 1u)
@@ -334,9 +334,9 @@ Function Apply(const Matching& matching, const Function& first,
                const std::vector<std::string>& inputs)
 {
     const size_t numInputs = inputs.size();
-    const uint64_t numRows = uint64_t(1) << numInputs;
+    const size_t numRows = size_t(1) << numInputs;
     std::vector<uint64_t> words(numRows > 64 ? numRows / 64 : 1);
-    for (uint64_t row = 0; row < numRows; ++row) {
+    for (size_t row = 0; row < numRows; ++row) {
         uint64_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
             if (matching.sources[place] == Matching::kIdle)

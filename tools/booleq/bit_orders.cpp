@@ -37,7 +37,7 @@ void PutBitOrders(const Function& msb, const Function& lsb, Output& output)
     const std::string name = Visible(msb.Inputs().front());
     const std::string first = name + " most significant";
     // Longer digits are not aligned.
-    const size_t width = std::max<size_t>(first.size(), std::min<uint64_t>(34, 2 + msb.NumRows()));
+    const size_t width = std::max<size_t>(first.size(), std::min<size_t>(34, 2 + msb.NumRows()));
     PutLabel(output, "");
     output.Put(first + std::string(width - first.size() + 2, ' ') + name +
                " least (--lsb-first)\n");

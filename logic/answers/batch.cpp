@@ -25,8 +25,8 @@ BatchResult RefuseText(const char* what, const std::string& text, const Reading&
     const RefusalReport report = ExplainRefusal(text, reading);
     std::string message =
         std::string(what) + " refused at " + PlaceName(text, report.offset) + ": " + report.reason;
-    if (!report.mend.empty())
-        message += "; " + report.mend;
+    if (!report.hint.empty())
+        message += "; " + report.hint;
     return Fail(BatchOutcome::kTextRefused, std::move(message));
 }
 
@@ -64,7 +64,7 @@ BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& 
 // Sets equation and function from the row's init value over the inputs of 'reading'.
 BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquation& equation)
 {
-    if (row.init.find('\0') != std::string::npos || WidthOfInit(row.init).numRows == 0 ||
+    if (row.init.find('\0') != std::string::npos || WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
         !SetFromText(equation, row.init, reading))
         return RefuseText("the init value is", row.init, reading);
     // Read over a name like 'a'+b, an init value has the inputs that its expression has.

@@ -6,6 +6,7 @@
 #include "convert.h"
 #include "foreign_tree.h"
 #include "function.h"
+#include "lint_reason.h"
 #include "notation_writer.h"
 #include "short_form.h"
 #include "text.h"
@@ -17,23 +18,6 @@ namespace {
 constexpr size_t kMaxNamedInputs = 16;
 constexpr size_t kMaxShortenedInputs = 8;
 
-bool Contains(const ForeignTree& tree, Meaning meaning)
-{
-    return std::any_of(
-        tree.nodes.begin(), tree.nodes.end(),
-        [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
-}
-
-std::string ReasonOf(const ForeignTree& tree)
-{
-    const bool isInt = tree.notation->values == Values::Int;
-    if (isInt && Contains(tree, Meaning::BitNot))
-        return "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
-    if (Contains(tree, Meaning::Add))
-        return "\"+\" adds there";
-    if (tree.notation == &LibertyNotation())
-        return "\"^\" binds tighter than \"&\" and \"*\" there, these tighter than \"|\" and \"+\"";
-    return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
 }
 
 std::string WithoutLineEnd(std::string text)
@@ -87,7 +71,9 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     if (reading.decision.IsEqual())
         return reading;
     reading.grouping = WriteWhole(tree, expression.names);
-    reading.reason = ReasonOf(tree);
+    reading.reason = FindReason(expression, tree, [&](const ForeignTree& undone) {
+        return DecideEqual(SideOf(expression), SideOf(undone), limits).IsEqual();
+    });
     reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "", limits).text);
     reading.textHere = TextHere(tree, foreign.evaluate);
     return reading;

@@ -2,6 +2,8 @@
 
 #include <set>
 
+#include "init_literal.h"
+
 namespace booleq {
 
 namespace {
@@ -17,6 +19,11 @@ std::string WithoutOuterBlanks(const std::string& text)
 } // namespace
 
 bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
+{
+    return SetVerbatim(equation, LibraryText(text, reading), reading);
+}
+
+bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
 {
     if (!reading.hasInputs)
         return equation.SetEquation(text.c_str());
@@ -44,6 +51,15 @@ InitWidth WidthOfInit(const std::string& text)
     for (uint64_t highestRow = width.numRows - 1; highestRow > 0; highestRow /= 2)
         ++width.numInputs;
     return width;
+}
+
+std::string LibraryText(const std::string& text, const Reading& reading)
+{
+    const bool isLoneDigit = text.size() == 3 && text[0] == '0';
+    if (!reading.hasInputs || (!isLoneDigit && !IsSizedLiteral(text)))
+        return text;
+    const InitLiteral literal = ReadInitLiteral(text, CheckInputs(reading.inputs).usable.size());
+    return literal.code ? text : literal.text;
 }
 
 bool SplitInputs(const std::string& list, std::vector<std::string>& inputs)

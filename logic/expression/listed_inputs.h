@@ -18,8 +18,14 @@ struct Reading {
     const char* inputsName = "--inputs"; // what the caller's users write to list inputs
 };
 
-// Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.
+// Sets 'equation' from 'text', which holds no NUL byte. Over listed inputs an init value may also
+// be one that only people write (init_literal.h).  Fails: false.
 bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+// The same without those: what the library itself reads.
+bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+
+// What the library is given for a text over these inputs; the text where it is refused.
+std::string LibraryText(const std::string& text, const Reading& reading);
 
 // True for an equation that was set from an init value.
 bool IsInitValue(const Kq_BoolEquation& equation);

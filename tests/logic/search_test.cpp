@@ -11,6 +11,7 @@
 #include "match.h"
 #include "notation_writer.h"
 #include "short_form.h"
+#include "spectrum.h"
 
 namespace {
 
@@ -282,6 +283,112 @@ TEST(Match, IsQuickForInputsThatAreAlike)
     const Function second(names, words);
     EXPECT_TRUE(Match(first, first, true).isFound);
     EXPECT_FALSE(Match(first, second, true).isFound);
+}
+
+TEST(Match, LeavesInputsWithoutEffectOut)
+{
+    const Function narrow = Make(3, 0xca);
+    const Function wide = Make(4, 0xcaca);
+    const Matching matching = Match(narrow, wide, false);
+    ASSERT_TRUE(matching.isFound);
+    EXPECT_EQ(matching.sources, (std::vector<unsigned int>{Matching::kIdle, 0, 1, 2}));
+    EXPECT_TRUE(Apply(matching, narrow, wide.Inputs()) == wide);
+    const Matching back = Match(wide, narrow, true);
+    ASSERT_TRUE(back.isFound);
+    EXPECT_TRUE(Apply(back, wide, narrow.Inputs()) == narrow);
+    EXPECT_FALSE(Match(narrow, Make(4, 0xcacb), true).isFound);
+}
+
+TEST(Match, FindsAMappingOfFourInputsWheneverThereIsOne)
+{
+    std::mt19937_64 random(5);
+    size_t numMatches = 0;
+    for (int count = 0; count < 400; ++count) {
+        // Few ones, so that many pairs match.
+        const Function first = Make(4, random() & random() & random() & 0xffff);
+        const Function second = Make(4, random() & random() & random() & 0xffff);
+        const Matching matching = Match(first, second, true);
+        ASSERT_EQ(matching.isFound, MatchesSomehow(first, second, true))
+            << first.Hex() << " " << second.Hex();
+        numMatches += matching.isFound ? 1 : 0;
+    }
+    EXPECT_GT(numMatches, 10u);
+}
+
+// Sixteen inputs, alike in all that a single one or a pair shows: two strongly regular graphs with
+// the same numbers, an OR of the edges' products.
+Function OfGraph(bool isShrikhande)
+{
+    const auto isEdge = [isShrikhande](unsigned int one, unsigned int other) {
+        const unsigned int row = (one / 4 + 4 - other / 4) % 4;
+        const unsigned int column = (one + 4 - other % 4) % 4;
+        if (isShrikhande)
+            return row * 4 + column == 1 || row * 4 + column == 3 || row * 4 + column == 4 ||
+                   row * 4 + column == 12 || row * 4 + column == 5 || row * 4 + column == 15;
+        return (row == 0) != (column == 0);
+    };
+    Rows rows(16);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
+        for (unsigned int one = 0; one < 16; ++one)
+            for (unsigned int other = 0; other < one; ++other)
+                if ((row >> one & row >> other & 1u) != 0 && isEdge(one, other))
+                    rows.Set(row, true);
+    return {Names(16), rows};
+}
+
+TEST(Match, TellsGraphsOfSixteenInputsApart)
+{
+    EXPECT_TRUE(Match(OfGraph(true), OfGraph(true), true).isFound);
+    EXPECT_FALSE(Match(OfGraph(true), OfGraph(false), true).isFound);
+}
+
+TEST(Match, TellsLargeRandomFunctionsApart)
+{
+    std::mt19937_64 random(6);
+    const Function first = RandomFunction(Names(16), random);
+    Rows rows = first.GetRows();
+    // As many ones, but two rows have traded places.
+    rows.Words()[0] ^= uint64_t(1) << __builtin_ctzll(rows.Words()[0]);
+    rows.Words()[1] ^= uint64_t(1) << __builtin_ctzll(~rows.Words()[1]);
+    EXPECT_FALSE(Match(first, Function(first.Inputs(), rows), true).isFound);
+}
+
+TEST(Match, EndsWithItsTime)
+{
+    std::mt19937_64 random(7);
+    const Function function = RandomFunction(Names(16), random);
+    const Matching matching = Match(function, function, true, 1e-9);
+    EXPECT_FALSE(matching.isDecided);
+    EXPECT_FALSE(matching.isFound);
+}
+
+TEST(Spectrum, IsTheSumOfItsDefinition)
+{
+    std::mt19937_64 random(8);
+    for (unsigned int numInputs = 0; numInputs <= 8; ++numInputs) {
+        const Function function = RandomFunction(FirstNames(numInputs), random);
+        const std::vector<int32_t> spectrum = WalshSpectrum(function.GetRows());
+        const std::vector<uint32_t> weights = DerivativeWeights(function.GetRows());
+        for (uint64_t set = 0; set < function.NumRows(); ++set) {
+            int32_t sum = 0;
+            uint32_t weight = 0;
+            for (uint64_t row = 0; row < function.NumRows(); ++row) {
+                const bool parity = (__builtin_popcountll(row & set) & 1) != 0;
+                sum += function.At(row) != parity ? -1 : 1;
+                if (set == 0 || (row & set) != 0)
+                    continue;
+                bool difference = false; // over all rows that differ from this one in 'set' only
+                for (uint64_t part = set;; part = (part - 1) & set) {
+                    difference = difference != function.At(row | part);
+                    if (part == 0)
+                        break;
+                }
+                weight += difference ? 1 : 0;
+            }
+            ASSERT_EQ(spectrum[set], sum) << numInputs << " " << set;
+            ASSERT_EQ(weights[set], weight) << numInputs << " " << set;
+        }
+    }
 }
 
 } // namespace

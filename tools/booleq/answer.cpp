@@ -43,10 +43,10 @@ void SayRefusal(const Text& text, const Request& request, Output& output,
     std::string message = line + "refused at " + PlaceName(text.text, report.offset) + ": " +
                           report.reason + "\n" +
                           MarkPlace(text.text, report.offset, report.length, "  ");
-    if (report.mend.empty())
+    if (report.hint.empty())
         message.pop_back(); // the line end is Complain's
     else
-        message += "  " + report.mend;
+        message += "  " + report.hint;
     Complain(output, message);
 }
 
@@ -119,7 +119,7 @@ Json RefusalAsJson(const RefusalReport& report)
     json["offset"] = report.offset;
     json["length"] = report.length;
     json["reason"] = report.reason;
-    json["mend"] = report.mend.empty() ? Json() : Json(report.mend);
+    json["hint"] = report.hint.empty() ? Json() : Json(report.hint);
     return json;
 }
 

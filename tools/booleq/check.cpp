@@ -48,7 +48,7 @@ Command CheckCommand()
         1,
         "Tell whether a text is accepted, and where and why not",
         "A refusal, here and in all commands, marks the place, gives the reason and, where the\n"
-        "text shows what was meant, the mend. Status 0: accepted, 3: refused.\n",
+        "text shows what was meant, the hint. Status 0: accepted, 3: refused.\n",
         {},
         {"booleq check 'A && B'", "booleq check \"A'\"", "booleq check --file equations.txt"},
         RunCheck};

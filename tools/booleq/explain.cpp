@@ -2,6 +2,7 @@
 #include "describe.h"
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "options.h"
 #include "table_rows.h"
@@ -10,6 +11,8 @@
 namespace booleq {
 
 namespace {
+
+constexpr size_t kMaxShownInputs = 10; // 1024 binary digits; 'init' writes longer ones
 
 std::string Listed(const std::vector<std::string>& names)
 {
@@ -34,6 +37,10 @@ void PutText(const Text& text, const Function& function, const Description& desc
     if (inputs.size() > 1)
         order += "; " + Visible(inputs.front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", order);
+    if (inputs.empty())
+        PutField(output, "init value", "none: there are no rows to number");
+    else if (inputs.size() <= kMaxShownInputs)
+        PutBitOrders(function, function.Reversed(), output);
     PutField(output, "without effect", Listed(description.idle));
     PutField(output, "function",
              description.kind.empty() ? "none with a common name" : Visible(description.text));
@@ -58,6 +65,7 @@ Json ToJson(const Function& function, const Description& description)
     json["inputs"] = function.Inputs();
     json["hex"] = function.Hex();
     json["binary"] = function.Binary();
+    json["lsb_first"] = LsbFirstJson(function);
     json["without_effect"] = description.idle;
     json["kind"] = isNamed ? Json(description.kind) : Json(nullptr);
     json["function"] = isNamed ? Json(description.text) : Json(nullptr);

@@ -2,6 +2,7 @@
 #include <algorithm>
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "picture.h"
 #include "text.h"
@@ -32,7 +33,7 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     Kq_BoolEquation equation;
     Function read;
     // Over a name like 'a'+b the library reads the inputs of the expression that it stands for.
-    if (!SetFromText(equation, text, reading) || !FunctionOf(equation, read) ||
+    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read) ||
         read.NumInputs() != function.NumInputs() || read.Over(function.Inputs()) != function)
         return false;
     const Port::StringBase<char> rendered = rendering[1] == 'x'
@@ -56,33 +57,6 @@ std::string Call(const Function& function, const std::string& text, bool lsbFirs
 {
     return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + Shortened(text) + "\", " +
            (lsbFirst ? "true" : "false") + ", " + (reverse ? "true" : "false") + ")";
-}
-
-// Two columns; the digits of the second are made when those of the first are written.
-void PutBoth(const char* label, const Order& msb, const Order& lsb, size_t width,
-             std::string (Function::*digits)() const, Output& output)
-{
-    PutLabel(output, label);
-    {
-        const std::string first = (msb.column.*digits)();
-        output.Put(first);
-        output.Put(std::string(std::max(width, first.size()) - first.size() + 2, ' '));
-    }
-    output.Put((lsb.column.*digits)());
-    output.Put("\n");
-}
-
-void PutDigits(const Order& msb, const Order& lsb, Output& output)
-{
-    const std::string name = Visible(msb.column.Inputs().front());
-    const std::string first = name + " most significant";
-    // Longer digits are not aligned.
-    const size_t width = std::max(first.size(), std::min<size_t>(34, 2 + msb.column.NumRows()));
-    PutLabel(output, "");
-    output.Put(first + std::string(width - first.size() + 2, ' ') + name +
-               " least (--lsb-first)\n");
-    PutBoth("hexadecimal", msb, lsb, width, &Function::Hex, output);
-    PutBoth("binary", msb, lsb, width, &Function::Binary, output);
 }
 
 void PutTried(const Function& function, const std::string& text, bool lsbFirst, bool reverse,
@@ -138,12 +112,7 @@ void PutInit(const Order& msb, const Order& lsb, Output& output)
              names.size() == 1 ? "bit k, from the right, is row k: " + Visible(names[0]) + "=k"
                                : "bit k, from the right, is row k; bit 0 is all inputs 0, bit " +
                                      std::to_string(function.NumRows() - 1) + " all inputs 1");
-    if (names.size() == 1) {
-        PutField(output, "hexadecimal", function.Hex());
-        PutField(output, "binary", function.Binary());
-    } else {
-        PutDigits(msb, lsb, output);
-    }
+    PutBitOrders(msb.column, lsb.column, output);
     PutReadsBack(msb, lsb, output);
 }
 

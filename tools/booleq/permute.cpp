@@ -2,6 +2,7 @@
 #include "permute.h"
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "text.h"
 
@@ -36,8 +37,7 @@ void PutText(const Text& text, const Function& function, Output& output)
         names +=
             "; " + Visible(function.Inputs().front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", names);
-    PutField(output, "init value hex", function.Hex());
-    PutField(output, "init value bin", function.Binary());
+    PutBitOrders(function, function.Reversed(), output);
     if (text.line > 0)
         output.Put("\n");
 }
@@ -67,7 +67,8 @@ int RunPermute(const Request& request, Output& output)
             const Json result = {{"from", {{"inputs", function.Inputs()}, {"hex", function.Hex()}}},
                                  {"inputs", to},
                                  {"hex", permuted.Hex()},
-                                 {"binary", permuted.Binary()}};
+                                 {"binary", permuted.Binary()},
+                                 {"lsb_first", LsbFirstJson(permuted)}};
             PutJson(text, own, "done", result, output);
         } else {
             PutText(text, permuted, output);

@@ -143,7 +143,7 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
         const std::vector<std::string> names = InputNames(equation);
         const std::vector<std::string> others(names.begin() + static_cast<long>(numListed),
                                               names.end());
-        notes.push_back("not in --inputs, so behind them: " + Visible(Join(others, ", ")));
+        notes.push_back("not in --inputs, so after them: " + Visible(Join(others, ", ")));
     }
     if (!ReadsBack(equation, reading))
         notes.push_back(
@@ -166,7 +166,7 @@ Notes NotesFor(Kq_BoolEquation& equation, const Reading& reading, bool hasTable)
     else
         NoteExpression(equation, reading, notes);
     if (equation.GetNumVariables() == 1)
-        notes.push_back("over one input only the binary init value reads back");
+        notes.push_back("over one input the library reads the binary init value only");
     NoteNames(equation, hasTable, notes);
     return notes;
 }

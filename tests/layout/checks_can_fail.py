@@ -134,6 +134,10 @@ class Includes(InCopy):
         self.append("logic/search/match.cpp", '#include "../column/bits.h"\n')
         self.expect("logic/search/match.cpp", "rooms are not named")
 
+    def test_header_of_the_second_library_that_looks_up(self):
+        self.append("include/kq_logic/match.h", '#include "rows.h"\n')
+        self.expect("include/kq_logic/match.h", "may not include")
+
     def test_two_headers_of_one_name(self):
         self.append("logic/search/bits.h", "")
         self.expect("logic/search/bits.h", "logic/column/bits.h has the same name")

@@ -131,6 +131,32 @@ void PutJson(const Text& text, const Request& request, const char* status, const
     output.Put(JsonLine(json) + "\n");
 }
 
+int Say(const Text& text, const Request& request, Output& output, const Reply& reply)
+{
+    if (request.json) {
+        PutJson(text, request, reply.word, reply.toJson(), output);
+        return reply.status;
+    }
+    const LineMark mark = text.line > 0 ? reply.mark : LineMark::Nothing;
+    switch (mark) {
+    case LineMark::Nothing:
+        break;
+    case LineMark::Prefix:
+        output.Put("line " + std::to_string(text.line) + ": ");
+        break;
+    case LineMark::Heading:
+        output.Put("line " + std::to_string(text.line) + "\n");
+        break;
+    case LineMark::Block:
+        PutField(output, "line", std::to_string(text.line));
+        break;
+    }
+    reply.putText();
+    if (mark == LineMark::Block)
+        output.Put("\n");
+    return reply.status;
+}
+
 std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,
                                                     const char* status, const Json& result)
 {

@@ -90,12 +90,11 @@ int RunConvert(const Request& request, Output& output)
             Refuse(text, request, output, conversion.fault);
             return kRefused;
         }
-        if (request.json)
-            PutJson(text, request, conversion.isProved ? "done" : "undecided",
-                    ToJson(expression, request, conversion), output);
-        else
-            PutText(expression, conversion, output);
-        return conversion.isProved ? kDone : kUndecided;
+        return Say(text, request, output,
+                   {conversion.isProved ? kDone : kUndecided,
+                    conversion.isProved ? "done" : "undecided", LineMark::Nothing,
+                    [&] { return ToJson(expression, request, conversion); },
+                    [&] { PutText(expression, conversion, output); }});
     });
 }
 

@@ -260,16 +260,9 @@ int RunInit(const Request& request, Output& output)
                        " inputs the digits are too long for one object: print them without --json");
             return kRefused;
         }
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(msb, lsb), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        PutInit(msb, lsb, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return kDone;
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block, [&] { return AsJson(msb, lsb); },
+                    [&] { PutInit(msb, lsb, output); }});
     });
 }
 

@@ -109,27 +109,24 @@ void PutIdle(const char* which, const Function& function, Output& output)
         output.Put("    without effect in the " + std::string(which) + ": " + list + "\n");
 }
 
-void PutText(const Text& text, const Request& request, const Function& first,
-             const Function& second, const Answer& answer, Output& output)
+void PutText(const Request& request, const Function& first, const Function& second,
+             const Answer& answer, Output& output)
 {
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
     if (!answer.matching.isDecided) {
-        output.Put(place + "not decided in " + request.Get("--seconds") + " seconds\n");
+        output.Put("not decided in " + request.Get("--seconds") + " seconds\n");
         return;
     }
     const size_t numFirst = EffectiveInputs(first).size();
     const size_t numSecond = EffectiveInputs(second).size();
     if (!answer.level) {
-        output.Put(place + "no match" +
-                   (numFirst == numSecond
-                        ? "\n"
-                        : ": " + Count(numFirst, "input") + " with an effect, and " +
-                              std::to_string(numSecond) + "\n"));
+        output.Put("no match" + (numFirst == numSecond
+                                     ? "\n"
+                                     : ": " + Count(numFirst, "input") + " with an effect, and " +
+                                           std::to_string(numSecond) + "\n"));
         return;
     }
     const bool isOrder = std::string(answer.level) == "order";
-    output.Put(place +
-               (isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
+    output.Put((isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
     output.Put("  the second is the first" +
                std::string(answer.matching.isInverted ? " inverted" : "") +
                (numFirst > 0 ? ", where\n" : "\n"));
@@ -198,13 +195,11 @@ int RunMatch(const Request& request, Output& output)
         if (!SetNamed(text, request, output, first) || RefuseTooMany(text, request, first, output))
             return kRefused;
         const Answer answer = FindMatch(first, second, request.Has("--order-only"), seconds);
-        if (request.json)
-            PutJson(text, request, StatusName(answer), ToJson(first, second, answer), output);
-        else
-            PutText(text, request, first, second, answer, output);
-        if (!answer.matching.isDecided)
-            return kUndecided;
-        return answer.level ? kDone : kFindings;
+        const int found = answer.level ? kDone : kFindings;
+        return Say(text, request, output,
+                   {answer.matching.isDecided ? found : kUndecided, StatusName(answer),
+                    LineMark::Prefix, [&] { return ToJson(first, second, answer); },
+                    [&] { PutText(request, first, second, answer, output); }});
     });
 }
 

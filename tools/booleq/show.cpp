@@ -226,16 +226,9 @@ int RunShow(const Request& request, Output& output)
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        if (request.json) {
-            PutJson(text, request, "done", ShowAsJson(equation, request), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        ShowEquation(equation, request, maxRows, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return kDone;
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block, [&] { return ShowAsJson(equation, request); },
+                    [&] { ShowEquation(equation, request, maxRows, output); }});
     });
 }
 

@@ -64,7 +64,8 @@ BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& 
 // Sets equation and function from the row's init value over the inputs of 'reading'.
 BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquation& equation)
 {
-    if (row.init.find('\0') != std::string::npos || WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
+    if (row.init.find('\0') != std::string::npos ||
+        WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
         !SetFromText(equation, row.init, reading))
         return RefuseText("the init value is", row.init, reading);
     // Read over a name like 'a'+b, an init value has the inputs that its expression has.

@@ -17,8 +17,7 @@ namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
 constexpr size_t kMaxShortenedInputs = 8;
-
-}
+constexpr double kMaxCauses = 16; // that lint_reason.h tries
 
 std::string WithoutLineEnd(std::string text)
 {
@@ -71,8 +70,9 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     if (reading.decision.IsEqual())
         return reading;
     reading.grouping = WriteWhole(tree, expression.names);
+    const Limits each = {limits.seconds / kMaxCauses};
     reading.reason = FindReason(expression, tree, [&](const ForeignTree& undone) {
-        return DecideEqual(SideOf(expression), SideOf(undone), limits).IsEqual();
+        return DecideEqual(SideOf(expression), SideOf(undone), each).IsEqual();
     });
     reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "", limits).text);
     reading.textHere = TextHere(tree, foreign.evaluate);

@@ -220,7 +220,7 @@ TEST(Lint, BlamesGroupingAloneWhereParenthesesAloneHelp)
         const std::string whole = WriteOwn(expression, OwnSyntax::AsTyped, Parentheses::Whole);
         for (const Notation* notation : ForeignNotations()) {
             const ForeignReading& reading = ReadingOf(report, notation->name);
-            if (!reading.isRead || reading.comparison.isEqual)
+            if (!reading.isRead || reading.decision.IsEqual())
                 continue;
             const bool helps = Agrees(whole, *notation, expression);
             const bool isBlamedAlone = reading.reason.find("binds tighter") != std::string::npos &&

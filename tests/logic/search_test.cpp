@@ -270,17 +270,16 @@ TEST(Match, FindsShuffledFunctionsOfTenInputs)
 TEST(Match, IsQuickForInputsThatAreAlike)
 {
     // A majority against itself with one row changed: every order fails for the same reason.
-    std::vector<uint64_t> words(size_t(1) << 6);
-    for (uint64_t row = 0; row < 4096; ++row)
-        if (__builtin_popcountll(row) > 6)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+    Rows rows(12);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
+        rows.Set(row, __builtin_popcountll(row) > 6);
     std::vector<std::string> names;
     for (int input = 0; input < 12; ++input)
         names.push_back("v" + std::to_string(input));
-    const Function first(names, words);
-    words[0] ^= 1;
-    words[63] ^= uint64_t(1) << 63;
-    const Function second(names, words);
+    const Function first(names, rows);
+    rows.Set(0, !rows.At(0));
+    rows.Set(4095, !rows.At(4095));
+    const Function second(names, rows);
     EXPECT_TRUE(Match(first, first, true).isFound);
     EXPECT_FALSE(Match(first, second, true).isFound);
 }

@@ -332,7 +332,8 @@ Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order)
     for (unsigned int place = 0; place < present.size(); ++place)
         present[place] = place;
     for (unsigned int place = 0; place < order.size(); ++place) {
-        Watch();
+        if (rows.Size() >= kWatchedWords)
+            Watch();
         const auto found = std::find(present.begin() + place, present.end(), order[place]);
         assert(found != present.end());
         const auto from = static_cast<unsigned int>(found - present.begin());

@@ -29,7 +29,7 @@ TEST(Convert, WritesTheParenthesesOfEachPrecedence)
 {
     const std::string text = "a | b & c ^ d";
     EXPECT_EQ(To("verilog", text), "(a | b) & c ^ d");
-    EXPECT_EQ(To("c", text), "(a | b) & c ^ d");
+    EXPECT_EQ(To("c", text), "((a | b) & c) ^ d");
     EXPECT_EQ(To("liberty", text), "((a | b) & c) ^ d");
     EXPECT_EQ(To("vhdl", text), "((a or b) and c) xor d");
     EXPECT_EQ(To("python", text), "((a or b) and c) != d");

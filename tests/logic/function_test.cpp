@@ -111,7 +111,7 @@ TEST(Function, WidthOfAnInitValueIsWhatTheLibraryTakes)
                 reading.hasInputs = true;
                 reading.inputs = Names(numInputs);
                 Kq_BoolEquation equation;
-                EXPECT_EQ(numInputs == width.numInputs, SetFromText(equation, text, reading))
+                EXPECT_EQ(numInputs == width.numInputs, SetVerbatim(equation, text, reading))
                     << text << " over " << numInputs;
             }
         }

@@ -25,7 +25,7 @@ constexpr size_t kMaxFunctionInputs = 30; // 128 MB; an equation has no column a
 
 // A value: copies share what nobody changes.
 // Fails: std::bad_alloc, and what a watcher throws (watch.h); otherwise as the members say.
-// Threads: one at a time, as with Kq_BoolEquation.
+// Threads: one at a time for all calls of this library: searches share a table, work its watcher.
 class KQ_EXPORT Function {
   public:
     // The constant 0 over no inputs.

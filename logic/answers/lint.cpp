@@ -6,6 +6,7 @@
 #include "convert.h"
 #include "foreign_tree.h"
 #include "function.h"
+#include "lint_reason.h"
 #include "notation_writer.h"
 #include "short_form.h"
 #include "text.h"
@@ -16,36 +17,7 @@ namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
 constexpr size_t kMaxShortenedInputs = 8;
-
-bool Contains(const ForeignTree& tree, Meaning meaning)
-{
-    return std::any_of(
-        tree.nodes.begin(), tree.nodes.end(),
-        [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
-}
-
-std::string ReasonOf(const ForeignTree& tree)
-{
-    const bool isInt = tree.notation->values == Values::Int;
-    if (isInt && Contains(tree, Meaning::BitNot))
-        return "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
-    if (Contains(tree, Meaning::Add))
-        return "\"+\" adds there";
-    if (tree.notation == &LibertyNotation())
-        return "\"^\" binds tighter than \"&\" and \"*\" there, these tighter than \"|\" and \"+\"";
-    return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
-}
-
-Target TargetOf(const Notation* notation)
-{
-    if (notation == &VerilogNotation())
-        return Target::Verilog;
-    if (notation == &CNotation())
-        return Target::C;
-    if (notation == &LibertyNotation())
-        return Target::Liberty;
-    return notation == &VhdlNotation() ? Target::Vhdl : Target::Python;
-}
+constexpr double kMaxCauses = 16; // that lint_reason.h tries
 
 std::string WithoutLineEnd(std::string text)
 {
@@ -98,8 +70,11 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     if (reading.decision.IsEqual())
         return reading;
     reading.grouping = WriteWhole(tree, expression.names);
-    reading.reason = ReasonOf(tree);
-    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(&notation), "", limits).text);
+    const Limits each = {limits.seconds / kMaxCauses};
+    reading.reason = FindReason(expression, tree, [&](const ForeignTree& undone) {
+        return DecideEqual(SideOf(expression), SideOf(undone), each).IsEqual();
+    });
+    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "", limits).text);
     reading.textHere = TextHere(tree, foreign.evaluate);
     return reading;
 }
@@ -111,11 +86,6 @@ bool IsSameTree(const Expression& left, const Expression& right)
                           return own.op == other.op && own.left == other.left &&
                                  own.right == other.right;
                       });
-}
-
-bool IsInitValue(const Kq_BoolEquation& equation)
-{
-    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
 }
 
 // Looks for what this library alone is about.
@@ -261,24 +231,26 @@ class Linter {
         const size_t numListed = check.usable.size();
         if (m_expression.names.size() <= numListed)
             return;
-        std::string names;
-        for (size_t input = numListed; input < m_expression.names.size(); ++input)
-            names += (names.empty() ? "" : ", ") + m_expression.names[input];
-        Add("unlisted-input",
-            "inputs that are not listed widen the table behind the others: " + names);
+        const std::vector<std::string> unlisted(
+            m_expression.names.begin() + static_cast<long>(numListed), m_expression.names.end());
+        Add("unlisted-input", "inputs that are not listed widen the table behind the others: " +
+                                  Join(unlisted, ", "));
     }
 
+    // Every input at 1 is the last row, which has no digit where some have none.
     void CheckInitWidth()
     {
         const size_t numInputs = m_expression.names.size();
-        const std::string text = ToStd(m_equation.GetEquation(false));
-        const InitText init = ReadInitText(text, numInputs);
-        if (init.fault != InitFault::kNone || numInputs > kMaxFunctionInputs ||
-            init.numGivenRows >= uint64_t(1) << numInputs)
+        const InitWidth width = WidthOfInit(ToStd(m_equation.GetEquation(false)));
+        if (width.numRows == 0 || numInputs > kMaxFunctionInputs ||
+            width.numRows >= uint64_t(1) << numInputs)
             return;
-        Add("short-init", "the init value gives " + std::to_string(init.numGivenRows) +
-                              " rows of " + std::to_string(uint64_t(1) << numInputs) +
-                              "; the others read as " + (init.missingRows ? "1" : "0"));
+        std::vector<uint64_t> stack;
+        const uint64_t last =
+            EvaluateWord(m_expression, std::vector<uint64_t>(numInputs, 1), stack);
+        Add("short-init", "the init value gives " + std::to_string(width.numRows) + " rows of " +
+                              std::to_string(uint64_t(1) << numInputs) + "; the others read as " +
+                              ((last & 1u) != 0 ? "1" : "0"));
     }
 
     const std::string& m_text;

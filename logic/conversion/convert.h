@@ -9,33 +9,9 @@
 
 #include "deadline.h"
 #include "expression.h"
+#include "target.h"
 
 namespace booleq {
-
-enum class Target {
-    Primary,
-    Alt1,
-    Alt2,
-    Alt3,
-    Paren,
-    Verilog,
-    Vhdl,
-    C,
-    Python,
-    Liberty,
-    Blif,
-    Pla,
-    Eqn
-};
-
-// All names of targets, in the order of the enumeration.
-const std::vector<const char*>& TargetNames();
-// Fails: false for a word that is no target.
-bool FindTarget(const std::string& name, Target& target);
-// Whether the target writes a module, an entity, a function or a cell around the expression when
-// asked, a file in any case, or an expression only.
-enum class Wrapping { Never, Optional, Always };
-Wrapping WrappingOf(Target target);
 
 struct Conversion {
     std::string fault; // not empty: there is no text, and why
@@ -52,7 +28,7 @@ struct Conversion {
 // what is put around it: "" for the bare expression where the target has one.
 // Fails: fault, for a function that the target cannot hold, or a text that does not read back;
 // doubt, when the limits end the comparison.
-Conversion Convert(const Expression& expression, Target target, const std::string& unit,
+Conversion Convert(const Expression& expression, const Target& target, const std::string& unit,
                    const Limits& limits);
 
 // The inputs whose name in the target is another one, each with that.

@@ -2,6 +2,7 @@
 #ifndef BOOLEQ_DECIDE_DEADLINE_H
 #define BOOLEQ_DECIDE_DEADLINE_H
 
+#include <algorithm>
 #include <chrono>
 
 #include "watch.h"
@@ -23,6 +24,13 @@ class Deadline {
         Watch();
         return m_limits.seconds > 0 &&
                std::chrono::duration<double>(Clock::now() - m_start).count() >= m_limits.seconds;
+    }
+
+    // The seconds that are left, a little where none are.  Requires: there is a limit.
+    double Left() const
+    {
+        const std::chrono::duration<double> passed = Clock::now() - m_start;
+        return std::max(m_limits.seconds - passed.count(), 1e-9);
     }
 
   private:

@@ -2,10 +2,13 @@
 #include <string>
 #include <vector>
 
+#include <kq_logic/explain.h>
+#include <kq_logic/short_form.h>
+
 #include "bind.h"
-#include "describe.h"
 #include "equality.h"
 #include "errors.h"
+#include "function_access.h"
 #include "lint.h"
 #include "permute.h"
 #include "text.h"
@@ -117,18 +120,19 @@ py::object OrNone(const std::string& text)
 py::object Explain(const Equation& equation)
 {
     const booleq::Function function = FunctionOf(equation);
-    const booleq::Description description = Describe(function);
-    if (!description.fault.empty())
-        throw py::value_error(description.fault);
-    const bool hasExpression = !description.expression.empty();
+    const kq_logic::Function asked = kq_logic::FunctionAccess::Make(function);
+    const kq_logic::Explanation explanation = kq_logic::Explain(asked);
+    if (!explanation.fault.empty())
+        throw py::value_error(explanation.fault);
+    const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(asked);
     const py::object operands =
-        hasExpression ? py::object(py::int_(description.numOperands)) : py::none();
+        shortForm.fault.empty() ? py::object(py::int_(shortForm.numOperands)) : py::none();
     return ResultClass("Explanation")(
         "inputs"_a = equation.Inputs(), "hex"_a = function.Hex(), "binary"_a = function.Binary(),
-        "without_effect"_a = DecodeAll(description.idle), "kind"_a = OrNone(description.kind),
-        "function"_a = description.kind.empty() ? py::none() : py::object(Decode(description.text)),
-        "expression"_a = OrNone(description.expression), "operands"_a = operands,
-        "minimal"_a = description.isMinimal);
+        "without_effect"_a = DecodeAll(explanation.idle), "kind"_a = OrNone(explanation.kind),
+        "function"_a = explanation.kind.empty() ? py::none() : py::object(Decode(explanation.text)),
+        "expression"_a = OrNone(shortForm.text), "operands"_a = operands,
+        "minimal"_a = shortForm.isMinimal);
 }
 
 py::object DifferenceOf(const booleq::LintReport& report, const booleq::ForeignReading& reading)

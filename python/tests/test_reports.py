@@ -138,7 +138,7 @@ class TestLint:
         assert verilog == Reading(
             "Verilog", True, None, False, True, "0xf8",
             Difference({"a": 1, "b": 0, "c": 0}, 0, "(a | (b & c))",
-                       '"&" binds tighter than "^" there, and "^" tighter than "|"',
+                       '"&" binds tighter than "|" there',
                        "(a | b) & c", "a | (b & c)"))
         assert vhdl.reads is False and vhdl.same is None and vhdl.compared_all is None
         assert vhdl.difference is None and vhdl.hex is None and "VHDL" == vhdl.notation

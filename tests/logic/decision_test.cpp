@@ -386,7 +386,7 @@ TEST(Clauses, AreSatisfiedByTheAssignmentsOfTheValue)
                 rows |= uint64_t(1)
                         << ((assignment & 1u) << 2 | (assignment & 2u) | (assignment >> 2 & 1u));
         }
-        const uint64_t column = ToFunction(expression).Words()[0];
+        const uint64_t column = ToFunction(expression).GetRows().Words()[0];
         ASSERT_EQ(rows, value ? column : ~column & 0xffu) << round;
     }
 }

@@ -1,9 +1,12 @@
 // Findings about texts: each once where it is, and none where nothing is.
 #include <algorithm>
+#include <random>
 
 #include <gtest/gtest.h>
 
+#include "foreign_tree.h"
 #include "lint.h"
+#include "notation_writer.h"
 
 namespace {
 
@@ -154,6 +157,80 @@ TEST(Lint, SaysWhatItDoesNotDecide)
     EXPECT_TRUE(decision.isTimeOver);
     EXPECT_FALSE(report.IsClean());
     EXPECT_NE(ReadingOf(report, "Verilog").grouping, "");
+}
+
+std::string ReasonIn(const std::string& text, const std::string& notation)
+{
+    const LintReport report = Linted(text);
+    return ReadingOf(report, notation).reason;
+}
+
+constexpr char kSumReason[] = "\"+\" adds there";
+constexpr char kInversionReason[] =
+    "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
+
+TEST(Lint, NamesTheReasonThatAloneExplainsTheDifference)
+{
+    EXPECT_EQ(ReasonIn("a | b & ~c", "C"), "\"&\" binds tighter than \"|\" there");
+    EXPECT_EQ(ReasonIn("a | b & ~c", "Python"), "\"&\" binds tighter than \"|\" there");
+    EXPECT_EQ(ReasonIn("a + b * c", "C"), "\"*\" binds tighter than \"+\" there");
+    EXPECT_EQ(ReasonIn("~A + B", "C"), kInversionReason);
+    EXPECT_EQ(ReasonIn("~A + B", "Verilog"), kSumReason);
+    EXPECT_EQ(ReasonIn("(a + b) * c", "Verilog"), kSumReason);
+    EXPECT_EQ(ReasonIn("!(~a ^ 1)", "Verilog"),
+              "0 and 1 are numbers of 32 bits there, and \"!\" asks for all of their bits");
+}
+
+TEST(Lint, NamesTwoReasonsWhereNoneExplainsAlone)
+{
+    EXPECT_EQ(ReasonIn("a + b * c", "Verilog"),
+              std::string("\"*\" binds tighter than \"+\" there; ") + kSumReason);
+    EXPECT_EQ(ReasonIn("a ^ b | c & d ^ ~e", "C"),
+              std::string("\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"; ") +
+                  kInversionReason);
+}
+
+// Whether 'notation' has this library's function for the text.
+bool Agrees(const std::string& text, const Notation& notation, const Expression& expression)
+{
+    ForeignTree tree;
+    std::string fault;
+    if (!Read(text, notation, tree, fault))
+        return false;
+    return Tabulate(ToWordFunction(tree), tree.names).Over(expression.names) ==
+           ToFunction(expression);
+}
+
+TEST(Lint, BlamesGroupingAloneWhereParenthesesAloneHelp)
+{
+    std::mt19937_64 random(20);
+    const std::string binaries[] = {"&", "|", "^", "+", "*"};
+    size_t numGroupings = 0;
+    size_t numOthers = 0;
+    for (int round = 0; round < 3000; ++round) {
+        std::string text;
+        for (int operand = 0; operand < 5; ++operand) {
+            if (operand > 0)
+                text += " " + binaries[random() % 5] + " ";
+            text += std::string(random() % 3 == 0 ? "~" : "") + static_cast<char>('a' + operand);
+        }
+        const LintReport report = Linted(text);
+        Kq_BoolEquation equation(text.c_str());
+        const Expression expression = ToExpression(equation);
+        const std::string whole = WriteOwn(expression, OwnSyntax::AsTyped, Parentheses::Whole);
+        for (const Notation* notation : ForeignNotations()) {
+            const ForeignReading& reading = ReadingOf(report, notation->name);
+            if (!reading.isRead || reading.decision.IsEqual())
+                continue;
+            const bool helps = Agrees(whole, *notation, expression);
+            const bool isBlamedAlone = reading.reason.find("binds tighter") != std::string::npos &&
+                                       reading.reason.find(';') == std::string::npos;
+            EXPECT_EQ(isBlamedAlone, helps) << text << " in " << notation->name;
+            ++(helps ? numGroupings : numOthers);
+        }
+    }
+    EXPECT_GT(numGroupings, 1000u);
+    EXPECT_GT(numOthers, 1000u);
 }
 
 } // namespace

@@ -73,6 +73,8 @@ def check_texts(checker, command):
         checker.refuses(command, "0x8", "an init value without inputs")
     for text, what in (("0x88", "wrong width"), ("0b1", "too narrow"), ("0x8g", "no digit"),
                        ("0 | A", "an expression that begins with 0")):
+        if command == "match" and what in ("wrong width", "too narrow"):
+            continue  # inputs that do not fit are lettered
         checker.refuses(command, text, what,
                         [] if command in OWN_INPUTS else ["--inputs", "A,B"])
     if command in COLUMNS:

@@ -12,26 +12,24 @@ namespace {
 
 constexpr double kDefaultSeconds = 10; // for each equation
 
-Target ParseTarget(const std::string& word)
+const Target& ParseTarget(const std::string& word)
 {
-    std::string known;
-    for (const char* name : TargetNames())
-        known += (known.empty() ? "" : ", ") + std::string(name);
+    const std::string known = Join(TargetNames(), ", ");
     if (word.empty())
         throw UsageError("convert needs --to with one of: " + known);
-    Target target = Target::Primary;
-    if (!FindTarget(word, target))
+    const Target* const target = FindTarget(word);
+    if (!target)
         throw UsageError("--to takes one of " + known + ", not '" + Visible(word) + "'");
-    return target;
+    return *target;
 }
 
 // A word that every target takes for the name of what is put around an expression.
-std::string ParseUnit(const Request& request, Target target)
+std::string ParseUnit(const Request& request, const Target& target)
 {
     const std::string name = request.Get("--name");
     if (!request.Has("--unit") && !request.Has("--name"))
         return std::string();
-    if (WrappingOf(target) == Wrapping::Never)
+    if (target.wrapping == Wrapping::Never)
         throw UsageError("--unit and --name are for other targets: --to " + request.Get("--to") +
                          " has no modules");
     const bool isWord = !name.empty() && name.find_first_not_of("abcdefghijklmnopqrstuvwxyz"
@@ -75,7 +73,7 @@ void PutText(const Expression& expression, const Conversion& conversion, Output&
 
 int RunConvert(const Request& request, Output& output)
 {
-    const Target target = ParseTarget(request.Get("--to"));
+    const Target& target = ParseTarget(request.Get("--to"));
     std::string unit = ParseUnit(request, target);
     const Limits limits = ParseLimits(request, kDefaultSeconds);
     return ForEachText(request, output, [&](const Text& text) {
@@ -84,20 +82,19 @@ int RunConvert(const Request& request, Output& output)
             return kRefused;
         const Expression expression = ToExpression(equation);
         std::string ownUnit = unit;
-        if (text.line > 0 && WrappingOf(target) != Wrapping::Never &&
-            (!unit.empty() || WrappingOf(target) == Wrapping::Always))
+        if (text.line > 0 && target.wrapping != Wrapping::Never &&
+            (!unit.empty() || target.wrapping == Wrapping::Always))
             ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
         const Conversion conversion = Convert(expression, target, ownUnit, limits);
         if (!conversion.fault.empty()) {
             Refuse(text, request, output, conversion.fault);
             return kRefused;
         }
-        if (request.json)
-            PutJson(text, request, conversion.isProved ? "done" : "undecided",
-                    ToJson(expression, request, conversion), output);
-        else
-            PutText(expression, conversion, output);
-        return conversion.isProved ? kDone : kUndecided;
+        return Say(text, request, output,
+                   {conversion.isProved ? kDone : kUndecided,
+                    conversion.isProved ? "done" : "undecided", LineMark::Nothing,
+                    [&] { return ToJson(expression, request, conversion); },
+                    [&] { PutText(expression, conversion, output); }});
     });
 }
 

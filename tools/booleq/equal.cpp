@@ -44,17 +44,15 @@ Json AsJson(const Decision& decision)
     return result;
 }
 
-void PutText(const Text& text, const Decision& decision, const Limits& limits, Output& output)
+void PutText(const Decision& decision, const Limits& limits, Output& output)
 {
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
     if (decision.IsEqual())
-        output.Put(place + "equal, over " + Count(decision.inputs.size(), "input") + "\n");
+        output.Put("equal, over " + Count(decision.inputs.size(), "input") + "\n");
     else if (decision.IsDifferent())
-        output.Put(place + "not equal, " + PlaceText(decision) + "\n  " + AssignmentLine(decision) +
-                   ": " + (decision.left ? "1" : "0") + " and " + (decision.right ? "1" : "0") +
-                   "\n");
+        output.Put("not equal, " + PlaceText(decision) + "\n  " + AssignmentLine(decision) + ": " +
+                   (decision.left ? "1" : "0") + " and " + (decision.right ? "1" : "0") + "\n");
     else
-        output.Put(place + UndecidedText(decision, limits) + "\n");
+        output.Put(UndecidedText(decision, limits) + "\n");
 }
 
 int RunEqual(const Request& request, Output& output)
@@ -79,11 +77,9 @@ int RunEqual(const Request& request, Output& output)
                                       ClausesOfDifference(ToExpression(left), ToExpression(right)),
                                       decision.verdict, limits);
         }
-        if (request.json)
-            PutJson(text, request, StatusWord(decision), AsJson(decision), output);
-        else
-            PutText(text, decision, limits, output);
-        return std::max(status, StatusOf(decision));
+        return Say(text, request, output,
+                   {std::max(status, StatusOf(decision)), StatusWord(decision), LineMark::Prefix,
+                    [&] { return AsJson(decision); }, [&] { PutText(decision, limits, output); }});
     });
 }
 

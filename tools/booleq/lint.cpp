@@ -132,20 +132,16 @@ int RunLint(const Request& request, Output& output)
             return kRefused;
         const LintReport report = Lint(text.text, equation, request.reading, limits);
         const int status = report.IsClean() ? kDone : kFindings;
-        if (request.json) {
-            PutJson(text, request, status == kDone ? "done" : "findings", ToJson(report), output);
-            return status;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        if (status == kDone)
-            output.Put("no findings\n");
-        PutDifferences(report, output);
-        PutFindings(report, output);
-        PutOthers(report, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return status;
+        const auto putText = [&] {
+            if (status == kDone)
+                output.Put("no findings\n");
+            PutDifferences(report, output);
+            PutFindings(report, output);
+            PutOthers(report, output);
+        };
+        return Say(text, request, output,
+                   {status, status == kDone ? "done" : "findings", LineMark::Block,
+                    [&] { return ToJson(report); }, putText});
     });
 }
 

@@ -24,18 +24,16 @@ int StatusOf(const Decision& decision, bool asksAlways)
     return IsYes(decision, asksAlways) ? kDone : kFindings;
 }
 
-void PutText(const Text& text, const Decision& decision, bool asksAlways, const Limits& limits,
-             Output& output)
+void PutText(const Decision& decision, bool asksAlways, const Limits& limits, Output& output)
 {
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
     if (decision.IsEqual())
-        output.Put(place + (asksAlways ? "always 1, over " : "never 1, over ") +
+        output.Put((asksAlways ? "always 1, over " : "never 1, over ") +
                    Count(decision.inputs.size(), "input") + "\n");
     else if (decision.IsDifferent())
-        output.Put(place + (asksAlways ? "not always 1, 0 " : "satisfiable, 1 ") +
-                   PlaceText(decision) + "\n  " + AssignmentLine(decision) + "\n");
+        output.Put((asksAlways ? "not always 1, 0 " : "satisfiable, 1 ") + PlaceText(decision) +
+                   "\n  " + AssignmentLine(decision) + "\n");
     else
-        output.Put(place + UndecidedText(decision, limits) + "\n");
+        output.Put(UndecidedText(decision, limits) + "\n");
 }
 
 Json AsJson(const Decision& decision, bool asksAlways)
@@ -76,11 +74,10 @@ int RunSat(const Request& request, Output& output)
         const int answer = StatusOf(decision, asksAlways);
         const char* const word =
             answer == kUndecided ? "undecided" : (answer == kDone ? "yes" : "no");
-        if (request.json)
-            PutJson(text, request, word, AsJson(decision, asksAlways), output);
-        else
-            PutText(text, decision, asksAlways, limits, output);
-        return std::max(status, answer);
+        return Say(text, request, output,
+                   {std::max(status, answer), word, LineMark::Prefix,
+                    [&] { return AsJson(decision, asksAlways); },
+                    [&] { PutText(decision, asksAlways, limits, output); }});
     });
 }
 

@@ -1,6 +1,6 @@
 // Truth-table rows in several formats, one by one; never held as a whole.
-#ifndef BOOLEQ_ROWS_H
-#define BOOLEQ_ROWS_H
+#ifndef BOOLEQ_TABLE_ROWS_H
+#define BOOLEQ_TABLE_ROWS_H
 
 #include <cstdint>
 #include <functional>
@@ -13,8 +13,6 @@
 
 namespace booleq {
 
-constexpr unsigned int kMaxTableInputs = 30; // the library has no table above
-
 enum class RowFormat { kText, kMarkdown, kCsv, kJson };
 
 // True when a column of text bears its number, "#2", because the input's name is long or not
@@ -23,14 +21,14 @@ bool HasNumberedColumn(const std::vector<std::string>& names);
 
 // Prints header and rows 0 to maxRows - 1, and in text says how many more there are. kJson is the
 // elements of an array, [input..., result], without the array.
-// Requires: at most kMaxTableInputs names.
+// Requires: at most kMaxFunctionInputs names.
 void PrintRows(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format,
                const std::function<bool(uint64_t)>& valueAt, Output& output);
 // What PrintRows writes, about; the rows behind maxRows left out.
 uint64_t EstimateBytes(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format);
 
 // The table of 'show': the equation's rows as text.
-// Requires: 1 to kMaxTableInputs variables. Their values are changed.
+// Requires: 1 to kMaxFunctionInputs variables. Their values are changed.
 // Cost: one evaluation for each printed row, or the packed column (2^n / 64 evaluations, 2^n / 8
 // bytes) where that is less.
 void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output);

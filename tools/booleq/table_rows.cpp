@@ -1,4 +1,4 @@
-#include "rows.h"
+#include "table_rows.h"
 
 #include <algorithm>
 
@@ -99,7 +99,7 @@ RowShape ShapeOf(const std::vector<std::string>& names, uint64_t numPrinted, Row
 
 uint64_t NumPrinted(const std::vector<std::string>& names, uint64_t maxRows)
 {
-    return std::min(uint64_t(1) << names.size(), maxRows); // at most 30 names
+    return std::min(uint64_t(1) << names.size(), maxRows);
 }
 
 } // namespace
@@ -162,9 +162,9 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
         return;
     output.Put("\n");
     // The packed column takes about the work of one evaluation for 64 rows.
-    std::vector<uint64_t> words;
-    if (numPrinted >= (uint64_t(1) << names.size()) / 64 && equation.GetColumn(words)) {
-        const auto valueAt = [&words](uint64_t row) { return ValueOfRow(words, row); };
+    Rows rows;
+    if (numPrinted >= (uint64_t(1) << names.size()) / 64 && RowsOf(equation, rows)) {
+        const auto valueAt = [&rows](uint64_t row) { return rows.At(row); };
         PrintRows(names, maxRows, RowFormat::kText, valueAt, output);
         return;
     }

@@ -73,7 +73,7 @@ int main(int argc, char** argv)
         const auto passed = std::chrono::steady_clock::now() - start;
         const std::string path = directory + "/" + std::to_string(number);
         Write(path + ".cnf", ToDimacs(booleq::ClausesOfDifference(pair.left, pair.right)));
-        const booleq::NetworkNames names = {pair.left.names, "y", "pair"};
+        const booleq::UnitNames names = {pair.left.names, "y", "pair"};
         Write(path + "a.blif", WriteBlif(pair.left, names));
         Write(path + "b.blif", WriteBlif(pair.right, names));
         std::printf("%llu %s %s %s %lld\n", static_cast<unsigned long long>(number),

@@ -42,10 +42,9 @@ class KQ_EXPORT Kq_BoolEquation {
     void SetEquationFromEquation(const Kq_BoolEquation& other);
 
     void Clear(); // removes equation and variables
-    // Sets the equation from an expression in any accepted syntax, or from an init value
-    // ("0x8", "0b1000") over the variables defined now, the first being the most significant. The
-    // variables of an expression are numbered by first occurrence; all start at 0.
-    // Fails: false, and the object is empty.  Cost: in step with the text.
+    // Sets the equation from an expression, whose variables are numbered by first occurrence, or
+    // from an init value ("0x8", "0b1000") over the variables defined now, the first being the most
+    // significant. All start at 0.  Fails: false, and the object is empty.  Cost: O(text).
     bool SetEquation(const Port::StringBase<char>& equation);
     // Sets the equation over the inputs 'terms', the first being the first variable. Other names
     // in the text follow them. A term that is not a legal name or stands twice is skipped.

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <memory>
+#include <mutex>
 
 #include "watch.h"
 
@@ -152,8 +153,11 @@ Formula FindShortest(const Bits& function)
         if (function.At(ownRow))
             column = static_cast<Column>(column | 1u << row);
     }
+    static std::mutex mutex;    // guards the table
     static ShortestTable table; // it grows as far as it was asked for
+    std::unique_lock<std::mutex> lock(mutex);
     Formula formula = table.Find(column);
+    lock.unlock();
     Renumber(formula, support);
     return formula;
 }

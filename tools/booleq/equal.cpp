@@ -29,7 +29,8 @@ Json AsJson(const Equality& equality)
         difference["row"] = equality.row;
         difference["assignment"] = Json::object();
         for (size_t index = 0; index < equality.inputs.size(); ++index)
-            difference["assignment"][equality.inputs[index]] = equality.InputAt(index) ? 1 : 0;
+            PutMember(difference["assignment"], equality.inputs[index],
+                      equality.InputAt(index) ? 1 : 0);
         difference["values"] = {equality.left ? 1 : 0, equality.right ? 1 : 0};
     }
     return result;

@@ -82,7 +82,8 @@ Json DifferenceJson(const LintReport& report, const ForeignReading& reading)
     Json json;
     json["assignment"] = Json::object();
     for (size_t input = 0; input < report.inputs.size(); ++input)
-        json["assignment"][report.inputs[input]] = reading.comparison.first[input] ? 1 : 0;
+        PutMember(json["assignment"], report.inputs[input],
+                  reading.comparison.first[input] ? 1 : 0);
     json["here"] = reading.valueHere ? 1 : 0;
     json["grouping"] = reading.grouping;
     json["reason"] = reading.reason;

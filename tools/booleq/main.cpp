@@ -1,9 +1,13 @@
 // booleq: explains and compares Boolean equations on a terminal or in a pipe.
 // Command line, file or standard input in; answers on standard output, complaints on standard
 // error, one of the statuses of status.h out.
+#include <clocale>
 #include <csignal>
+#include <cstring>
 #include <new>
 #include <optional>
+
+#include <langinfo.h>
 
 #include "messages.h"
 #include "options.h"
@@ -32,6 +36,8 @@ int Run(const std::vector<std::string>& arguments, Output& output)
         output.Put(line.answer);
         return kDone;
     }
+    if (!line.note.empty())
+        Complain(output, line.note);
     std::optional<NoMessages> silence; // whoever types an equation gets a reason instead
     if (!line.request.debug)
         silence.emplace();
@@ -52,8 +58,9 @@ int Fail(const char* message, const char* more = "")
 int main(int argc, char** argv)
 {
     using namespace booleq;
-    // A reader that has gone is an error like a full disk, with a message and a status.
-    std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
+    std::setlocale(LC_CTYPE, "");
+    ShowUtf8(std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0);
     HandleInterrupts();
     try {
         Output output(stdout);
@@ -61,6 +68,8 @@ int main(int argc, char** argv)
         const int status = Run(arguments, output);
         output.Flush();
         return status;
+    } catch (const ReaderGone&) {
+        return kDone; // it has what it wanted
     } catch (const UsageError& error) {
         return Fail(error.what(), "\nTry 'booleq --help'.");
     } catch (const std::bad_alloc&) {

@@ -13,6 +13,7 @@ namespace booleq {
 // The words of a command line, understood: either an answer that is ready, or a request.
 struct CommandLine {
     std::string answer; // not empty: the text of --help or --version, and nothing else to do
+    std::string note;   // not empty: said on standard error first
     Request request;
 };
 

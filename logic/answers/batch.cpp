@@ -68,8 +68,7 @@ BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& 
 // A text in the column of init values that is an expression for the library.
 BatchResult RefuseNoInit(const std::string& text)
 {
-    std::string message =
-        "the init value begins neither with 0x or 0b nor with a size";
+    std::string message = "the init value begins neither with 0x or 0b nor with a size";
     const bool isHex =
         !text.empty() && text.find_first_not_of("0123456789abcdefABCDEF") == std::string::npos;
     message += isHex ? "; write 0x" + Excerpt(text) : "; write 0xca or 8'hca";

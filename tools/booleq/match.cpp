@@ -36,15 +36,23 @@ size_t WidthOf(const std::string& text)
     return init.fault == InitFault::kNone ? numInputs : kMaxFunctionInputs + 1;
 }
 
-// The inputs that --inputs names, or --second-inputs for the second: an init value that is not so
-// wide, and one without listed inputs, gets letters. Anything else is read as usual.
-bool SetNamed(const Text& text, const Request& request, Output& output, Function& function)
+// Whether the text is an init value over the inputs listed.
+bool IsInitOver(const std::string& text, const Reading& reading)
 {
-    Reading reading(request.reading);
     Kq_BoolEquation equation;
+    return reading.hasInputs && text.find('\0') == std::string::npos &&
+           SetFromText(equation, text, reading) && !equation.IsExpression();
+}
+
+// The inputs that --inputs names, or --second-inputs for the second. An init value gets letters
+// when none are listed, or when the list is for the other one. Anything else is read as usual.
+bool SetNamed(const Text& text, const Request& request, bool isListForOther, Output& output,
+              Function& function)
+{
     const size_t width = WidthOf(text.text);
-    const bool isFitting = reading.hasInputs && SetFromText(equation, text.text, reading);
-    if (width > kMaxFunctionInputs || isFitting)
+    const bool hasNames =
+        request.reading.hasInputs && (!isListForOther || IsInitOver(text.text, request.reading));
+    if (width > kMaxFunctionInputs || hasNames)
         return SetFunction(text, request, output, function);
     Request lettered(request);
     lettered.reading.hasInputs = true;
@@ -191,12 +199,17 @@ int RunMatch(const Request& request, Output& output)
     const Request forSecond = ForSecond(request);
     const Text other{request.operands.back(), 0};
     Function second;
-    if (!SetNamed(other, forSecond, output, second) ||
+    const bool hasOwnList = request.Has("--second-inputs");
+    const bool isForFirst =
+        !hasOwnList && (request.hasLines || IsInitOver(request.operands.front(), request.reading));
+    const bool isForSecond = !hasOwnList && IsInitOver(other.text, request.reading);
+    if (!SetNamed(other, forSecond, isForFirst, output, second) ||
         RefuseTooMany(other, request, second, output))
         return kRefused;
     return ForEachText(request, output, [&](const Text& text) {
         Function first;
-        if (!SetNamed(text, request, output, first) || RefuseTooMany(text, request, first, output))
+        if (!SetNamed(text, request, isForSecond, output, first) ||
+            RefuseTooMany(text, request, first, output))
             return kRefused;
         const Answer answer = FindMatch(first, second, request.Has("--order-only"), seconds);
         if (request.json)

@@ -121,7 +121,7 @@ TEST(Function, InitTextsReadAsTheLibraryReadsThem)
         if (reading.inputs.empty())
             continue; // the library makes an empty group of "0b0" and "0b1"
         Kq_BoolEquation equation;
-        const bool isAccepted = SetFromText(equation, text, reading);
+        const bool isAccepted = SetVerbatim(equation, text, reading);
         Function function;
         const InitText init = FunctionFromInit(text, reading.inputs, reading.lsbFirst, function);
         ASSERT_EQ(isAccepted, init.fault == InitFault::kNone) << text;

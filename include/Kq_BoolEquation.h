@@ -12,14 +12,16 @@
 
 #include <port/Port_StringBase.h>
 
+#ifndef KQ_EXPORT // defined by the build where that is a DLL's
 #define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
+#endif
 
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
 // One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: one at a time for all calls in the process, with synchronisation in between.
+// Threads: different objects at once; const members of one at once; changing one wants it alone.
 // Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
 // new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {
@@ -45,8 +47,8 @@ class KQ_EXPORT Kq_BoolEquation {
     // variables of an expression are numbered by first occurrence; all start at 0.
     // Fails: false, and the object is empty.  Cost: in step with the text.
     bool SetEquation(const Port::StringBase<char>& equation);
-    // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
-    // text that are no terms follow them. A term that is no legal name or stands twice is skipped.
+    // Sets the equation over the inputs 'terms', the first being the first variable. Other names
+    // in the text follow them. A term that is not a legal name or stands twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
     // number, not the highest; 'reverseTerms' defines terms from the last.  Fails: as SetEquation.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
@@ -82,8 +84,8 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
-    // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
-    // every few milliseconds, less often of over 100,000 operators; what it throws passes.
+    // row without variables; never traced. goOn(context), unless null, is asked every few
+    // milliseconds, less often of over 100,000 operators; it may throw, not change the equation.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
@@ -96,7 +98,7 @@ class KQ_EXPORT Kq_BoolEquation {
 
     // The result, 0 or 1, for the current variable values; 0 without an equation.
     unsigned int Eval() const;
-    // Adds a variable behind the others; 'value' counts as 1 unless 0. A name is letters, digits
+    // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits
     // and '_', not starting with a digit, or anything that starts with ' and has a second '.
     // Fails: false for a name already there (its value stays) or not legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
@@ -131,17 +133,17 @@ struct Kq_BoolEquation::Refusal {
         NONE = 0,              // nothing: the text is accepted
         EMPTY = 1,             // there is no token in it
         CHARACTER = 2,         // this character begins no token
-        WORD = 3,    // it stands between dots and is no operator, or the second dot is missing
+        WORD = 3,    // it stands between dots and is not an operator, or lacks the second dot
         QUOTE = 4,   // this quote has no second one
         PAREN = 5,   // this parenthesis has no other one
         OPERAND = 6, // an operand where an operator must stand
         NO_LEFT_OPERAND = 7,   // nothing on the left of this operator
         NO_RIGHT_OPERAND = 8,  // nothing on the right of this operator
-        NO_OPERAND = 9,        // nothing behind this negation
+        NO_OPERAND = 9,        // nothing after this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
-        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b behind a first 0
+        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b after a first 0
         INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
-        INIT_NAME = 13 // over terms: one's name is no single token, and what it makes is refused
+        INIT_NAME = 13 // over terms: one's name is not a single token, and what it makes is refused
     };
     CODE code = NONE;  // why the text is refused
     size_t offset = 0; // where: the first byte
@@ -153,13 +155,12 @@ struct Kq_BoolEquation::Refusal {
 // Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle(); // empty
-    // A value: each copy has elements of its own.
-    Handle(const Handle& other);
+    Handle();                    // empty
+    Handle(const Handle& other); // a value: each copy has elements of its own
     ~Handle();
     Handle& operator=(const Handle& other);
 
-    // The first element, and behind the last one; valid until the handle is set or destroyed.
+    // The first element, and after the last one; valid until the handle is set or destroyed.
     unsigned int* begin() { return m_values.data(); }
     const unsigned int* begin() const { return m_values.data(); }
     unsigned int* end() { return m_values.data() + m_values.size(); }

@@ -1,5 +1,6 @@
 #include "batch.h"
 
+#include <cassert>
 #include <utility>
 
 #include "function.h"
@@ -60,8 +61,23 @@ BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& 
                     "the equation has " + Excerpt(ToStd(name)) + ", which is not among the inputs");
     }
     if (!FunctionOf(equation, function))
-        return Fail(BatchOutcome::kTextRefused, std::to_string(equation.GetNumVariables()) +
-                                                    " inputs: at most 30 have an init value");
+        return Fail(BatchOutcome::kTextRefused, NoFunctionReason(equation.GetNumVariables()));
+    return {};
+}
+
+// Sets equation and function from the row's init value over the inputs of 'reading'.
+BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquation& equation)
+{
+    if (row.init.find('\0') != std::string::npos ||
+        WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
+        !SetFromText(equation, row.init, reading))
+        return RefuseText("the init value is", row.init, reading);
+    // Read over a name like 'a'+b, an init value has the inputs that its expression has.
+    if (equation.GetNumVariables() > reading.inputs.size()) {
+        const auto& name = equation.GetVariables()[reading.inputs.size()].first;
+        return Fail(BatchOutcome::kDiffers, "the init value has " + Excerpt(ToStd(name)) +
+                                                ", which is not among the inputs");
+    }
     return {};
 }
 
@@ -77,8 +93,7 @@ BatchResult RefuseNoInit(const std::string& text)
 
 bool BeginsLikeInit(const std::string& text)
 {
-    const char base = text.size() > 2 && text[0] == '0' ? static_cast<char>(text[1] | 0x20) : '\0';
-    return base == 'x' || base == 'b' || IsSizedLiteral(text);
+    return WidthOfInit(text).numRows > 0 || IsSizedLiteral(text);
 }
 
 // Compares the row's init value with the equation's function.
@@ -89,10 +104,12 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
     Reading reading;
     reading.hasInputs = true;
     reading.inputs = function.Inputs();
+    Kq_BoolEquation equation;
+    const BatchResult result = ReadInit(row, reading, equation);
     Function given;
-    if (FunctionFromInit(LibraryText(row.init, reading), reading.inputs, false, given).fault !=
-        InitFault::kNone)
-        return RefuseText("the init value is", row.init, reading);
+    if (result.outcome != BatchOutcome::kOk || !FunctionOf(equation, given))
+        return result;
+    assert(given.Inputs() == function.Inputs());
     const uint64_t different = function.FirstDifference(given);
     if (different == Function::kNoRow)
         return {};
@@ -125,11 +142,9 @@ BatchResult WriteEquation(BatchRow& row, const Reading& reading)
         return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
     Kq_BoolEquation equation;
-    if (row.init.find('\0') != std::string::npos ||
-        ReadInitText(LibraryText(row.init, reading), reading.inputs.size()).fault !=
-            InitFault::kNone ||
-        !SetFromText(equation, row.init, reading))
-        return RefuseText("the init value is", row.init, reading);
+    const BatchResult result = ReadInit(row, reading, equation);
+    if (result.outcome != BatchOutcome::kOk)
+        return result;
     row.equation = ShortText(equation);
     return {BatchOutcome::kFilled, std::string()};
 }

@@ -35,6 +35,24 @@ bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Readi
                                                  reading.reverse);
 }
 
+bool IsInitValue(const Kq_BoolEquation& equation)
+{
+    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
+}
+
+InitWidth WidthOfInit(const std::string& text)
+{
+    InitWidth width;
+    const char base = text.size() > 2 && text[0] == '0' ? static_cast<char>(text[1] | 0x20) : ' ';
+    if (base != 'x' && base != 'b')
+        return width;
+    width.isHex = base == 'x';
+    width.numRows = static_cast<uint64_t>(text.size() - 2) * (width.isHex ? 4 : 1);
+    for (uint64_t highestRow = width.numRows - 1; highestRow > 0; highestRow /= 2)
+        ++width.numInputs;
+    return width;
+}
+
 std::string LibraryText(const std::string& text, const Reading& reading)
 {
     const bool isLoneDigit = text.size() == 3 && text[0] == '0';

@@ -151,15 +151,14 @@ void ExplainOperator(const Context& context, const char* side, RefusalReport& re
 
 void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalReport& report)
 {
-    const InitText init = ReadInitText(text, 0);
-    const bool isHex = (text[1] | 0x20) == 'x';
+    const InitWidth width = WidthOfInit(text);
     const size_t numGiven = CheckInputs(reading.inputs).usable.size();
-    report.reason = std::to_string(text.size() - 2) + (isHex ? " hexadecimal" : " binary") +
+    report.reason = std::to_string(text.size() - 2) + (width.isHex ? " hexadecimal" : " binary") +
                     (text.size() == 3 ? " digit is" : " digits are") + " read over exactly " +
-                    std::to_string(init.numInputs) + (init.numInputs == 1 ? " input" : " inputs") +
-                    ", and " + std::to_string(numGiven) +
-                    (numGiven == 1 ? " is listed" : " are listed");
-    if (isHex && text.size() == 3 && numGiven == 1)
+                    std::to_string(width.numInputs) +
+                    (width.numInputs == 1 ? " input" : " inputs") + ", and " +
+                    std::to_string(numGiven) + (numGiven == 1 ? " is listed" : " are listed");
+    if (width.isHex && text.size() == 3 && numGiven == 1)
         report.hint = "one input has two rows: write 0x0 to 0x3, or two bits, 0b...";
 }
 

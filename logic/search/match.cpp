@@ -8,6 +8,7 @@
 #include <array>
 #include <cassert>
 #include <chrono>
+#include <utility>
 
 #include "spectrum.h"
 #include "watch.h"
@@ -23,21 +24,6 @@ uint64_t Mix(uint64_t value)
     value = (value ^ value >> 30) * 0xbf58476d1ce4e5b9u;
     value = (value ^ value >> 27) * 0x94d049bb133111ebu;
     return value ^ value >> 31;
-}
-
-// The function over its effective inputs alone. Input k of these is bit numInputs-1-k of the row.
-std::vector<uint64_t> Reduced(const Function& function, const std::vector<unsigned int>& inputs)
-{
-    const size_t numRows = size_t(1) << inputs.size();
-    std::vector<uint64_t> words(numRows > 64 ? numRows / 64 : 1);
-    for (size_t row = 0; row < numRows; ++row) {
-        uint64_t from = 0;
-        for (size_t input = 0; input < inputs.size(); ++input)
-            from |= (row >> (inputs.size() - 1 - input) & 1u)
-                    << (function.NumInputs() - 1 - inputs[input]);
-        words[row / 64] |= uint64_t(function.At(from) ? 1 : 0) << (row % 64);
-    }
-    return words;
 }
 
 // Equations between bits: the exclusive or of the bits of a set is a value.
@@ -82,11 +68,10 @@ class ParityEquations {
 // One of the two functions: its spectrum, and a number for each set of inputs that the changes
 // allowed leave alone.
 struct Side {
-    Side(const std::vector<uint64_t>& words, unsigned int numInputs, bool allowInversions)
-        : spectrum(WalshSpectrum(words, numInputs))
+    Side(const Rows& rows, bool allowInversions) : spectrum(WalshSpectrum(rows))
     {
         const std::vector<uint32_t> weights =
-            allowInversions ? DerivativeWeights(words, numInputs) : std::vector<uint32_t>();
+            allowInversions ? DerivativeWeights(rows) : std::vector<uint32_t>();
         for (size_t set = 0; set < spectrum.size(); ++set) {
             const int32_t value = allowInversions ? std::abs(spectrum[set]) : spectrum[set];
             const uint64_t weight = allowInversions ? weights[set] : 0;
@@ -135,10 +120,9 @@ enum class Outcome { kFound, kNone, kTimeIsUp };
 
 class MatchSearch {
   public:
-    MatchSearch(const std::vector<uint64_t>& first, const std::vector<uint64_t>& second,
-                unsigned int numInputs, bool allowInversions, double seconds)
-        : m_first(first, numInputs, allowInversions), m_second(second, numInputs, allowInversions),
-          m_num_inputs(numInputs), m_allow_inversions(allowInversions), m_seconds(seconds),
+    MatchSearch(const Rows& first, const Rows& second, bool allowInversions, double seconds)
+        : m_first(first, allowInversions), m_second(second, allowInversions),
+          m_num_inputs(first.NumInputs()), m_allow_inversions(allowInversions), m_seconds(seconds),
           m_start(std::chrono::steady_clock::now())
     {
     }
@@ -295,11 +279,7 @@ class MatchSearch {
 
 std::vector<unsigned int> EffectiveInputs(const Function& function)
 {
-    std::vector<unsigned int> inputs;
-    for (unsigned int input = 0; input < function.NumInputs(); ++input)
-        if (function.DependsOn(input))
-            inputs.push_back(input);
-    return inputs;
+    return Support(function.GetRows());
 }
 
 Matching Match(const Function& first, const Function& second, bool allowInversions, double seconds)
@@ -311,8 +291,8 @@ Matching Match(const Function& first, const Function& second, bool allowInversio
         return matching;
     assert(ownInputs.size() <= kMaxMatchInputs);
     const auto numInputs = static_cast<unsigned int>(ownInputs.size());
-    MatchSearch search(Reduced(first, ownInputs), Reduced(second, otherInputs), numInputs,
-                       allowInversions, seconds);
+    MatchSearch search(Restrict(first.GetRows(), ownInputs),
+                       Restrict(second.GetRows(), otherInputs), allowInversions, seconds);
     const Outcome outcome = search.Run();
     matching.isFound = outcome == Outcome::kFound;
     matching.isDecided = outcome != Outcome::kTimeIsUp;
@@ -334,9 +314,8 @@ Function Apply(const Matching& matching, const Function& first,
                const std::vector<std::string>& inputs)
 {
     const size_t numInputs = inputs.size();
-    const size_t numRows = size_t(1) << numInputs;
-    std::vector<uint64_t> words(numRows > 64 ? numRows / 64 : 1);
-    for (size_t row = 0; row < numRows; ++row) {
+    Rows rows(static_cast<unsigned int>(numInputs));
+    for (size_t row = 0; row < rows.NumRows(); ++row) {
         uint64_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
             if (matching.sources[place] == Matching::kIdle)
@@ -345,10 +324,9 @@ Function Apply(const Matching& matching, const Function& first,
                 ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
             from |= uint64_t(value ? 1 : 0) << (first.NumInputs() - 1 - matching.sources[place]);
         }
-        if (first.At(from) != matching.isInverted)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+        rows.Set(row, first.At(from) != matching.isInverted);
     }
-    return Function(inputs, std::move(words));
+    return {inputs, std::move(rows)};
 }
 
 } // namespace booleq

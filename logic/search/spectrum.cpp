@@ -10,9 +10,6 @@ namespace booleq {
 
 namespace {
 
-// The rows of a word where the input at a bit of the row number is 0.
-constexpr uint64_t kLowRows[] = {0x5555555555555555, 0x3333333333333333, 0x0f0f0f0f0f0f0f0f,
-                                 0x00ff00ff00ff00ff, 0x0000ffff0000ffff, 0x00000000ffffffff};
 constexpr unsigned int kWordBits = 6;
 
 // Differences by ever more inputs, from the highest bit of the row number down. A difference by one
@@ -30,7 +27,7 @@ class Derivatives {
         for (unsigned int bit = 0; bit < end; ++bit) {
             const size_t with = set | size_t(1) << bit;
             if (bit < kWordBits)
-                Run(LowDifference(words, bit), rows & kLowRows[bit], with, bit);
+                Run(LowDifference(words, bit), rows & ~BitPattern(bit), with, bit);
             else
                 Run(HighDifference(words, size_t(1) << (bit - kWordBits)), rows, with, bit);
         }
@@ -67,13 +64,13 @@ class Derivatives {
 
 } // namespace
 
-std::vector<int32_t> WalshSpectrum(const std::vector<uint64_t>& words, unsigned int numInputs)
+std::vector<int32_t> WalshSpectrum(const Rows& rows)
 {
-    assert(numInputs <= kMaxSpectrumInputs);
-    const size_t numRows = size_t(1) << numInputs;
+    assert(rows.NumInputs() <= kMaxSpectrumInputs);
+    const size_t numRows = rows.NumRows();
     std::vector<int32_t> spectrum(numRows);
     for (size_t row = 0; row < numRows; ++row)
-        spectrum[row] = (words[row / 64] >> (row % 64) & 1u) != 0 ? -1 : 1;
+        spectrum[row] = rows.At(row) ? -1 : 1;
     for (size_t half = 1; half < numRows; half *= 2)
         for (size_t start = 0; start < numRows; start += 2 * half)
             for (size_t low = start; low < start + half; ++low) {
@@ -84,14 +81,12 @@ std::vector<int32_t> WalshSpectrum(const std::vector<uint64_t>& words, unsigned 
     return spectrum;
 }
 
-std::vector<uint32_t> DerivativeWeights(const std::vector<uint64_t>& words, unsigned int numInputs)
+std::vector<uint32_t> DerivativeWeights(const Rows& rows)
 {
-    assert(numInputs <= kMaxSpectrumInputs);
-    assert(words.size() == (numInputs > kWordBits ? size_t(1) << (numInputs - kWordBits) : 1));
-    std::vector<uint32_t> weights(size_t(1) << numInputs);
-    const uint64_t rows =
-        numInputs >= kWordBits ? ~uint64_t(0) : (uint64_t(1) << (1u << numInputs)) - 1;
-    Derivatives(weights).Run(words, rows, 0, numInputs);
+    assert(rows.NumInputs() <= kMaxSpectrumInputs);
+    std::vector<uint32_t> weights(rows.NumRows());
+    const std::vector<uint64_t> words(rows.Words(), rows.Words() + rows.Size());
+    Derivatives(weights).Run(words, RowMask(rows.NumInputs()), 0, rows.NumInputs());
     return weights;
 }
 

@@ -43,12 +43,12 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels);
 class KqColumn {
   public:
     // Compiles the tree at 'root', which may be null and then counts as 0.
-    // Requires: a checked tree; numVariables <= kKqMaxColumnVariables. An ID whose index is no
-    // variable counts as 0. Fails: std::bad_alloc.  Cost: O(nodes).
+    // Requires: a checked tree; numVariables <= kKqMaxColumnVariables. An ID whose index is not
+    // that of a variable counts as 0.  Fails: std::bad_alloc.  Cost: O(nodes).
     KqColumn(const Kq_BoolEquationImp::Node* root, unsigned int numVariables);
 
     // 2^numVariables / 64, at least 1.
-    uint64_t GetNumWords() const { return m_num_words; }
+    size_t GetNumWords() const { return m_num_words; }
 
     // Words of a piece that is filled within some milliseconds, or, with over 100,000 operators, of
     // the smallest that is worth fixing variables for. A power of two that divides GetNumWords().
@@ -96,7 +96,7 @@ class KqColumn {
 
     static constexpr size_t kNumWritten = 128;
 
-    uint64_t m_num_words;
+    size_t m_num_words;
     KqKernel m_kernel;
     KqJoiner m_joiner;
     std::vector<KqCode> m_codes; // the program, then what is left of it

@@ -43,8 +43,8 @@ TEST(InitLiteral, SizedValuesReadAsTheirRows)
 
 TEST(InitLiteral, DigitsThatAreLeftOutAreZero)
 {
-    EXPECT_EQ(ReadOver("64'h1", Names(6)).Words(), std::vector<uint64_t>{1});
-    EXPECT_EQ(ReadOver("8'b101", Names(3)).Words(), std::vector<uint64_t>{5});
+    EXPECT_EQ(ReadOver("64'h1", Names(6)).GetRows(), Rows::OfWord(6, 1));
+    EXPECT_EQ(ReadOver("8'b101", Names(3)).GetRows(), Rows::OfWord(3, 5));
 }
 
 TEST(InitLiteral, OneInputReadsWhatIsPrinted)

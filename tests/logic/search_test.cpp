@@ -5,7 +5,6 @@
 
 #include <gtest/gtest.h>
 
-#include "bits.h"
 #include "cover.h"
 #include "kind.h"
 #include "logic_support.h"
@@ -28,13 +27,12 @@ std::vector<std::string> FirstNames(size_t numInputs)
 
 Function Make(size_t numInputs, uint64_t column)
 {
-    return Function(FirstNames(numInputs), {column});
+    return {FirstNames(numInputs), Rows::OfWord(static_cast<unsigned int>(numInputs), column)};
 }
 
 std::string Shortest(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
+    const Function function = FromInit(init, inputs);
     const ShortForm shortForm = FindShortForm(function);
     EXPECT_TRUE(shortForm.isFound);
     EXPECT_TRUE(ToFunction(shortForm.expression) == function);
@@ -139,7 +137,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
     std::mt19937_64 random(2);
     for (size_t numInputs = 1; numInputs <= 8; ++numInputs)
         for (int count = 0; count < 20; ++count) {
-            const Bits function(RandomFunction(FirstNames(numInputs), random, true));
+            const Rows function = RandomFunction(FirstNames(numInputs), random, true).GetRows();
             const std::vector<Cube> cubes = FindCover(function);
             const auto covers = [&](const Cube& cube, uint64_t row) {
                 for (size_t input = 0; input < numInputs; ++input)
@@ -165,9 +163,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
 
 std::string Said(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
-    return FindKind(function).text;
+    return FindKind(FromInit(init, inputs)).text;
 }
 
 TEST(FindKind, NamesFunctions)
@@ -201,9 +197,7 @@ TEST(FindKind, NamesFunctions)
 
 TEST(FindKind, TellsIdleInputs)
 {
-    Function function;
-    FunctionFromInit("0x3c", kNames.empty() ? kNames : std::vector<std::string>{"A", "B", "C"},
-                     false, function);
+    const Function function = FromInit("0x3c", {"A", "B", "C"});
     EXPECT_EQ(FindKind(function).idle, std::vector<std::string>{"C"});
     EXPECT_EQ(FindKind(function).mattering, (std::vector<std::string>{"A", "B"}));
 }
@@ -276,17 +270,16 @@ TEST(Match, FindsShuffledFunctionsOfTenInputs)
 TEST(Match, IsQuickForInputsThatAreAlike)
 {
     // A majority against itself with one row changed: every order fails for the same reason.
-    std::vector<uint64_t> words(size_t(1) << 6);
-    for (uint64_t row = 0; row < 4096; ++row)
-        if (__builtin_popcountll(row) > 6)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+    Rows rows(12);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
+        rows.Set(row, __builtin_popcountll(row) > 6);
     std::vector<std::string> names;
     for (int input = 0; input < 12; ++input)
         names.push_back("v" + std::to_string(input));
-    const Function first(names, words);
-    words[0] ^= 1;
-    words[63] ^= uint64_t(1) << 63;
-    const Function second(names, words);
+    const Function first(names, rows);
+    rows.Set(0, !rows.At(0));
+    rows.Set(4095, !rows.At(4095));
+    const Function second(names, rows);
     EXPECT_TRUE(Match(first, first, true).isFound);
     EXPECT_FALSE(Match(first, second, true).isFound);
 }
@@ -333,13 +326,13 @@ Function OfGraph(bool isShrikhande)
                    row * 4 + column == 12 || row * 4 + column == 5 || row * 4 + column == 15;
         return (row == 0) != (column == 0);
     };
-    std::vector<uint64_t> words(1024);
-    for (uint64_t row = 0; row < 65536; ++row)
+    Rows rows(16);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
         for (unsigned int one = 0; one < 16; ++one)
             for (unsigned int other = 0; other < one; ++other)
                 if ((row >> one & row >> other & 1u) != 0 && isEdge(one, other))
-                    words[row / 64] |= uint64_t(1) << (row % 64);
-    return {Names(16), words};
+                    rows.Set(row, true);
+    return {Names(16), rows};
 }
 
 TEST(Match, TellsGraphsOfSixteenInputsApart)
@@ -352,11 +345,11 @@ TEST(Match, TellsLargeRandomFunctionsApart)
 {
     std::mt19937_64 random(6);
     const Function first = RandomFunction(Names(16), random);
-    std::vector<uint64_t> words = first.Words();
+    Rows rows = first.GetRows();
     // As many ones, but two rows have traded places.
-    words[0] ^= uint64_t(1) << __builtin_ctzll(words[0]);
-    words[1] ^= uint64_t(1) << __builtin_ctzll(~words[1]);
-    EXPECT_FALSE(Match(first, Function(first.Inputs(), words), true).isFound);
+    rows.Words()[0] ^= uint64_t(1) << __builtin_ctzll(rows.Words()[0]);
+    rows.Words()[1] ^= uint64_t(1) << __builtin_ctzll(~rows.Words()[1]);
+    EXPECT_FALSE(Match(first, Function(first.Inputs(), rows), true).isFound);
 }
 
 TEST(Match, EndsWithItsTime)
@@ -373,8 +366,8 @@ TEST(Spectrum, IsTheSumOfItsDefinition)
     std::mt19937_64 random(8);
     for (unsigned int numInputs = 0; numInputs <= 8; ++numInputs) {
         const Function function = RandomFunction(FirstNames(numInputs), random);
-        const std::vector<int32_t> spectrum = WalshSpectrum(function.Words(), numInputs);
-        const std::vector<uint32_t> weights = DerivativeWeights(function.Words(), numInputs);
+        const std::vector<int32_t> spectrum = WalshSpectrum(function.GetRows());
+        const std::vector<uint32_t> weights = DerivativeWeights(function.GetRows());
         for (uint64_t set = 0; set < function.NumRows(); ++set) {
             int32_t sum = 0;
             uint32_t weight = 0;

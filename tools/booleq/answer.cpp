@@ -57,15 +57,6 @@ bool IsComment(const std::string& line)
     return first != std::string::npos && line[first] == '#';
 }
 
-// An init value is read over the usable inputs in the order that the request gives.
-std::vector<std::string> UsableInputs(const Reading& reading)
-{
-    std::vector<std::string> inputs = CheckInputs(reading.inputs).usable;
-    if (reading.reverse)
-        std::reverse(inputs.begin(), inputs.end());
-    return inputs;
-}
-
 } // namespace
 
 int ForEachText(const Request& request, Output& output,
@@ -109,14 +100,6 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
 
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function)
 {
-    if (request.reading.hasInputs) {
-        const std::vector<std::string> inputs = UsableInputs(request.reading);
-        if (inputs.size() <= kMaxFunctionInputs &&
-            FunctionFromInit(LibraryText(text.text, request.reading), inputs,
-                             request.reading.lsbFirst, function)
-                    .fault == InitFault::kNone)
-            return true;
-    }
     Kq_BoolEquation equation;
     if (!SetEquation(text, request, output, equation))
         return false;
@@ -163,6 +146,32 @@ std::string EnvelopeLine(const Text& text, const Request& request, const char* s
     Json json = Envelope(text, request, status);
     json["result"] = result;
     return JsonLine(json) + "\n";
+}
+
+int Say(const Text& text, const Request& request, Output& output, const Reply& reply)
+{
+    if (request.json) {
+        PutJson(text, request, reply.word, reply.toJson(), output);
+        return reply.status;
+    }
+    const LineMark mark = text.line > 0 ? reply.mark : LineMark::Nothing;
+    switch (mark) {
+    case LineMark::Nothing:
+        break;
+    case LineMark::Prefix:
+        output.Put("line " + std::to_string(text.line) + ": ");
+        break;
+    case LineMark::Heading:
+        output.Put("line " + std::to_string(text.line) + "\n");
+        break;
+    case LineMark::Block:
+        PutField(output, "line", std::to_string(text.line));
+        break;
+    }
+    reply.putText();
+    if (mark == LineMark::Block)
+        output.Put("\n");
+    return reply.status;
 }
 
 std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,

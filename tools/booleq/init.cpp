@@ -11,9 +11,6 @@ namespace booleq {
 
 namespace {
 
-// The library reads an init value by way of an expression; above, that takes long.
-constexpr size_t kMaxTriedInputs = 12;
-
 // Above, the digits are too long to be one text in JSON.
 constexpr size_t kMaxJsonInputs = 24;
 
@@ -35,26 +32,30 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     reading.reverse = reverse;
     Kq_BoolEquation equation;
     Function read;
-    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read))
+    // Over a name like 'a'+b the library reads the inputs of the expression that it stands for.
+    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read) ||
+        read.NumInputs() != function.NumInputs() || read.Over(function.Inputs()) != function)
         return false;
-    const std::string rendered =
-        ToStd(rendering[1] == 'x' ? equation.GetEquationAsHexInitValue(false)
-                                  : equation.GetEquationAsBinaryInitValue());
-    return rendered == rendering && read.Over(function.Inputs()) == function;
+    const Port::StringBase<char> rendered = rendering[1] == 'x'
+                                                ? equation.GetEquationAsHexInitValue(false)
+                                                : equation.GetEquationAsBinaryInitValue();
+    return rendering.compare(0, std::string::npos, rendered.c_str(), rendered.length()) == 0;
 }
 
 std::string Names(const Function& function)
 {
-    std::string names;
-    for (const std::string& name : function.Inputs())
-        names += (names.empty() ? "" : ", ") + Visible(name);
-    return names;
+    return Visible(Join(function.Inputs(), ", "));
+}
+
+// The digits are printed in full once.
+std::string Shortened(const std::string& digits)
+{
+    return digits.size() <= 40 ? digits : digits.substr(0, 40) + "...";
 }
 
 std::string Call(const Function& function, const std::string& text, bool lsbFirst, bool reverse)
 {
-    const std::string shown = text.size() <= 40 ? text : text.substr(0, 40) + "...";
-    return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + shown + "\", " +
+    return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + Shortened(text) + "\", " +
            (lsbFirst ? "true" : "false") + ", " + (reverse ? "true" : "false") + ")";
 }
 
@@ -68,11 +69,6 @@ void PutTried(const Function& function, const std::string& text, bool lsbFirst, 
 void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
 {
     const Function& function = msb.column;
-    if (function.NumInputs() > kMaxTriedInputs) {
-        PutField(output, "reads back",
-                 "not tried over more than " + std::to_string(kMaxTriedInputs) + " inputs");
-        return;
-    }
     const std::string hex = function.Hex();
     if (function.NumInputs() == 1) {
         PutTried(function, function.Binary(), false, false, function.Binary(), output);
@@ -85,10 +81,11 @@ void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
     const std::string turned = lsb.column.Hex();
     PutTried(function, hex, false, false, hex, output);
     PutTried(function, turned, true, false, hex, output);
-    PutField(output, "", "  which renders " + hex + ", the first input most significant again");
+    PutField(output, "",
+             "  which renders " + Shortened(hex) + ", the first input most significant again");
     PutTried(function, turned, false, true, turned, output);
     PutField(output, "",
-             "  which renders " + turned + ", " + Visible(function.Inputs().back()) +
+             "  which renders " + Shortened(turned) + ", " + Visible(function.Inputs().back()) +
                  " being the first variable now");
 }
 
@@ -127,7 +124,7 @@ Json AsJson(const Order& msb, const Order& lsb)
     result["num_rows"] = function.NumInputs() == 0 ? 0 : function.NumRows();
     if (function.NumInputs() == 0)
         result["value"] = function.At(0) ? 1 : 0;
-    const bool isTried = function.NumInputs() > 0 && function.NumInputs() <= kMaxTriedInputs;
+    const bool isTried = function.NumInputs() > 0;
     for (const Order* order : {&msb, &lsb}) {
         Json& json = result[order->lsbFirst ? "lsb_first" : "msb_first"];
         for (const bool isHex : {true, false}) {
@@ -263,16 +260,9 @@ int RunInit(const Request& request, Output& output)
                        " inputs the digits are too long for one object: print them without --json");
             return kRefused;
         }
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(msb, lsb), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        PutInit(msb, lsb, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return kDone;
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block, [&] { return AsJson(msb, lsb); },
+                    [&] { PutInit(msb, lsb, output); }});
     });
 }
 

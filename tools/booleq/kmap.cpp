@@ -44,10 +44,8 @@ struct Map {
     std::string ColumnNames() const { return Names(numRowInputs, function.NumInputs()); }
     std::string Names(size_t from, size_t to) const
     {
-        std::string names;
-        for (size_t index = from; index < to; ++index)
-            names += (index == from ? "" : " ") + Visible(function.Inputs()[index]);
-        return names;
+        const auto begin = function.Inputs().begin();
+        return Visible(Join({begin + static_cast<long>(from), begin + static_cast<long>(to)}, " "));
     }
 
     const Function& function;
@@ -132,18 +130,11 @@ int RunMap(const Request& request, Output& output)
         if (!HasPicture(function, "a map", text, request, output))
             return kRefused;
         const Map map(function);
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(map), output);
-            return kDone;
-        }
-        if (request.Has("--svg")) {
-            PutSvg(map, output);
-            return kDone;
-        }
-        if (text.line > 0)
-            output.Put("line " + std::to_string(text.line) + "\n");
-        PutText(map, output);
-        return kDone;
+        const bool isPicture = request.Has("--svg");
+        return Say(text, request, output,
+                   {kDone, "done", isPicture ? LineMark::Nothing : LineMark::Heading,
+                    [&] { return AsJson(map); },
+                    [&] { isPicture ? PutSvg(map, output) : PutText(map, output); }});
     });
 }
 

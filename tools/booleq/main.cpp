@@ -1,13 +1,23 @@
 // booleq: explains and compares Boolean equations on a terminal or in a pipe.
 // Command line, file or standard input in; answers on standard output, complaints on standard
 // error, one of the statuses of status.h out.
-#include <clocale>
 #include <csignal>
-#include <cstring>
+#include <cstdio>
 #include <new>
 #include <optional>
 
+#ifdef _WIN32
+#include <fcntl.h>
+#include <io.h>
+
+extern "C" int _dowildcard;
+int _dowildcard = 0; // an argument is an equation: its * names no files
+#else
+#include <clocale>
+#include <cstring>
+
 #include <langinfo.h>
+#endif
 
 #include "messages.h"
 #include "options.h"
@@ -51,6 +61,20 @@ int Fail(const char* message, const char* more = "")
     return kWrongUsage;
 }
 
+void PrepareProcess()
+{
+#ifdef _WIN32
+    // The same bytes as elsewhere: a line feed stays one byte, and a control-Z ends nothing.
+    for (std::FILE* stream : {stdin, stdout, stderr})
+        _setmode(_fileno(stream), _O_BINARY);
+#else
+    std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
+    std::setlocale(LC_CTYPE, "");
+    ShowUtf8(std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0);
+#endif
+    HandleInterrupts();
+}
+
 } // namespace
 
 } // namespace booleq
@@ -58,10 +82,7 @@ int Fail(const char* message, const char* more = "")
 int main(int argc, char** argv)
 {
     using namespace booleq;
-    std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
-    std::setlocale(LC_CTYPE, "");
-    ShowUtf8(std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0);
-    HandleInterrupts();
+    PrepareProcess();
     try {
         Output output(stdout);
         const std::vector<std::string> arguments(argv + (argc > 0 ? 1 : 0), argv + argc);

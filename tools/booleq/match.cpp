@@ -1,13 +1,9 @@
 // The command 'match': are two functions one up to the order of inputs, or up to inversions.
 #include "match.h"
 
-#include <algorithm>
-#include <chrono>
-
-#include "answer.h"
 #include "commands.h"
+#include "decide.h"
 #include "init_literal.h"
-#include "options.h"
 #include "text.h"
 
 namespace booleq {
@@ -27,13 +23,14 @@ std::vector<std::string> LetterNames(size_t count)
 // The number of inputs of an init value that names none; kMaxFunctionInputs + 1 for another text.
 size_t WidthOf(const std::string& text)
 {
-    size_t numInputs = ReadInitText(text, 0).numInputs;
-    if (IsSizedLiteral(text))
-        for (numInputs = 0; numInputs <= kMaxFunctionInputs; ++numInputs)
+    if (IsSizedLiteral(text)) {
+        for (size_t numInputs = 0; numInputs <= kMaxFunctionInputs; ++numInputs)
             if (!ReadInitLiteral(text, numInputs).code)
-                break;
-    const InitText init = ReadInitText(ReadInitLiteral(text, numInputs).text, numInputs);
-    return init.fault == InitFault::kNone ? numInputs : kMaxFunctionInputs + 1;
+                return numInputs;
+        return kMaxFunctionInputs + 1;
+    }
+    const InitWidth width = WidthOfInit(text);
+    return width.numRows > 0 ? width.numInputs : kMaxFunctionInputs + 1;
 }
 
 // Whether the text is an init value over the inputs listed.
@@ -80,17 +77,16 @@ struct Answer {
 };
 
 // First by order alone, then with inversions; both within the time.
-Answer FindMatch(const Function& first, const Function& second, bool orderOnly, double seconds)
+Answer FindMatch(const Function& first, const Function& second, bool orderOnly,
+                 const Limits& limits)
 {
-    const auto start = std::chrono::steady_clock::now();
+    const Deadline deadline(limits);
     Answer answer;
-    answer.matching = Match(first, second, false, seconds);
+    answer.matching = Match(first, second, false, limits.seconds);
     answer.level = answer.matching.isFound ? "order" : nullptr;
     if (answer.level || orderOnly || !answer.matching.isDecided)
         return answer;
-    const std::chrono::duration<double> passed = std::chrono::steady_clock::now() - start;
-    const double left = seconds > 0 ? std::max(seconds - passed.count(), 1e-6) : 0;
-    answer.matching = Match(first, second, true, left);
+    answer.matching = Match(first, second, true, limits.seconds > 0 ? deadline.Left() : 0);
     answer.level = answer.matching.isFound ? "inversions" : nullptr;
     return answer;
 }
@@ -103,42 +99,37 @@ std::string SourceText(const Function& second, const Matching& matching, size_t 
 std::vector<std::string> IdleInputs(const Function& function)
 {
     std::vector<std::string> idle;
-    for (size_t input = 0; input < function.NumInputs(); ++input)
-        if (!function.DependsOn(input))
+    for (unsigned int input = 0; input < function.NumInputs(); ++input)
+        if (!DependsOn(function.GetRows(), input))
             idle.push_back(function.Inputs()[input]);
     return idle;
 }
 
 void PutIdle(const char* which, const Function& function, Output& output)
 {
-    std::string list;
-    for (const std::string& name : IdleInputs(function))
-        list += (list.empty() ? "" : ", ") + Visible(name);
+    const std::string list = Visible(Join(IdleInputs(function), ", "));
     if (!list.empty())
         output.Put("    without effect in the " + std::string(which) + ": " + list + "\n");
 }
 
-void PutText(const Text& text, const Request& request, const Function& first,
-             const Function& second, const Answer& answer, Output& output)
+void PutText(const Request& request, const Function& first, const Function& second,
+             const Answer& answer, Output& output)
 {
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
     if (!answer.matching.isDecided) {
-        output.Put(place + "not decided in " + request.Get("--seconds") + " seconds\n");
+        output.Put("not decided in " + request.Get("--seconds") + " seconds\n");
         return;
     }
     const size_t numFirst = EffectiveInputs(first).size();
     const size_t numSecond = EffectiveInputs(second).size();
     if (!answer.level) {
-        output.Put(place + "no match" +
-                   (numFirst == numSecond
-                        ? "\n"
-                        : ": " + Count(numFirst, "input") + " with an effect, and " +
-                              std::to_string(numSecond) + "\n"));
+        output.Put("no match" + (numFirst == numSecond
+                                     ? "\n"
+                                     : ": " + Count(numFirst, "input") + " with an effect, and " +
+                                           std::to_string(numSecond) + "\n"));
         return;
     }
     const bool isOrder = std::string(answer.level) == "order";
-    output.Put(place +
-               (isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
+    output.Put((isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
     output.Put("  the second is the first" +
                std::string(answer.matching.isInverted ? " inverted" : "") +
                (numFirst > 0 ? ", where\n" : "\n"));
@@ -195,7 +186,7 @@ const char* StatusName(const Answer& answer)
 
 int RunMatch(const Request& request, Output& output)
 {
-    const double seconds = ParseSeconds(request);
+    const Limits limits = ParseLimits(request, 0);
     const Request forSecond = ForSecond(request);
     const Text other{request.operands.back(), 0};
     Function second;
@@ -211,14 +202,12 @@ int RunMatch(const Request& request, Output& output)
         if (!SetNamed(text, request, isForSecond, output, first) ||
             RefuseTooMany(text, request, first, output))
             return kRefused;
-        const Answer answer = FindMatch(first, second, request.Has("--order-only"), seconds);
-        if (request.json)
-            PutJson(text, request, StatusName(answer), ToJson(first, second, answer), output);
-        else
-            PutText(text, request, first, second, answer, output);
-        if (!answer.matching.isDecided)
-            return kUndecided;
-        return answer.level ? kDone : kFindings;
+        const Answer answer = FindMatch(first, second, request.Has("--order-only"), limits);
+        const int found = answer.level ? kDone : kFindings;
+        return Say(text, request, output,
+                   {answer.matching.isDecided ? found : kUndecided, StatusName(answer),
+                    LineMark::Prefix, [&] { return ToJson(first, second, answer); },
+                    [&] { PutText(request, first, second, answer, output); }});
     });
 }
 

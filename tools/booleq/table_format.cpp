@@ -4,7 +4,7 @@
 #include <utility>
 
 #include "answer.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {
@@ -39,14 +39,6 @@ bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
             return false;
     }
     return true;
-}
-
-std::string JoinNames(const std::vector<std::string>& names)
-{
-    std::string list;
-    for (const std::string& name : names)
-        list += (list.empty() ? "" : ",") + name;
-    return list;
 }
 
 BatchResult Refused(std::string message)
@@ -84,7 +76,7 @@ class CsvFormat : public TableFormat {
         if (result == fields.end())
             fields.emplace_back("result");
         m_num_written = fields.size();
-        answer = Join(fields);
+        answer = CsvLine(fields);
         return true;
     }
 
@@ -114,12 +106,12 @@ class CsvFormat : public TableFormat {
                          const BatchResult& result) override
     {
         if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
-            m_fields[m_inputs] = JoinNames(row.inputs);
+            m_fields[m_inputs] = Join(row.inputs, ",");
             m_fields[m_equation] = row.equation;
             m_fields[m_init] = row.init;
         }
         m_fields[m_result] = OutcomeName(result.outcome);
-        return Join(m_fields);
+        return CsvLine(m_fields);
     }
 
     std::unique_ptr<TableFormat> Clone() const override
@@ -134,7 +126,7 @@ class CsvFormat : public TableFormat {
         return !line.empty() && line.back() == '\r' ? line.substr(0, line.size() - 1) : line;
     }
 
-    static std::string Join(const std::vector<std::string>& fields)
+    static std::string CsvLine(const std::vector<std::string>& fields)
     {
         std::string line;
         for (size_t index = 0; index < fields.size(); ++index)

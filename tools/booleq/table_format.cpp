@@ -24,8 +24,10 @@ bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
             fields.emplace_back();
             continue;
         }
-        if (line[position] != '"' || !fields.back().empty()) {
-            fields.back() += line[position];
+        if (line[position] != '"') {
+            const size_t end = std::min(line.find(',', position), line.size());
+            fields.back().assign(line, position, end - position);
+            position = end - 1;
             continue;
         }
         for (++position; position < line.size(); ++position) {
@@ -129,8 +131,11 @@ class CsvFormat : public TableFormat {
     static std::string CsvLine(const std::vector<std::string>& fields)
     {
         std::string line;
-        for (size_t index = 0; index < fields.size(); ++index)
-            line += (index == 0 ? "" : ",") + CsvField(fields[index]);
+        for (const std::string& field : fields) {
+            line += CsvField(field);
+            line += ',';
+        }
+        line.pop_back(); // a header has a field at least
         return line;
     }
 

@@ -4,8 +4,11 @@
 #include <utility>
 
 #include "function.h"
+#include "init_literal.h"
 #include "listed_inputs.h"
+#include "notation_writer.h"
 #include "refusal.h"
+#include "short_form.h"
 #include "text.h"
 
 namespace booleq {
@@ -14,6 +17,7 @@ namespace {
 
 // Above, the library's expression of an init value is too long to be of use: 10,000 characters.
 constexpr size_t kMaxWrittenInputs = 10;
+constexpr size_t kMaxShortInputs = 6; // a short form of more takes too long for a table
 
 BatchResult Fail(BatchOutcome outcome, std::string message)
 {
@@ -77,9 +81,26 @@ BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquatio
     return {};
 }
 
+// A text in the column of init values that is an expression for the library.
+BatchResult RefuseNoInit(const std::string& text)
+{
+    std::string message = "the init value begins neither with 0x or 0b nor with a size";
+    const bool isHex =
+        !text.empty() && text.find_first_not_of("0123456789abcdefABCDEF") == std::string::npos;
+    message += isHex ? "; write 0x" + Excerpt(text) : "; write 0xca or 8'hca";
+    return Fail(BatchOutcome::kTextRefused, std::move(message));
+}
+
+bool BeginsLikeInit(const std::string& text)
+{
+    return WidthOfInit(text).numRows > 0 || IsSizedLiteral(text);
+}
+
 // Compares the row's init value with the equation's function.
 BatchResult CompareInit(const BatchRow& row, const Function& function)
 {
+    if (!BeginsLikeInit(row.init))
+        return RefuseNoInit(row.init);
     Reading reading;
     reading.hasInputs = true;
     reading.inputs = function.Inputs();
@@ -101,9 +122,22 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
     return Fail(BatchOutcome::kDiffers, std::move(message));
 }
 
+// The short form up to six inputs, otherwise the one that the library reads the init value as.
+std::string ShortText(const Kq_BoolEquation& equation)
+{
+    Function function;
+    ShortForm shortForm;
+    if (equation.GetNumVariables() <= kMaxShortInputs && FunctionOf(equation, function))
+        shortForm = FindShortForm(function);
+    return shortForm.isFound ? WriteOwn(shortForm.expression, OwnSyntax::First, Parentheses::Clear)
+                             : ToStd(equation.GetEquationAsExpression(true));
+}
+
 // The equation of a row that has an init value and inputs only.
 BatchResult WriteEquation(BatchRow& row, const Reading& reading)
 {
+    if (!BeginsLikeInit(row.init))
+        return RefuseNoInit(row.init);
     if (reading.inputs.size() > kMaxWrittenInputs)
         return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
@@ -111,7 +145,7 @@ BatchResult WriteEquation(BatchRow& row, const Reading& reading)
     const BatchResult result = ReadInit(row, reading, equation);
     if (result.outcome != BatchOutcome::kOk)
         return result;
-    row.equation = ToStd(equation.GetEquationAsExpression(true));
+    row.equation = ShortText(equation);
     return {BatchOutcome::kFilled, std::string()};
 }
 
@@ -120,7 +154,7 @@ BatchResult CheckNames(const std::vector<std::string>& inputs)
     const InputCheck check = CheckInputs(inputs);
     if (!check.illegal.empty())
         return Fail(BatchOutcome::kTextRefused,
-                    "'" + Excerpt(check.illegal.front()) + "' is no name of an input");
+                    "'" + Excerpt(check.illegal.front()) + "' is not a name of an input");
     if (!check.repeated.empty())
         return Fail(BatchOutcome::kTextRefused,
                     Excerpt(check.repeated.front()) + " stands twice among the inputs");

@@ -34,7 +34,9 @@ struct BatchResult {
 // Fills and compares. Where the outcome is neither kOk nor kFilled, the row is as it was.
 // An equation without init value gets the hexadecimal one, the binary one over one input, because
 // that reads back; without inputs it has none. Missing inputs are those of the equation in order
-// of first occurrence. A missing equation is the one the library reads the init value as.
+// of first occurrence. A missing equation is a short one up to six inputs; above it is the one the
+// library reads the init value as.
+// Threads: any, each with rows of its own.
 // Cost: that of the column, up to 30 inputs.
 BatchResult CompleteRow(BatchRow& row);
 

@@ -1,6 +1,8 @@
 #include "text.h"
 
 #include <algorithm>
+#include <cwchar>
+#include <cwctype>
 
 namespace booleq {
 
@@ -8,12 +10,42 @@ namespace {
 
 constexpr size_t kExcerptBytes = 60;
 
+bool isUtf8Shown = false;
+
 bool IsPrintableByte(char byte)
 {
     return byte >= ' ' && byte <= '~';
 }
 
+// Bytes of the printable character that begins there, 0 for none.
+size_t PrintableLength(const std::string& text, size_t position)
+{
+    if (IsPrintableByte(text[position]))
+        return 1;
+    if (!isUtf8Shown || static_cast<unsigned char>(text[position]) < 0x80)
+        return 0;
+    wchar_t character = 0;
+    std::mbstate_t state = {};
+    const size_t length =
+        std::mbrtowc(&character, text.data() + position, text.size() - position, &state);
+    const bool isWhole = length != 0 && length <= text.size() - position;
+    return isWhole && std::iswprint(static_cast<std::wint_t>(character)) != 0 ? length : 0;
+}
+
 } // namespace
+
+void ShowUtf8(bool isShown)
+{
+    isUtf8Shown = isShown;
+}
+
+size_t Width(const std::string& visible)
+{
+    // A character has one byte that does not continue another.
+    return static_cast<size_t>(std::count_if(visible.begin(), visible.end(), [](char byte) {
+        return (static_cast<unsigned char>(byte) & 0xc0u) != 0x80u;
+    }));
+}
 
 std::string ToStd(const Port::StringBase<char>& text)
 {
@@ -30,9 +62,12 @@ std::string Visible(const std::string& text)
     static constexpr char kDigits[] = "0123456789abcdef";
     std::string visible;
     visible.reserve(text.size());
-    for (const char byte : text) {
-        if (IsPrintableByte(byte)) {
-            visible += byte;
+    for (size_t position = 0; position < text.size(); ++position) {
+        const char byte = text[position];
+        const size_t length = PrintableLength(text, position);
+        if (length > 0) {
+            visible.append(text, position, length);
+            position += length - 1;
             continue;
         }
         const unsigned int value = static_cast<unsigned char>(byte);

@@ -14,6 +14,11 @@ std::string ToStd(const Port::StringBase<char>& text);
 
 // True when every byte is printable ASCII, so that Visible changes nothing.
 bool IsPrintable(const std::string& text);
+// From now on Visible leaves characters of UTF-8 that the locale can print; at first it does not.
+// Threads: before others start.
+void ShowUtf8(bool isShown);
+// How many columns of a terminal a visible text takes.
+size_t Width(const std::string& visible);
 // Every byte that is not printable ASCII as \xNN: a name may hold any byte, an escape sequence for
 // the terminal too.
 std::string Visible(const std::string& text);

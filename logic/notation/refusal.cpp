@@ -343,8 +343,8 @@ std::string MarkPlace(const std::string& text, size_t offset, size_t length,
     const std::string marked = Visible(text.substr(offset, markEnd - offset));
     const std::string right = Visible(text.substr(markEnd, std::max(end, markEnd) - markEnd)) +
                               (end < lineEnd ? "..." : "");
-    return indent + left + marked + right + "\n" + indent + std::string(left.size(), ' ') +
-           std::string(std::max<size_t>(1, marked.size()), '^') + "\n";
+    return indent + left + marked + right + "\n" + indent + std::string(Width(left), ' ') +
+           std::string(std::max<size_t>(1, Width(marked)), '^') + "\n";
 }
 
 std::string PlaceName(const std::string& text, size_t offset)

@@ -1,6 +1,7 @@
 #include "shortest.h"
 
 #include <cassert>
+#include <mutex>
 #include <utility>
 
 #include "watch.h"
@@ -161,8 +162,11 @@ Formula FindShortest(const Rows& function)
     for (unsigned int place = 0; place < kMaxShortestInputs; ++place)
         order.push_back((place + numIdle) % kMaxShortestInputs);
     const auto column = static_cast<Column>(PermuteInputs(std::move(rows), order).Words()[0]);
+    static std::mutex mutex;    // guards the table
     static ShortestTable table; // it grows as far as it was asked for
+    std::unique_lock<std::mutex> lock(mutex);
     Formula formula = table.Find(column);
+    lock.unlock();
     Renumber(formula, support);
     return formula;
 }

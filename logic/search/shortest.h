@@ -13,7 +13,7 @@ constexpr unsigned int kMaxShortestInputs = 4;
 // Functions of 1, 2, 3, ... literals are made of all pairs of shorter ones until this one is there;
 // with as many literals, fewer exclusive ORs come first. Inversions are free, so a function and its
 // inversion are one.
-// Requires: at most kMaxShortestInputs inputs matter.
+// Requires: at most kMaxShortestInputs inputs matter.  Threads: any; they share one table.
 Formula FindShortest(const Rows& function);
 
 } // namespace booleq

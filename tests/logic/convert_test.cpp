@@ -81,8 +81,8 @@ TEST(Convert, ProvesTextsOfAnyNumberOfInputs)
     std::string text = "v0";
     for (int input = 1; input <= 40; ++input)
         text += std::string(input % 2 == 0 ? " ^ v" : " | v") + std::to_string(input);
-    for (const char* target : {"verilog", "vhdl", "c", "python",
-                                "liberty", "blif", "eqn", "alt3"}) {
+    for (const char* target :
+         {"verilog", "vhdl", "c", "python", "liberty", "blif", "eqn", "alt3"}) {
         const Conversion conversion = Converted(Parsed(text), target, "");
         EXPECT_EQ(conversion.fault, "");
         EXPECT_TRUE(conversion.isProved) << conversion.doubt;
@@ -95,10 +95,8 @@ TEST(Convert, TakesDeepExpressions)
     for (int level = 0; level < 50000; ++level)
         text = "b ^ (" + text;
     text += std::string(50000, ')');
-    for (const char* target :
-         {"verilog", "c", "vhdl", "blif", "eqn"})
-        EXPECT_EQ(Converted(Parsed(text), target, "").fault, "")
-            << target;
+    for (const char* target : {"verilog", "c", "vhdl", "blif", "eqn"})
+        EXPECT_EQ(Converted(Parsed(text), target, "").fault, "") << target;
 }
 
 // What a notation reads: the column over the tree's names, or why not.

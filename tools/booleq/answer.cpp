@@ -50,6 +50,13 @@ void SayRefusal(const Text& text, const Request& request, Output& output,
     Complain(output, message);
 }
 
+// No text begins with this character.
+bool IsComment(const std::string& line)
+{
+    const size_t first = line.find_first_not_of(" \t");
+    return first != std::string::npos && line[first] == '#';
+}
+
 } // namespace
 
 int ForEachText(const Request& request, Output& output,
@@ -63,11 +70,15 @@ int ForEachText(const Request& request, Output& output,
     size_t numTexts = 0;
     int status = kDone;
     while (reader.Next(text.text)) {
-        ++text.line;
-        if (IsBlank(text.text))
+        if (++text.line == 1)
+            DropByteOrderMark(text.text);
+        DropCarriageReturn(text.text);
+        if (IsBlank(text.text) || IsComment(text.text))
             continue;
         ++numTexts;
         status = std::max(status, answer(text));
+        if (request.Has("--line-buffered"))
+            output.Flush();
         progress.Show(reader.GetPosition());
     }
     if (numTexts == 0)
@@ -126,9 +137,15 @@ Json RefusalAsJson(const RefusalReport& report)
 void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
              Output& output)
 {
+    output.Put(EnvelopeLine(text, request, status, result));
+}
+
+std::string EnvelopeLine(const Text& text, const Request& request, const char* status,
+                         const Json& result)
+{
     Json json = Envelope(text, request, status);
     json["result"] = result;
-    output.Put(JsonLine(json) + "\n");
+    return JsonLine(json) + "\n";
 }
 
 int Say(const Text& text, const Request& request, Output& output, const Reply& reply)
@@ -171,6 +188,15 @@ std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Requ
 std::string JsonLine(const Json& json)
 {
     return json.dump(-1, ' ', false, Json::error_handler_t::replace);
+}
+
+void PutMember(Json& object, const std::string& name, const Json& value)
+{
+    const std::string written = Json::parse(JsonLine(Json(name))).get<std::string>();
+    std::string key = written;
+    for (size_t number = 2; object.contains(key); ++number)
+        key = written + "#" + std::to_string(number);
+    object[key] = value;
 }
 
 void PutLabel(Output& output, const std::string& label)

@@ -52,6 +52,10 @@ Json RefusalAsJson(const RefusalReport& report);
 // The envelope around 'result'. 'status' is "done", "yes", "no" or "findings".
 void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
              Output& output);
+// The same as a text with its line end.
+std::string EnvelopeLine(const Text& text, const Request& request, const char* status,
+                         const Json& result);
+
 // What marks an answer as that of a line, where there are many.
 enum class LineMark {
     Nothing,
@@ -78,6 +82,10 @@ std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Requ
                                                     const char* status, const Json& result);
 // A text or name for JSON: bytes that are no UTF-8 become U+FFFD when they are written.
 std::string JsonLine(const Json& json);
+
+// Adds a member to an object. Names that differ in bytes that are no UTF-8 look alike when they are
+// written; the later one gets a number, as no key is written twice.
+void PutMember(Json& object, const std::string& name, const Json& value);
 
 // "label           value"; values of one answer stand below each other.
 void PutLabel(Output& output, const std::string& label);

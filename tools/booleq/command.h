@@ -67,6 +67,8 @@ constexpr size_t kAnyNumber = static_cast<size_t>(-1);
 const std::vector<Command>& Commands();
 // Null for a word that is no command.
 const Command* FindCommand(const std::string& word);
+// The command whose name is most like the word, a letter or two apart; null when none is.
+const Command* NearestCommand(const std::string& word);
 // Options that every command takes.
 const std::vector<Option>& CommonOptions();
 

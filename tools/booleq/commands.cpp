@@ -12,6 +12,7 @@ const std::vector<Option>& CommonOptions()
         {"--lsb-first", nullptr, "Init value: its first input is bit 0 of the row number"},
         {"--reverse", nullptr, "Init value: take --inputs from the last to the first"},
         {"--file", "FILE", "Take each line of FILE for the equation; - is standard input"},
+        {"--line-buffered", nullptr, "Let each answer out at once, not in blocks"},
         {"--json", nullptr, "Answer with one JSON object on a line for each equation"},
         {"--debug", nullptr, "Let the library's diagnostics go to standard error"},
     };
@@ -35,6 +36,45 @@ const Command* FindCommand(const std::string& word)
         std::find_if(commands.begin(), commands.end(),
                      [&word](const Command& command) { return word == command.name; });
     return found == commands.end() ? nullptr : &*found;
+}
+
+// The number of letters to put in, take out, change or swap with the next one, after Damerau.
+size_t EditDistance(const std::string& left, const std::string& right)
+{
+    std::vector<std::vector<size_t>> distance(left.size() + 1,
+                                              std::vector<size_t>(right.size() + 1));
+    for (size_t row = 0; row <= left.size(); ++row)
+        for (size_t column = 0; column <= right.size(); ++column) {
+            size_t& own = distance[row][column];
+            if (row == 0 || column == 0) {
+                own = row + column;
+                continue;
+            }
+            const bool isSame = left[row - 1] == right[column - 1];
+            own = std::min({distance[row - 1][column] + 1, distance[row][column - 1] + 1,
+                            distance[row - 1][column - 1] + (isSame ? 0u : 1u)});
+            if (row > 1 && column > 1 && left[row - 1] == right[column - 2] &&
+                left[row - 2] == right[column - 1])
+                own = std::min(own, distance[row - 2][column - 2] + 1);
+        }
+    return distance[left.size()][right.size()];
+}
+
+const Command* NearestCommand(const std::string& word)
+{
+    constexpr size_t kMinLength = 4; // shorter ones are names of inputs
+    const Command* nearest = nullptr;
+    size_t least = 3;
+    if (word.size() < kMinLength || word.size() > 2 * kMinLength)
+        return nullptr;
+    for (const Command& command : Commands()) {
+        const size_t distance = EditDistance(word, command.name);
+        if (distance < least && distance * 3 <= word.size()) {
+            least = distance;
+            nearest = &command;
+        }
+    }
+    return nearest;
 }
 
 } // namespace booleq

@@ -4,6 +4,7 @@
 
 #include "commands.h"
 #include "decide.h"
+#include "short_form.h"
 #include "text.h"
 
 namespace booleq {
@@ -71,6 +72,21 @@ void PutText(const Expression& expression, const Conversion& conversion, Output&
     output.Put(conversion.text);
 }
 
+// The short form in place of the expression.  Fails: why there is none.
+std::string Shorten(const Kq_BoolEquation& equation, Expression& expression)
+{
+    const size_t numInputs = equation.GetNumVariables();
+    Function function;
+    if (numInputs > kMaxShortFormInputs || !FunctionOf(equation, function))
+        return Count(numInputs, "input") + ": at most " + std::to_string(kMaxShortFormInputs) +
+               " are shortened";
+    const ShortForm shortForm = FindShortForm(function);
+    if (!shortForm.isFound)
+        return "no expression of bearable length was found";
+    expression = shortForm.expression;
+    return std::string();
+}
+
 int RunConvert(const Request& request, Output& output)
 {
     const Target& target = ParseTarget(request.Get("--to"));
@@ -80,7 +96,13 @@ int RunConvert(const Request& request, Output& output)
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const Expression expression = ToExpression(equation);
+        Expression expression = ToExpression(equation);
+        const std::string fault =
+            request.Has("--short") ? Shorten(equation, expression) : std::string();
+        if (!fault.empty()) {
+            Refuse(text, request, output, fault);
+            return kRefused;
+        }
         std::string ownUnit = unit;
         if (text.line > 0 && target.wrapping != Wrapping::Never &&
             (!unit.empty() || target.wrapping == Wrapping::Always))
@@ -111,11 +133,11 @@ Command ConvertCommand()
         "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
         "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
         "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
-        "the answer says how. Before it is printed the text is read again and compared; where "
-        "that\n"
-        "takes over 10 seconds, or what --seconds says, a warning says so, and the status is 4.\n"
-        "Of lines, each module gets its line's number behind its name.\n",
+        "the answer says how. Before it is printed the text is read again and compared; where\n"
+        "that takes over 10 seconds, or what --seconds says, a warning says so, and the status is\n"
+        "4. Of lines, each module gets its line's number after its name.\n",
         {{"--to", "TARGET", "What to write"},
+         {"--short", nullptr, "Write a short expression of the function, not the one given"},
          {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
          {"--name", "NAME", "The name of that, or of the model of a blif file (f)"},
          SecondsOption()},

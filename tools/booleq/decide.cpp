@@ -132,7 +132,7 @@ Json AssignmentJson(const Decision& decision)
 {
     Json json = Json::object();
     for (size_t index = 0; index < decision.inputs.size(); ++index)
-        json[decision.inputs[index]] = decision.assignment[index] ? 1 : 0;
+        PutMember(json, decision.inputs[index], decision.assignment[index] ? 1 : 0);
     return json;
 }
 

@@ -21,7 +21,7 @@ Assignment ParseAssignment(const std::string& word)
     const size_t sign = word.rfind('=');
     const std::string value = sign == std::string::npos ? std::string() : word.substr(sign + 1);
     if (sign == 0 || (value != "0" && value != "1"))
-        throw UsageError("'" + Excerpt(word) + "' is no assignment: write NAME=0 or NAME=1");
+        throw UsageError("'" + Excerpt(word) + "' is not an assignment: write NAME=0 or NAME=1");
     return {word.substr(0, sign), value == "1" ? 1u : 0u};
 }
 
@@ -37,15 +37,21 @@ std::vector<Assignment> ParseAssignments(const Request& request)
     return assignments;
 }
 
-// What keeps the assignments from being one value for each input; empty when nothing does.
-std::string Assign(Kq_BoolEquation& equation, const std::vector<Assignment>& assignments)
+// What keeps the assignments from being one value for each input; empty when nothing does. One of
+// many lines need not have all the inputs; those that it has go to 'assigned'.
+std::string Assign(Kq_BoolEquation& equation, const std::vector<Assignment>& assignments,
+                   bool isLine, std::set<std::string>& assigned)
 {
-    for (const Assignment& assignment : assignments)
+    std::set<std::string> inputs;
+    for (const std::string& name : InputNames(equation))
+        inputs.insert(name);
+    for (const Assignment& assignment : assignments) {
+        if (isLine && inputs.count(assignment.name) == 0)
+            continue;
         if (!equation.SetVariable(assignment.name.c_str(), assignment.value))
             return "there is no input " + Excerpt(assignment.name);
-    std::set<std::string> assigned;
-    for (const Assignment& assignment : assignments)
         assigned.insert(assignment.name);
+    }
     for (const std::string& name : InputNames(equation))
         if (assigned.count(name) == 0)
             return "no value for " + Excerpt(name) + ": write " + Excerpt(name) + "=0 or " +
@@ -56,11 +62,14 @@ std::string Assign(Kq_BoolEquation& equation, const std::vector<Assignment>& ass
 int RunEval(const Request& request, Output& output)
 {
     const std::vector<Assignment> assignments = ParseAssignments(request);
-    return ForEachText(request, output, [&](const Text& text) {
+    std::set<std::string> everAssigned;
+    const int status = ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const std::string fault = Assign(equation, assignments);
+        std::set<std::string> assigned;
+        const std::string fault = Assign(equation, assignments, text.line > 0, assigned);
+        everAssigned.insert(assigned.begin(), assigned.end());
         if (!fault.empty() && text.line == 0)
             throw UsageError(fault);
         if (!fault.empty()) {
@@ -70,8 +79,10 @@ int RunEval(const Request& request, Output& output)
         const unsigned int value = equation.Eval();
         if (request.json) {
             Json result;
+            result["assignment"] = Json::object();
             for (const Assignment& assignment : assignments)
-                result["assignment"][assignment.name] = assignment.value;
+                if (assigned.count(assignment.name) != 0)
+                    PutMember(result["assignment"], assignment.name, assignment.value);
             result["value"] = value;
             PutJson(text, request, "done", result, output);
         } else if (text.line > 0) {
@@ -81,23 +92,29 @@ int RunEval(const Request& request, Output& output)
         }
         return kDone;
     });
+    for (const Assignment& assignment : assignments)
+        if (request.hasLines && everAssigned.count(assignment.name) == 0)
+            Complain(output, "warning: no line has an input " + Excerpt(assignment.name));
+    return status;
 }
 
 } // namespace
 
 Command EvalCommand()
 {
-    return {"eval",
-            "EQUATION [NAME=VALUE...]",
-            1,
-            kAnyNumber,
-            "Print the value for one assignment",
-            "Every input needs a value, 0 or 1. The answer is the status 0 and the value printed,\n"
-            "0 or 1; a missing value or an unknown name is wrong usage.\n",
-            {},
-            {"booleq eval 'A & ~B' A=1 B=0", "booleq eval --inputs A,B 0x6 A=1 B=1",
-             "booleq eval --file equations.txt A=1 B=0"},
-            RunEval};
+    return {
+        "eval",
+        "EQUATION [NAME=VALUE...]",
+        1,
+        kAnyNumber,
+        "Print the value for one assignment",
+        "Every input needs a value, 0 or 1. The answer is the status 0 and the value printed,\n"
+        "0 or 1; a missing value or an unknown name is wrong usage. Of many lines each takes the\n"
+        "values of the inputs that it has.\n",
+        {},
+        {"booleq eval 'A & ~B' A=1 B=0", "booleq eval --inputs A,B 0x6 A=1 B=1",
+         "booleq eval --file equations.txt A=1 B=0"},
+        RunEval};
 }
 
 } // namespace booleq

@@ -16,6 +16,18 @@ constexpr size_t kBufferBytes = 65536;
 
 } // namespace
 
+void DropByteOrderMark(std::string& line)
+{
+    if (line.compare(0, 3, "\xef\xbb\xbf") == 0)
+        line.erase(0, 3);
+}
+
+void DropCarriageReturn(std::string& line)
+{
+    if (!line.empty() && line.back() == '\r')
+        line.pop_back();
+}
+
 LineReader::LineReader(const std::string& path)
     : m_name(path == "-" ? "standard input" : Visible(path)),
       m_stream(path == "-" ? stdin : std::fopen(path.c_str(), "rb")), m_buffer(kBufferBytes)

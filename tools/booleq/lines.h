@@ -9,6 +9,10 @@
 
 namespace booleq {
 
+// What some programs put before the first line of a file, and at the end of each.
+void DropByteOrderMark(std::string& line);
+void DropCarriageReturn(std::string& line);
+
 // Invariant: the bytes from m_position on are read from the stream but not yet given out.
 class LineReader {
   public:

@@ -12,6 +12,11 @@
 
 extern "C" int _dowildcard;
 int _dowildcard = 0; // an argument is an equation: its * names no files
+#else
+#include <clocale>
+#include <cstring>
+
+#include <langinfo.h>
 #endif
 
 #include "messages.h"
@@ -41,6 +46,8 @@ int Run(const std::vector<std::string>& arguments, Output& output)
         output.Put(line.answer);
         return kDone;
     }
+    if (!line.note.empty())
+        Complain(output, line.note);
     std::optional<NoMessages> silence; // whoever types an equation gets a reason instead
     if (!line.request.debug)
         silence.emplace();
@@ -61,8 +68,9 @@ void PrepareProcess()
     for (std::FILE* stream : {stdin, stdout, stderr})
         _setmode(_fileno(stream), _O_BINARY);
 #else
-    // A reader that has gone is an error like a full disk, with a message and a status.
-    std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
+    std::setlocale(LC_CTYPE, "");
+    ShowUtf8(std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0);
 #endif
     HandleInterrupts();
 }
@@ -81,6 +89,8 @@ int main(int argc, char** argv)
         const int status = Run(arguments, output);
         output.Flush();
         return status;
+    } catch (const ReaderGone&) {
+        return kDone; // it has what it wanted
     } catch (const UsageError& error) {
         return Fail(error.what(), "\nTry 'booleq --help'.");
     } catch (const std::bad_alloc&) {

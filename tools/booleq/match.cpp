@@ -1,13 +1,9 @@
 // The command 'match': are two functions one up to the order of inputs, or up to inversions.
 #include "match.h"
 
-#include <algorithm>
-#include <chrono>
-
-#include "answer.h"
 #include "commands.h"
+#include "decide.h"
 #include "init_literal.h"
-#include "options.h"
 #include "text.h"
 
 namespace booleq {
@@ -37,15 +33,23 @@ size_t WidthOf(const std::string& text)
     return width.numRows > 0 ? width.numInputs : kMaxFunctionInputs + 1;
 }
 
-// The inputs that --inputs names, or --second-inputs for the second: an init value that is not so
-// wide, and one without listed inputs, gets letters. Anything else is read as usual.
-bool SetNamed(const Text& text, const Request& request, Output& output, Function& function)
+// Whether the text is an init value over the inputs listed.
+bool IsInitOver(const std::string& text, const Reading& reading)
 {
-    Reading reading(request.reading);
     Kq_BoolEquation equation;
+    return reading.hasInputs && text.find('\0') == std::string::npos &&
+           SetFromText(equation, text, reading) && !equation.IsExpression();
+}
+
+// The inputs that --inputs names, or --second-inputs for the second. An init value gets letters
+// when none are listed, or when the list is for the other one. Anything else is read as usual.
+bool SetNamed(const Text& text, const Request& request, bool isListForOther, Output& output,
+              Function& function)
+{
     const size_t width = WidthOf(text.text);
-    const bool isFitting = reading.hasInputs && SetFromText(equation, text.text, reading);
-    if (width > kMaxFunctionInputs || isFitting)
+    const bool hasNames =
+        request.reading.hasInputs && (!isListForOther || IsInitOver(text.text, request.reading));
+    if (width > kMaxFunctionInputs || hasNames)
         return SetFunction(text, request, output, function);
     Request lettered(request);
     lettered.reading.hasInputs = true;
@@ -73,17 +77,16 @@ struct Answer {
 };
 
 // First by order alone, then with inversions; both within the time.
-Answer FindMatch(const Function& first, const Function& second, bool orderOnly, double seconds)
+Answer FindMatch(const Function& first, const Function& second, bool orderOnly,
+                 const Limits& limits)
 {
-    const auto start = std::chrono::steady_clock::now();
+    const Deadline deadline(limits);
     Answer answer;
-    answer.matching = Match(first, second, false, seconds);
+    answer.matching = Match(first, second, false, limits.seconds);
     answer.level = answer.matching.isFound ? "order" : nullptr;
     if (answer.level || orderOnly || !answer.matching.isDecided)
         return answer;
-    const std::chrono::duration<double> passed = std::chrono::steady_clock::now() - start;
-    const double left = seconds > 0 ? std::max(seconds - passed.count(), 1e-6) : 0;
-    answer.matching = Match(first, second, true, left);
+    answer.matching = Match(first, second, true, limits.seconds > 0 ? deadline.Left() : 0);
     answer.level = answer.matching.isFound ? "inversions" : nullptr;
     return answer;
 }
@@ -183,18 +186,23 @@ const char* StatusName(const Answer& answer)
 
 int RunMatch(const Request& request, Output& output)
 {
-    const double seconds = ParseSeconds(request);
+    const Limits limits = ParseLimits(request, 0);
     const Request forSecond = ForSecond(request);
     const Text other{request.operands.back(), 0};
     Function second;
-    if (!SetNamed(other, forSecond, output, second) ||
+    const bool hasOwnList = request.Has("--second-inputs");
+    const bool isForFirst =
+        !hasOwnList && (request.hasLines || IsInitOver(request.operands.front(), request.reading));
+    const bool isForSecond = !hasOwnList && IsInitOver(other.text, request.reading);
+    if (!SetNamed(other, forSecond, isForFirst, output, second) ||
         RefuseTooMany(other, request, second, output))
         return kRefused;
     return ForEachText(request, output, [&](const Text& text) {
         Function first;
-        if (!SetNamed(text, request, output, first) || RefuseTooMany(text, request, first, output))
+        if (!SetNamed(text, request, isForSecond, output, first) ||
+            RefuseTooMany(text, request, first, output))
             return kRefused;
-        const Answer answer = FindMatch(first, second, request.Has("--order-only"), seconds);
+        const Answer answer = FindMatch(first, second, request.Has("--order-only"), limits);
         const int found = answer.level ? kDone : kFindings;
         return Say(text, request, output,
                    {answer.matching.isDecided ? found : kUndecided, StatusName(answer),

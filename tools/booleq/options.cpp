@@ -47,6 +47,11 @@ void CheckOperands(Request& request, bool hasFile)
     if (numGiven > command.maxOperands && hasFile)
         throw UsageError("--file stands in place of the equation, so '" +
                          Excerpt(operands[command.maxOperands - 1]) + "' is one word too many");
+    const Command* nearest =
+        numGiven > command.maxOperands && isPlain ? NearestCommand(operands[0]) : nullptr;
+    if (nearest)
+        throw UsageError("there is no command '" + Excerpt(operands[0]) + "'; the nearest is '" +
+                         nearest->name + "'");
     if (numGiven > command.maxOperands && isPlain)
         throw UsageError("more than one equation, '" + Excerpt(operands[1]) +
                          "' is the second: put quotes around a whole equation ('A & B'), or give "
@@ -56,11 +61,15 @@ void CheckOperands(Request& request, bool hasFile)
                          "' is one word too many: " + usage);
     if (hasFile) {
         request.hasLines = true;
-    } else if (operands[0] == "-") {
-        request.hasLines = true;
-        request.file = "-";
-        operands.erase(operands.begin());
+        return;
     }
+    // In any place; a second one is a text like others.
+    const auto dash = std::find(operands.begin(), operands.end(), "-");
+    if (dash == operands.end())
+        return;
+    request.hasLines = true;
+    request.file = "-";
+    operands.erase(dash);
 }
 
 void CheckInputOptions(Request& request)
@@ -124,9 +133,26 @@ void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
 
 } // namespace
 
+// 'booleq help' and 'booleq help COMMAND'.
+std::string HelpFor(const std::vector<std::string>& arguments)
+{
+    if (arguments.size() == 1)
+        return ToolHelp();
+    const Command* command = FindCommand(arguments[1]);
+    if (command && arguments.size() == 2)
+        return CommandHelp(*command);
+    const Command* nearest = NearestCommand(arguments[1]);
+    throw UsageError("there is no command '" + Excerpt(arguments[1]) + "' to help with" +
+                     (nearest ? std::string("; the nearest is '") + nearest->name + "'" : ""));
+}
+
 CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
 {
     CommandLine line;
+    if (!arguments.empty() && arguments.front() == "help") {
+        line.answer = HelpFor(arguments);
+        return line;
+    }
     Request& request = line.request;
     // The first word only, so that a variable called like a command stays an equation elsewhere.
     const Command* named = arguments.empty() ? nullptr : FindCommand(arguments.front());
@@ -161,6 +187,12 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
     }
     request.operands = TakeOperands(app.remaining());
     FillRequest(request, entries);
+    const Command* nearest = !named && !request.hasLines && !request.operands.empty()
+                                 ? NearestCommand(request.operands.front())
+                                 : nullptr;
+    if (nearest)
+        line.note = "note: '" + Excerpt(request.operands.front()) +
+                    "' is taken for an equation; the nearest command is '" + nearest->name + "'";
     return line;
 }
 
@@ -173,20 +205,6 @@ uint64_t ParseRows(const std::string& text)
     if (!isNumber)
         throw UsageError("--rows takes a number or 'all', not '" + Visible(text) + "'");
     return std::stoull(text);
-}
-
-double ParseSeconds(const Request& request)
-{
-    if (!request.Has("--seconds"))
-        return 0;
-    const std::string text = request.Get("--seconds");
-    const bool isNumber = !text.empty() && text.size() <= 12 &&
-                          text.find_first_not_of("0123456789.") == std::string::npos &&
-                          std::count(text.begin(), text.end(), '.') <= 1;
-    const double seconds = isNumber && text != "." ? std::stod(text) : 0;
-    if (seconds <= 0)
-        throw UsageError("--seconds takes a number above 0, not '" + Visible(text) + "'");
-    return seconds;
 }
 
 } // namespace booleq

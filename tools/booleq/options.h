@@ -13,6 +13,7 @@ namespace booleq {
 // The words of a command line, understood: either an answer that is ready, or a request.
 struct CommandLine {
     std::string answer; // not empty: the text of --help or --version, and nothing else to do
+    std::string note;   // not empty: said on standard error first
     Request request;
 };
 
@@ -21,9 +22,6 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments);
 
 // A number of --rows: "all" is the highest.  Fails: UsageError.
 uint64_t ParseRows(const std::string& text);
-// A number of --seconds, of which parts count; 0, no bound, where the option was not given.
-// Fails: UsageError.
-double ParseSeconds(const Request& request);
 
 } // namespace booleq
 

@@ -10,6 +10,13 @@ namespace {
 
 constexpr size_t kBlockBytes = 65536;
 
+[[noreturn]] void Fail()
+{
+    if (errno == EPIPE)
+        throw ReaderGone(errno);
+    throw IoError("cannot write standard output", errno);
+}
+
 } // namespace
 
 IoError::IoError(const std::string& what, int errorNumber)
@@ -38,7 +45,7 @@ void Output::Flush()
 {
     WriteBlock();
     if (std::fflush(m_stream) != 0)
-        throw IoError("cannot write standard output", errno);
+        Fail();
 }
 
 void Output::WriteBlock()
@@ -51,7 +58,7 @@ void Output::WriteBlock()
 void Output::Write(const char* text, size_t length)
 {
     if (std::fwrite(text, 1, length, m_stream) != length)
-        throw IoError("cannot write standard output", errno);
+        Fail();
 }
 
 void Complain(Output& output, const std::string& message)

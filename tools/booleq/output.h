@@ -14,10 +14,16 @@ class IoError : public std::runtime_error {
     IoError(const std::string& what, int errorNumber);
 };
 
+// Whoever read the output has left, as 'head' does.
+class ReaderGone : public IoError {
+  public:
+    explicit ReaderGone(int errorNumber) : IoError("cannot write standard output", errorNumber) {}
+};
+
 class Output {
   public:
     explicit Output(std::FILE* stream);
-    // Fails: IoError, here or at the next call, when the stream takes no more.
+    // Fails: IoError or ReaderGone, here or at the next call, when the stream takes no more.
     void Put(const std::string& text);
     void Put(const char* text, size_t length);
     // Everything put so far has left this process afterwards.

@@ -181,11 +181,14 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
 
 std::string CsvField(const std::string& text)
 {
-    if (text.find_first_of(",\"\r\n") == std::string::npos)
+    const auto isSpecial = [](char character) {
+        return character == ',' || character == '"' || character == '\r' || character == '\n';
+    };
+    if (std::none_of(text.begin(), text.end(), isSpecial))
         return text;
     std::string field = "\"";
     for (const char character : text)
-        field += character == '"' ? std::string("\"\"") : std::string(1, character);
+        field.append(character == '"' ? 2 : 1, character);
     return field + "\"";
 }
 

@@ -1,0 +1,238 @@
+#include "table_format.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "answer.h"
+#include "table_rows.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr int kMaxJsonDepth = 100;
+constexpr size_t kNoColumn = static_cast<size_t>(-1);
+
+// Fields of one line of CSV. A line end inside a field is not accepted: one stray quote would
+// swallow the rest of the file.  Fails: false when a quote is not closed or has text behind it.
+bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
+{
+    fields.assign(1, std::string());
+    for (size_t position = 0; position < line.size(); ++position) {
+        if (line[position] == ',') {
+            fields.emplace_back();
+            continue;
+        }
+        if (line[position] != '"') {
+            const size_t end = std::min(line.find(',', position), line.size());
+            fields.back().assign(line, position, end - position);
+            position = end - 1;
+            continue;
+        }
+        for (++position; position < line.size(); ++position) {
+            const bool isQuote = line[position] == '"';
+            if (isQuote && (position + 1 == line.size() || line[position + 1] != '"'))
+                break;
+            position += isQuote ? 1u : 0u;
+            fields.back() += line[position];
+        }
+        if (position == line.size() || (position + 1 < line.size() && line[position + 1] != ','))
+            return false;
+    }
+    return true;
+}
+
+BatchResult Refused(std::string message)
+{
+    return {BatchOutcome::kTextRefused, std::move(message)};
+}
+
+class CsvFormat : public TableFormat {
+  public:
+    bool IsHeader(const std::string& line, std::string& answer) override
+    {
+        if (m_num_columns != 0)
+            return false;
+        std::vector<std::string> fields;
+        if (!SplitCsv(WithoutLineEnd(line), fields))
+            throw UsageError("the header of the table has a quote that is not closed");
+        m_num_columns = fields.size();
+        size_t* const columns[] = {&m_inputs, &m_equation, &m_init};
+        const char* const names[] = {"inputs", "equation", "init"};
+        for (size_t which = 0; which < 3; ++which) {
+            const auto found = std::find(fields.begin(), fields.end(), names[which]);
+            if (found != fields.end()) {
+                *columns[which] = static_cast<size_t>(found - fields.begin());
+                continue;
+            }
+            *columns[which] = fields.size();
+            fields.emplace_back(names[which]);
+        }
+        if (fields.size() - m_num_columns == 3)
+            throw UsageError("the first line of the table names its columns; none is called "
+                             "inputs, equation or init");
+        // A table that was completed before has the column already.
+        const auto result = std::find(fields.begin(), fields.end(), "result");
+        m_result = static_cast<size_t>(result - fields.begin());
+        if (result == fields.end())
+            fields.emplace_back("result");
+        m_num_written = fields.size();
+        answer = CsvLine(fields);
+        return true;
+    }
+
+    BatchResult ReadRow(const std::string& line, BatchRow& row) override
+    {
+        m_fields.clear();
+        const bool isSplit = SplitCsv(WithoutLineEnd(line), m_fields);
+        const size_t numFields = m_fields.size();
+        m_fields.resize(m_num_columns); // what a bad row has stays in its columns
+        m_fields.resize(m_num_written);
+        if (!isSplit)
+            return Refused("a quote is not closed, or has more after it than a comma");
+        if (numFields > m_num_columns)
+            return Refused(Count(numFields, "field") + " where the header has " +
+                           std::to_string(m_num_columns) + "; what is beyond is left out");
+        if (numFields < m_num_columns)
+            return Refused(Count(numFields, "field") + " where the header has " +
+                           std::to_string(m_num_columns));
+        row.equation = m_fields[m_equation];
+        row.init = m_fields[m_init];
+        if (!IsBlank(m_fields[m_inputs]) && !SplitInputs(m_fields[m_inputs], row.inputs))
+            return Refused("a single quote is not closed among the inputs");
+        return {};
+    }
+
+    std::string WriteRow(const std::string&, const BatchRow& row,
+                         const BatchResult& result) override
+    {
+        if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
+            m_fields[m_inputs] = Join(row.inputs, ",");
+            m_fields[m_equation] = row.equation;
+            m_fields[m_init] = row.init;
+        }
+        m_fields[m_result] = OutcomeName(result.outcome);
+        return CsvLine(m_fields);
+    }
+
+    std::unique_ptr<TableFormat> Clone() const override
+    {
+        return std::make_unique<CsvFormat>(*this);
+    }
+
+  private:
+    // Many programs end lines of CSV with a carriage return too.
+    static std::string WithoutLineEnd(const std::string& line)
+    {
+        return !line.empty() && line.back() == '\r' ? line.substr(0, line.size() - 1) : line;
+    }
+
+    static std::string CsvLine(const std::vector<std::string>& fields)
+    {
+        std::string line;
+        for (const std::string& field : fields) {
+            line += CsvField(field);
+            line += ',';
+        }
+        line.pop_back(); // a header has a field at least
+        return line;
+    }
+
+    size_t m_num_columns = 0; // of the file
+    size_t m_inputs = kNoColumn;
+    size_t m_equation = kNoColumn;
+    size_t m_init = kNoColumn;
+    size_t m_result = kNoColumn;
+    size_t m_num_written = 0;          // columns of what is written
+    std::vector<std::string> m_fields; // of the line read last
+};
+
+class JsonFormat : public TableFormat {
+  public:
+    JsonFormat() {} // not noexcept, as an empty Json need not be
+
+    bool IsHeader(const std::string&, std::string&) override { return false; }
+
+    BatchResult ReadRow(const std::string& line, BatchRow& row) override
+    {
+        // The writer of JSON goes as deep as its reader was led.
+        bool isDeep = false;
+        const auto keep = [&isDeep](int depth, Json::parse_event_t, Json&) {
+            isDeep = isDeep || depth > kMaxJsonDepth;
+            return depth <= kMaxJsonDepth;
+        };
+        m_json = Json::parse(line, keep, false);
+        if (isDeep)
+            m_json = Json();
+        if (!m_json.is_object())
+            return Refused(isDeep ? "this is nested too deep" : "this is not a JSON object");
+        std::string list;
+        if (!TakeText("equation", row.equation) || !TakeText("init", row.init))
+            return Refused("equation and init are texts");
+        const auto inputs = m_json.find("inputs");
+        if (inputs == m_json.end() || inputs->is_null())
+            return {};
+        if (inputs->is_array()) {
+            for (const Json& name : *inputs) {
+                if (!name.is_string())
+                    return Refused("inputs is a list of texts, or one text with commas");
+                row.inputs.push_back(name.get<std::string>());
+            }
+            return {};
+        }
+        if (!TakeText("inputs", list))
+            return Refused("inputs is a list of texts, or one text with commas");
+        if (!IsBlank(list) && !SplitInputs(list, row.inputs))
+            return Refused("a single quote is not closed among the inputs");
+        return {};
+    }
+
+    std::string WriteRow(const std::string& line, const BatchRow& row,
+                         const BatchResult& result) override
+    {
+        if (!m_json.is_object()) {
+            m_json = Json::object();
+            m_json["line"] = Excerpt(line);
+        } else if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
+            m_json["inputs"] = row.inputs;
+            m_json["equation"] = row.equation;
+            m_json["init"] = row.init;
+        }
+        m_json["result"] = OutcomeName(result.outcome);
+        return JsonLine(m_json);
+    }
+
+    std::unique_ptr<TableFormat> Clone() const override { return std::make_unique<JsonFormat>(); }
+
+  private:
+    // A missing member is an empty text.  Fails: false for another type.
+    bool TakeText(const char* name, std::string& text) const
+    {
+        const auto found = m_json.find(name);
+        if (found == m_json.end() || found->is_null())
+            return true;
+        if (!found->is_string())
+            return false;
+        text = found->get<std::string>();
+        return true;
+    }
+
+    Json m_json; // the line read last
+};
+
+} // namespace
+
+std::unique_ptr<TableFormat> MakeTableFormat(const Request& request, const std::string& firstLine)
+{
+    const std::string format = request.Get("--format");
+    const size_t start = firstLine.find_first_not_of(" \t");
+    const bool looksLikeJson = start != std::string::npos && firstLine[start] == '{';
+    if (format == "jsonl" || (!request.Has("--format") && looksLikeJson))
+        return std::make_unique<JsonFormat>();
+    if (format == "csv" || !request.Has("--format"))
+        return std::make_unique<CsvFormat>();
+    throw UsageError("--format is csv or jsonl, not '" + Visible(format) + "'");
+}
+
+} // namespace booleq

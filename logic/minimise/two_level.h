@@ -1,0 +1,42 @@
+// Sums of products for several outputs at once: the problem, and the heuristic search for a small
+// answer. Input: what is on, what is free, what is off, as cubes. Output: a cover with as few terms,
+// then as few literals, as the search finds; every answer is proved right by Prove before it leaves.
+#ifndef BOOLEQ_MINIMISE_TWO_LEVEL_H
+#define BOOLEQ_MINIMISE_TWO_LEVEL_H
+
+#include "cube.h"
+#include "work.h"
+
+namespace booleq {
+
+// Invariants: for each output every row is in 'on', 'free' or 'off'; 'off' meets neither of the
+// others; rows in both 'on' and 'free' are free.
+struct TwoLevelProblem {
+    explicit TwoLevelProblem(const CubeSpace& itsSpace)
+        : space(itsSpace), on(space.NumWords()), free(space.NumWords()), off(space.NumWords())
+    {
+    }
+    CubeSpace space;
+    CubeList on;
+    CubeList free;
+    CubeList off;
+};
+
+struct CoverCost {
+    size_t numTerms;
+    size_t numLiterals;
+};
+
+CoverCost CostOf(const CubeSpace& space, const CubeList& cubes);
+bool IsCheaper(const CoverCost& left, const CoverCost& right);
+
+// An irredundant cover, by the classical loop. Repeatable: the same problem gives the same cover.
+CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work);
+
+// Whether 'sum' is 1 wherever the problem is on and not free, and 0 wherever it is off. By cube
+// calculus on 'on' and 'free' or 'off' as they are, never by sample.
+bool IsSumRight(const TwoLevelProblem& problem, const CubeList& sum, Work& work);
+
+} // namespace booleq
+
+#endif

@@ -252,12 +252,11 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes)
 CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     Work& work)
 {
-    std::vector<uint64_t> all(space.NumWords(), ~uint64_t(0));
     CubeList result(space.NumWords());
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         CubeList cubes(space.NumInputWords());
-        AppendCofactor(space, first, output, all.data(), first.Size(), cubes);
-        AppendCofactor(space, second, output, all.data(), second.Size(), cubes);
+        AppendOfOutput(space, first, output, cubes);
+        AppendOfOutput(space, second, output, cubes);
         const CubeList rows = ComplementInputs(space, cubes, work);
         for (size_t index = 0; index < rows.Size(); ++index) {
             result.Resize(result.Size() + 1);

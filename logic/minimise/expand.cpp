@@ -8,16 +8,22 @@ namespace booleq {
 
 Expander::Expander(const CubeSpace& space, const CubeList& off, Work& work)
     : m_space(space), m_off(off), m_work(work), m_num_words(space.NumWords()),
-      m_raised(m_num_words), m_free(m_num_words), m_blocked(m_num_words), m_scratch(m_num_words)
+      m_raised(m_num_words), m_free(m_num_words), m_blocked(m_num_words), m_scratch(m_num_words),
+      m_order(off.Size())
 {
+    std::iota(m_order.begin(), m_order.end(), 0u);
 }
 
 bool Expander::IsImplicant(const uint64_t* cube)
 {
+    for (size_t place = 0; place < m_order.size(); ++place) {
+        if (IsDisjoint(m_space, cube, m_off.At(m_order[place])))
+            continue;
+        std::swap(m_order[place], m_order[place / 2]); // those that object come to the front
+        m_work.Spend(place + 1);
+        return false;
+    }
     m_work.Spend(m_off.Size());
-    for (size_t index = 0; index < m_off.Size(); ++index)
-        if (!IsDisjoint(m_space, cube, m_off.At(index)))
-            return false;
     return true;
 }
 
@@ -58,44 +64,61 @@ void Expander::Settle()
 bool Expander::LowerAndDrop()
 {
     m_work.Spend(m_active.size() * m_num_words + 1);
+    switch (m_num_words) {
+    case 1:
+        return LowerAndDropIn<1>();
+    case 2:
+        return LowerAndDropIn<2>();
+    default:
+        return LowerAndDropIn<0>();
+    }
+}
+
+// 'kNumWords' is the number of words if the compiler is to know it, else 0.
+template <size_t kNumWords>
+bool Expander::LowerAndDropIn()
+{
+    const size_t numWords = kNumWords > 0 ? kNumWords : m_num_words;
+    const uint64_t* const raised = m_raised.data();
+    uint64_t* const free = m_free.data();
+    uint64_t* const missing = m_scratch.data();
+    uint64_t* const blocked = m_blocked.data();
     bool isLowered = false;
     std::fill(m_blocked.begin(), m_blocked.end(), 0);
     size_t numActive = 0;
-    for (size_t place = 0; place < m_active.size(); ++place) {
-        const uint64_t* off = m_off.At(m_active[place]);
-        size_t distance = 0;
-        bool isReachable = true;
+    for (const uint32_t index : m_active) {
+        const uint64_t* const off = m_off.At(index);
+        size_t distance = 0; // exact up to 1
+        uint64_t unreachable = 0;
         uint64_t commonOutputs = 0;
         uint64_t reachableOutputs = 0;
-        for (size_t word = 0; word < m_num_words; ++word) {
-            const uint64_t conflicts = InputConflicts(m_space, m_raised.data(), off, word) * 3;
-            const uint64_t missing = off[word] & conflicts;
+        for (size_t word = 0; word < numWords; ++word) {
+            const uint64_t conflicts = InputConflicts(m_space, raised, off, word);
+            missing[word] = off[word] & conflicts * 3;
             // Of each pair in conflict one part of the off cube must still be free.
-            const uint64_t open = missing & m_free[word];
-            const uint64_t openPairs = (open | open >> 1) & m_space.InputLow(word);
-            isReachable = isReachable && openPairs * 3 == conflicts;
-            distance += CountBits(conflicts) / 2;
-            m_scratch[word] = missing;
-            commonOutputs |= off[word] & m_raised[word] & m_space.Outputs(word);
-            reachableOutputs |= off[word] & m_free[word] & m_space.Outputs(word);
+            const uint64_t open = missing[word] & free[word];
+            unreachable |= conflicts & ~(open | open >> 1);
+            distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
+            commonOutputs |= off[word] & raised[word] & m_space.Outputs(word);
+            reachableOutputs |= off[word] & free[word] & m_space.Outputs(word);
         }
-        if (!isReachable || (commonOutputs | reachableOutputs) == 0)
+        if (unreachable != 0 || (commonOutputs | reachableOutputs) == 0)
             continue;
         if (commonOutputs == 0) {
             ++distance;
-            for (size_t word = m_space.FirstOutputWord(); word < m_num_words; ++word)
-                m_scratch[word] |= off[word] & m_space.Outputs(word);
+            for (size_t word = 0; word < numWords; ++word)
+                missing[word] |= off[word] & m_space.Outputs(word);
         }
         assert(distance > 0); // invariant 1
         if (distance == 1) {
-            for (size_t word = 0; word < m_num_words; ++word)
-                m_free[word] &= ~m_scratch[word];
+            for (size_t word = 0; word < numWords; ++word)
+                free[word] &= ~missing[word];
             isLowered = true; // and the cube cannot be met any more
             continue;
         }
-        for (size_t word = 0; word < m_num_words; ++word)
-            m_blocked[word] |= m_scratch[word];
-        m_active[numActive++] = m_active[place];
+        for (size_t word = 0; word < numWords; ++word)
+            blocked[word] |= missing[word];
+        m_active[numActive++] = index;
     }
     m_active.resize(numActive);
     return isLowered;
@@ -157,6 +180,20 @@ size_t Expander::FilterCandidates(const CubeList& others)
     return numFeasible;
 }
 
+namespace {
+
+bool IsAtDistanceOne(const CubeSpace& space, const uint64_t* left, const uint64_t* right)
+{
+    size_t distance = HasCommonOutput(space, left, right) ? 0 : 1;
+    for (size_t word = 0; word < space.NumInputWords() && distance <= 1; ++word) {
+        const uint64_t conflicts = InputConflicts(space, left, right, word);
+        distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
+    }
+    return distance == 1;
+}
+
+} // namespace
+
 // How many candidates could still be taken in, as far as parts that are then lowered at once tell.
 size_t Expander::CountAfter(const CubeList& others, size_t numFeasible, const uint64_t* with)
 {
@@ -169,7 +206,7 @@ size_t Expander::CountAfter(const CubeList& others, size_t numFeasible, const ui
     m_work.Spend(m_active.size() + numFeasible);
     for (const uint32_t place : m_active) {
         const uint64_t* off = m_off.At(place);
-        if (Distance(m_space, raised.data(), off) != 1)
+        if (!IsAtDistanceOne(m_space, raised.data(), off))
             continue;
         for (size_t word = 0; word < m_num_words; ++word)
             reach[word] &= ~(off[word] & InputConflicts(m_space, raised.data(), off, word) * 3);

@@ -31,6 +31,8 @@ class Expander {
     //    these are all the free parts.
     void Settle();
     bool LowerAndDrop();
+    template <size_t kNumWords>
+    bool LowerAndDropIn();
     bool IsFeasible(const uint64_t* with);
     void CoverOthers(const CubeList& others);
     size_t FilterCandidates(const CubeList& others);
@@ -48,6 +50,7 @@ class Expander {
     std::vector<uint64_t> m_free;
     std::vector<uint64_t> m_blocked;
     std::vector<uint64_t> m_scratch;
+    std::vector<uint32_t> m_order; // of the off cubes, for IsImplicant
     std::vector<uint32_t> m_active;
     std::vector<uint32_t> m_candidates; // feasible ones first
     std::vector<uint32_t> m_counts;

@@ -115,19 +115,15 @@ class ChoiceSearch {
     std::vector<std::vector<uint32_t>>& m_rows;
 };
 
-void AppendLabelled(const CubeSpace& space, const CubeList& cubes, size_t output, const uint64_t* by,
-                    const std::vector<uint32_t>& labelOf, CubeList& target,
-                    std::vector<uint32_t>& labels)
+// AppendMeeting with the label of each cube; without labels all are fixed.
+void AppendLabelled(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, bool isFixed,
+                    CubeList& meeting, std::vector<uint32_t>& labels)
 {
-    for (size_t index = 0; index < cubes.Size(); ++index) {
-        const uint64_t* cube = cubes.At(index);
-        if (!GetBit(cube, space.OutputBit(output)) || !HasCommonInputs(space, cube, by))
-            continue;
-        target.Resize(target.Size() + 1);
-        for (size_t word = 0; word < space.NumInputWords(); ++word)
-            target.At(target.Size() - 1)[word] = cube[word] | ~(by[word] & space.Inputs(word));
-        labels.push_back(labelOf.empty() ? kFixed : labelOf[index]);
-    }
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (!IsDisjoint(space, cubes.At(index), by))
+            labels.push_back(isFixed ? kFixed : static_cast<uint32_t>(index));
+    AppendMeeting(space, cubes, by, cubes.Size(), meeting);
+    assert(meeting.Size() == labels.size());
 }
 
 // The rows of the covering problem whose columns are the cubes of 'choices'; 'fixed' stay.
@@ -135,18 +131,22 @@ std::vector<std::vector<uint32_t>> FindChoices(const CubeSpace& space, const Cub
                                                const CubeList& fixed, Work& work)
 {
     std::vector<std::vector<uint32_t>> rows;
-    std::vector<uint32_t> labelOf(choices.Size());
-    std::iota(labelOf.begin(), labelOf.end(), 0u);
     for (size_t index = 0; index < choices.Size(); ++index) {
         const size_t numBefore = rows.size();
+        CubeList meeting(space.NumWords());
+        std::vector<uint32_t> meetingLabels;
+        work.Spend((choices.Size() + fixed.Size()) * space.NumWords());
+        AppendLabelled(space, choices, choices.At(index), false, meeting, meetingLabels);
+        AppendLabelled(space, fixed, choices.At(index), true, meeting, meetingLabels);
         for (size_t output = 0; output < space.NumOutputs(); ++output) {
             if (!GetBit(choices.At(index), space.OutputBit(output)))
                 continue;
             CubeList cubes(space.NumInputWords());
             std::vector<uint32_t> labels;
-            work.Spend(choices.Size() + fixed.Size());
-            AppendLabelled(space, choices, output, choices.At(index), labelOf, cubes, labels);
-            AppendLabelled(space, fixed, output, choices.At(index), {}, cubes, labels);
+            AppendOfOutput(space, meeting, output, cubes);
+            for (size_t place = 0; place < meeting.Size(); ++place)
+                if (GetBit(meeting.At(place), space.OutputBit(output)))
+                    labels.push_back(meetingLabels[place]);
             ChoiceSearch(space, work, rows).Find(cubes, labels);
         }
         std::sort(rows.begin() + static_cast<std::ptrdiff_t>(numBefore), rows.end());
@@ -199,30 +199,35 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
 
 namespace {
 
-// Appends the consensus of the part of 'cube' outside 'prime' with 'prime', as far as it has the
-// output, as a cofactor with respect to 'prime'.
-void AppendConsensus(const CubeSpace& space, const uint64_t* cube, size_t output,
+// The cubes whose part outside 'prime' has a consensus with it: as cofactors with respect to 'prime',
+// with the outputs for which it is one.
+void AppendConsensus(const CubeSpace& space, const CubeList& cubes, size_t left,
                      const uint64_t* prime, CubeList& target)
 {
-    size_t distance = 0;
-    uint64_t outside = 0;
-    for (size_t word = 0; word < space.NumInputWords(); ++word) {
-        distance += CountBits(InputConflicts(space, cube, prime, word));
-        outside |= cube[word] & ~prime[word] & space.Inputs(word);
+    for (size_t index = 0; index < cubes.Size(); ++index) {
+        const uint64_t* cube = cubes.At(index);
+        size_t distance = 0;
+        uint64_t outside = 0;
+        for (size_t word = 0; word < space.NumInputWords() && distance <= 1; ++word) {
+            const uint64_t conflicts = InputConflicts(space, cube, prime, word);
+            distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
+            outside |= cube[word] & ~prime[word] & space.Inputs(word);
+        }
+        if (index == left || distance > 1)
+            continue;
+        uint64_t outputsOutside = 0;
+        for (size_t word = space.FirstOutputWord(); word < space.NumWords(); ++word)
+            outputsOutside |= cube[word] & ~prime[word] & space.Outputs(word);
+        const bool isForAll = distance == 0 && outputsOutside != 0;
+        if (!isForAll && (outside == 0 || !HasCommonOutput(space, cube, prime)))
+            continue;
+        target.Resize(target.Size() + 1);
+        uint64_t* consensus = target.At(target.Size() - 1);
+        for (size_t word = 0; word < space.NumWords(); ++word)
+            consensus[word] = ((cube[word] | ~prime[word]) & space.Inputs(word)) |
+                              InputConflicts(space, cube, prime, word) * 3 |
+                              ((isForAll ? ~uint64_t(0) : cube[word]) & space.Outputs(word));
     }
-    if (distance > 1)
-        return;
-    uint64_t outputsOutside = 0;
-    for (size_t word = space.FirstOutputWord(); word < space.NumWords(); ++word)
-        outputsOutside |= cube[word] & ~prime[word] & space.Outputs(word);
-    const bool hasOutput = GetBit(cube, space.OutputBit(output));
-    if (distance == 0 ? outputsOutside == 0 && (outside == 0 || !hasOutput) : !hasOutput)
-        return;
-    target.Resize(target.Size() + 1);
-    uint64_t* inputs = target.At(target.Size() - 1);
-    for (size_t word = 0; word < space.NumInputWords(); ++word)
-        inputs[word] = cube[word] | ~(prime[word] & space.Inputs(word)) |
-                       InputConflicts(space, cube, prime, word) * 3;
 }
 
 } // namespace
@@ -230,23 +235,21 @@ void AppendConsensus(const CubeSpace& space, const uint64_t* cube, size_t output
 std::vector<uint8_t> FindEssential(const CubeSpace& space, const CubeList& cubes,
                                    const CubeList& free, Work& work)
 {
-    const size_t numInputWords = space.NumInputWords();
     std::vector<uint8_t> isEssential(cubes.Size(), 0);
-    CubeList all = cubes;
-    all.Append(free);
-    CubeList consensus(numInputWords);
     for (size_t index = 0; index < cubes.Size(); ++index) {
         const uint64_t* prime = cubes.At(index);
+        CubeList consensus(space.NumWords());
+        work.Spend(2 * (cubes.Size() + free.Size()) * space.NumWords());
+        AppendMeeting(space, free, prime, free.Size(), consensus);
+        AppendConsensus(space, cubes, index, prime, consensus);
+        AppendConsensus(space, free, free.Size(), prime, consensus);
         for (size_t output = 0; output < space.NumOutputs() && isEssential[index] == 0; ++output) {
             if (!GetBit(prime, space.OutputBit(output)))
                 continue;
-            consensus.Resize(0);
-            AppendCofactor(space, free, output, prime, free.Size(), consensus);
-            work.Spend(2 * all.Size() * space.NumWords());
-            for (size_t other = 0; other < all.Size(); ++other)
-                if (other != index)
-                    AppendConsensus(space, all.At(other), output, prime, consensus);
-            if (!IsTautology(space, consensus, work))
+            CubeList ofOutput(space.NumInputWords());
+            work.Spend(consensus.Size());
+            AppendOfOutput(space, consensus, output, ofOutput);
+            if (!IsTautology(space, ofOutput, work))
                 isEssential[index] = 1;
         }
     }

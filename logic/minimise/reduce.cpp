@@ -21,14 +21,17 @@ void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, con
     }
     std::fill(reduced, reduced + space.NumWords(), 0);
     bool isEmpty = true;
+    CubeList meeting(space.NumWords());
+    work.Spend((cubes.Size() + free.Size()) * space.NumWords());
+    AppendMeeting(space, cubes, cube, index, meeting);
+    AppendMeeting(space, free, cube, free.Size(), meeting);
     CubeList cofactor(numInputWords);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         if (!GetBit(cube, space.OutputBit(output)))
             continue;
         cofactor.Resize(0);
-        work.Spend(cubes.Size() + free.Size());
-        AppendCofactor(space, cubes, output, cube, index, cofactor);
-        AppendCofactor(space, free, output, cube, free.Size(), cofactor);
+        work.Spend(meeting.Size());
+        AppendOfOutput(space, meeting, output, cofactor);
         CubeList scratch = cofactor;
         if (IsTautology(space, scratch, work))
             continue;
@@ -146,14 +149,17 @@ void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const 
         return CountCubeLiterals(space, cubes.At(left)) > CountCubeLiterals(space, cubes.At(right));
     });
     for (const uint32_t index : order) {
+        CubeList meeting(space.NumWords());
+        work.Spend((cubes.Size() + free.Size()) * space.NumWords());
+        AppendMeeting(space, cubes, cubes.At(index), index, meeting);
+        AppendMeeting(space, free, cubes.At(index), free.Size(), meeting);
         for (size_t output = 0; output < space.NumOutputs(); ++output) {
             const size_t bit = space.OutputBit(output);
             if (!GetBit(cubes.At(index), bit) || CountOutputs(space, cubes.At(index)) == 1)
                 continue;
             CubeList cofactor(space.NumInputWords());
-            work.Spend(cubes.Size() + free.Size());
-            AppendCofactor(space, cubes, output, cubes.At(index), index, cofactor);
-            AppendCofactor(space, free, output, cubes.At(index), free.Size(), cofactor);
+            work.Spend(meeting.Size());
+            AppendOfOutput(space, meeting, output, cofactor);
             if (IsTautology(space, cofactor, work))
                 ClearBit(cubes.At(index), bit);
         }

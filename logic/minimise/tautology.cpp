@@ -128,20 +128,31 @@ class TautologyCheck {
 
 } // namespace
 
-void AppendCofactor(const CubeSpace& space, const CubeList& cubes, size_t output, const uint64_t* by,
-                    size_t left, CubeList& target)
+void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
+                   CubeList& target)
 {
-    const size_t numWords = space.NumInputWords();
-    assert(target.NumWords() == numWords);
-    const size_t outputBit = space.OutputBit(output);
     for (size_t index = 0; index < cubes.Size(); ++index) {
         const uint64_t* cube = cubes.At(index);
-        if (index == left || !GetBit(cube, outputBit) || !HasCommonInputs(space, cube, by))
+        if (index == left || IsDisjoint(space, cube, by))
             continue;
         target.Resize(target.Size() + 1);
-        uint64_t* inputs = target.At(target.Size() - 1);
-        for (size_t word = 0; word < numWords; ++word)
-            inputs[word] = cube[word] | ~(by[word] & space.Inputs(word));
+        uint64_t* cofactor = target.At(target.Size() - 1);
+        for (size_t word = 0; word < space.NumWords(); ++word)
+            cofactor[word] = ((cube[word] | ~by[word]) & space.Inputs(word)) |
+                             (cube[word] & by[word] & space.Outputs(word));
+    }
+}
+
+void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target)
+{
+    assert(target.NumWords() == space.NumInputWords());
+    const size_t bit = space.OutputBit(output);
+    for (size_t index = 0; index < cubes.Size(); ++index) {
+        if (!GetBit(cubes.At(index), bit))
+            continue;
+        target.Resize(target.Size() + 1);
+        for (size_t word = 0; word < space.NumInputWords(); ++word)
+            target.At(target.Size() - 1)[word] = cubes.At(index)[word] | ~space.Inputs(word);
     }
 }
 
@@ -154,15 +165,18 @@ bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work)
 bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
                const CubeList& second, Work& work)
 {
-    CubeList cofactor(space.NumInputWords());
+    CubeList meeting(space.NumWords());
+    work.Spend((first.Size() + second.Size()) * space.NumWords());
+    AppendMeeting(space, first, cube, left, meeting);
+    AppendMeeting(space, second, cube, second.Size(), meeting);
+    CubeList ofOutput(space.NumInputWords());
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         if (!GetBit(cube, space.OutputBit(output)))
             continue;
-        cofactor.Resize(0);
-        work.Spend(first.Size() + second.Size());
-        AppendCofactor(space, first, output, cube, left, cofactor);
-        AppendCofactor(space, second, output, cube, second.Size(), cofactor);
-        if (!IsTautology(space, cofactor, work))
+        ofOutput.Resize(0);
+        work.Spend(meeting.Size());
+        AppendOfOutput(space, meeting, output, ofOutput);
+        if (!IsTautology(space, ofOutput, work))
             return false;
     }
     return true;

@@ -10,10 +10,14 @@
 
 namespace booleq {
 
-// Appends to 'target' the inputs of each cube of 'cubes' that has the output and meets the inputs
-// of 'by', as the cofactor with respect to them; 'left' is left out (cubes.Size() for none).
-void AppendCofactor(const CubeSpace& space, const CubeList& cubes, size_t output, const uint64_t* by,
-                    size_t left, CubeList& target);
+// Appends to 'target' the cofactors with respect to 'by' of the cubes that meet it: their inputs as
+// far as 'by' leaves them open, all others admitted, and the outputs that both have. 'left' is left
+// out (cubes.Size() for none).
+void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
+                   CubeList& target);
+
+// Appends the inputs of each cube that has the output to 'target', as the functions below want them.
+void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
 
 // Whether the cubes cover all rows. 'cubes' is scratch space afterwards.
 bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);

@@ -31,6 +31,11 @@ CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work);
 // space afterwards.
 void AddUncovered(const CubeSpace& space, CubeList& cubes, Work& work, uint64_t* found);
 
+// A row of an output of 'cube' that no cube of the list covers: all inputs fixed, one output.
+// Fails: false when there is none.
+bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes, Work& work,
+                      uint64_t* row);
+
 // Cubes of the same inputs become one, with the outputs of all.
 void UniteOutputs(const CubeSpace& space, CubeList& cubes);
 

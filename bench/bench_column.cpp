@@ -4,7 +4,7 @@
 
 #include <Kq_BoolEquationImp.h>
 
-#include "Kq_BoolEquationImpColumn.h"
+#include "Column.h"
 #include "support/cases.h"
 #include "support/formulas.h"
 #include "support/texts.h"

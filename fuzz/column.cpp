@@ -6,7 +6,7 @@
 
 #include <Kq_BoolEquationImp.h>
 
-#include "Kq_BoolEquationImpColumn.h"
+#include "Column.h"
 #include "fuzz/bytes.h"
 #include "fuzz/target.h"
 #include "support/library_view.h"

@@ -9,11 +9,19 @@
 
 #include <Kq_BoolEquation.h>
 
-class KqInitText; // an init value as read; inside the library
+// Inside the library: the tokens of a text, an init value as read, what an equation holds, and the
+// pool's table of names.
+class KqDigits;
+class KqNamePool;
+class KqStore;
+class KqTokens;
+struct KqTree;
 
 // One equation: nodes that its copies share, and a variable table of its own.
 // Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
+// Threads: different objects are independent, whatever they share inside; const members of one
+// object may run at once; changing an object wants it alone. Static members at any time.
 // Invariants:
 // 1. m_store is never null; its count is the number of engine objects that point at it.
 // 2. Variable names are unique; a variable's position is its index, its value is 0 or 1.
@@ -24,9 +32,6 @@ class KQ_EXPORT Kq_BoolEquationImp {
     class Node;
     class StringMgr;
     class TruthTable;
-    // The tokens of a text and the shared nodes made of them; completed inside the library.
-    class Tokens;
-    struct Store;
 
     Kq_BoolEquationImp(); // no equation, no variables
     // Shares the other's nodes, copies its variables.
@@ -120,28 +125,30 @@ class KQ_EXPORT Kq_BoolEquationImp {
   private:
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
 
-    static StringMgr& GetNamePool();
-    static bool ScanTokens(const char* text, Tokens& tokens,
-                           Kq_BoolEquation::Refusal* refusal = nullptr);
-    static void LocateToken(const char* text, const Tokens& tokens, size_t position,
-                            Kq_BoolEquation::Refusal& refusal);
-    Kq_BoolEquation::Refusal::CODE FindTreeRefusal(size_t& position) const;
-    static std::vector<Variable> ListTerms(const std::vector<Port::StringBase<char>>& terms,
-                                           bool reverseTerms);
+    static KqNamePool& GetNamePool();
 
-    bool FinishEquation(const Tokens& tokens, const Port::StringBase<char>* initValue);
-    bool FinishInitValue(std::unique_ptr<KqInitText> initText);
-    void DefineListedNames(const Tokens& tokens);
+    void ReplaceStore(KqStore* fresh) noexcept;
+    const Node* GetExpressionRoot() const;
+    bool SetExpression(const char* text, size_t length, std::vector<Variable> inputs,
+                       const Port::StringBase<char>* initValue);
+    bool SetDigits(std::unique_ptr<KqDigits> digits, std::vector<Variable> inputs);
+    bool BuildSilently(const KqTokens& tokens, std::vector<Variable>& inputs,
+                       const Port::StringBase<char>* initValue);
+    bool BuildTraced(const KqTokens& tokens, std::vector<Variable>& inputs,
+                     const Port::StringBase<char>* initValue);
+    void FinishTree(const KqTokens& tokens, const Port::StringBase<char>* initValue, Node* root,
+                    KqTree& tree);
+    void TakeVariables(std::vector<Variable>& inputs);
     size_t FindVariable(const Port::StringBase<char>& name) const;
     size_t FindVariable(const Kq_BoolEquation::Handle& handle) const;
     std::vector<Port::StringBase<char>> GetVariableNames() const;
 
-    Store* m_store;
+    KqStore* m_store;
     std::vector<Variable> m_variables;
 };
 
-// The process-wide pool of names: each distinct name is kept once, until unload.
-// A trie; it only grows.
+// The process-wide pool of names: each distinct name is kept once, until unload. It only grows.
+// Threads: all at any time, but for the destructor.
 class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
   public:
     StringMgr();  // no names
@@ -155,8 +162,10 @@ class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
     // Cost: in step with the name's length, whatever the number of names.
     const Port::StringBase<char>& find(const char* name);
 
+    struct StringMgrNode; // what the names are kept in; completed inside the library
+
   private:
-    struct StringMgrNode;
+    friend class Kq_BoolEquationImp;
 
     static void cleanup(StringMgrNode* node);
 

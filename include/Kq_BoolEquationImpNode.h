@@ -6,6 +6,8 @@
 #ifndef KQ_BOOLEQUATIONIMPNODE_H
 #define KQ_BOOLEQUATIONIMPNODE_H
 
+#include <atomic>
+
 #include <Kq_BoolEquationImp.h>
 
 // One node of an equation: a token of the text first, an element of its tree later.
@@ -50,9 +52,23 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     {
     }
     // Links are copied as they are: the copy points at the same parent and children.
-    Node(const Node& other) = default;
+    Node(const Node& other)
+        : m_type(other.m_type), m_token(other.m_token), m_parent(other.m_parent),
+          m_left_child(other.m_left_child), m_right_child(other.m_right_child),
+          m_value(other.GetValue())
+    {
+    }
     ~Node() = default; // other nodes stay as they are
-    Node& operator=(const Node& other) = default;
+    Node& operator=(const Node& other)
+    {
+        m_token = other.m_token; // all that can fail comes first
+        m_type = other.m_type;
+        m_parent = other.m_parent;
+        m_left_child = other.m_left_child;
+        m_right_child = other.m_right_child;
+        SetValue(other.GetValue());
+        return *this;
+    }
 
     void SetType(TYPE type) { m_type = type; } // the type alone
     TYPE GetType() const { return m_type; }    // the type as set, a corrupt one too
@@ -67,8 +83,9 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     void SetRightChild(Node* rightChild) { m_right_child = rightChild; }
     Node* GetRightChild() const { return m_right_child; }
     // An ID's variable index, counted from 0; no meaning for other types.
-    void SetValue(unsigned int value) { m_value = value; }
-    unsigned int GetValue() const { return m_value; }
+    // Threads: both at any time, as copies of an equation may link the nodes that they share.
+    void SetValue(unsigned int value) { m_value.store(value, std::memory_order_relaxed); }
+    unsigned int GetValue() const { return m_value.load(std::memory_order_relaxed); }
 
     // Is the node of this type, or of one of these types.
     bool Is0() const { return m_type == ZERO; }
@@ -127,8 +144,8 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
 
     // Dbg for the node that broke a build: bounded, as a whole text can hang below it.
     void DbgFailure() const;
-    void DbgLines(int depth, size_t maxNodes) const;
     void DbgLine(int depth) const;
+    size_t CountDbgBytes(int depth) const;
     void Dbg(int depth) const;
     void DbgName(Port::StringBase<char>& name) const;
     void DbgPrefix(int numPieces) const;
@@ -138,7 +155,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     Node* m_parent;
     Node* m_left_child;
     Node* m_right_child;
-    unsigned int m_value;
+    std::atomic<unsigned int> m_value;
 };
 
 #endif

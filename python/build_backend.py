@@ -22,7 +22,7 @@ ROOT = Path(__file__).resolve().parent.parent
 PROJECT = tomllib.loads((ROOT / "pyproject.toml").read_text(encoding="utf-8"))["project"]
 NAME = PROJECT["name"]
 SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
-           "include", "port", "python", "s", "tools/core"]
+           "include", "logic", "port", "python", "s"]
 DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
 
 

@@ -4,7 +4,7 @@
 
 #include <Kq_BoolEquationImp.h>
 
-#include "Kq_BoolEquationImpDiag.h"
+#include "Messages.h"
 
 typedef Port::StringBase<char> String;
 
@@ -266,10 +266,11 @@ bool Kq_BoolEquation::Handle::operator!=(const Handle& other) const
 
 void Kq_BoolEquation::Handle::Dbg() const
 {
+    const std::vector<unsigned int> held(m_values); // the receiver may change this handle
     KQ_FACADE_EMIT("Kq_BoolEquation::Handle::Dbg");
-    KQ_FACADE_EMIT("Size = %d\n", static_cast<int>(m_values.size()));
+    KQ_FACADE_EMIT("Size = %d\n", static_cast<int>(held.size()));
     int entry = 0;
-    for (const unsigned int value : m_values)
+    for (const unsigned int value : held)
         KQ_FACADE_EMIT("Entry[%d] = %d\n", entry++, static_cast<int>(value));
 }
 

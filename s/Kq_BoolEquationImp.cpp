@@ -1,20 +1,20 @@
-// The engine object: life, sharing of nodes, setting an equation, evaluation, dumps.
+// The engine object: life, sharing of nodes, evaluation, renderings, dumps.
 // Statics with a run-time initialiser stand here, in the order that they need.
-// Fails: false or 0, with the object cleared when setting fails; std::bad_alloc.
+// Fails: false or 0; std::bad_alloc.
 #include <Kq_BoolEquationImp.h>
 
+#include <cstring>
 #include <new>
-#include <string>
-#include <unordered_map>
 
 #include <port/Port_Env.h>
 #include <port/Port_Init.h>
 #include <port/mav_malloc.h>
 
-#include "Kq_BoolEquationImpDiag.h"
-#include "Kq_BoolEquationImpInitText.h"
-#include "Kq_BoolEquationImpStore.h"
-#include "Kq_BoolEquationImpWalk.h"
+#include "Messages.h"
+#include "NamePool.h"
+#include "Render.h"
+#include "Spelling.h"
+#include "Store.h"
 
 typedef Port::StringBase<char> String;
 typedef Kq_BoolEquationImp::Node Node;
@@ -28,48 +28,53 @@ Port_MsgManInit s_msgManInit;
 InstanceTableInit s_instanceTableInit;
 FactoryInit s_factoryInit;
 
-// The pool of names, from load to unload. With it the texts of nodes are made, so that they
+// The pool of names, from load to unload. With it the spellings of nodes are made, so that they
 // outlive every equation, also one that is a static object elsewhere.
 struct NamePool {
-    NamePool()
-    {
-        const Node node;
-        node.GetTypeName();
-        node.GetTokenAlt1();
-    }
+    NamePool() { KqGetSpelling(0); }
     Kq_BoolEquationImp::StringMgr m_names;
 };
 NamePool s_namePool;
 
-// Any value counts, an empty one too; read at load and never again.
-bool s_internalDebugMode = Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr;
-
 } // namespace
+
+// Any value counts, an empty one too; read at load and never again.
+std::atomic<bool> KqDebugMode::s_isOn{Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr};
 
 std::allocator<Kq_BoolEquationImp> Kq_BoolEquationImp::m_kq_boolequationimp_mem;
 
-Kq_BoolEquationImp::Kq_BoolEquationImp() : m_store(new Store) {}
+Kq_BoolEquationImp::Kq_BoolEquationImp() : m_store(new KqStore) {}
 
 Kq_BoolEquationImp::Kq_BoolEquationImp(const Kq_BoolEquationImp& other)
     : m_store(other.m_store), m_variables(other.m_variables)
 {
-    ++m_store->m_count;
+    m_store->Hold();
 }
 
 Kq_BoolEquationImp::~Kq_BoolEquationImp()
 {
-    Store::Release(m_store);
+    ReplaceStore(nullptr);
+}
+
+// Lets the store go, and tells whoever watches.
+void Kq_BoolEquationImp::ReplaceStore(KqStore* fresh) noexcept
+{
+    KqStore* const old = m_store;
+    m_store = fresh;
+    if (old->IsWatched(this))
+        old->Watch(nullptr);
+    KqStore::Release(old);
 }
 
 Kq_BoolEquationImp& Kq_BoolEquationImp::operator=(const Kq_BoolEquationImp& other)
 {
+    if (this == &other)
+        return *this;
     std::vector<Variable> variables(other.m_variables);
     m_variables.swap(variables);
-    // Counted before the old store is let go, so assignment among copies is harmless.
-    ++other.m_store->m_count;
-    Store* old = m_store;
-    m_store = other.m_store;
-    Store::Release(old);
+    // Held before the old store is let go, so assignment among copies is harmless.
+    other.m_store->Hold();
+    ReplaceStore(other.m_store);
     return *this;
 }
 
@@ -80,94 +85,26 @@ void Kq_BoolEquationImp::Copy(const Kq_BoolEquationImp& other)
 
 void Kq_BoolEquationImp::Clear()
 {
-    if (m_store->m_count == 1) {
+    if (m_store->IsShared())
+        ReplaceStore(new KqStore);
+    else
         m_store->Clear();
-    } else {
-        Store* fresh = new Store;
-        Store::Release(m_store);
-        m_store = fresh;
-    }
     m_variables.clear();
-}
-
-bool Kq_BoolEquationImp::SetEquation(const String& text)
-{
-    if (KqInitText::IsCandidate(text)) {
-        // Deliberate: what is no init value over these variables is read as an expression.
-        std::unique_ptr<KqInitText> initText = KqInitText::Read(text, m_variables, false);
-        if (initText) {
-            Clear();
-            return FinishInitValue(std::move(initText));
-        }
-    }
-    // Read before anything is cleared: the text may be one of the names that go.
-    Tokens tokens(text.length());
-    const bool isRead = ScanTokens(text.c_str(), tokens);
-    Clear();
-    if (!isRead || tokens.GetSize() == 0)
-        return false;
-    return FinishEquation(tokens, nullptr);
-}
-
-// Makes an equation of the tokens: nodes, tree, variables, the init value's own root, pre-order.
-// Requires: no nodes; listed inputs are defined.
-bool Kq_BoolEquationImp::FinishEquation(const Tokens& tokens, const String* initValue)
-{
-    try {
-        m_store->MakeNodes(tokens);
-        BuildTree();
-        if (!m_store->HasEquation())
-            return false;
-        // Variables are numbered in the order of the text, which pre-order need not be.
-        DefineListedNames(tokens);
-        if (initValue)
-            m_store->AddTruthTableRoot(*initValue);
-        m_store->ListInPreOrder();
-        KqCheckStore(*m_store); // allocates, in the builds that check
-    } catch (...) {
-        Clear(); // rather than an equation that lacks some of its variables
-        throw;
-    }
-    return true;
-}
-
-// Makes an equation of an init value. Its tree is owed, but where the way to it is output or only
-// the expression counts.
-// Requires: no nodes; either no variables or, as listed inputs, those of the value's names.
-bool Kq_BoolEquationImp::FinishInitValue(std::unique_ptr<KqInitText> initText)
-{
-    try {
-        if (initText->IsExact() && !GetInternalDebugMode()) {
-            if (m_variables.empty()) {
-                m_variables.reserve(initText->GetNumNames());
-                for (const String& name : initText->GetNames())
-                    m_variables.push_back(Variable(name, 0u));
-            }
-            m_store->Owe(std::move(initText));
-            return true;
-        }
-        const std::string expression = initText->Expand();
-        Tokens tokens(expression.length());
-        if (ScanTokens(expression.c_str(), tokens))
-            return FinishEquation(tokens, &initText->GetText());
-    } catch (...) {
-        Clear();
-        throw;
-    }
-    Clear();
-    return false;
 }
 
 unsigned int Kq_BoolEquationImp::Eval() const
 {
-    if (!GetInternalDebugMode())
+    if (!KqDebugMode::IsOn())
         return m_store->Eval(m_variables);
-    const Node* const root = m_store->GetRoot();
+    // Node by node, because the trace is output. Of a copy, because the receiver of the messages
+    // may set, clear or destroy this object.
+    const Kq_BoolEquationImp held(*this);
+    const Node* const root = held.GetRoot();
     if (!root)
         return 0;
-    // Node by node, because the trace is output.
-    const unsigned int value = root->Eval(m_variables);
-    root->Dbg();
+    const unsigned int value = root->Eval(held.m_variables);
+    if (KqDebugMode::IsOn())
+        root->Dbg();
     return value;
 }
 
@@ -224,17 +161,71 @@ void Kq_BoolEquationImp::operator delete(void* memory, size_t size)
 
 bool Kq_BoolEquationImp::GetInternalDebugMode()
 {
-    return s_internalDebugMode;
+    return KqDebugMode::IsOn();
 }
 
 void Kq_BoolEquationImp::SetInternalDebugMode(bool on)
 {
-    s_internalDebugMode = on;
+    KqDebugMode::s_isOn.store(on, std::memory_order_relaxed);
 }
 
-Kq_BoolEquationImp::StringMgr& Kq_BoolEquationImp::GetNamePool()
+struct Kq_BoolEquationImp::StringMgr::StringMgrNode : KqNamePool {};
+
+Kq_BoolEquationImp::StringMgr::StringMgr() : m_root(new StringMgrNode) {}
+
+Kq_BoolEquationImp::StringMgr::~StringMgr()
 {
-    return s_namePool.m_names;
+    cleanup(m_root);
+}
+
+void Kq_BoolEquationImp::StringMgr::cleanup(StringMgrNode* node)
+{
+    delete node;
+}
+
+const String& Kq_BoolEquationImp::StringMgr::find(const char* name)
+{
+    const char* const text = name ? name : "";
+    return m_root->Find(text, std::strlen(text)).text;
+}
+
+KqNamePool& Kq_BoolEquationImp::GetNamePool()
+{
+    return *s_namePool.m_names.m_root;
+}
+
+String Kq_BoolEquationImp::GetEquation(bool spaces) const
+{
+    const String* const initValue = m_store->GetInitValue();
+    return initValue ? *initValue : KqRender(m_store->GetRoot(), &Node::GetToken, spaces);
+}
+
+// Deliberate: of an init value the fixed syntaxes show the expression that it stands for, the
+// primary one shows the value as given.
+const Node* Kq_BoolEquationImp::GetExpressionRoot() const
+{
+    const Node* const root = m_store->GetRoot();
+    return root && root->GetType() == Node::TRUTH_TABLE ? root->GetLeftChild() : root;
+}
+
+String Kq_BoolEquationImp::GetEquationAlt1(bool spaces) const
+{
+    return KqRender(GetExpressionRoot(), &Node::GetTokenAlt1, spaces);
+}
+
+String Kq_BoolEquationImp::GetEquationAlt2(bool spaces) const
+{
+    return KqRender(GetExpressionRoot(), &Node::GetTokenAlt2, spaces);
+}
+
+String Kq_BoolEquationImp::GetEquationAlt3(bool spaces) const
+{
+    return KqRender(GetExpressionRoot(), &Node::GetTokenAlt3, spaces);
+}
+
+String Kq_BoolEquationImp::GetEquationAsExpression(bool spaces) const
+{
+    return IsExpression() ? GetEquation(spaces) : GetEquationAlt1(spaces);
 }
 
 // The dumps stand in this file because their messages carry its lines.
@@ -242,14 +233,11 @@ Kq_BoolEquationImp::StringMgr& Kq_BoolEquationImp::GetNamePool()
 
 namespace {
 
-typedef std::unordered_map<const Node*, int> Positions;
-
 // A link that leads to no listed node prints like a null one.
-void DumpReference(const Node* node, const Positions& positions)
+void DumpReference(size_t position)
 {
-    const auto position = positions.find(node);
-    if (position != positions.end())
-        KQ_ENGINE_EMIT(" [%03d]", position->second);
+    if (position != KqStore::Place::kNowhere)
+        KQ_ENGINE_EMIT(" [%03d]", static_cast<int>(position));
     else
         KQ_ENGINE_EMIT(" -----");
 }
@@ -267,62 +255,65 @@ void DumpVariables(const std::vector<std::pair<String, unsigned int>>& variables
                        static_cast<int>(variable.second));
 }
 
-void DumpNodes(const std::vector<Node*>& nodes, const Node* root)
+void DumpNodes(const KqStore& store)
 {
-    Positions positions;
-    for (const Node* node : nodes)
-        positions.emplace(node, static_cast<int>(positions.size()));
-    KQ_ENGINE_EMIT("NumNodes = %d\n", static_cast<int>(nodes.size()));
+    size_t root = 0;
+    const std::vector<KqStore::Place> places = store.ListPlaces(root);
+    KQ_ENGINE_EMIT("NumNodes = %d\n", static_cast<int>(places.size()));
     KQ_ENGINE_EMIT("Root = ");
-    DumpReference(root, positions);
+    DumpReference(root);
     KQ_ENGINE_EMIT("\n");
-    if (!nodes.empty()) {
+    if (!places.empty()) {
         KQ_ENGINE_EMIT("\n");
         KQ_ENGINE_EMIT("     Id     Par  Left Right\n");
         KQ_ENGINE_EMIT("   =====   ===== ===== =====\n");
     }
-    for (const Node* node : nodes) {
-        KQ_ENGINE_EMIT("   [%03d] =", positions.at(node));
-        DumpReference(node->GetParent(), positions);
-        DumpReference(node->GetLeftChild(), positions);
-        DumpReference(node->GetRightChild(), positions);
-        KQ_ENGINE_EMIT(" %-12s", node->GetTypeName().c_str());
-        KQ_ENGINE_EMIT(" %s", node->GetToken().c_str());
+    int position = 0;
+    for (const KqStore::Place& place : places) {
+        KQ_ENGINE_EMIT("   [%03d] =", position++);
+        DumpReference(place.parent);
+        DumpReference(place.left);
+        DumpReference(place.right);
+        KQ_ENGINE_EMIT(" %-12s", place.node->GetTypeName().c_str());
+        KQ_ENGINE_EMIT(" %s", place.node->GetToken().c_str());
         KQ_ENGINE_EMIT("\n");
     }
 }
 
 } // namespace
 
+// Of a copy, because the receiver of the messages may set, clear or destroy this object.
 void Kq_BoolEquationImp::Dbg() const
 {
-    KQ_ENGINE_EMIT("Bool Equation = %s\n", GetEquation(false).c_str());
-    KQ_ENGINE_EMIT("Bool Equation Alt1 = %s\n", GetEquationAlt1(false).c_str());
-    KQ_ENGINE_EMIT("Bool Equation Alt2 = %s\n", GetEquationAlt2(false).c_str());
-    KQ_ENGINE_EMIT("Bool Equation Alt3 = %s\n", GetEquationAlt3(false).c_str());
-    DumpVariables(std::vector<Variable>(m_variables));
+    const Kq_BoolEquationImp held(*this);
+    KQ_ENGINE_EMIT("Bool Equation = %s\n", held.GetEquation(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt1 = %s\n", held.GetEquationAlt1(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt2 = %s\n", held.GetEquationAlt2(false).c_str());
+    KQ_ENGINE_EMIT("Bool Equation Alt3 = %s\n", held.GetEquationAlt3(false).c_str());
+    DumpVariables(held.m_variables);
     KQ_ENGINE_EMIT("\n");
     KQ_ENGINE_EMIT("ExprTree\n");
-    if (m_store->HasEquation())
-        m_store->GetRoot()->Dbg();
+    if (held.GetRoot())
+        held.GetRoot()->Dbg();
     KQ_ENGINE_EMIT("\n");
-    DumpNodes(m_store->GetNodes(), m_store->GetRoot());
+    DumpNodes(*held.m_store);
     KQ_ENGINE_EMIT("\n");
-    GetTruthTable().Dbg();
+    held.GetTruthTable().Dbg();
     KQ_ENGINE_EMIT("\n");
 }
 
 void Kq_BoolEquationImp::TruthTable::Dbg() const
 {
+    const TruthTable held(*this);
     KQ_ENGINE_EMIT("TruthTable\n");
-    KQ_ENGINE_EMIT("  Eqn: \"%s\"\n", m_equation.c_str());
-    const int numColumns = static_cast<int>(m_variable_names.size());
+    KQ_ENGINE_EMIT("  Eqn: \"%s\"\n", held.m_equation.c_str());
+    const int numColumns = static_cast<int>(held.m_variable_names.size());
     KQ_ENGINE_EMIT("  NumCols: %d\n", numColumns);
     for (int column = 0; column < numColumns; ++column)
         KQ_ENGINE_EMIT("  Col[%d] = \"%s\"\n", column + 1,
-                       m_variable_names[static_cast<size_t>(column)].c_str());
-    KQ_ENGINE_EMIT("  NumRows: %d\n", static_cast<int>(m_rows.size()));
-    if (!m_rows.empty()) {
+                       held.m_variable_names[static_cast<size_t>(column)].c_str());
+    KQ_ENGINE_EMIT("  NumRows: %d\n", static_cast<int>(held.m_rows.size()));
+    if (!held.m_rows.empty()) {
         KQ_ENGINE_EMIT("   ");
         KQ_ENGINE_EMIT("   ");
         KQ_ENGINE_EMIT("  v");
@@ -337,7 +328,7 @@ void Kq_BoolEquationImp::TruthTable::Dbg() const
         KQ_ENGINE_EMIT("\n");
     }
     int number = 0;
-    for (const Row& row : m_rows) {
+    for (const Row& row : held.m_rows) {
         KQ_ENGINE_EMIT("   ");
         KQ_ENGINE_EMIT(" %2d", ++number);
         KQ_ENGINE_EMIT(" %2d", static_cast<int>(row.GetResultValue()));
@@ -349,8 +340,9 @@ void Kq_BoolEquationImp::TruthTable::Dbg() const
 
 void Kq_BoolEquationImp::TruthTable::Row::Dbg() const
 {
-    KQ_ENGINE_EMIT("    Row: %d=", static_cast<int>(m_result_value));
-    for (const unsigned int value : m_variable_values)
+    const Row held(*this);
+    KQ_ENGINE_EMIT("    Row: %d=", static_cast<int>(held.m_result_value));
+    for (const unsigned int value : held.m_variable_values)
         KQ_ENGINE_EMIT("%d", static_cast<int>(value));
     KQ_ENGINE_EMIT("\n");
 }

@@ -1,12 +1,11 @@
 // The node: its fields, what its type answers, its spellings and its allocator.
 #include <Kq_BoolEquationImpNode.h>
 
-#include <cstring>
 #include <new>
 
 #include <port/mav_malloc.h>
 
-#include "Kq_BoolEquationImpSpelling.h"
+#include "Spelling.h"
 
 typedef Kq_BoolEquationImp::Node Node;
 typedef Port::StringBase<char> String;
@@ -15,34 +14,11 @@ std::allocator<Node> Node::m_kq_boolequationimp_node_mem;
 
 namespace {
 
-struct TypeNames {
-    TypeNames()
-    {
-        for (unsigned int type = 0; type <= KqSpelling::kNumTypes; ++type)
-            m_names[type] = KqSpelling::kTypes[type].name;
-    }
-    String m_names[KqSpelling::kNumTypes + 1];
-};
-
-struct Texts {
-    Texts()
-    {
-        for (unsigned int id = 0; id < KqSpelling::kNumSpellings; ++id)
-            m_texts[id] = KqSpelling::kSpellings[id].text;
-    }
-    String m_texts[KqSpelling::kNumSpellings];
-};
-
-// Row of the type tables; every corrupt value shares the row behind the last type.
-unsigned int TypeRow(Node::TYPE type)
-{
-    return type < KqSpelling::kNumTypes ? type : KqSpelling::kNumTypes;
-}
-
+// The node's spelling in a fixed syntax, 0 to 2.
 const String& GetAlternative(const Node& node, unsigned int syntaxIndex)
 {
-    const KqSpelling::Id id = KqSpelling::kTypes[TypeRow(node.GetType())].alt[syntaxIndex];
-    return id == KqSpelling::kOwnToken ? node.GetToken() : KqSpelling::GetTexts()[id];
+    const String* const spelling = KqGetTypeSpelling(node.GetType(), syntaxIndex);
+    return spelling ? *spelling : node.GetToken();
 }
 
 bool HasAsChild(const Node& parent, const Node& node)
@@ -51,12 +27,6 @@ bool HasAsChild(const Node& parent, const Node& node)
 }
 
 } // namespace
-
-const String* KqSpelling::GetTexts()
-{
-    static const Texts texts;
-    return texts.m_texts;
-}
 
 Node* Node::GetTopParent() const
 {
@@ -88,8 +58,7 @@ Node* Node::GetTopParent() const
 
 const String& Node::GetTypeName() const
 {
-    static const TypeNames names;
-    return names.m_names[TypeRow(m_type)];
+    return KqGetTypeName(m_type);
 }
 
 const String& Node::GetTokenAlt1() const
@@ -117,8 +86,7 @@ bool Node::operator==(const Node& other) const
         return false;
     if (m_type != ID && m_type != TRUTH_TABLE)
         return true;
-    return m_token.length() == other.m_token.length() &&
-           std::memcmp(m_token.c_str(), other.m_token.c_str(), m_token.length()) == 0;
+    return KqIsSameText(m_token, other.m_token);
 }
 
 bool Node::operator!=(const Node& other) const

@@ -4,8 +4,8 @@
 usage: check_includes.py ROOT
 
 Checked: the floors (who may include whom), the own header first, no include of a .cpp file, sizes of
-files and functions, plain ASCII, the names in the host's folders, macros, foreign declarations,
-where a test model may look. Exit status: 1 when something was found.
+files and functions, plain ASCII, the names of the rooms' headers and in the host's folders, macros,
+foreign declarations, where a test model may look. Exit status: 1 when something was found.
 """
 import pathlib
 import re
@@ -15,60 +15,14 @@ FACADE = "Kq_BoolEquation.h"
 ENGINE = "Kq_BoolEquationImp.h"
 NODE = "Kq_BoolEquationImpNode.h"
 PUBLIC = {FACADE, ENGINE, NODE}
-PREFIX = "Kq_BoolEquationImp"
 
-# For each file, by its name without the prefix of the engine family: the headers of ours that it
-# may include. Internal headers are named without the prefix too. Any file may include the standard
-# library; PORT stands for the host's interfaces. A new file needs a line here, and a reason.
-PORT = "port"
-HEADER_FLOORS = {
-    FACADE: {PORT},
-    ENGINE: {PORT, FACADE},
-    NODE: {PORT, ENGINE},
-    "Diag.h": {PORT},
-    "InitText.h": {PORT},
-    "Spelling.h": {PORT, NODE},
-    "Walk.h": {NODE},
-    "Program.h": {NODE},  # a root goes in, steps come out
-    "Writer.h": {"Program.h"},
-    "Store.h": {NODE, "Walk.h", "Program.h", "InitText.h"},  # keeps what its tree is made of
-    "Column.h": {NODE, "ColumnJoin.h", "Program.h"},  # a program goes in, bits come out
-    "ColumnJoin.h": {"Program.h"},
-    "ColumnKernel.h": {"Column.h", "Word.h"},
-    "JoinKernel.h": {"ColumnJoin.h", "ColumnKernel.h"},
-    "Results.h": {"Column.h", "Store.h"},  # chooses where bits come from
-    "Word.h": set(),
-}
-SOURCE_HEADERS = {  # besides the host's interfaces and the public headers
-    "Kq_BoolEquation.cpp": {"Diag.h"},
-    ".cpp": {"Diag.h", "InitText.h", "Store.h", "Walk.h"},
-    "Column.cpp": {"Column.h", "ColumnKernel.h", "JoinKernel.h", "Writer.h"},
-    "ColumnAvx2.cpp": {"ColumnKernel.h", "JoinKernel.h"},
-    "ColumnAvx512.cpp": {"ColumnKernel.h", "JoinKernel.h"},
-    "ColumnJoin.cpp": {"ColumnJoin.h", "ColumnKernel.h"},
-    "InitText.cpp": {"InitText.h", "Word.h"},
-    "InitTree.cpp": {"Spelling.h", "Store.h"},
-    "InitValue.cpp": {"InitText.h", "Results.h", "Store.h"},
-    "Node.cpp": {"Spelling.h", "Diag.h", "Walk.h"},
-    "NodeDbg.cpp": {"Spelling.h", "Diag.h", "Walk.h"},
-    "NodeEval.cpp": {"Spelling.h", "Diag.h", "Walk.h"},
-    "Program.cpp": {"Program.h", "Walk.h", "Word.h", "Writer.h"},
-    "Refusal.cpp": {"InitText.h", "Store.h"},
-    "Render.cpp": {"Store.h", "Walk.h"},
-    "Store.cpp": {"Store.h", "Walk.h", "sys/mman.h"},  # large pages for large texts
-    "StringMgr.cpp": set(),
-    "Terms.cpp": {"InitText.h", "Store.h"},
-    "Tokenizer.cpp": {"Spelling.h", "Store.h"},
-    "Tree.cpp": {"Store.h", "Walk.h"},
-    "TruthTable.cpp": {"Results.h"},
-    "Variables.cpp": {"Store.h"},
-}
-# A source that has no header of its own name implements a part of a larger one.
-OWN_HEADERS = {"ColumnAvx2.cpp": "ColumnKernel.h", "ColumnAvx512.cpp": "ColumnKernel.h",
-               "InitTree.cpp": "Store.h", "NodeDbg.cpp": NODE, "NodeEval.cpp": NODE}
+# What a public header may include of the other two: each knows only those below it. Inside, the build
+# enforces the floors: a room's compiler sees the headers of the rooms before it and no others.
+PUBLIC_FLOORS = {FACADE: set(), ENGINE: {FACADE}, NODE: {ENGINE}}
+SYSTEM_HEADERS = {"sys/mman.h"}  # large pages for large texts, where the system has them
 
 MAX_HEADER_LINES = 199
-MAX_SOURCE_LINES = 499
+MAX_SOURCE_LINES = 399
 MAX_FUNCTION_LINES = 59
 
 INCLUDE = re.compile(r'^\s*#\s*include\s*([<"])([^>"]+)[>"]')
@@ -88,13 +42,6 @@ class Report:
         print(f"{path.relative_to(self.root)}:{line}: {text}")
 
 
-def short_name(name):
-    """The name without the engine prefix, for internal files; public headers keep theirs."""
-    if name in PUBLIC or not name.startswith(PREFIX):
-        return name
-    return name[len(PREFIX):]
-
-
 def read_lines(path):
     return path.read_text(encoding="utf-8", errors="replace").splitlines()
 
@@ -109,35 +56,26 @@ def is_ours(name):
     return "/" in name or name.startswith("Kq_") or name.endswith((".h", ".cpp"))
 
 
-def check_floors(path, lines, allowed, report):
+def check_library_includes(path, lines, report):
+    """Public headers in angle brackets, headers of rooms by their bare names in quotes."""
+    others = PUBLIC_FLOORS.get(path.name, PUBLIC)
     for number, bracket, name in includes(lines):
-        if bracket == "<" and not is_ours(name):
-            continue  # the standard library
-        if name.startswith("port/"):
-            fits = PORT in allowed and bracket == "<"
+        if bracket == "<":
+            fits = (not is_ours(name) or name in others or name in SYSTEM_HEADERS
+                    or name.startswith("port/"))
         else:
-            is_internal = name.startswith("Kq_") and name not in PUBLIC
-            fits = short_name(name) in allowed and bracket == ('"' if is_internal else "<")
+            fits = path.name not in PUBLIC and re.fullmatch(r"\w+\.h", name) and name not in PUBLIC
         if not fits:
             report.add(path, number, f"may not include {name} here")
 
 
-def own_header(path):
-    name = short_name(path.name)
-    if name in OWN_HEADERS:
-        return OWN_HEADERS[name]
-    for folder in (path.parent, path.parent.parent / "include"):
-        header = path.with_suffix(".h").name
-        if (folder / header).exists():
-            return short_name(header)
-    return ENGINE
-
-
 def check_own_header(path, lines, report):
-    found = includes(lines)
-    wanted = own_header(path)
-    if not found or short_name(found[0][2]) != wanted:
-        report.add(path, found[0][0] if found else 1, f"the first include must be {wanted}")
+    """Included first, a header shows that it lacks nothing."""
+    own = path.with_suffix(".h")
+    if path.suffix == ".cpp" and own.exists():
+        found = includes(lines)
+        if not found or found[0][2] != own.name:
+            report.add(path, found[0][0] if found else 1, f"the first include must be {own.name}")
 
 
 def table_lines(lines):
@@ -181,9 +119,10 @@ def check_ascii(path, report):
 
 def check_macros(path, lines, report):
     guard = re.sub(r"\W", "_", path.name).upper()
+    guards = {guard, "KQ_" + guard}
     for number, line in enumerate(lines, 1):
         match = DEFINE.match(line)
-        if match and match[1] != guard and not ALLOWED_MACRO.fullmatch(match[1]):
+        if match and match[1] not in guards and not ALLOWED_MACRO.fullmatch(match[1]):
             report.add(path, number, f"macro {match[1]}: only export, assert and diagnostics")
 
 
@@ -198,18 +137,10 @@ def check_library_text(path, lines, report):
 
 
 def check_library(root, report):
-    for path in sorted([*root.glob("include/*.h"), *root.glob("s/*.h"), *root.glob("s/*.cpp")]):
+    for path in sorted([*root.glob("include/*.h"), *root.glob("s/**/*.h"), *root.glob("s/**/*.cpp")]):
         lines = read_lines(path)
-        name = short_name(path.name)
-        if path.suffix == ".h" and name in HEADER_FLOORS:
-            check_floors(path, lines, HEADER_FLOORS[name], report)
-        elif path.suffix == ".cpp" and name in SOURCE_HEADERS:
-            check_floors(path, lines, {PORT} | PUBLIC | SOURCE_HEADERS[name], report)
-            check_own_header(path, lines, report)
-        else:
-            report.add(path, 1, "not in the tables of scripts/check_includes.py")
-        if not path.name.startswith("Kq_BoolEquation"):
-            report.add(path, 1, "the name does not start with Kq_BoolEquation")
+        check_library_includes(path, lines, report)
+        check_own_header(path, lines, report)
         check_sizes(path, lines, report)
         check_macros(path, lines, report)
         check_library_text(path, lines, report)
@@ -231,9 +162,9 @@ def check_host(root, report):
 
 
 def check_users(root, report):
-    """The tool sees the public headers only, the Python module the facade's and the tool's core; the
+    """Tool and logic see the public headers only, the Python module the facade's and logic's; the
     reference model nothing of the library."""
-    for path in sorted(root.glob("tools/**/*")):
+    for path in sorted([*root.glob("logic/**/*"), *root.glob("tools/**/*")]):
         if path.suffix in (".h", ".cpp"):
             for number, _, name in includes(read_lines(path)):
                 if "Kq_" in name and name not in PUBLIC:
@@ -248,9 +179,26 @@ def check_users(root, report):
                 report.add(path, number, "the reference model shares no code with the library")
 
 
+def check_rooms(root, report):
+    """Headers of rooms are included by name alone, and what links them sees the folders of all: one
+    of a name that another has, or tool or module, would be taken for it."""
+    seen = {}
+    for path in sorted([*root.glob("logic/*/*.h"), *root.glob("tools/booleq/*.h"),
+                        *root.glob("python/src/*.h")]):
+        first = seen.setdefault(path.name, path)
+        if path != first and "logic" in (first.parent.parent.name, path.parent.parent.name):
+            report.add(path, 1, f"{first.relative_to(root)} has the same name")
+    for path in sorted([*root.glob("logic/*/*.h"), *root.glob("logic/*/*.cpp")]):
+        lines = read_lines(path)
+        for number, bracket, name in includes(lines):
+            if bracket == '"' and "/" in name:
+                report.add(path, number, f"{name}: rooms are not named, the links say which are seen")
+        check_sizes(path, lines, report)
+
+
 def check_all_ascii(root, report):
     files = [root / "dev", root / "CMakeLists.txt"]
-    for folder in ("include", "s", "port", "tools", "scripts", "cmake", "python", "tests", "bench",
+    for folder in ("include", "s", "port", "logic", "tools", "scripts", "cmake", "python", "tests", "bench",
                    "fuzz"):
         files += [path for path in root.glob(f"{folder}/**/*")
                   if path.suffix in (".h", ".cpp", ".py", ".sh", ".txt", ".cmake")]
@@ -269,6 +217,7 @@ def main():
     check_library(root, report)
     check_host(root, report)
     check_users(root, report)
+    check_rooms(root, report)
     check_all_ascii(root, report)
     return 1 if report.count else 0
 

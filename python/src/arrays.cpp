@@ -6,10 +6,10 @@
 #include <vector>
 
 #include "bind.h"
-#include "core/expression.h"
-#include "core/text.h"
 #include "errors.h"
+#include "expression.h"
 #include "packing.h"
+#include "text.h"
 
 namespace booleq_python {
 

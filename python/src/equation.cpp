@@ -3,13 +3,13 @@
 #include <algorithm>
 #include <functional>
 
-#include "core/expression.h"
-#include "core/messages.h"
-#include "core/permute.h"
-#include "core/text.h"
-#include "core/watch.h"
 #include "errors.h"
+#include "expression.h"
+#include "messages.h"
+#include "permute.h"
 #include "text.h"
+#include "unicode.h"
+#include "watch.h"
 
 namespace booleq_python {
 

@@ -12,8 +12,8 @@
 
 #include <Kq_BoolEquation.h>
 
-#include "core/function.h"
-#include "core/reading.h"
+#include "function.h"
+#include "listed_inputs.h"
 
 namespace booleq_python {
 

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "text.h"
+#include "unicode.h"
 
 namespace booleq_python {
 

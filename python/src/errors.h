@@ -4,7 +4,7 @@
 
 #include <pybind11/pybind11.h>
 
-#include "core/refusal.h"
+#include "refusal.h"
 
 namespace booleq_python {
 

@@ -4,8 +4,8 @@
 #include <vector>
 
 #include "bind.h"
-#include "core/text.h"
 #include "text.h"
+#include "unicode.h"
 
 namespace booleq_python {
 

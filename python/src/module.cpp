@@ -3,8 +3,8 @@
 #include <pybind11/pybind11.h>
 
 #include "bind.h"
-#include "core/watch.h"
 #include "errors.h"
+#include "watch.h"
 
 namespace {
 

@@ -3,14 +3,14 @@
 #include <vector>
 
 #include "bind.h"
-#include "core/describe.h"
-#include "core/equality.h"
-#include "core/lint.h"
-#include "core/permute.h"
-#include "core/text.h"
-#include "core/tree.h"
+#include "describe.h"
+#include "equality.h"
 #include "errors.h"
+#include "lint.h"
+#include "permute.h"
 #include "text.h"
+#include "tree.h"
+#include "unicode.h"
 
 namespace booleq_python {
 

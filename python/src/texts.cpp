@@ -2,10 +2,10 @@
 #include <string>
 
 #include "bind.h"
-#include "core/function.h"
-#include "core/text.h"
 #include "errors.h"
+#include "function.h"
 #include "text.h"
+#include "unicode.h"
 
 namespace booleq_python {
 

@@ -11,7 +11,9 @@ import tempfile
 import unittest
 
 ROOT = COMPILER = None
-ENGINE = "s/Kq_BoolEquationImp"
+BUILDER = "s/tree/Builder.cpp"
+SETTING = "s/equation/Setting.cpp"
+MESSAGES = "s/message/Messages.h"
 
 
 def run(*command):
@@ -30,7 +32,7 @@ class InCopy(unittest.TestCase):
 class Includes(InCopy):
     def setUp(self):
         super().setUp()
-        for folder in ("include", "s", "port", "tools", "python"):
+        for folder in ("include", "s", "port", "logic", "tools", "python"):
             shutil.copytree(ROOT / folder, self.copy / folder)
         self.before = self.check()[1]
 
@@ -64,45 +66,41 @@ class Includes(InCopy):
         self.append("include/Kq_BoolEquation.h", "#include <Kq_BoolEquationImp.h>\n")
         self.expect("include/Kq_BoolEquation.h", "may not include")
 
-    def test_internal_header_that_looks_up(self):
-        self.append(ENGINE + "InitText.h", '#include "Kq_BoolEquationImpColumn.h"\n')
-        self.expect(ENGINE + "InitText.h", "may not include")
-
-    def test_source_that_uses_what_is_not_its_job(self):
-        self.append(ENGINE + "Tokenizer.cpp", '#include "Kq_BoolEquationImpWalk.h"\n')
-        self.expect(ENGINE + "Tokenizer.cpp", "may not include")
+    def test_header_of_a_room_by_its_path(self):
+        self.append(BUILDER, '#include "../equation/Store.h"\n')
+        self.expect(BUILDER, "may not include")
 
     def test_source_that_includes_a_source(self):
-        self.append(ENGINE + "Tree.cpp", '#include "Kq_BoolEquationImpRender.cpp"\n')
-        self.expect(ENGINE + "Tree.cpp", "may not include")
+        self.append(BUILDER, '#include "Render.cpp"\n')
+        self.expect(BUILDER, "may not include")
 
     def test_internal_header_in_angle_brackets(self):
-        self.append(ENGINE + "Tree.cpp", "#include <Kq_BoolEquationImpWalk.h>\n")
-        self.expect(ENGINE + "Tree.cpp", "may not include")
+        self.append(BUILDER, "#include <Walk.h>\n")
+        self.expect(BUILDER, "may not include")
+
+    def test_header_of_the_system(self):
+        self.append(BUILDER, "#include <unistd.h>\n")
+        self.expect(BUILDER, "may not include")
 
     def test_own_header_not_first(self):
-        self.prepend(ENGINE + "NodeEval.cpp", "#include <vector>\n")
-        self.expect(ENGINE + "NodeEval.cpp", "first include must be Kq_BoolEquationImpNode.h")
-
-    def test_source_without_a_floor(self):
-        self.append(ENGINE + "Extra.cpp", "#include <Kq_BoolEquationImp.h>\n")
-        self.expect(ENGINE + "Extra.cpp", "not in the tables")
+        self.prepend(BUILDER, "#include <vector>\n")
+        self.expect(BUILDER, "first include must be Builder.h")
 
     def test_long_header(self):
-        self.append(ENGINE + "Diag.h", "// line\n" * 200)
-        self.expect(ENGINE + "Diag.h", "the limit is 199")
+        self.append(MESSAGES, "// line\n" * 200)
+        self.expect(MESSAGES, "the limit is 199")
 
     def test_long_source(self):
-        self.append(ENGINE + "Terms.cpp", "// line\n" * 500)
-        self.expect(ENGINE + "Terms.cpp", "the limit is 499")
+        self.append(SETTING, "// line\n" * 400)
+        self.expect(SETTING, "the limit is 399")
 
     def test_constant_tables_have_no_size(self):
-        self.append(ENGINE + "Terms.cpp", "const int kTable[] = {\n" + "    1,\n" * 600 + "};\n")
+        self.append(SETTING, "const int kTable[] = {\n" + "    1,\n" * 600 + "};\n")
         self.assertEqual(self.find_new(), [])
 
     def test_long_function(self):
-        self.append(ENGINE + "Terms.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
-        self.expect(ENGINE + "Terms.cpp", "function of 60 lines")
+        self.append(SETTING, "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
+        self.expect(SETTING, "function of 60 lines")
 
     def test_byte_that_is_not_ascii(self):
         self.append("tools/booleq/text.cpp", "// \u00ab\n")
@@ -113,20 +111,40 @@ class Includes(InCopy):
         self.expect("port/Port_Env.cpp", "knows nothing of Kq_")
 
     def test_macro(self):
-        self.append(ENGINE + "Tree.cpp", "#define MAXIMUM 5\n")
-        self.expect(ENGINE + "Tree.cpp", "macro MAXIMUM")
+        self.append(BUILDER, "#define MAXIMUM 5\n")
+        self.expect(BUILDER, "macro MAXIMUM")
 
     def test_file_macro(self):
-        self.append(ENGINE + "Tree.cpp", "const char* const kName = __FILE__;\n")
-        self.expect(ENGINE + "Tree.cpp", "__FILE__")
+        self.append(BUILDER, "const char* const kName = __FILE__;\n")
+        self.expect(BUILDER, "__FILE__")
 
     def test_foreign_declaration(self):
-        self.append(ENGINE + "Tree.cpp", "extern int s_other;\n")
-        self.expect(ENGINE + "Tree.cpp", "foreign declaration")
+        self.append(BUILDER, "extern int s_other;\n")
+        self.expect(BUILDER, "foreign declaration")
 
     def test_tool_that_uses_internals(self):
-        self.append("tools/booleq/text.cpp", '#include "Kq_BoolEquationImpStore.h"\n')
+        self.append("tools/booleq/text.cpp", '#include "Kq_Internal.h"\n')
         self.expect("tools/booleq/text.cpp", "is internal")
+
+    def test_room_that_uses_internals(self):
+        self.append("logic/search/match.cpp", '#include "Kq_Internal.h"\n')
+        self.expect("logic/search/match.cpp", "is internal")
+
+    def test_room_that_is_named(self):
+        self.append("logic/search/match.cpp", '#include "../column/bits.h"\n')
+        self.expect("logic/search/match.cpp", "rooms are not named")
+
+    def test_two_headers_of_one_name(self):
+        self.append("logic/search/bits.h", "")
+        self.expect("logic/search/bits.h", "logic/column/bits.h has the same name")
+
+    def test_header_of_the_tool_named_like_a_room_s(self):
+        self.append("tools/booleq/bits.h", "")
+        self.expect("tools/booleq/bits.h", "logic/column/bits.h has the same name")
+
+    def test_long_function_of_a_room(self):
+        self.append("logic/search/match.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
+        self.expect("logic/search/match.cpp", "function of 60 lines")
 
     def test_python_module_that_uses_the_engine(self):
         self.append("python/src/reports.cpp", "#include <Kq_BoolEquationImp.h>\n")

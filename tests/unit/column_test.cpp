@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-#include "Kq_BoolEquationImpColumn.h"
+#include "Column.h"
 #include "unit_support.h"
 
 namespace {

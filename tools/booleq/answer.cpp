@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <utility>
 
-#include "core/refusal.h"
-#include "core/text.h"
 #include "lines.h"
 #include "progress.h"
+#include "refusal.h"
+#include "text.h"
 
 namespace booleq {
 

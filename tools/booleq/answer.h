@@ -12,9 +12,9 @@
 #include <Kq_BoolEquation.h>
 
 #include "command.h"
-#include "core/function.h"
-#include "core/refusal.h"
+#include "function.h"
 #include "output.h"
+#include "refusal.h"
 #include "status.h"
 
 namespace booleq {

@@ -5,12 +5,12 @@
 #include <utility>
 
 #include "answer.h"
+#include "batch.h"
 #include "commands.h"
-#include "core/batch.h"
-#include "core/text.h"
 #include "lines.h"
 #include "progress.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

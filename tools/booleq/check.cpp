@@ -1,8 +1,8 @@
 // The command 'check': accepted, or the refusal that every command gives.
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

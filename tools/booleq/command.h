@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-#include "core/reading.h"
+#include "listed_inputs.h"
 #include "output.h"
 
 namespace booleq {

@@ -1,10 +1,10 @@
 // The command 'convert': an equation as text of another notation, proved equal before it is
 // printed.
-#include "core/convert.h"
+#include "convert.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
+#include "text.h"
 
 namespace booleq {
 

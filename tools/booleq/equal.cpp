@@ -1,9 +1,9 @@
 // The command 'equal': are two equations the same function.
-#include "core/equality.h"
+#include "equality.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
+#include "text.h"
 
 namespace booleq {
 

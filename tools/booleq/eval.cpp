@@ -3,8 +3,8 @@
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -1,11 +1,11 @@
 // The command 'explain': what a function is, and a short expression for it.
-#include "core/describe.h"
+#include "describe.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "options.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -3,8 +3,8 @@
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "picture.h"
+#include "text.h"
 
 namespace booleq {
 
@@ -76,8 +76,7 @@ void PutDigits(const Order& msb, const Order& lsb, Output& output)
     const std::string name = Visible(msb.column.Inputs().front());
     const std::string first = name + " most significant";
     // Longer digits are not aligned.
-    const size_t width =
-        std::max<size_t>(first.size(), std::min<uint64_t>(34, 2 + msb.column.NumRows()));
+    const size_t width = std::max(first.size(), std::min<size_t>(34, 2 + msb.column.NumRows()));
     PutLabel(output, "");
     output.Put(first + std::string(width - first.size() + 2, ' ') + name +
                " least (--lsb-first)\n");
@@ -216,7 +215,7 @@ void PutPictureTable(const Function& function, const std::vector<size_t>& places
         const uint64_t weight = uint64_t(1) << (function.NumInputs() - 1 - index);
         output.Put(SvgNote(middle, kTableTop - 10, "middle", std::to_string(weight)));
     }
-    for (uint64_t row = 0; row < function.NumRows(); ++row) {
+    for (size_t row = 0; row < function.NumRows(); ++row) {
         const size_t y = kTableTop + kRowHeight * row;
         const size_t base = y + kRowHeight / 2 + 5;
         output.Put(SvgText(kMargin + 3 * kCharacterWidth, base, "end", std::to_string(row)));
@@ -231,19 +230,19 @@ void PutPictureTable(const Function& function, const std::vector<size_t>& places
 // The digits of both bases below each other, from 'left' and 'top' on.
 void PutPictureDigits(const Function& function, size_t left, size_t top, Output& output)
 {
-    const uint64_t numRows = function.NumRows();
+    const size_t numRows = function.NumRows();
     output.Put(SvgNote(left - kCharacterWidth, top - 8, "end", "bit"));
     output.Put(SvgText(left - kCharacterWidth, top + kRowHeight / 2 + 5, "end", "0b"));
     output.Put(SvgText(left - kCharacterWidth, top + 2 * kRowHeight + 5, "end", "0x"));
-    for (uint64_t place = 0; place < numRows; ++place) {
-        const uint64_t row = numRows - 1 - place;
+    for (size_t place = 0; place < numRows; ++place) {
+        const size_t row = numRows - 1 - place;
         const size_t x = left + kDigitWidth * place;
         output.Put(SvgNote(x + kDigitWidth / 2, top - 8, "middle", std::to_string(row)));
         output.Put(SvgBox(x, top, kDigitWidth, kRowHeight, function.At(row),
                           function.At(row) ? "1" : "0"));
     }
     const std::string hex = function.Hex();
-    const size_t rowsOfDigit = std::min<uint64_t>(4, numRows);
+    const size_t rowsOfDigit = std::min<size_t>(4, numRows);
     for (size_t digit = 2; digit < hex.size(); ++digit)
         output.Put(SvgBox(left + kDigitWidth * rowsOfDigit * (digit - 2), top + kRowHeight * 3 / 2,
                           kDigitWidth * rowsOfDigit, kRowHeight, hex[digit] != '0',
@@ -264,7 +263,7 @@ void PutPicture(const Function& function, Output& output)
     output.Put(SvgText(kMargin, 25, "start", captions[0]));
     output.Put(SvgText(kMargin, 45, "start", captions[1]));
     PutPictureTable(function, places, output);
-    for (uint64_t row = 0; row < function.NumRows(); ++row)
+    for (size_t row = 0; row < function.NumRows(); ++row)
         output.Put(
             SvgArrow(tableRight, kTableTop + kRowHeight * row + kRowHeight / 2,
                      digitsLeft + kDigitWidth * (function.NumRows() - 1 - row) + kDigitWidth / 2,

@@ -4,19 +4,19 @@
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "picture.h"
+#include "text.h"
 
 namespace booleq {
 
 namespace {
 
-uint64_t GrayCode(uint64_t place)
+size_t GrayCode(size_t place)
 {
     return place ^ (place >> 1);
 }
 
-std::string Bits(uint64_t value, size_t width)
+std::string Bits(size_t value, size_t width)
 {
     std::string bits;
     for (size_t bit = width; bit-- > 0;)
@@ -32,14 +32,11 @@ struct Map {
     {
     }
 
-    uint64_t NumRows() const { return uint64_t(1) << numRowInputs; }
-    uint64_t NumColumns() const { return uint64_t(1) << numColumnInputs; }
-    std::string RowLabel(uint64_t row) const { return Bits(GrayCode(row), numRowInputs); }
-    std::string ColumnLabel(uint64_t column) const
-    {
-        return Bits(GrayCode(column), numColumnInputs);
-    }
-    bool At(uint64_t row, uint64_t column) const
+    size_t NumRows() const { return size_t(1) << numRowInputs; }
+    size_t NumColumns() const { return size_t(1) << numColumnInputs; }
+    std::string RowLabel(size_t row) const { return Bits(GrayCode(row), numRowInputs); }
+    std::string ColumnLabel(size_t column) const { return Bits(GrayCode(column), numColumnInputs); }
+    bool At(size_t row, size_t column) const
     {
         return function.At(GrayCode(row) << numColumnInputs | GrayCode(column));
     }
@@ -64,13 +61,13 @@ void PutText(const Map& map, Output& output)
     const size_t width = std::max(rowNames.size(), map.numRowInputs);
     output.Put(std::string(width, ' ') + "  " + map.ColumnNames() + "\n");
     output.Put(rowNames + std::string(width - rowNames.size(), ' '));
-    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+    for (size_t column = 0; column < map.NumColumns(); ++column)
         output.Put("  " + map.ColumnLabel(column));
     output.Put("\n");
-    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+    for (size_t row = 0; row < map.NumRows(); ++row) {
         const std::string label = map.RowLabel(row);
         output.Put(label + std::string(width - label.size(), ' '));
-        for (uint64_t column = 0; column < map.NumColumns(); ++column)
+        for (size_t column = 0; column < map.NumColumns(); ++column)
             output.Put("  " + std::string(map.numColumnInputs - 1, ' ') +
                        (map.At(row, column) ? "1" : "0"));
         output.Put("\n");
@@ -88,13 +85,13 @@ void PutSvg(const Map& map, Output& output)
     output.Put(SvgHead(width, height));
     output.Put(SvgText(left, 20, "start", map.ColumnNames()));
     output.Put(SvgText(left - 20, kTop - 12, "end", map.RowNames()));
-    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+    for (size_t column = 0; column < map.NumColumns(); ++column)
         output.Put(SvgText(left + kCell * column + kCell / 2, kTop - 12, "middle",
                            map.ColumnLabel(column)));
-    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+    for (size_t row = 0; row < map.NumRows(); ++row) {
         const size_t y = kTop + kCell * row;
         output.Put(SvgText(left - 20, y + kCell / 2 + 5, "end", map.RowLabel(row)));
-        for (uint64_t column = 0; column < map.NumColumns(); ++column) {
+        for (size_t column = 0; column < map.NumColumns(); ++column) {
             const size_t x = left + kCell * column;
             const bool value = map.At(row, column);
             output.Put(SvgBox(x, y, kCell, kCell, value, value ? "1" : "0"));
@@ -113,12 +110,12 @@ Json AsJson(const Map& map)
     result["row_labels"] = Json::array();
     result["column_labels"] = Json::array();
     result["cells"] = Json::array();
-    for (uint64_t column = 0; column < map.NumColumns(); ++column)
+    for (size_t column = 0; column < map.NumColumns(); ++column)
         result["column_labels"].push_back(map.ColumnLabel(column));
-    for (uint64_t row = 0; row < map.NumRows(); ++row) {
+    for (size_t row = 0; row < map.NumRows(); ++row) {
         result["row_labels"].push_back(map.RowLabel(row));
         Json cells = Json::array();
-        for (uint64_t column = 0; column < map.NumColumns(); ++column)
+        for (size_t column = 0; column < map.NumColumns(); ++column)
             cells.push_back(map.At(row, column) ? 1 : 0);
         result["cells"].push_back(cells);
     }

@@ -5,8 +5,8 @@
 
 #include <sys/stat.h>
 
-#include "core/text.h"
 #include "output.h"
+#include "text.h"
 
 namespace booleq {
 

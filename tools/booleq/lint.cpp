@@ -1,9 +1,9 @@
 // The command 'lint': who reads the text as another function, and where the library surprises.
-#include "core/lint.h"
+#include "lint.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
+#include "text.h"
 
 namespace booleq {
 

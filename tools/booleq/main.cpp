@@ -5,12 +5,12 @@
 #include <new>
 #include <optional>
 
-#include "core/messages.h"
-#include "core/text.h"
+#include "messages.h"
 #include "options.h"
 #include "output.h"
 #include "progress.h"
 #include "status.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -1,9 +1,9 @@
 // The command 'match': are two functions one up to the order of inputs, or up to inversions.
-#include "core/match.h"
+#include "match.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -5,8 +5,8 @@
 
 #include <CLI/CLI.hpp>
 
-#include "core/text.h"
 #include "help.h"
+#include "text.h"
 
 namespace booleq {
 

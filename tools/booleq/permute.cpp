@@ -1,9 +1,9 @@
 // The command 'permute': an init value for another order of the same inputs.
-#include "core/permute.h"
+#include "permute.h"
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
+#include "text.h"
 
 namespace booleq {
 

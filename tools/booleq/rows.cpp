@@ -2,8 +2,9 @@
 
 #include <algorithm>
 
-#include "core/text.h"
+#include "function.h"
 #include "progress.h"
+#include "text.h"
 
 namespace booleq {
 
@@ -163,9 +164,7 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
     // The packed column takes about the work of one evaluation for 64 rows.
     std::vector<uint64_t> words;
     if (numPrinted >= (uint64_t(1) << names.size()) / 64 && equation.GetColumn(words)) {
-        const auto valueAt = [&words](uint64_t row) {
-            return (words[row / 64] >> (row % 64) & 1u) != 0;
-        };
+        const auto valueAt = [&words](uint64_t row) { return ValueOfRow(words, row); };
         PrintRows(names, maxRows, RowFormat::kText, valueAt, output);
         return;
     }

@@ -1,9 +1,9 @@
 // The command 'show': everything the library answers about one equation.
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "options.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -4,9 +4,9 @@
 
 #include "answer.h"
 #include "commands.h"
-#include "core/text.h"
 #include "options.h"
 #include "rows.h"
+#include "text.h"
 
 namespace booleq {
 

@@ -1,5 +1,5 @@
 // The command 'tree': the expression tree as indented text, as a Graphviz graph, as JSON.
-#include "core/tree.h"
+#include "tree.h"
 
 #include <algorithm>
 

@@ -1,0 +1,170 @@
+#include "batch.h"
+
+#include <utility>
+
+#include "function.h"
+#include "listed_inputs.h"
+#include "refusal.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+// Above, the library's expression of an init value is too long to be of use: 10,000 characters.
+constexpr size_t kMaxWrittenInputs = 10;
+
+BatchResult Fail(BatchOutcome outcome, std::string message)
+{
+    return {outcome, std::move(message)};
+}
+
+BatchResult RefuseText(const char* what, const std::string& text, const Reading& reading)
+{
+    const RefusalReport report = ExplainRefusal(text, reading);
+    std::string message =
+        std::string(what) + " refused at " + PlaceName(text, report.offset) + ": " + report.reason;
+    if (!report.mend.empty())
+        message += "; " + report.mend;
+    return Fail(BatchOutcome::kTextRefused, std::move(message));
+}
+
+std::string AssignmentText(const Function& function, uint64_t row)
+{
+    std::string text;
+    for (size_t index = 0; index < function.NumInputs(); ++index)
+        text += (index == 0 ? "" : " ") + Visible(function.Inputs()[index]) +
+                (function.InputAt(row, index) ? "=1" : "=0");
+    return text;
+}
+
+std::string InitFor(const Function& function)
+{
+    return function.NumInputs() == 1 ? function.Binary() : function.Hex();
+}
+
+// Sets equation and function from the row's equation over its inputs.
+BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& function)
+{
+    Kq_BoolEquation equation;
+    if (row.equation.find('\0') != std::string::npos ||
+        !SetFromText(equation, row.equation, reading))
+        return RefuseText("the equation is", row.equation, reading);
+    if (reading.hasInputs && equation.GetNumVariables() > reading.inputs.size()) {
+        const auto& name = equation.GetVariables()[reading.inputs.size()].first;
+        return Fail(BatchOutcome::kDiffers,
+                    "the equation has " + Excerpt(ToStd(name)) + ", which is not among the inputs");
+    }
+    if (!FunctionOf(equation, function))
+        return Fail(BatchOutcome::kTextRefused, std::to_string(equation.GetNumVariables()) +
+                                                    " inputs: at most 30 have an init value");
+    return {};
+}
+
+// Compares the row's init value with the equation's function.
+BatchResult CompareInit(const BatchRow& row, const Function& function)
+{
+    Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = function.Inputs();
+    Function given;
+    if (FunctionFromInit(row.init, reading.inputs, false, given).fault != InitFault::kNone)
+        return RefuseText("the init value is", row.init, reading);
+    const uint64_t different = function.FirstDifference(given);
+    if (different == Function::kNoRow)
+        return {};
+    std::string message = "the equation is " + std::string(function.At(different) ? "1" : "0") +
+                          " at row " + std::to_string(different) + " (" +
+                          AssignmentText(function, different) + "), the init value " +
+                          (given.At(different) ? "1" : "0");
+    if (function.NumInputs() <= kMaxWrittenInputs)
+        message += "; the equation's is " + InitFor(function);
+    return Fail(BatchOutcome::kDiffers, std::move(message));
+}
+
+// The equation of a row that has an init value and inputs only.
+BatchResult WriteEquation(BatchRow& row, const Reading& reading)
+{
+    if (reading.inputs.size() > kMaxWrittenInputs)
+        return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
+                                                   std::to_string(kMaxWrittenInputs) + " inputs");
+    Kq_BoolEquation equation;
+    if (row.init.find('\0') != std::string::npos ||
+        ReadInitText(row.init, reading.inputs.size()).fault != InitFault::kNone ||
+        !SetFromText(equation, row.init, reading))
+        return RefuseText("the init value is", row.init, reading);
+    row.equation = ToStd(equation.GetEquationAsExpression(true));
+    return {BatchOutcome::kFilled, std::string()};
+}
+
+BatchResult CheckNames(const std::vector<std::string>& inputs)
+{
+    const InputCheck check = CheckInputs(inputs);
+    if (!check.illegal.empty())
+        return Fail(BatchOutcome::kTextRefused,
+                    "'" + Excerpt(check.illegal.front()) + "' is no name of an input");
+    if (!check.repeated.empty())
+        return Fail(BatchOutcome::kTextRefused,
+                    Excerpt(check.repeated.front()) + " stands twice among the inputs");
+    return {};
+}
+
+} // namespace
+
+const char* OutcomeName(BatchOutcome outcome)
+{
+    switch (outcome) {
+    case BatchOutcome::kOk:
+        return "ok";
+    case BatchOutcome::kFilled:
+        return "filled";
+    case BatchOutcome::kDiffers:
+        return "differs";
+    case BatchOutcome::kIncomplete:
+        return "incomplete";
+    case BatchOutcome::kTextRefused:
+        return "refused";
+    }
+    return "";
+}
+
+BatchResult CompleteRow(BatchRow& row)
+{
+    Reading reading;
+    reading.hasInputs = !row.inputs.empty();
+    reading.inputs = row.inputs;
+    BatchResult result = CheckNames(row.inputs);
+    if (result.outcome != BatchOutcome::kOk)
+        return result;
+    if (IsBlank(row.equation)) {
+        if (IsBlank(row.init))
+            return Fail(BatchOutcome::kIncomplete,
+                        "there is neither an equation nor an init value");
+        if (row.inputs.empty())
+            return Fail(BatchOutcome::kIncomplete,
+                        "an init value without an equation needs its inputs");
+        return WriteEquation(row, reading);
+    }
+    Function function;
+    result = ReadEquation(row, reading, function);
+    if (result.outcome != BatchOutcome::kOk)
+        return result;
+    if (function.NumInputs() == 0)
+        return Fail(BatchOutcome::kIncomplete,
+                    "the equation has no inputs, so no init value: it is "
+                    "always " +
+                        std::string(function.At(0) ? "1" : "0"));
+    const bool hasInit = !IsBlank(row.init);
+    if (hasInit)
+        result = CompareInit(row, function);
+    if (result.outcome != BatchOutcome::kOk)
+        return result;
+    if (!hasInit || row.inputs.empty())
+        result.outcome = BatchOutcome::kFilled;
+    if (!hasInit)
+        row.init = InitFor(function);
+    row.inputs = function.Inputs();
+    return result;
+}
+
+} // namespace booleq

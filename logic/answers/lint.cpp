@@ -1,0 +1,347 @@
+#include "lint.h"
+
+#include <algorithm>
+#include <unordered_map>
+
+#include "convert.h"
+#include "foreign_tree.h"
+#include "function.h"
+#include "notation_writer.h"
+#include "short_form.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr size_t kMaxNamedInputs = 16;
+constexpr size_t kMaxShortenedInputs = 8;
+
+bool Contains(const ForeignTree& tree, Meaning meaning)
+{
+    return std::any_of(
+        tree.nodes.begin(), tree.nodes.end(),
+        [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
+}
+
+std::string ReasonOf(const ForeignTree& tree)
+{
+    const bool isInt = tree.notation->values == Values::Int;
+    if (isInt && Contains(tree, Meaning::BitNot))
+        return "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
+    if (Contains(tree, Meaning::Add))
+        return "\"+\" adds there";
+    if (tree.notation == &LibertyNotation())
+        return "\"^\" binds tighter than \"&\" and \"*\" there, these tighter than \"|\" and \"+\"";
+    return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
+}
+
+Target TargetOf(const Notation* notation)
+{
+    if (notation == &VerilogNotation())
+        return Target::Verilog;
+    if (notation == &CNotation())
+        return Target::C;
+    if (notation == &LibertyNotation())
+        return Target::Liberty;
+    return notation == &VhdlNotation() ? Target::Vhdl : Target::Python;
+}
+
+std::string WithoutLineEnd(std::string text)
+{
+    if (!text.empty() && text.back() == '\n')
+        text.pop_back();
+    return text;
+}
+
+// The same names in this library's numbering. A name that the notation folds into another one is
+// that one.
+void Renumber(const Notation& notation, const std::vector<std::string>& names, ForeignTree& tree)
+{
+    std::unordered_map<std::string, uint32_t> numbers;
+    for (size_t input = 0; input < names.size(); ++input)
+        numbers.emplace(CanonicalName(notation, names[input]), static_cast<uint32_t>(input));
+    for (ForeignTree::Node& node : tree.nodes)
+        if (node.meaning == Meaning::Input)
+            node.left = numbers.at(tree.names[node.left]);
+    tree.names = names;
+}
+
+// This library's text for what the other notation reads; empty for a large function that is none of
+// bits.
+std::string TextHere(const ForeignTree& tree, const WordFunction& function)
+{
+    Expression expression;
+    if (ToExpression(tree, expression))
+        return WriteOwn(expression, OwnSyntax::First, Parentheses::Clear);
+    if (tree.names.size() > kMaxShortenedInputs)
+        return std::string();
+    const ShortForm shortForm = FindShortForm(Tabulate(function, tree.names));
+    return shortForm.isFound ? WriteOwn(shortForm.expression, OwnSyntax::First, Parentheses::Clear)
+                             : std::string();
+}
+
+ForeignReading ReadAs(const Notation& notation, const std::string& text,
+                      const Expression& expression)
+{
+    ForeignReading reading;
+    reading.notation = notation.name;
+    ForeignTree tree;
+    reading.isRead = Read(text, notation, tree, reading.fault);
+    if (!reading.isRead)
+        return reading;
+    Renumber(notation, expression.names, tree);
+    const WordFunction foreign = ToWordFunction(tree);
+    std::vector<uint64_t> stack;
+    const auto own = [&](const std::vector<uint64_t>& inputs) {
+        return EvaluateWord(expression, inputs, stack);
+    };
+    Expression inBits;
+    const uint64_t cost = ToExpression(tree, inBits) ? 1 : 64; // a row at a time
+    const auto numInputs = static_cast<unsigned int>(expression.names.size());
+    reading.comparison =
+        CompareWords(own, foreign, numInputs, expression.nodes.size() + cost * tree.nodes.size());
+    if (numInputs <= kMaxLintHexInputs)
+        reading.hex = Tabulate(foreign, expression.names).Hex();
+    if (reading.comparison.isEqual)
+        return reading;
+    std::vector<uint64_t> inputs;
+    for (const bool value : reading.comparison.first)
+        inputs.push_back(value ? 1 : 0);
+    reading.valueHere = (own(inputs) & 1u) != 0;
+    reading.grouping = WriteWhole(tree, expression.names);
+    reading.reason = ReasonOf(tree);
+    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(&notation), "").text);
+    reading.textHere = TextHere(tree, foreign);
+    return reading;
+}
+
+bool IsSameTree(const Expression& left, const Expression& right)
+{
+    return std::equal(left.nodes.begin(), left.nodes.end(), right.nodes.begin(), right.nodes.end(),
+                      [](const Expression::Node& own, const Expression::Node& other) {
+                          return own.op == other.op && own.left == other.left &&
+                                 own.right == other.right;
+                      });
+}
+
+bool IsInitValue(const Kq_BoolEquation& equation)
+{
+    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
+}
+
+// Looks for what this library alone is about.
+class Linter {
+  public:
+    Linter(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
+           const Expression& expression, LintReport& report)
+        : m_text(text), m_equation(equation), m_reading(reading), m_expression(expression),
+          m_report(report)
+    {
+    }
+
+    void Run()
+    {
+        if (IsInitValue(m_equation)) {
+            CheckInitWidth();
+        } else {
+            CheckBlanks();
+            CheckRenderings();
+            CheckLeadingZero();
+        }
+        CheckInputList();
+    }
+
+  private:
+    Finding& Add(const char* code, const std::string& message)
+    {
+        m_report.findings.push_back({code, message, {}});
+        return m_report.findings.back();
+    }
+
+    bool ReadAgain(const std::string& text, Expression& again) const
+    {
+        Kq_BoolEquation equation;
+        if (!SetFromText(equation, text, m_reading))
+            return false;
+        again = ToExpression(equation);
+        return again.names == m_expression.names;
+    }
+
+    Comparison CompareWith(const Expression& other) const
+    {
+        std::vector<uint64_t> ownStack;
+        std::vector<uint64_t> otherStack;
+        return CompareWords(
+            [&](const std::vector<uint64_t>& inputs) {
+                return EvaluateWord(m_expression, inputs, ownStack);
+            },
+            [&](const std::vector<uint64_t>& inputs) {
+                return EvaluateWord(other, inputs, otherStack);
+            },
+            static_cast<unsigned int>(m_expression.names.size()),
+            m_expression.nodes.size() + other.nodes.size());
+    }
+
+    // The same tree, with parentheses wherever a reader may doubt.
+    std::string ClearText() const
+    {
+        return WriteOwn(m_expression, OwnSyntax::AsTyped, Parentheses::Clear);
+    }
+
+    // "~ |" is an inversion and an operator, "~|" one operator.
+    void CheckBlanks()
+    {
+        constexpr size_t kMaxPlaces = 20;
+        bool isQuoted = false;
+        size_t numPlaces = 0;
+        for (size_t start = 0; start < m_text.size() && numPlaces < kMaxPlaces; ++start) {
+            if (m_text[start] == '\'')
+                isQuoted = !isQuoted;
+            if (isQuoted || (m_text[start] != '~' && m_text[start] != '!'))
+                continue;
+            const size_t next = m_text.find_first_not_of(" \t\n", start + 1);
+            if (next == std::string::npos || next == start + 1 ||
+                std::string("&*|+^@").find(m_text[next]) == std::string::npos)
+                continue;
+            ++numPlaces;
+            CheckBlank(start, next);
+        }
+    }
+
+    void CheckBlank(size_t start, size_t next)
+    {
+        const std::string operatorText = std::string(1, m_text[start]) + m_text[next];
+        const std::string message = "the blank inside \"" + std::string(1, m_text[start]) + " " +
+                                    m_text[next] + "\" at character " + std::to_string(start + 1) +
+                                    " changes the meaning: \"" + operatorText +
+                                    "\" is another operator";
+        const std::string closed = m_text.substr(0, start + 1) + m_text.substr(next);
+        Expression other;
+        if (!ReadAgain(closed, other)) {
+            Add("blank", message).details = {{"without it", "refused"}, {"write", ClearText()}};
+            return;
+        }
+        const Comparison comparison = CompareWith(other);
+        if (comparison.isEqual)
+            return;
+        Add("blank", message).details = {
+            {"first at", AssignmentText(m_expression.names, comparison.first)},
+            {"with it", WriteOwn(m_expression, OwnSyntax::First, Parentheses::Whole)},
+            {"without it", WriteOwn(other, OwnSyntax::First, Parentheses::Whole)},
+            {"write", ClearText()}};
+    }
+
+    void CheckRenderings()
+    {
+        struct Rendering {
+            const char* name;
+            Port::StringBase<char> (Kq_BoolEquation::*get)(bool) const;
+        };
+        static constexpr Rendering kRenderings[] = {
+            {"GetEquation", &Kq_BoolEquation::GetEquation},
+            {"GetEquationAlt1", &Kq_BoolEquation::GetEquationAlt1},
+            {"GetEquationAlt2", &Kq_BoolEquation::GetEquationAlt2},
+            {"GetEquationAlt3", &Kq_BoolEquation::GetEquationAlt3}};
+        for (const bool hasBlanks : {true, false}) {
+            Finding finding = {hasBlanks ? "rendering" : "unspaced-rendering", "", {}};
+            for (const Rendering& rendering : kRenderings) {
+                const std::string text = ToStd((m_equation.*rendering.get)(hasBlanks));
+                Expression again;
+                if (!ReadAgain(text, again) ||
+                    !(IsSameTree(again, m_expression) || CompareWith(again).isEqual))
+                    finding.details.emplace_back(rendering.name, text);
+            }
+            if (finding.details.empty())
+                continue;
+            finding.message = std::string("written ") + (hasBlanks ? "with" : "without") +
+                              " blanks by the library, the equation does not read back";
+            finding.details.emplace_back("write", ClearText());
+            m_report.findings.push_back(finding);
+        }
+    }
+
+    void CheckLeadingZero()
+    {
+        if (m_text.size() < 3 || m_text[0] != '0')
+            return;
+        Add("leading-zero", "over listed inputs a text that begins with \"0\" is taken for an init "
+                            "value and refused")
+            .details = {{"write", "(" + m_text + ")"}};
+    }
+
+    void CheckInputList()
+    {
+        if (!m_reading.hasInputs)
+            return;
+        const InputCheck check = CheckInputs(m_reading.inputs);
+        for (const std::string& name : check.illegal)
+            Add("skipped-input", "the listed input " + name + " is no name and is skipped");
+        for (const std::string& name : check.repeated)
+            Add("skipped-input", "the input " + name + " is listed again and counts once");
+        const size_t numListed = check.usable.size();
+        if (m_expression.names.size() <= numListed)
+            return;
+        std::string names;
+        for (size_t input = numListed; input < m_expression.names.size(); ++input)
+            names += (names.empty() ? "" : ", ") + m_expression.names[input];
+        Add("unlisted-input",
+            "inputs that are not listed widen the table behind the others: " + names);
+    }
+
+    void CheckInitWidth()
+    {
+        const size_t numInputs = m_expression.names.size();
+        const std::string text = ToStd(m_equation.GetEquation(false));
+        const InitText init = ReadInitText(text, numInputs);
+        if (init.fault != InitFault::kNone || numInputs > kMaxFunctionInputs ||
+            init.numGivenRows >= uint64_t(1) << numInputs)
+            return;
+        Add("short-init", "the init value gives " + std::to_string(init.numGivenRows) +
+                              " rows of " + std::to_string(uint64_t(1) << numInputs) +
+                              "; the others read as " + (init.missingRows ? "1" : "0"));
+    }
+
+    const std::string& m_text;
+    const Kq_BoolEquation& m_equation;
+    const Reading& m_reading;
+    const Expression& m_expression;
+    LintReport& m_report;
+};
+
+} // namespace
+
+bool LintReport::IsClean() const
+{
+    return findings.empty() &&
+           std::all_of(readings.begin(), readings.end(), [](const ForeignReading& reading) {
+               return !reading.isRead || reading.comparison.isEqual;
+           });
+}
+
+LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading)
+{
+    LintReport report;
+    const Expression expression = ToExpression(equation);
+    report.inputs = expression.names;
+    report.grouping = WriteOwn(expression, OwnSyntax::First, Parentheses::Whole);
+    if (!IsInitValue(equation))
+        for (const Notation* notation : ForeignNotations())
+            report.readings.push_back(ReadAs(*notation, text, expression));
+    Linter(text, equation, reading, expression, report).Run();
+    return report;
+}
+
+std::string AssignmentText(const std::vector<std::string>& names, const std::vector<bool>& values)
+{
+    std::string text;
+    const bool isShort = names.size() <= kMaxNamedInputs;
+    for (size_t input = 0; input < names.size(); ++input)
+        if (isShort || values[input])
+            text += (text.empty() ? "" : " ") + names[input] + (values[input] ? "=1" : "=0");
+    if (isShort)
+        return text.empty() ? "no inputs" : text;
+    return text.empty() ? "all inputs 0" : text + ", the others 0";
+}
+
+} // namespace booleq

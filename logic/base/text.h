@@ -1,0 +1,28 @@
+// Text for people: what may go to a terminal, and how much of it.
+#ifndef BOOLEQ_BASE_TEXT_H
+#define BOOLEQ_BASE_TEXT_H
+
+#include <cstdint>
+#include <string>
+
+#include <port/Port_StringBase.h>
+
+namespace booleq {
+
+std::string ToStd(const Port::StringBase<char>& text);
+
+// True when every byte is printable ASCII, so that Visible changes nothing.
+bool IsPrintable(const std::string& text);
+// Every byte that is not printable ASCII as \xNN: a name may hold any byte, an escape sequence for
+// the terminal too.
+std::string Visible(const std::string& text);
+// Visible, cut behind 60 bytes; what was cut is counted.
+std::string Excerpt(const std::string& text);
+// "1 input", "2 inputs".
+std::string Count(uint64_t number, const std::string& noun);
+// True for a text of blanks, tabs and line feeds only; the empty text is one.
+bool IsBlank(const std::string& text);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,65 @@
+#include "listed_inputs.h"
+
+#include <set>
+
+namespace booleq {
+
+namespace {
+
+std::string WithoutOuterBlanks(const std::string& text)
+{
+    const size_t first = text.find_first_not_of(" \t");
+    if (first == std::string::npos)
+        return std::string();
+    return text.substr(first, text.find_last_not_of(" \t") - first + 1);
+}
+
+} // namespace
+
+bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
+{
+    if (!reading.hasInputs)
+        return equation.SetEquation(text.c_str());
+    std::vector<Port::StringBase<char>> terms;
+    terms.reserve(reading.inputs.size());
+    for (const std::string& input : reading.inputs)
+        terms.push_back(Port::StringBase<char>(input.c_str()));
+    return equation.SetEquationWithExplicitTerms(terms, text.c_str(), reading.lsbFirst,
+                                                 reading.reverse);
+}
+
+bool SplitInputs(const std::string& list, std::vector<std::string>& inputs)
+{
+    bool quoted = false;
+    std::string name;
+    for (const char character : list) {
+        if (character == '\'')
+            quoted = !quoted;
+        if (character == ',' && !quoted) {
+            inputs.push_back(WithoutOuterBlanks(name));
+            name.clear();
+        } else {
+            name += character;
+        }
+    }
+    inputs.push_back(WithoutOuterBlanks(name));
+    return !quoted;
+}
+
+InputCheck CheckInputs(const std::vector<std::string>& inputs)
+{
+    InputCheck check;
+    std::set<std::string> known;
+    for (const std::string& input : inputs) {
+        Kq_BoolEquation probe; // the library itself says what a legal name is
+        if (!probe.DefineVariable(input.c_str(), 0))
+            check.illegal.push_back(input);
+        else if (known.insert(input).second)
+            check.usable.push_back(input);
+        else
+            check.repeated.push_back(input);
+    }
+    return check;
+}
+
+} // namespace booleq

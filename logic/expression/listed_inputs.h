@@ -1,0 +1,37 @@
+// How a text becomes an equation: with or without listed inputs.
+#ifndef BOOLEQ_EXPRESSION_LISTED_INPUTS_H
+#define BOOLEQ_EXPRESSION_LISTED_INPUTS_H
+
+#include <string>
+#include <vector>
+
+#include <Kq_BoolEquation.h>
+
+namespace booleq {
+
+struct Reading {
+    bool hasInputs = false;
+    std::vector<std::string> inputs;     // first is the most significant
+    bool lsbFirst = false;               // an init value's first input is bit 0 of the row number
+    bool reverse = false;                // an init value's inputs are defined from the last
+    const char* inputsName = "--inputs"; // what the caller's users write to list inputs
+};
+
+// Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.
+bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+
+// Names of a list 'A,B,'c,d'': a comma inside single quotes belongs to the name, blanks around a
+// name do not.  Fails: false when a quote is not closed.
+bool SplitInputs(const std::string& list, std::vector<std::string>& inputs);
+
+// Sorts out what the library would skip without a word.
+struct InputCheck {
+    std::vector<std::string> usable;   // each once, in the order listed
+    std::vector<std::string> illegal;  // no names; they become no inputs
+    std::vector<std::string> repeated; // listed again; they count once
+};
+InputCheck CheckInputs(const std::vector<std::string>& inputs);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,50 @@
+// Functions as networks of signals: what logic synthesis reads. Writers for three file formats and
+// the readers that check them.
+#ifndef BOOLEQ_NETLIST_NETWORK_H
+#define BOOLEQ_NETLIST_NETWORK_H
+
+#include <string>
+#include <vector>
+
+#include "cover.h"
+#include "expression.h"
+
+namespace booleq {
+
+struct NetworkNames {
+    std::vector<std::string> inputs;
+    std::string output;
+    std::string model;
+};
+
+// One gate for each operator, named so that nothing collides.
+std::string WriteBlif(const Expression& expression, const NetworkNames& names);
+// One equation; an operand of an exclusive or that is more than a name gets an equation of its own.
+std::string WriteEqn(const Expression& expression, const NetworkNames& names);
+// A sum of products.
+std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names);
+
+// What a text in one of the formats says about its one output, over its inputs in their order.
+// Invariant: a definition uses inputs and signals defined before it.
+struct Network {
+    struct Definition {
+        uint32_t signal;
+        Expression expression; // its inputs are signals
+    };
+    std::vector<std::string> signals; // inputs first
+    size_t numInputs = 0;
+    std::vector<Definition> definitions;
+    uint32_t output = 0;
+};
+
+// Read what the writers write, and as much of the formats as that needs.
+// Fails: false for anything else.
+bool ReadBlif(const std::string& text, Network& network);
+bool ReadEqn(const std::string& text, Network& network);
+bool ReadPla(const std::string& text, Network& network);
+
+WordFunction ToWordFunction(const Network& network);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,31 @@
+// Functions as sums of products, found by Minato's and Morreale's recursion: each product is a
+// prime and none can be left out. That is not always the fewest products, but it is found at once,
+// and for a function that no input makes both rise and fall it is the only such sum.
+#ifndef BOOLEQ_SEARCH_COVER_H
+#define BOOLEQ_SEARCH_COVER_H
+
+#include <cstdint>
+#include <vector>
+
+#include "bits.h"
+
+namespace booleq {
+
+// A product of inputs: input k takes part where bit k of 'used' is set, and must then have the
+// value of bit k of 'values'.
+struct Cube {
+    uint32_t used;
+    uint32_t values;
+};
+
+constexpr unsigned int kMaxCoverInputs = 16;
+
+// None for the constant 0; one without inputs for the constant 1.
+// Requires: at most kMaxCoverInputs inputs.
+std::vector<Cube> FindCover(const Bits& function);
+
+size_t CountLiterals(const std::vector<Cube>& cubes);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,303 @@
+#include "kind.h"
+
+#include <algorithm>
+
+#include "bits.h"
+#include "cover.h"
+
+namespace booleq {
+
+namespace {
+
+std::string Listed(const std::vector<std::string>& words, const char* between)
+{
+    std::string text;
+    for (const std::string& word : words)
+        text += (text.empty() ? "" : between) + word;
+    return text;
+}
+
+// A function of the inputs that matter, with ways to ask about it.
+class Explainer {
+  public:
+    explicit Explainer(const Function& function)
+        : m_names(function.Inputs()), m_bits(function), m_support(m_bits.Support())
+    {
+    }
+
+    void Run(FunctionKind& found)
+    {
+        for (unsigned int input = 0; input < m_bits.NumInputs(); ++input) {
+            const bool matters = std::count(m_support.begin(), m_support.end(), input) != 0;
+            (matters ? found.mattering : found.idle).push_back(m_names[input]);
+        }
+        m_found = &found;
+        FindConstant() || FindProduct() || FindParity() || FindMultiplexer() || FindThreshold() ||
+            FindAndOr() || FindSymmetric();
+    }
+
+  private:
+    bool Say(const std::string& kind, const std::string& text)
+    {
+        m_found->kind = kind;
+        m_found->text = text;
+        return true;
+    }
+
+    std::string Literal(unsigned int input, bool isInverted) const
+    {
+        return (isInverted ? "~" : "") + m_names[input];
+    }
+
+    // The cofactor for one assignment of the inputs of 'inputs'; bit k of 'values' is the k-th's.
+    Bits FixTo(const std::vector<unsigned int>& inputs, uint32_t values) const
+    {
+        Bits result(m_bits);
+        for (size_t place = 0; place < inputs.size(); ++place)
+            result = result.Cofactor(inputs[place], (values >> place & 1u) != 0);
+        return result;
+    }
+
+    // Fails: false for a function that is no single literal.
+    bool AsLiteral(const Bits& bits, unsigned int& input, std::string& literal) const
+    {
+        const std::vector<unsigned int> support = bits.Support();
+        if (support.size() != 1)
+            return false;
+        input = support[0];
+        literal = Literal(input, bits.At(0));
+        return true;
+    }
+
+    // The value with all inputs at 0 but those that 'inverted' turns.
+    bool FindConstant()
+    {
+        if (m_support.empty())
+            return Say("constant", m_bits.IsOne() ? "constant 1" : "constant 0");
+        if (m_support.size() > 1)
+            return false;
+        const bool isInverter = m_bits.At(0);
+        const std::string& name = m_names[m_support[0]];
+        return Say(isInverter ? "inverter" : "buffer",
+                   (isInverter ? "inverter of " : "buffer of ") + name);
+    }
+
+    // One row of those that matter is 1, or one is 0.
+    bool FindProduct()
+    {
+        const std::vector<Cube> cover = FindCover(m_bits);
+        const std::vector<Cube> inverse = FindCover(~m_bits);
+        const bool isAnd = cover.size() == 1;
+        if (!isAnd && inverse.size() != 1)
+            return false;
+        const Cube cube = isAnd ? cover[0] : inverse[0];
+        std::vector<std::string> plain;
+        std::vector<std::string> literals;
+        size_t numInverted = 0;
+        for (const unsigned int input : m_support) {
+            const bool isInverted = ((cube.values >> input & 1u) != 0) != isAnd;
+            numInverted += isInverted ? 1 : 0;
+            plain.push_back(m_names[input]);
+            literals.push_back(Literal(input, isInverted));
+        }
+        const bool isAll = numInverted == literals.size();
+        const std::string kind = isAnd ? (isAll ? "NOR" : "AND") : (isAll ? "NAND" : "OR");
+        return Say(kind, kind + " of " + Listed(isAll ? plain : literals, ", "));
+    }
+
+    bool FindParity()
+    {
+        Bits parity = Bits::OfInput(m_bits.NumInputs(), m_support[0]);
+        std::vector<std::string> names = {m_names[m_support[0]]};
+        for (size_t place = 1; place < m_support.size(); ++place) {
+            parity = parity ^ Bits::OfInput(m_bits.NumInputs(), m_support[place]);
+            names.push_back(m_names[m_support[place]]);
+        }
+        if (m_bits == parity)
+            return Say("XOR", "XOR of " + Listed(names, ", ") + ": 1 when an odd number is 1");
+        if (m_bits == ~parity)
+            return Say("XNOR", "XNOR of " + Listed(names, ", ") + ": 1 when an even number is 1");
+        return false;
+    }
+
+    // One select and two data inputs, or two selects and four.
+    bool FindMultiplexer()
+    {
+        const size_t size = m_support.size();
+        if (size == 3) {
+            for (const unsigned int select : m_support)
+                if (IsMultiplexer({select}))
+                    return true;
+        }
+        if (size == 6) {
+            for (size_t high = 0; high < size; ++high)
+                for (size_t low = high + 1; low < size; ++low)
+                    if (IsMultiplexer({m_support[high], m_support[low]}))
+                        return true;
+        }
+        return false;
+    }
+
+    bool IsMultiplexer(const std::vector<unsigned int>& selects)
+    {
+        std::vector<std::string> choices;
+        std::vector<unsigned int> data = selects;
+        const uint32_t numChoices = uint32_t(1) << selects.size();
+        for (uint32_t values = numChoices; values-- > 0;) {
+            unsigned int input = 0;
+            std::string literal;
+            if (!AsLiteral(FixTo(selects, values), input, literal) ||
+                std::count(data.begin(), data.end(), input) != 0)
+                return false;
+            data.push_back(input);
+            literal += " for ";
+            for (size_t place = 0; place < selects.size(); ++place)
+                literal.append(place == 0 ? "" : ", ")
+                    .append(m_names[selects[place]])
+                    .append((values >> place & 1u) != 0 ? "=1" : "=0");
+            choices.push_back(std::move(literal));
+        }
+        std::vector<std::string> names;
+        names.reserve(selects.size());
+        for (const unsigned int select : selects)
+            names.push_back(m_names[select]);
+        return Say("multiplexer",
+                   "multiplexer, select " + Listed(names, ", ") + ": " + Listed(choices, "; "));
+    }
+
+    // For each input that matters, whether it has to be inverted for the function to rise with it.
+    // Fails: false when some input makes it both rise and fall.
+    bool FindDirections(uint32_t& inverted) const
+    {
+        inverted = 0;
+        for (const unsigned int input : m_support) {
+            const Bits low = m_bits.Cofactor(input, false);
+            const Bits high = m_bits.Cofactor(input, true);
+            if ((low & high) == high)
+                inverted |= uint32_t(1) << input;
+            else if ((low & high) != low)
+                return false;
+        }
+        return true;
+    }
+
+    // By the number of literals that are 1, whether the function is 1; empty when it does not
+    // depend on the number alone.
+    std::vector<int> ByCount(uint32_t inverted) const
+    {
+        std::vector<int> values(m_support.size() + 1, -1);
+        for (uint64_t row = 0; row < m_bits.NumRows(); ++row) {
+            size_t count = 0;
+            for (const unsigned int input : m_support) {
+                const bool bit = (row >> (m_bits.NumInputs() - 1 - input) & 1u) != 0;
+                count += bit != ((inverted >> input & 1u) != 0) ? 1 : 0;
+            }
+            const int value = m_bits.At(row) ? 1 : 0;
+            if (values[count] != -1 && values[count] != value)
+                return {};
+            values[count] = value;
+        }
+        return values;
+    }
+
+    std::vector<std::string> Literals(uint32_t inverted) const
+    {
+        std::vector<std::string> literals;
+        for (const unsigned int input : m_support)
+            literals.push_back(Literal(input, (inverted >> input & 1u) != 0));
+        return literals;
+    }
+
+    bool FindThreshold()
+    {
+        uint32_t inverted = 0;
+        if (!FindDirections(inverted))
+            return false;
+        const std::vector<int> values = ByCount(inverted);
+        if (values.empty())
+            return false;
+        const auto needed = std::find(values.begin(), values.end(), 1) - values.begin();
+        const std::string literals = Listed(Literals(inverted), ", ");
+        if (2 * needed == static_cast<std::ptrdiff_t>(m_support.size()) + 1)
+            return Say("majority", "majority of " + literals);
+        return Say("threshold",
+                   "at least " + std::to_string(needed) + " of " + literals + " are 1");
+    }
+
+    bool FindSymmetric()
+    {
+        const std::vector<int> values = ByCount(0);
+        if (values.empty())
+            return false;
+        std::vector<std::string> counts;
+        for (size_t count = 0; count < values.size(); ++count)
+            if (values[count] == 1)
+                counts.push_back(std::to_string(count));
+        return Say("symmetric", "1 when the number of ones among " + Listed(Literals(0), ", ") +
+                                    " is " + Listed(counts, " or "));
+    }
+
+    // Products without a common input, summed: and-or; the other three forms are its inversions.
+    bool FindAndOr()
+    {
+        return IsAndOr(FindCover(m_bits), false) || IsAndOr(FindCover(~m_bits), true);
+    }
+
+    bool IsAndOr(const std::vector<Cube>& cover, bool isInverse)
+    {
+        uint32_t used = 0;
+        size_t numPlain = 0;
+        for (const Cube& cube : cover) {
+            if ((used & cube.used) != 0)
+                return false;
+            used |= cube.used;
+            numPlain += static_cast<size_t>(__builtin_popcount(cube.values));
+        }
+        // Mostly inverted literals: the sum is the inversion of a product of sums of plain ones.
+        const bool isOrAnd = 2 * numPlain < CountLiterals(cover);
+        const bool hasInvertedOutput = isInverse != isOrAnd;
+        std::vector<std::pair<size_t, std::string>> groups;
+        for (const Cube& cube : cover) {
+            std::vector<std::string> literals;
+            for (const unsigned int input : m_support)
+                if ((cube.used >> input & 1u) != 0)
+                    literals.push_back(
+                        Literal(input, ((cube.values >> input & 1u) != 0) == isOrAnd));
+            const std::string group = Listed(literals, isOrAnd ? " | " : " & ");
+            groups.emplace_back(literals.size(), literals.size() > 1 ? "(" + group + ")" : group);
+        }
+        std::stable_sort(groups.begin(), groups.end(), [](const auto& left, const auto& right) {
+            return left.first > right.first;
+        });
+        std::string sizes;
+        std::vector<std::string> texts;
+        for (const auto& group : groups) {
+            sizes += std::to_string(group.first);
+            texts.push_back(group.second);
+        }
+        std::string text = Listed(texts, isOrAnd ? " & " : " | ");
+        if (hasInvertedOutput)
+            text = "~(" + text + ")";
+        const std::string kind =
+            std::string(isOrAnd ? "or-and" : "and-or") + (hasInvertedOutput ? "-invert" : "");
+        const std::string shape =
+            std::string(isOrAnd ? "OA" : "AO") + (hasInvertedOutput ? "I" : "") + sizes;
+        return Say(kind, kind + " (" + shape + "): " + text);
+    }
+
+    const std::vector<std::string>& m_names;
+    Bits m_bits;
+    std::vector<unsigned int> m_support;
+    FunctionKind* m_found = nullptr;
+};
+
+} // namespace
+
+FunctionKind FindKind(const Function& function)
+{
+    FunctionKind found;
+    Explainer(function).Run(found);
+    return found;
+}
+
+} // namespace booleq

@@ -1,0 +1,233 @@
+// Tree in, program out; program in, value out. The program has neither groups nor constants, and
+// inversions cost nothing. Cost: O(nodes) to compile, O(codes) to run; no recursion.
+#include "Program.h"
+
+#include <algorithm>
+#include <cassert>
+
+#include "Operators.h"
+#include "ProgramWriter.h"
+#include "Walk.h"
+
+typedef Kq_BoolEquationImp::Node Node;
+
+namespace {
+
+// Writes the leaves and operators of one tree into a list that grows as needed.
+class Compiler {
+  public:
+    Compiler(uint32_t numVariables, bool isReversed, std::vector<KqCode>& codes)
+        : m_num_variables(numVariables), m_is_reversed(isReversed), m_codes(codes),
+          m_writer(codes.data(), 0)
+    {
+    }
+
+    size_t GetEnd() const { return m_writer.GetEnd(); }
+
+    KqValue PutLeaf(const KqOperand& leaf)
+    {
+        Reserve();
+        const Node* const node = leaf.node;
+        if (!node || !node->IsId() || node->GetValue() >= m_num_variables)
+            return m_writer.PutConstant(node && node->Is1()).Invert(leaf.inversion);
+        const uint32_t index = node->GetValue();
+        return m_writer.PutVariable(m_is_reversed ? m_num_variables - 1 - index : index)
+            .Invert(leaf.inversion);
+    }
+
+    // All operators are symmetric: either operand may be the one put last.
+    KqValue PutOperator(const KqOperand& operation, KqValue last, KqValue before)
+    {
+        Reserve();
+        const KqOperator found = KqOperatorOf(operation.node->GetType());
+        return m_writer.PutUnstack(found.kind, last, before)
+            .Invert(found.inversion ^ operation.inversion);
+    }
+
+  private:
+    void Reserve()
+    {
+        if (m_writer.GetEnd() < m_codes.size())
+            return;
+        m_codes.resize(2 * m_codes.size() + 128);
+        m_writer.SetCodes(m_codes.data());
+    }
+
+    uint32_t m_num_variables;
+    bool m_is_reversed;
+    std::vector<KqCode>& m_codes;
+    KqWriter m_writer;
+};
+
+// The operator's result for lower and upper value, bit lower + 2 * upper, by kind.
+constexpr uint8_t kTables[8] = {0x6, 0, 0, 0, 0x8, 0x4, 0x2, 0x1};
+
+// Compiles operands as they stand, but a leaf after an operand that is none, and gives up when that
+// stacks too many values.
+struct CompilerAsItStands {
+    // An operand, and the value of its first operand once that is written.
+    struct Place {
+        KqOperand operand;
+        KqValue first;
+    };
+
+    unsigned int Enter(Place& place, Place& first, Place& second)
+    {
+        if (!KqIsOperator(place.operand)) {
+            value = compiler.PutLeaf(place.operand);
+            return KQ_NONE;
+        }
+        first.operand = KqFindOperand(place.operand.node->GetLeftChild());
+        second.operand = KqFindOperand(place.operand.node->GetRightChild());
+        if (!KqIsOperator(first.operand))
+            std::swap(first.operand, second.operand);
+        return KQ_BOTH | KQ_RETURN;
+    }
+
+    void Between(Place& place)
+    {
+        place.first = value;
+        ++numStacked;
+        maxStacked = std::max(maxStacked, numStacked);
+    }
+
+    void Leave(const Place& place)
+    {
+        value = compiler.PutOperator(place.operand, value, place.first);
+        --numStacked;
+    }
+
+    Compiler& compiler;
+    KqValue value;
+    size_t numStacked;
+    size_t maxStacked;
+};
+
+// An operator or a leaf of the tree, for a walk that must know all before it starts.
+struct Item {
+    KqOperand operand;
+    uint32_t left; // positions of the operands; 0 when there are none
+    uint32_t right;
+    uint32_t need; // how many values the machine stacks for it
+};
+
+// All items below 'root', operators before their operands.
+std::vector<Item> ListItems(const Node* root)
+{
+    std::vector<Item> items;
+    items.reserve(64);
+    items.push_back({KqFindOperand(root), 0, 0, 1});
+    for (size_t position = 0; position < items.size(); ++position) {
+        const KqOperand operand = items[position].operand;
+        if (!KqIsOperator(operand))
+            continue;
+        assert(items.size() < UINT32_MAX - 1);
+        items[position].left = static_cast<uint32_t>(items.size());
+        items.push_back({KqFindOperand(operand.node->GetLeftChild()), 0, 0, 1});
+        items[position].right = static_cast<uint32_t>(items.size());
+        items.push_back({KqFindOperand(operand.node->GetRightChild()), 0, 0, 1});
+    }
+    // Operands stand after their operator, so a walk backwards knows what they need.
+    for (size_t position = items.size(); position-- > 0;) {
+        Item& item = items[position];
+        if (item.left == 0)
+            continue;
+        const uint32_t left = items[item.left].need;
+        const uint32_t right = items[item.right].need;
+        item.need = left == right ? left + 1 : std::max(left, right);
+    }
+    return items;
+}
+
+// Compiles the operand that needs more values first.
+struct CompilerByNeed {
+    struct Place {
+        const Item* item;
+        KqValue first;
+    };
+
+    unsigned int Enter(Place& place, Place& first, Place& second)
+    {
+        const Item& item = *place.item;
+        if (item.left == 0) {
+            value = compiler.PutLeaf(item.operand);
+            return KQ_NONE;
+        }
+        // All operators are symmetric, so either operand may go first.
+        const bool isRightFirst = items[item.right].need > items[item.left].need;
+        first.item = &items[isRightFirst ? item.right : item.left];
+        second.item = &items[isRightFirst ? item.left : item.right];
+        return KQ_BOTH | KQ_RETURN;
+    }
+
+    void Between(Place& place) { place.first = value; }
+
+    void Leave(const Place& place)
+    {
+        value = compiler.PutOperator(place.item->operand, value, place.first);
+    }
+
+    Compiler& compiler;
+    const std::vector<Item>& items;
+    KqValue value;
+};
+
+} // namespace
+
+KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
+{
+    KqProgram program;
+    Compiler compiler(numVariables, isReversed, program.codes);
+    CompilerAsItStands asItStands{compiler, KqValue(), 0, 0};
+    KqWalk(CompilerAsItStands::Place{KqFindOperand(root), KqValue()}, asItStands);
+    KqValue value = asItStands.value;
+    program.numCodes = compiler.GetEnd();
+    if (asItStands.maxStacked >= kKqMaxStack) {
+        Compiler again(numVariables, isReversed, program.codes);
+        const std::vector<Item> items = ListItems(root);
+        CompilerByNeed byNeed{again, items, KqValue()};
+        KqWalk(CompilerByNeed::Place{&items[0], KqValue()}, byNeed);
+        value = byNeed.value;
+        program.numCodes = again.GetEnd();
+    }
+    program.isInverted = value.GetInversion() != 0;
+    return program;
+}
+
+unsigned int
+KqRunProgram(const KqProgram& program,
+             const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& variables)
+{
+    static_assert(kKqMaxStack < 64, "the stack is the bits of a word");
+    uint64_t stack = 0;
+    unsigned int value = 0;
+    const KqCode* const end = program.codes.data() + program.numCodes;
+    for (const KqCode* next = program.codes.data(); next != end; ++next) {
+        const KqCode action = KqActionOf(*next);
+        const unsigned int table = kTables[KqKindOf(action)];
+        if (action >= kKqUnstack) {
+            value = table >> (2 * (stack & 1u)) >> value & 1u;
+            stack >>= 1;
+            continue;
+        }
+        const unsigned int operand = variables[KqVariableOf(*next)].second;
+        if (action >= kKqCombine) {
+            value = table >> (2 * operand) >> value & 1u;
+        } else {
+            stack = stack << 1 | value;
+            value = operand;
+        }
+    }
+    return value ^ (program.isInverted ? 1u : 0u);
+}
+
+size_t KqCountVariables(const KqProgram& program)
+{
+    size_t numVariables = 0;
+    for (size_t position = 0; position < program.numCodes; ++position) {
+        const KqCode code = program.codes[position];
+        if (KqActionOf(code) < kKqUnstack)
+            numVariables = std::max<size_t>(numVariables, KqVariableOf(code) + 1);
+    }
+    return numVariables;
+}

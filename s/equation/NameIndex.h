@@ -1,0 +1,100 @@
+// Where the names of a growing variable table stand, for as long as an equation is being set.
+#ifndef KQ_NAMEINDEX_H
+#define KQ_NAMEINDEX_H
+
+#include <cassert>
+#include <cstdint>
+#include <utility>
+#include <vector>
+
+#include "Name.h"
+
+constexpr size_t kKqNotFound = SIZE_MAX;
+
+// Few names are searched one by one, by their hashes; more get a hash table of positions, at most
+// half full, so that setting an equation of many names stays in step with its text.
+// Invariant: m_hashes has the hash of every name that was added, in the order of the table.
+class KqNameIndex {
+  public:
+    typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
+
+    // Knows the names that the table has now; those that follow are added one by one.
+    explicit KqNameIndex(const std::vector<Variable>& variables) : m_variables(variables)
+    {
+        for (const Variable& variable : variables)
+            Add(KqHashText(variable.first.c_str(), variable.first.length()));
+    }
+
+    // Position of the name, or kKqNotFound.
+    size_t Find(const Port::StringBase<char>& name, uint64_t hash) const
+    {
+        if (!m_slots.empty())
+            return m_slots[SlotOf(name, hash)];
+        for (size_t position = 0; position < m_size; ++position) {
+            if (IsAt(position, name, hash))
+                return position;
+        }
+        return kKqNotFound;
+    }
+
+    // The table's next name, which is new.  Fails: std::bad_alloc.
+    void Add(uint64_t hash)
+    {
+        if (m_size < kInline)
+            m_first[m_size] = hash;
+        else
+            AddToHeap(hash);
+        ++m_size;
+    }
+
+  private:
+    static constexpr size_t kInline = 16;
+
+    bool IsAt(size_t position, const Port::StringBase<char>& name, uint64_t hash) const
+    {
+        const uint64_t known = m_hashes.empty() ? m_first[position] : m_hashes[position];
+        return known == hash &&
+               KqIsNamed(m_variables[position].first, known, name.c_str(), name.length(), hash);
+    }
+
+    // The slot that holds the position of the name, or the free one where it belongs.
+    size_t SlotOf(const Port::StringBase<char>& name, uint64_t hash) const
+    {
+        size_t slot = static_cast<size_t>(hash) & (m_slots.size() - 1);
+        while (m_slots[slot] != kKqNotFound && !IsAt(m_slots[slot], name, hash))
+            slot = (slot + 1) & (m_slots.size() - 1);
+        return slot;
+    }
+
+    // The slot for a name that is known to be new.
+    void Place(size_t position)
+    {
+        size_t slot = static_cast<size_t>(m_hashes[position]) & (m_slots.size() - 1);
+        while (m_slots[slot] != kKqNotFound)
+            slot = (slot + 1) & (m_slots.size() - 1);
+        m_slots[slot] = position;
+    }
+
+    void AddToHeap(uint64_t hash)
+    {
+        if (m_size == kInline)
+            m_hashes.assign(m_first, m_first + kInline);
+        m_hashes.push_back(hash);
+        if (m_slots.size() < 2 * m_hashes.size()) {
+            m_slots.assign(m_slots.empty() ? 8 * kInline : 4 * m_slots.size(), kKqNotFound);
+            for (size_t position = 0; position < m_hashes.size(); ++position)
+                Place(position);
+        } else {
+            Place(m_hashes.size() - 1);
+        }
+        assert(m_hashes.size() == m_size + 1);
+    }
+
+    const std::vector<Variable>& m_variables;
+    size_t m_size = 0;
+    uint64_t m_first[kInline];
+    std::vector<uint64_t> m_hashes; // of all names, once they are too many for m_first
+    std::vector<size_t> m_slots;
+};
+
+#endif

@@ -1,0 +1,128 @@
+// The one walk over trees, without recursion: the depth of a tree is the text's to choose, the
+// stack is the host's. The first entries of a stack stay in place, so ordinary walks allocate
+// nothing.
+#ifndef KQ_WALK_H
+#define KQ_WALK_H
+
+#include <cassert>
+#include <cstddef>
+#include <type_traits>
+#include <vector>
+
+// A last-in first-out stack of plain values; the first kInline of them need no heap.
+// Requires: Pop and Top on a stack that is not empty.  Fails: std::bad_alloc from Push.
+template <class Entry, size_t kInline>
+class KqStack {
+    static_assert(std::is_trivially_copyable<Entry>::value, "entries are plain values");
+
+  public:
+    bool IsEmpty() const { return m_size == 0; }
+
+    void Push(const Entry& entry)
+    {
+        if (m_size < kInline)
+            m_first[m_size] = entry;
+        else
+            m_rest.push_back(entry);
+        ++m_size;
+    }
+
+    Entry Pop()
+    {
+        assert(m_size > 0);
+        --m_size;
+        if (m_size < kInline)
+            return m_first[m_size];
+        const Entry entry = m_rest.back();
+        m_rest.pop_back();
+        return entry;
+    }
+
+    Entry& Top()
+    {
+        assert(m_size > 0);
+        return m_size <= kInline ? m_first[m_size - 1] : m_rest.back();
+    }
+
+  private:
+    size_t m_size = 0;
+    Entry m_first[kInline];
+    std::vector<Entry> m_rest;
+};
+
+// What a visitor wants of the place it has entered: which of its places below to go to, and whether
+// to come back to it between them and after the last.
+enum KqBelow : unsigned int {
+    KQ_NONE = 0,
+    KQ_ONE = 1,  // the first alone
+    KQ_BOTH = 2, // the first, then the second
+    KQ_RETURN = 4,
+    KQ_END = 8 // the whole walk
+};
+
+// Walks a tree from 'place' down, in pre-order and, where the visitor asks for it, in post-order.
+// A place is whatever the visitor needs to know of a node, a plain value: a pointer, a pair, a
+// pointer with a depth or a result. The visitor has
+//     unsigned int Enter(Place& place, Place& first, Place& second)
+//         the place is reached; sets the places below, returns a KqBelow, or'ed with KQ_RETURN;
+//     void Between(Place& place)    all below the first is done;
+//     void Leave(Place& place)      all below is done.
+// Fails: std::bad_alloc.  Cost: O(places); memory for as many as wait for others at a time.
+template <class Place, class Visitor>
+void KqWalk(Place place, Visitor&& visitor)
+{
+    enum STAGE : unsigned int { TO_ENTER, AFTER_FIRST, AFTER_LAST };
+    struct Waiting {
+        Place place;
+        Place second;
+        STAGE stage;
+    };
+    KqStack<Waiting, 64> waiting;
+    for (;;) {
+        Place first = place;
+        Place second = place;
+        const unsigned int below = visitor.Enter(place, first, second);
+        if ((below & KQ_END) != 0)
+            return;
+        if ((below & KQ_RETURN) != 0)
+            waiting.Push({place, second, (below & KQ_BOTH) != 0 ? AFTER_FIRST : AFTER_LAST});
+        else if ((below & KQ_BOTH) != 0)
+            waiting.Push({second, second, TO_ENTER});
+        if ((below & (KQ_ONE | KQ_BOTH)) != 0) {
+            place = first;
+            continue;
+        }
+        for (;;) {
+            if (waiting.IsEmpty())
+                return;
+            Waiting& top = waiting.Top();
+            if (top.stage == AFTER_LAST) {
+                visitor.Leave(top.place);
+                waiting.Pop();
+                continue;
+            }
+            place = top.second;
+            if (top.stage == TO_ENTER) {
+                waiting.Pop();
+            } else {
+                visitor.Between(top.place);
+                top.stage = AFTER_LAST;
+            }
+            break;
+        }
+    }
+}
+
+// For visitors that never return to a place.
+struct KqPreOrder {
+    template <class Place>
+    void Between(Place&)
+    {
+    }
+    template <class Place>
+    void Leave(Place&)
+    {
+    }
+};
+
+#endif

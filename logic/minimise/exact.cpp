@@ -14,6 +14,8 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxColumns = 400000;
+// Rows are moved to harder ones, which costs more for each, when there are so many for each cube.
+constexpr size_t kHardFactor = 20;
 
 class ExactSearch {
   public:
@@ -72,21 +74,80 @@ class ExactSearch {
     void FindRows()
     {
         CubeList known = m_fixed;
-        std::vector<uint64_t> point(m_space.NumWords());
-        std::vector<uint64_t> signature(m_space.NumWords());
+        m_point.resize(m_space.NumWords());
         for (size_t index = 0; index < m_start.Size(); ++index) {
-            while (FindUncoveredRow(m_space, m_start.At(index), known, m_work, point.data())) {
-                const CubeList blocking =
-                    FindBlockingSets(m_space, m_problem.off, point.data(), m_work);
-                FindSignature(m_space, blocking, signature.data());
-                assert(Contains(signature.data(), point.data(), m_space.NumWords()));
-                m_rows.Append(point.data());
-                m_signatures.Append(signature.data());
-                m_blocking.push_back(blocking);
-                known.Append(signature.data());
+            while (FindUncoveredRow(m_space, m_start.At(index), known, m_work, m_point.data())) {
+                Row row = RowAt(m_point.data());
+                while (m_rows.Size() > kHardFactor * m_start.Size() && MoveToHarder(row)) {
+                }
+                m_rows.Append(row.point.data());
+                m_signatures.Append(row.signature.data());
+                m_blocking.push_back(row.blocking);
+                known.Append(row.signature.data());
             }
         }
         DropImpliedRows();
+    }
+
+    struct Row {
+        std::vector<uint64_t> point;
+        std::vector<uint64_t> signature;
+        CubeList blocking;
+    };
+
+    Row RowAt(const uint64_t* point)
+    {
+        Row row = {std::vector<uint64_t>(point, point + m_space.NumWords()),
+                   std::vector<uint64_t>(m_space.NumWords()),
+                   FindBlockingSets(m_space, m_problem.off, point, m_work)};
+        FindSignature(m_space, row.blocking, row.signature.data());
+        assert(Contains(row.signature.data(), point, m_space.NumWords()));
+        return row;
+    }
+
+    // A row beside this one that is covered by fewer primes, all of which cover this one as well.
+    bool MoveToHarder(Row& row)
+    {
+        const size_t numBits = 2 * m_space.NumInputs() + m_space.NumOutputs();
+        size_t output = 2 * m_space.NumInputs();
+        while (!GetBit(row.point.data(), output))
+            ++output;
+        std::vector<uint64_t> point;
+        for (size_t bit = 0; bit < numBits; bit += bit < 2 * m_space.NumInputs() ? 2 : 1) {
+            point = row.point;
+            if (bit < 2 * m_space.NumInputs()) {
+                point[bit / 64] ^= uint64_t(3) << (bit % 64);
+            } else {
+                ClearBit(point.data(), output);
+                SetBit(point.data(), bit);
+            }
+            if (!IsOpenRow(point.data()) || !IsImplicantWith(row.point, point))
+                continue;
+            Row other = RowAt(point.data());
+            if (Contains(other.signature.data(), row.signature.data(), m_space.NumWords()) &&
+                other.signature != row.signature) {
+                row = std::move(other);
+                return true;
+            }
+        }
+        return false;
+    }
+
+    bool IsImplicantWith(const std::vector<uint64_t>& left, std::vector<uint64_t> right)
+    {
+        for (size_t word = 0; word < right.size(); ++word)
+            right[word] |= left[word];
+        return m_expander.IsImplicant(right.data());
+    }
+
+    // Whether the row is on, and neither free nor covered by an essential prime.
+    bool IsOpenRow(const uint64_t* point)
+    {
+        m_work.Spend(m_fixed.Size());
+        for (size_t index = 0; index < m_fixed.Size(); ++index)
+            if (Contains(m_fixed.At(index), point, m_space.NumWords()))
+                return false;
+        return m_expander.IsImplicant(point);
     }
 
     // A row in the signature of another one is covered whenever that one is.
@@ -246,7 +307,8 @@ class ExactSearch {
     CubeList m_start; // primes; then those that are not essential
     CubeList m_essential;
     CubeList m_fixed; // free, and the essential primes
-    CubeList m_rows;  // one row of one output each
+    std::vector<uint64_t> m_point;
+    CubeList m_rows; // one row of one output each
     CubeList m_signatures;
     std::vector<CubeList> m_blocking;
     std::vector<std::vector<uint32_t>> m_neighbours;

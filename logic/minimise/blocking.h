@@ -19,11 +19,11 @@ CubeList FindBlockingSets(const CubeSpace& space, const CubeList& off, const uin
 // The parts that all primes that hold the cube have: those in no blocking set.
 void FindSignature(const CubeSpace& space, const CubeList& blocking, uint64_t* signature);
 
-// Appends the complements of all minimal sets that have a part in common with each of 'blocking', up
-// to 'maxCount' of them: the primes, when 'blocking' is of one cube. Parts outside 'parts' count as
-// chosen already. (K. Murakami, T. Uno, Efficient algorithms for dualizing large-scale hypergraphs,
-// 2014.) False when there are more.
-// Recursion: one level for each part chosen, at most inputs + outputs.
+// Appends the complements of all minimal sets that have a part in common with each of 'blocking',
+// up to 'maxCount' of them: the primes, when 'blocking' is of one cube. Parts outside 'parts' count
+// as chosen already. (K. Murakami, T. Uno, Efficient algorithms for dualizing large-scale
+// hypergraphs, 2014.) False when there are more. Recursion: one level for each part chosen, at most
+// inputs + outputs.
 bool FindPrimes(const CubeSpace& space, const CubeList& blocking, const uint64_t* parts,
                 size_t maxCount, Work& work, CubeList& primes);
 

@@ -236,9 +236,8 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes)
         }
         return 0;
     };
-    std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
-        return compare(left, right) < 0;
-    });
+    std::stable_sort(order.begin(), order.end(),
+                     [&](uint32_t left, uint32_t right) { return compare(left, right) < 0; });
     CubeList united(numWords);
     for (size_t place = 0; place < order.size(); ++place) {
         if (place == 0 || compare(order[place - 1], order[place]) != 0)

@@ -126,9 +126,10 @@ class Reduction {
                            const std::vector<std::vector<uint32_t>>& lists)
     {
         assert(!elements.empty());
-        return *std::min_element(
-            elements.begin(), elements.end(),
-            [&](uint32_t left, uint32_t right) { return lists[left].size() < lists[right].size(); });
+        return *std::min_element(elements.begin(), elements.end(),
+                                 [&](uint32_t left, uint32_t right) {
+                                     return lists[left].size() < lists[right].size();
+                                 });
     }
 
     CoveringTable& m_table;

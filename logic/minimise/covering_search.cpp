@@ -116,7 +116,8 @@ class CoveringSearch {
             }
             if (round % 10 == 0)
                 Construct(node, reduced);
-            if (IsHopeless(node) || step < 1e-3 || !Climb(table, reduced, bound, step, node, multipliers))
+            if (IsHopeless(node) || step < 1e-3 ||
+                !Climb(table, reduced, bound, step, node, multipliers))
                 break;
         }
         table.multipliers = best;
@@ -288,9 +289,9 @@ class CoveringSearch {
     {
         for (size_t row = 0; row < table.rows.size(); ++row) {
             const std::vector<uint32_t>& columns = table.rows[row];
-            if (isRow[row] != 0 && std::none_of(columns.begin(), columns.end(), [&](uint32_t column) {
-                    return isColumn[column] != 0;
-                }))
+            if (isRow[row] != 0 &&
+                std::none_of(columns.begin(), columns.end(),
+                             [&](uint32_t column) { return isColumn[column] != 0; }))
                 return false;
         }
         KeepInTable(table, isRow, isColumn);
@@ -301,10 +302,9 @@ class CoveringSearch {
     void Branch(Node& node)
     {
         const CoveringTable& table = node.table;
-        const auto shortest = std::min_element(table.rows.begin(), table.rows.end(),
-                                               [](const auto& left, const auto& right) {
-                                                   return left.size() < right.size();
-                                               });
+        const auto shortest = std::min_element(
+            table.rows.begin(), table.rows.end(),
+            [](const auto& left, const auto& right) { return left.size() < right.size(); });
         const uint32_t column = *std::min_element(
             shortest->begin(), shortest->end(),
             [&](uint32_t left, uint32_t right) { return m_reduced[left] < m_reduced[right]; });

@@ -117,7 +117,9 @@ void RemoveContained(CubeList& cubes, Work& work)
     std::vector<uint32_t> kept;
     for (const uint32_t index : order) {
         const uint64_t* cube = cubes.At(index);
-        const auto holds = [&](uint32_t other) { return Contains(cubes.At(other), cube, numWords); };
+        const auto holds = [&](uint32_t other) {
+            return Contains(cubes.At(other), cube, numWords);
+        };
         work.Spend(kept.size() + 1);
         if (std::none_of(kept.begin(), kept.end(), holds)) {
             kept.push_back(index);

@@ -1,7 +1,7 @@
 // Cubes of several-output functions, packed: two bits for each input, one for each output.
-// An input pair is 01 for the value 0, 10 for 1, 11 for either (low bit first: bit 0 admits 0, bit 1
-// admits 1); a pair 00 makes the cube empty. Inputs come first, outputs follow without a gap, bits
-// above the last output are 0. A pair never lies across two words.
+// An input pair is 01 for the value 0, 10 for 1, 11 for either (low bit first: bit 0 admits 0, bit
+// 1 admits 1); a pair 00 makes the cube empty. Inputs come first, outputs follow without a gap,
+// bits above the last output are 0. A pair never lies across two words.
 #ifndef BOOLEQ_MINIMISE_CUBE_H
 #define BOOLEQ_MINIMISE_CUBE_H
 

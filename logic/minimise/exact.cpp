@@ -19,8 +19,8 @@ constexpr size_t kHardFactor = 20;
 
 class ExactSearch {
   public:
-    ExactSearch(const TwoLevelProblem& problem, const CubeList& start, Count count, Work& work)
-        : m_space(problem.space), m_problem(problem), m_count(count), m_work(work),
+    ExactSearch(const TwoLevelProblem& problem, const CubeList& start, Goal goal, Work& work)
+        : m_space(problem.space), m_problem(problem), m_goal(goal), m_work(work),
           m_expander(m_space, problem.off, work), m_start(start), m_essential(m_space.NumWords()),
           m_fixed(problem.free), m_rows(m_space.NumWords()), m_signatures(m_space.NumWords()),
           m_result(m_space)
@@ -34,7 +34,7 @@ class ExactSearch {
             SetEssentialAside();
             FindRows();
             FindNeighbours();
-            if (m_count == Count::Terms)
+            if (m_goal == Goal::Terms)
                 CountTerms();
             CountBoth();
         } catch (const OutOfWork&) {
@@ -51,8 +51,7 @@ class ExactSearch {
             m_expander.Expand(m_start.At(index), nullptr, m_start, isOpen);
         m_start.SortAndUnite();
         m_result.sum = m_start;
-        std::vector<uint8_t> isEssential =
-            FindEssential(m_space, m_start, m_problem.free, m_work);
+        std::vector<uint8_t> isEssential = FindEssential(m_space, m_start, m_problem.free, m_work);
         for (size_t index = 0; index < isEssential.size(); ++index) {
             if (isEssential[index] != 0) {
                 m_essential.Append(m_start.At(index));
@@ -67,10 +66,11 @@ class ExactSearch {
 
     size_t BaseCost() const
     {
-        return m_count == Count::Terms ? m_essential.Size() : CountLiterals(m_space, m_essential);
+        return m_goal == Goal::Terms ? m_essential.Size() : CountLiterals(m_space, m_essential);
     }
 
-    // Rows of outputs that no essential prime covers, until the signatures of those found cover all.
+    // Rows of outputs that no essential prime covers, until the signatures of those found cover
+    // all.
     void FindRows()
     {
         CubeList known = m_fixed;
@@ -228,8 +228,8 @@ class ExactSearch {
         CoveringProblem problem;
         for (size_t index = 0; index < columns.Size(); ++index) {
             const uint64_t numLiterals = CountCubeLiterals(m_space, columns.At(index));
-            problem.costs.push_back(m_count == Count::Terms ? most + numLiterals
-                                                            : most * numLiterals + 1);
+            problem.costs.push_back(m_goal == Goal::Terms ? most + numLiterals
+                                                          : most * numLiterals + 1);
         }
         const uint64_t cost = Solve(problem, columns);
         const size_t firstBound = static_cast<size_t>(m_bound / most) + BaseCost();
@@ -241,11 +241,11 @@ class ExactSearch {
 
     size_t FirstCount() const
     {
-        return m_count == Count::Terms ? m_result.sum.Size() : CountLiterals(m_space, m_result.sum);
+        return m_goal == Goal::Terms ? m_result.sum.Size() : CountLiterals(m_space, m_result.sum);
     }
 
-    // Fills the rows of the problem, solves it, takes the sum if it is better. Returns its cost; the
-    // bound is in m_bound.
+    // Fills the rows of the problem, solves it, takes the sum if it is better. Returns its cost;
+    // the bound is in m_bound.
     uint64_t Solve(CoveringProblem& problem, const CubeList& columns)
     {
         problem.rows.resize(m_rows.Size());
@@ -266,10 +266,9 @@ class ExactSearch {
         }
         const CoverCost cost = CostOf(m_space, sum);
         const CoverCost best = CostOf(m_space, m_result.sum);
-        const bool isBetter = m_count == Count::Terms
-                                  ? IsCheaper(cost, best)
-                                  : IsCheaper({cost.numLiterals, cost.numTerms},
-                                              {best.numLiterals, best.numTerms});
+        const bool isBetter = m_goal == Goal::Terms ? IsCheaper(cost, best)
+                                                    : IsCheaper({cost.numLiterals, cost.numTerms},
+                                                                {best.numLiterals, best.numTerms});
         if (isBetter)
             m_result.sum = sum;
         return result.cost;
@@ -278,7 +277,7 @@ class ExactSearch {
     // Rows no two of which fit into a product need a term each.
     void BoundByStrangers()
     {
-        if (!m_are_neighbours_known || m_count != Count::Terms)
+        if (!m_are_neighbours_known || m_goal != Goal::Terms)
             return;
         std::vector<uint8_t> isOut(m_rows.Size(), 0);
         std::vector<uint32_t> order(m_rows.Size());
@@ -301,7 +300,7 @@ class ExactSearch {
 
     const CubeSpace& m_space;
     const TwoLevelProblem& m_problem;
-    Count m_count;
+    Goal m_goal;
     Work& m_work;
     Expander m_expander;
     CubeList m_start; // primes; then those that are not essential
@@ -320,10 +319,10 @@ class ExactSearch {
 
 } // namespace
 
-ExactResult FindSmallestSum(const TwoLevelProblem& problem, const CubeList& start, Count count,
+ExactResult FindSmallestSum(const TwoLevelProblem& problem, const CubeList& start, Goal goal,
                             Work& work)
 {
-    return ExactSearch(problem, start, count, work).Run();
+    return ExactSearch(problem, start, goal, work).Run();
 }
 
 } // namespace booleq

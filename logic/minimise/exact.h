@@ -8,18 +8,19 @@
 
 namespace booleq {
 
-enum class Count { Terms, Literals }; // what counts first; the other one then decides
+enum class Goal { Terms, Literals }; // what counts first; the other one then decides
 
 struct ExactResult {
     explicit ExactResult(const CubeSpace& space) : sum(space.NumWords()) {}
-    CubeList sum;           // of primes; the best one known
-    size_t lowerBound = 0;  // no sum has fewer of what counts first
-    bool isProved = false;  // the sum has that many
+    CubeList sum;                // of primes; the best one known
+    size_t lowerBound = 0;       // no sum has fewer of what counts first
+    bool isProved = false;       // the sum has that many
     bool isSecondProved = false; // and no such sum has fewer of what counts second
 };
 
-// 'start' is an irredundant sum to beat. Ends when the work's limits say so, with what is known then.
-ExactResult FindSmallestSum(const TwoLevelProblem& problem, const CubeList& start, Count count,
+// 'start' is an irredundant sum to beat. Ends when the work's limits say so, with what is known
+// then.
+ExactResult FindSmallestSum(const TwoLevelProblem& problem, const CubeList& start, Goal goal,
                             Work& work);
 
 } // namespace booleq

@@ -262,7 +262,8 @@ void Expander::RaiseMostFrequent(const CubeList& others)
     m_counts.assign(64 * m_num_words, 0);
     for (const uint32_t candidate : m_candidates)
         for (size_t word = 0; word < m_num_words; ++word)
-            for (uint64_t rest = others.At(candidate)[word] & m_free[word]; rest != 0; rest &= rest - 1)
+            for (uint64_t rest = others.At(candidate)[word] & m_free[word]; rest != 0;
+                 rest &= rest - 1)
                 ++m_counts[64 * word + LowestBit(rest)];
     const auto best = std::max_element(m_counts.begin(), m_counts.end());
     assert(*best > 0);

@@ -14,7 +14,7 @@ namespace booleq {
 namespace {
 
 constexpr uint64_t kIrredundantUnits = 1u << 22; // to choose cubes in; each row has a cube anyway
-constexpr uint32_t kFixed = UINT32_MAX; // label of cubes that stay
+constexpr uint32_t kFixed = UINT32_MAX;          // label of cubes that stay
 
 // Appends a row for each place that only labelled cubes cover.
 class ChoiceSearch {
@@ -51,8 +51,8 @@ class ChoiceSearch {
             }
             if (anyUnate == 0)
                 break;
-            // Where an input that is unate has its worse value, fewer cubes are left: the rows found
-            // there imply those elsewhere.
+            // Where an input that is unate has its worse value, fewer cubes are left: the rows
+            // found there imply those elsewhere.
             DropUnate(part);
         }
         assert(part.count > 0); // the cubes cover this place
@@ -175,7 +175,8 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
     std::vector<uint32_t> places;
     const CubeList none(space.NumWords());
     for (size_t index = 0; index < cubes.Size(); ++index) {
-        if (isKept[index] == 0 && !IsCovered(space, cubes.At(index), fixed, fixed.Size(), none, work)) {
+        if (isKept[index] == 0 &&
+            !IsCovered(space, cubes.At(index), fixed, fixed.Size(), none, work)) {
             choices.Append(cubes.At(index));
             places.push_back(static_cast<uint32_t>(index));
         }
@@ -199,8 +200,8 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
 
 namespace {
 
-// The cubes whose part outside 'prime' has a consensus with it: as cofactors with respect to 'prime',
-// with the outputs for which it is one.
+// The cubes whose part outside 'prime' has a consensus with it: as cofactors with respect to
+// 'prime', with the outputs for which it is one.
 void AppendConsensus(const CubeSpace& space, const CubeList& cubes, size_t left,
                      const uint64_t* prime, CubeList& target)
 {

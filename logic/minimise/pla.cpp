@@ -112,16 +112,6 @@ class MeetingSearch {
     size_t m_right_index = 0;
 };
 
-void AppendInputs(const CubeSpace& space, const uint64_t* cube, std::string& text)
-{
-    for (size_t input = 0; input < space.NumInputs(); ++input) {
-        const bool hasZero = GetBit(cube, 2 * input);
-        const bool hasOne = GetBit(cube, 2 * input + 1);
-        assert(hasZero || hasOne);
-        text += hasZero && hasOne ? '-' : hasOne ? '1' : '0';
-    }
-}
-
 void AppendNames(const char* directive, const std::vector<std::string>& names, std::string& text)
 {
     text += directive;
@@ -193,6 +183,21 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
     return true;
 }
 
+std::string CubeText(const CubeSpace& space, const uint64_t* cube)
+{
+    std::string text;
+    for (size_t input = 0; input < space.NumInputs(); ++input) {
+        const bool hasZero = GetBit(cube, 2 * input);
+        const bool hasOne = GetBit(cube, 2 * input + 1);
+        assert(hasZero || hasOne);
+        text += hasZero && hasOne ? '-' : hasOne ? '1' : '0';
+    }
+    text += ' ';
+    for (size_t output = 0; output < space.NumOutputs(); ++output)
+        text += GetBit(cube, space.OutputBit(output)) ? '1' : '0';
+    return text;
+}
+
 std::string WritePla(const Pla& pla, const CubeList& sum)
 {
     const CubeSpace& space = pla.space;
@@ -204,11 +209,7 @@ std::string WritePla(const Pla& pla, const CubeList& sum)
         AppendNames(".ob", pla.outputs, text);
     text += ".type f\n.p " + std::to_string(sum.Size()) + "\n";
     for (size_t index = 0; index < sum.Size(); ++index) {
-        AppendInputs(space, sum.At(index), text);
-        text += ' ';
-        for (size_t output = 0; output < space.NumOutputs(); ++output)
-            text += GetBit(sum.At(index), space.OutputBit(output)) ? '1' : '0';
-        text += '\n';
+        text += CubeText(space, sum.At(index)) + "\n";
     }
     return text + ".e\n";
 }

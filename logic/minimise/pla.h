@@ -23,7 +23,7 @@ enum class PlaType { F, Fd, Fr, Fdr };
 struct Pla {
     Pla() : space(0, 0), on(1), free(1), off(1) {}
     CubeSpace space;
-    std::vector<std::string> inputs;  // names: as given, or made up
+    std::vector<std::string> inputs; // names: as given, or made up
     std::vector<std::string> outputs;
     bool hasInputNames = false;
     bool hasOutputNames = false;
@@ -54,6 +54,9 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
 // Cost: far below one step for each pair, unless nearly all pairs meet.
 bool FindMeeting(const CubeSpace& space, const CubeList& left, const CubeList& right, Work& work,
                  size_t& leftIndex, size_t& rightIndex);
+
+// "1-0 10": a digit for each input, a blank, a digit for each output.
+std::string CubeText(const CubeSpace& space, const uint64_t* cube);
 
 // A sum of products as a file of type f with the names of 'pla' where it had any.
 std::string WritePla(const Pla& pla, const CubeList& sum);

@@ -100,14 +100,14 @@ class PlaReader {
     {
         if (m_num_digits == 0)
             return true;
-        return Fail(m_row_line, "the row has " + Counted(m_num_digits, "digit") + ", not " +
-                                    RowWidth());
+        return Fail(m_row_line,
+                    "the row has " + Counted(m_num_digits, "digit") + ", not " + RowWidth());
     }
 
     std::string RowWidth() const
     {
-        return std::to_string(m_num_inputs + m_num_outputs) + " (" + Counted(m_num_inputs, "input") +
-               " and " + Counted(m_num_outputs, "output") + ")";
+        return std::to_string(m_num_inputs + m_num_outputs) + " (" +
+               Counted(m_num_inputs, "input") + " and " + Counted(m_num_outputs, "output") + ")";
     }
 
     bool ReadDirective(const std::vector<std::string>& words)
@@ -138,7 +138,8 @@ class PlaReader {
         const bool isNumber = words.size() == 2 && !words[1].empty() && words[1].size() <= 6 &&
                               words[1].find_first_not_of("0123456789") == std::string::npos;
         if (!isNumber)
-            return Fail(m_line, words[0] + " needs one number", "write for example '" + words[0] + " 4'");
+            return Fail(m_line, words[0] + " needs one number",
+                        "write for example '" + words[0] + " 4'");
         const size_t value = std::stoul(words[1]);
         if (value > most || (value == 0 && words[0] == ".o"))
             return Fail(m_line, words[0] + " " + words[1] + ": from " +
@@ -188,7 +189,8 @@ class PlaReader {
         std::unordered_set<std::string> seen;
         for (const std::string& name : names)
             if (!seen.insert(name).second)
-                return Fail(m_line, "the " + std::string(what) + " " + Shown(name) + " is named twice",
+                return Fail(m_line,
+                            "the " + std::string(what) + " " + Shown(name) + " is named twice",
                             "give each a name of its own");
         return true;
     }
@@ -216,8 +218,8 @@ class PlaReader {
                 return Fail(m_row_line, "the row is longer than " + RowWidth(), RowHint());
             if (*place == '|') {
                 if (m_num_digits != m_num_inputs)
-                    return Fail(m_line, "'|' after " + Counted(m_num_digits, "digit") + ", not after " +
-                                            Counted(m_num_inputs, "input"));
+                    return Fail(m_line, "'|' after " + Counted(m_num_digits, "digit") +
+                                            ", not after " + Counted(m_num_inputs, "input"));
                 continue;
             }
             if (!TakeDigit(*place))
@@ -229,16 +231,16 @@ class PlaReader {
         }
         const bool isOneLine = isAtStart && isAfterRow;
         if (isOneLine && blank && numBlanks == 1 && digitsBeforeBlank != m_num_inputs)
-            return Fail(m_line, Counted(digitsBeforeBlank, "digit") + " before the blank, but .i is " +
-                                    std::to_string(m_num_inputs));
+            return Fail(m_line, Counted(digitsBeforeBlank, "digit") +
+                                    " before the blank, but .i is " + std::to_string(m_num_inputs));
         return true;
     }
 
     std::string RowHint() const
     {
-        return m_row_line == m_line
-                   ? ""
-                   : "it goes on in line " + std::to_string(m_line) + "; is a digit missing before?";
+        return m_row_line == m_line ? ""
+                                    : "it goes on in line " + std::to_string(m_line) +
+                                          "; is a digit missing before?";
     }
 
     bool FailDigit(char digit, size_t column)
@@ -246,8 +248,8 @@ class PlaReader {
         const bool isInput = m_num_digits < m_num_inputs;
         return Fail(m_line,
                     "no digit of an " + std::string(isInput ? "input" : "output") + ": " +
-                        Shown(std::string(1, digit)) + " at character " + std::to_string(column + 1) +
-                        " of the row",
+                        Shown(std::string(1, digit)) + " at character " +
+                        std::to_string(column + 1) + " of the row",
                     isInput ? "inputs are 0, 1 or - (also 2, x)"
                             : "outputs are 0, 1 (also 4), - (also 2, x) or ~ (also 3)");
     }
@@ -350,8 +352,8 @@ class PlaReader {
         }
         if (names.size() == count)
             return true;
-        return Fail(line, std::string(directive) + " has " + Counted(names.size(), "name") + " for " +
-                              Counted(count, what));
+        return Fail(line, std::string(directive) + " has " + Counted(names.size(), "name") +
+                              " for " + Counted(count, what));
     }
 
     const std::string& m_text;

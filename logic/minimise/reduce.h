@@ -1,6 +1,6 @@
-// REDUCE, IRREDUNDANT, ESSENTIAL PRIMES and LAST GASP of the classical loop (R. Brayton, G. Hachtel,
-// C. McMullen, A. Sangiovanni-Vincentelli, Logic Minimization Algorithms for VLSI Synthesis, 1984;
-// R. Rudell, Multiple-valued logic minimization for PLA synthesis, 1986).
+// REDUCE, IRREDUNDANT, ESSENTIAL PRIMES and LAST GASP of the classical loop (R. Brayton, G.
+// Hachtel, C. McMullen, A. Sangiovanni-Vincentelli, Logic Minimization Algorithms for VLSI
+// Synthesis, 1984; R. Rudell, Multiple-valued logic minimization for PLA synthesis, 1986).
 #ifndef BOOLEQ_MINIMISE_REDUCE_H
 #define BOOLEQ_MINIMISE_REDUCE_H
 
@@ -27,8 +27,8 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
 std::vector<uint8_t> FindEssential(const CubeSpace& space, const CubeList& cubes,
                                    const CubeList& free, Work& work);
 
-// Appends primes that each cover two cubes of the cover after each has been reduced as if the others
-// stayed as they are; returns how many.
+// Appends primes that each cover two cubes of the cover after each has been reduced as if the
+// others stayed as they are; returns how many.
 size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
                    Work& work);
 

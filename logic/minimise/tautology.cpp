@@ -88,7 +88,8 @@ class TautologyCheck {
                 m_is_tautology = true;
                 return true;
             }
-            share += numLiterals < 64 ? 1.0 / static_cast<double>(uint64_t(1) << numLiterals) : 1e-19;
+            share +=
+                numLiterals < 64 ? 1.0 / static_cast<double>(uint64_t(1) << numLiterals) : 1e-19;
         }
         if (share < 0.999) // short of 1 by more than rounding can take
             return true;

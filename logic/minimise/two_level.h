@@ -1,6 +1,7 @@
 // Sums of products for several outputs at once: the problem, and the heuristic search for a small
-// answer. Input: what is on, what is free, what is off, as cubes. Output: a cover with as few terms,
-// then as few literals, as the search finds; every answer is proved right by Prove before it leaves.
+// answer. Input: what is on, what is free, what is off, as cubes. Output: a cover with as few
+// terms, then as few literals, as the search finds; every answer is proved right by Prove before it
+// leaves.
 #ifndef BOOLEQ_MINIMISE_TWO_LEVEL_H
 #define BOOLEQ_MINIMISE_TWO_LEVEL_H
 
@@ -30,12 +31,14 @@ struct CoverCost {
 CoverCost CostOf(const CubeSpace& space, const CubeList& cubes);
 bool IsCheaper(const CoverCost& left, const CoverCost& right);
 
-// An irredundant cover, by the classical loop. Repeatable: the same problem gives the same cover.
+// An irredundant cover, by the classical loop. Repeatable: the same problem gives the same cover,
+// unless the work has a deadline, which ends the loop early.
 CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work);
 
-// Whether 'sum' is 1 wherever the problem is on and not free, and 0 wherever it is off. By cube
-// calculus on 'on' and 'free' or 'off' as they are, never by sample.
-bool IsSumRight(const TwoLevelProblem& problem, const CubeList& sum, Work& work);
+// Outputs that other cubes cover go, then inputs that are not needed for those left: fewer literals
+// for the same terms.
+// Requires: an irredundant cover of the problem.
+void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work);
 
 } // namespace booleq
 

@@ -16,7 +16,8 @@ namespace booleq {
 void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
                    CubeList& target);
 
-// Appends the inputs of each cube that has the output to 'target', as the functions below want them.
+// Appends the inputs of each cube that has the output to 'target', as the functions below want
+// them.
 void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
 
 // Whether the cubes cover all rows. 'cubes' is scratch space afterwards.
@@ -27,14 +28,14 @@ bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);
 CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work);
 
 // Adds to 'found' the parts of input cube that occur in rows that no cube covers; what 'found' has
-// already is not looked for, so it starts with the parts that are of no interest. 'cubes' is scratch
-// space afterwards.
+// already is not looked for, so it starts with the parts that are of no interest. 'cubes' is
+// scratch space afterwards.
 void AddUncovered(const CubeSpace& space, CubeList& cubes, Work& work, uint64_t* found);
 
 // A row of an output of 'cube' that no cube of the list covers: all inputs fixed, one output.
 // Fails: false when there is none.
-bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes, Work& work,
-                      uint64_t* row);
+bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
+                      Work& work, uint64_t* row);
 
 // Cubes of the same inputs become one, with the outputs of all.
 void UniteOutputs(const CubeSpace& space, CubeList& cubes);

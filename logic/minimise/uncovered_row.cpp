@@ -90,8 +90,8 @@ class RowSearch {
 
 } // namespace
 
-bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes, Work& work,
-                      uint64_t* row)
+bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
+                      Work& work, uint64_t* row)
 {
     CubeList meeting(space.NumWords());
     work.Spend(cubes.Size() * space.NumWords());

@@ -3,6 +3,8 @@
 
 #include <algorithm>
 
+#include "watch.h"
+
 namespace booleq {
 
 void Work::SetLimit(uint64_t spent)
@@ -13,6 +15,7 @@ void Work::SetLimit(uint64_t spent)
 
 void Work::Check()
 {
+    Watch();
     m_next_check = std::min(m_spent + kUnitsBetweenChecks, std::max(m_limit, m_spent + 1));
     if (m_spent >= m_limit)
         throw OutOfWork{false};

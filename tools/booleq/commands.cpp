@@ -23,7 +23,7 @@ const std::vector<Command>& Commands()
     static const std::vector<Command> commands = {
         ShowCommand(),  CheckCommand(),   EvalCommand(),    TableCommand(), InitCommand(),
         EqualCommand(), ExplainCommand(), PermuteCommand(), MatchCommand(), ConvertCommand(),
-        LintCommand(),  TreeCommand(),    KmapCommand(),    BatchCommand(),
+        LintCommand(),  TreeCommand(),    KmapCommand(),    BatchCommand(), MinimizeCommand(),
     };
     return commands;
 }

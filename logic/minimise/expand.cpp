@@ -83,6 +83,12 @@ bool Expander::LowerAndDropIn()
     uint64_t* const free = m_free.data();
     uint64_t* const missing = m_scratch.data();
     uint64_t* const blocked = m_blocked.data();
+    uint64_t lows[kNumWords > 0 ? kNumWords : 1] = {};
+    uint64_t outs[kNumWords > 0 ? kNumWords : 1] = {};
+    for (size_t word = 0; word < kNumWords; ++word) {
+        lows[word] = m_space.InputLow(word);
+        outs[word] = m_space.Outputs(word);
+    }
     bool isLowered = false;
     std::fill(m_blocked.begin(), m_blocked.end(), 0);
     size_t numActive = 0;
@@ -93,14 +99,17 @@ bool Expander::LowerAndDropIn()
         uint64_t commonOutputs = 0;
         uint64_t reachableOutputs = 0;
         for (size_t word = 0; word < numWords; ++word) {
-            const uint64_t conflicts = InputConflicts(m_space, raised, off, word);
+            const uint64_t low = kNumWords > 0 ? lows[word] : m_space.InputLow(word);
+            const uint64_t out = kNumWords > 0 ? outs[word] : m_space.Outputs(word);
+            const uint64_t common = raised[word] & off[word];
+            const uint64_t conflicts = low & ~(common | common >> 1);
             missing[word] = off[word] & conflicts * 3;
             // Of each pair in conflict one part of the off cube must still be free.
             const uint64_t open = missing[word] & free[word];
             unreachable |= conflicts & ~(open | open >> 1);
             distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
-            commonOutputs |= off[word] & raised[word] & m_space.Outputs(word);
-            reachableOutputs |= off[word] & free[word] & m_space.Outputs(word);
+            commonOutputs |= common & out;
+            reachableOutputs |= off[word] & free[word] & out;
         }
         if (unreachable != 0 || (commonOutputs | reachableOutputs) == 0)
             continue;

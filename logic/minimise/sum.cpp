@@ -1,6 +1,7 @@
 // From a table to a proved sum.
 #include "sum.h"
 
+#include <algorithm>
 #include <stdexcept>
 
 #include "unate.h"
@@ -9,9 +10,10 @@ namespace booleq {
 
 namespace {
 
-// An exact search is tried with so much work for each unit that the heuristic needed, and a little.
-constexpr uint64_t kTrialShare = 1;
+// Without --exact an exact search is tried with half of the work that the heuristic took, and a
+// little; where that took long it would need far more, so there is a limit.
 constexpr uint64_t kTrialUnits = 4u << 20;
+constexpr uint64_t kMaxTrialUnits = 8u << 20;
 
 void SetSeconds(double seconds, Work& work)
 {
@@ -76,7 +78,7 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
 {
     const uint64_t limit = work.Limit();
     if (!options.isExact)
-        work.SetLimit(work.Spent() + kTrialShare * work.Spent() / 2 + kTrialUnits);
+        work.SetLimit(work.Spent() + std::min(kMaxTrialUnits, kTrialUnits + work.Spent() / 2));
     const ExactResult exact = FindSmallestSum(problem, sum.cubes, options.goal, work);
     work.SetLimit(limit);
     work.SetDeadline(Work::Clock::time_point::max());

@@ -129,9 +129,35 @@ class TautologyCheck {
 
 } // namespace
 
+namespace {
+
+// The same for cubes of one word, which most are: nothing is looked up in the loop.
+void AppendMeetingOfWord(const CubeSpace& space, const CubeList& cubes, uint64_t by, size_t left,
+                         CubeList& target)
+{
+    const uint64_t low = space.InputLow(0);
+    const uint64_t inputs = space.Inputs(0);
+    const uint64_t outputs = space.Outputs(0);
+    const uint64_t* const words = cubes.At(0);
+    const size_t numCubes = cubes.Size();
+    for (size_t index = 0; index < numCubes; ++index) {
+        const uint64_t common = words[index] & by;
+        if ((low & ~(common | common >> 1)) != 0 || (common & outputs) == 0 || index == left)
+            continue;
+        const uint64_t cofactor = ((words[index] | ~by) & inputs) | (common & outputs);
+        target.Append(&cofactor);
+    }
+}
+
+} // namespace
+
 void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
                    CubeList& target)
 {
+    if (space.NumWords() == 1) {
+        AppendMeetingOfWord(space, cubes, by[0], left, target);
+        return;
+    }
     for (size_t index = 0; index < cubes.Size(); ++index) {
         const uint64_t* cube = cubes.At(index);
         if (index == left || IsDisjoint(space, cube, by))

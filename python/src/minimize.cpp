@@ -51,7 +51,7 @@ py::object MinimizeEquation(const Equation& equation, const py::object& dontCare
         output.free = booleq::ToExpression(dontCare.cast<const Equation&>().Get());
     }
     booleq::Work work;
-    const booleq::Pla table = TableOf({output}, InputsOf({output}), work);
+    const booleq::Pla table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
     const booleq::Sum sum = Minimised(table, Options(isExact, seconds));
     const booleq::Conversion conversion =
         Convert(ExpressionOf(table, sum.cubes, 0, false), booleq::Target::Primary, "");

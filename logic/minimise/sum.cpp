@@ -10,10 +10,11 @@ namespace booleq {
 
 namespace {
 
-// Without --exact an exact search is tried with half of the work that the heuristic took, and a
-// little; where that took long it would need far more, so there is a limit.
+// Without --exact an exact search is tried with a few times the work that the heuristic took, and a
+// little; where that was much it would need far more, so there is a limit.
+constexpr uint64_t kTrialShare = 3;
 constexpr uint64_t kTrialUnits = 4u << 20;
-constexpr uint64_t kMaxTrialUnits = 8u << 20;
+constexpr uint64_t kMaxTrialUnits = 10u << 20;
 
 void SetSeconds(double seconds, Work& work)
 {
@@ -78,7 +79,8 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
 {
     const uint64_t limit = work.Limit();
     if (!options.isExact)
-        work.SetLimit(work.Spent() + std::min(kMaxTrialUnits, kTrialUnits + work.Spent() / 2));
+        work.SetLimit(work.Spent() +
+                      std::min(kMaxTrialUnits, kTrialUnits + kTrialShare * work.Spent()));
     const ExactResult exact = FindSmallestSum(problem, sum.cubes, options.goal, work);
     work.SetLimit(limit);
     work.SetDeadline(Work::Clock::time_point::max());

@@ -25,6 +25,7 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
+constexpr uint64_t kMaxSpentForPool = 30u << 20; // where the loop took longer, more turns would too
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
 
@@ -117,6 +118,8 @@ class SmallSumSearch {
     // most a share of what has been spent before.
     void ChooseFromPool()
     {
+        if (m_work.Spent() > kMaxSpentForPool)
+            return;
         const uint64_t limit = m_work.Limit();
         m_work.SetLimit(std::min(limit, m_work.Spent() + m_work.Spent() * kPoolShare));
         bool isBySize = true;

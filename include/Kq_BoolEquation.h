@@ -12,14 +12,16 @@
 
 #include <port/Port_StringBase.h>
 
+#ifndef KQ_EXPORT // defined by the build where that is a DLL's
 #define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
+#endif
 
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
 // One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: one at a time for all calls in the process, with synchronisation in between.
+// Threads: different objects at once; const members of one at once; changing one wants it alone.
 // Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
 // new.  2. Copies share parsed nodes inside the engine, never variable values.
 class KQ_EXPORT Kq_BoolEquation {
@@ -96,7 +98,7 @@ class KQ_EXPORT Kq_BoolEquation {
 
     // The result, 0 or 1, for the current variable values; 0 without an equation.
     unsigned int Eval() const;
-    // Adds a variable behind the others; 'value' counts as 1 unless 0. A name is letters, digits
+    // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits
     // and '_', not starting with a digit, or anything that starts with ' and has a second '.
     // Fails: false for a name already there (its value stays) or not legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
@@ -137,9 +139,9 @@ struct Kq_BoolEquation::Refusal {
         OPERAND = 6, // an operand where an operator must stand
         NO_LEFT_OPERAND = 7,   // nothing on the left of this operator
         NO_RIGHT_OPERAND = 8,  // nothing on the right of this operator
-        NO_OPERAND = 9,        // nothing behind this negation
+        NO_OPERAND = 9,        // nothing after this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
-        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b behind a first 0
+        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b after a first 0
         INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
         INIT_NAME = 13 // over terms: one's name is no single token, and what it makes is refused
     };
@@ -153,13 +155,12 @@ struct Kq_BoolEquation::Refusal {
 // Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle(); // empty
-    // A value: each copy has elements of its own.
-    Handle(const Handle& other);
+    Handle();                    // empty
+    Handle(const Handle& other); // a value: each copy has elements of its own
     ~Handle();
     Handle& operator=(const Handle& other);
 
-    // The first element, and behind the last one; valid until the handle is set or destroyed.
+    // The first element, and after the last one; valid until the handle is set or destroyed.
     unsigned int* begin() { return m_values.data(); }
     const unsigned int* begin() const { return m_values.data(); }
     unsigned int* end() { return m_values.data() + m_values.size(); }

@@ -4,7 +4,8 @@
 usage: bench_table.py RESULTS... [--pairs] [--doc FILE]
 
 Reads the files of results, as Google Benchmark writes them in JSON, and prints what the library
-takes against its baselines, then how each step grows; with --pairs also every formula by itself.
+takes against its baselines, then how each step grows, and what two threads get done; with --pairs
+also every formula by itself.
 With --doc the tables, and the machine they come from, replace what FILE holds between its two
 'figures' marks.
 Times are processor time: the median of all repetitions, the shortest in brackets. Of several
@@ -61,6 +62,16 @@ TARGETS = (
 )
 GROWTH_SIZES = ("10000", "1000000")
 
+# Work of two threads to that of one in the same time, by the clock: at least this, on two cores.
+ThreadTarget = collections.namedtuple("ThreadTarget", "work name limit")
+THREAD_TARGETS = (
+    ThreadTarget("12 tokens set, 1,000 known names", "threads/set_known_names", 1.85),
+    ThreadTarget("12 tokens set, ever new names", "threads/set_new_names", 1.85),
+    ThreadTarget("6 variables set, 20 operators evaluated", "threads/eval", 1.85),
+    ThreadTarget("hexadecimal text, 6 inputs, 20 operators", "threads/hex_text_6_inputs", 1.85),
+    ThreadTarget("column, 16 inputs, 32 operators", "threads/column_16_inputs", 1.85),
+)
+
 
 class Case:
     """All repetitions of one side of one case."""
@@ -70,6 +81,7 @@ class Case:
         self.items = 1.0
         self.unit = "call"
         self.peaks = []
+        self.threads = []  # (nanoseconds of one thread, of two, ratio of work)
         self.error = None
 
     def add(self, entry):
@@ -80,6 +92,8 @@ class Case:
         self.items = entry.get("items", self.items)
         if "peak" in entry:
             self.peaks.append(entry["peak"])
+        if "two_threads" in entry:
+            self.threads.append((entry["one_thread"], entry["two_threads"], entry["ratio"]))
         for key in entry:
             if key.startswith("per_") and key != "per_family_instance_index":
                 self.unit = key[len("per_"):]
@@ -204,6 +218,21 @@ def shape_table(cases):
     return table
 
 
+def thread_table(cases):
+    table = [["two threads, objects of their own", "one thread", "two threads", "ratio of work",
+              "best", "at least", "met"]]
+    for target in THREAD_TARGETS:
+        case = cases.get(f"{target.name}/by_clock/manual_time")
+        if case and case.threads:
+            one, two, ratios = zip(*case.threads)
+            ratio = statistics.median(ratios)
+            table.append([target.work, f"{format_time(statistics.median(one))}/{case.unit}",
+                          f"{format_time(statistics.median(two))}/{case.unit}", f"{ratio:.2f}",
+                          f"{max(ratios):.2f}", f"{target.limit:g}",
+                          "yes" if ratio >= target.limit else "no"])
+    return table
+
+
 def format_text(table):
     widths = [max(len(row[column]) for row in table) for column in range(len(table[0]))]
     return "\n".join("  ".join(cell.ljust(width) for cell, width in zip(row, widths)).rstrip()
@@ -259,12 +288,14 @@ def main():
     cases, contexts = read_results(arguments.results)
     if not cases:
         sys.exit("bench_table.py: there are no results in these files")
-    targets, shapes = target_table(cases), shape_table(cases)
+    targets, shapes, threads = target_table(cases), shape_table(cases), thread_table(cases)
     run = [["run", ""]] + describe_run(contexts)
-    shown = [run[1:], targets, shapes] + ([pair_table(cases)] if arguments.pairs else [])
+    shown = [run[1:], targets, shapes, threads]
+    shown += [pair_table(cases)] if arguments.pairs else []
     print("\n\n".join(format_text(table) for table in shown if len(table) > 1))
     if arguments.doc:
-        write_document(arguments.doc, [format_markdown(table) for table in (run, targets, shapes)])
+        write_document(arguments.doc, [format_markdown(table)
+                                       for table in (run, targets, shapes, threads)])
     failed = [f"{name}: {case.error}" for name, case in cases.items() if case.error]
     for line in failed:
         print("failed:", line, file=sys.stderr)

@@ -45,7 +45,6 @@ EXHAUSTIVE = "*UpToThreeTokens*:*EveryTextOfOneByte*:*InitValues*:*UpToFiveToken
 TESTS = [
     ("unit_tests", "-Large.*"),
     ("golden_tests", "*"),
-    ("issue_tests", "*"),
     ("random_tests", "Scripts.Short*:Texts.Mutated*:Texts.*NegatedOperators*:Texts.*Dumps*"),
     ("exhaustive_tests", EXHAUSTIVE),
     ("unit_tests", "Large.*"),
@@ -72,7 +71,7 @@ SPEED_ONLY = [re.compile(text) for text in (
     r"\bhash|0x9e3779b97f4a7c15u",
     r"\w\[\d+\];",
 )]
-SKIPPED_FUNCTIONS = ("AdviseLargePages", "KqCheckStore", "RecentSlot")
+SKIPPED_FUNCTIONS = ("AdviseLargePages", "KqCheckTree")
 
 BINARY = {
     "<": ["<=", ">"], "<=": ["<"], ">": [">=", "<"], ">=": [">"], "==": ["!="], "!=": ["=="],
@@ -218,7 +217,7 @@ class Tree:
         self.source, self.build = work / "tree", work / "build"
         self.copy(root)
         self.run(["cmake", "-S", self.source, "-B", self.build, *CONFIGURE])
-        targets = [LIBRARY, *sorted({pathlib.Path(name).name for name, _ in self.tests()})]
+        targets = [LIBRARY, *sorted({pathlib.Path(name).name for name, _ in TESTS})]
         self.run(["ninja", "-C", self.build, "-j1", *targets])
         self.objects = {}  # by source or header: [(command, object)]
         self.read_commands()
@@ -226,14 +225,10 @@ class Tree:
                           for uses in self.objects.values() for _, path in uses}
         self.links = self.read_links(targets)
         self.seconds = {}
-        for test in self.tests():
+        for test in TESTS:
             started = children_seconds()
             self.run(self.test_command(test))
             self.seconds[test] = children_seconds() - started
-
-    def tests(self):
-        return [(name, selected) for name, selected in TESTS
-                if name != "issue_tests" or any((self.source / "tests/issues").glob("*.cpp"))]
 
     def copy(self, root):
         wanted = [path for top in root.iterdir() if not NOT_COPIED.fullmatch(top.name)
@@ -271,18 +266,16 @@ class Tree:
                     self.objects.setdefault(name, []).append((commands[path], path))
 
     def read_links(self, targets):
-        """(executable, command) of each link that the objects of s/ take part in."""
+        """The command of each link that objects of s/ take part in, the shared library's first."""
+        objects = {used for path, uses in self.objects.items() if path.endswith(".cpp")
+                   for _, used in uses if used.endswith(".cpp.o")}
         links = []
         for target in targets:
-            command = self.run(["ninja", "-C", self.build, "-t", "commands", target]).splitlines()[-1]
-            if "kq_boolequation_objects.dir" in command:
-                links.append(command)
-        # The shared library's link is followed by the links to its other names.
-        library = [line for line in self.run(
-            ["ninja", "-C", self.build, "-t", "commands", LIBRARY]).splitlines()
-                   if "-shared" in line and "kq_boolequation_objects.dir" in line]
-        return library + [command for command in links if command not in library
-                          and "cmake_symlink_library" not in command]
+            # The shared library's link is followed by the links to its other names.
+            links += [line for line in self.run(
+                ["ninja", "-C", self.build, "-t", "commands", target]).splitlines()
+                      if " -c " not in line and not objects.isdisjoint(line.split())]
+        return sorted(dict.fromkeys(links), key=lambda line: " -shared " not in line)
 
     def test_command(self, test):
         name, selected = test
@@ -313,7 +306,7 @@ class Tree:
                 (self.build / used).write_bytes(self.originals[used])
 
     def run_tests(self):
-        for test in self.tests():
+        for test in TESTS:
             seconds = round(max(MIN_SECONDS, SLOWDOWN * self.seconds[test]))
             try:
                 done = subprocess.run(self.test_command(test), cwd=self.build,
@@ -333,9 +326,13 @@ class Tree:
 # --- the campaign -------------------------------------------------------------------------------
 
 
+def sources(root):
+    """All sources and headers of s/, in all its folders."""
+    return sorted(path for path in (root / "s").rglob("*") if path.suffix in (".cpp", ".h"))
+
+
 def choose(root, seed, only):
-    paths = sorted(path.relative_to(root).as_posix() for path in (root / "s").iterdir()
-                   if path.suffix in (".cpp", ".h"))
+    paths = [path.relative_to(root).as_posix() for path in sources(root)]
     mutants = [mutant for path in paths for mutant in mutants_of(path, root)]
     random.Random(seed).shuffle(mutants)
     return [mutant for mutant in mutants if only in mutant.path]
@@ -369,7 +366,7 @@ def campaign(trees, mutants, count, report):
 
 
 def digest(root):
-    texts = b"".join(path.read_bytes() for path in sorted((root / "s").iterdir()))
+    texts = b"".join(path.read_bytes() for path in sources(root))
     return hashlib.sha256(texts).hexdigest()[:12]
 
 

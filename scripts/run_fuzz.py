@@ -2,8 +2,10 @@
 """Runs fuzzers one after the other and prints a table of what they did.
 
 usage: run_fuzz.py SECONDS BUILD SOURCE NAME...       run each for so many seconds
+       run_fuzz.py NUMBERx BUILD SOURCE NAME...       run each for so many executions: 1000000x, 1e8x
        run_fuzz.py --keep BUILD SOURCE NAME...        choose the inputs that SOURCE/corpus keeps
 
+Each fuzzer runs in two processes, which share what they find.
 BUILD is the folder of the executables fuzz_NAME and replay_NAME, SOURCE that of the targets. Inputs
 found are kept in BUILD/found/NAME, so that the next run goes on from there; an input that breaks
 something is told in words and lies in BUILD/findings. --keep chooses, of the inputs kept and found,
@@ -21,7 +23,8 @@ import time
 WORKERS = 2
 SECONDS_PER_INPUT = 10  # a hang is a finding
 MEGABYTES = 3072  # the pool of names keeps every name it has seen
-MAX_LENGTH = {"text": 240, "init_value": 320, "script": 400, "column": 240}
+MAX_LENGTH = {"text": 240, "init_value": 320, "script": 400, "column": 240, "lean": 80}
+DICTIONARY = {"text": "text", "lean": "text"}
 
 PROGRESS = re.compile(r"^#(\d+): cov: ", re.MULTILINE)  # the number of executions so far
 COVERED = re.compile(r"^#\d+\s+INITED cov: (\d+) ", re.MULTILINE)
@@ -42,8 +45,9 @@ class Target:
     def command(self, *options):
         command = ["nice", "-n", "10", self.fuzzer, f"-timeout={SECONDS_PER_INPUT}",
                    f"-rss_limit_mb={MEGABYTES}", f"-max_len={MAX_LENGTH[self.name]}", *options]
-        dictionary = self.source / f"{self.name}.dict"
-        return [*command, f"-dict={dictionary}"] if dictionary.exists() else command
+        if self.name in DICTIONARY:
+            command.append(f"-dict={self.source / DICTIONARY[self.name]}.dict")
+        return command
 
 
 def count_files(folder):
@@ -56,7 +60,16 @@ def describe(target, path):
     return told.stdout.rsplit("\n", 2)[0]
 
 
-def run(target, seconds):
+def read_limit(text):
+    """The option that ends a run after so many seconds, or so many executions: '60', '1e8x'."""
+    found = re.fullmatch(r"(\d+(?:e\d+)?)(x?)", text)
+    if not found:
+        sys.exit(f"run_fuzz.py: '{text}' is neither seconds (60) nor executions (1000000x, 1e8x)")
+    number = int(float(found[1]))
+    return f"-runs={number}" if found[2] else f"-max_total_time={number}"
+
+
+def run(target, limit):
     """Runs one fuzzer and gives its row of the table, and what it found."""
     before = count_files(target.found)
     log_path = target.build / f"fuzz_{target.name}.log"
@@ -64,7 +77,7 @@ def run(target, seconds):
     start = time.monotonic()
     with log_path.open("wb") as log:
         command = target.command(
-            f"-fork={WORKERS}", f"-max_total_time={seconds}", "-ignore_timeouts=0",
+            f"-fork={WORKERS}", limit, "-ignore_timeouts=0",
             "-ignore_ooms=0", f"-artifact_prefix={target.findings}/", target.found, target.kept)
         status = subprocess.run(command, stdout=log, stderr=subprocess.STDOUT, cwd=target.build,
                                 check=False).returncode
@@ -133,9 +146,10 @@ def main():
             keep(target)
         return 0
     rows, is_bad = [], False
+    limit = read_limit(sys.argv[1])
     for target in targets:
-        print(f"fuzzing {target.name} for {sys.argv[1]} s", file=sys.stderr, flush=True)
-        row, found = run(target, int(sys.argv[1]))
+        print(f"fuzzing {target.name}, {limit[1:]}", file=sys.stderr, flush=True)
+        row, found = run(target, limit)
         rows.append(row)
         is_bad = is_bad or found
     print_table(rows)

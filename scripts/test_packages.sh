@@ -2,7 +2,8 @@
 # Debian packages and a fresh clone in clean Debian 12 roots, as people meet them:
 #   user       nothing but the packages, installed by apt
 #   developer  programs built against them; when they are purged, no file is left behind
-#   newcomer   the two commands of README in a fresh clone, on Debian's minimal system
+#   newcomer   the two commands of README in a fresh clone, on Debian's minimal system, as a user
+#              whose sudo asks for a password
 # The same commit packed elsewhere gives the same bytes. All of it runs in a namespace of its own:
 # when this script ends, however it does, nothing stays mounted or running.
 # usage: test_packages.sh REPOSITORY PACKAGES DIRECTORY   as root; roots and logs go to DIRECTORY
@@ -40,6 +41,7 @@ fi
 
 base=$directory/base
 logs=$directory/logs
+password=seventeen-herons # of the newcomer, whose root is thrown away
 
 # Where this machine gets Debian 12 from, one line "URI SUITE" for each part.
 debian_sources() {
@@ -225,12 +227,50 @@ same_bytes() {
     done
 }
 
+# An ordinary user, who may use sudo with a password. The lists of packages go, because a minimal
+# system has none.
+add_newcomer() {
+    in_root newcomer 300 apt-get -q update
+    apt_get_install newcomer sudo
+    rm -rf -- "$directory"/newcomer/var/lib/apt/lists/*
+    in_root newcomer 60 useradd --create-home --groups sudo --shell /bin/bash newcomer
+    echo "newcomer:$password" | in_root newcomer 60 chpasswd
+    git clone -q -- "$repository" "$directory/newcomer/home/newcomer/repository"
+    in_root newcomer 60 chown -R newcomer: /home/newcomer
+}
+
+# Arguments: seconds, command. It runs on a terminal, where the password is typed when asked for.
+as_newcomer() {
+    local seconds=$1
+    shift
+    KQ_PASSWORD=$password python3 "$repository/scripts/type_password.py" "$seconds" \
+        chroot --userspec=newcomer:newcomer "$directory/newcomer" /usr/bin/env -i TERM=dumb \
+        HOME=/home/newcomer PATH=/usr/local/bin:/usr/bin:/bin LC_ALL=C.UTF-8 "$@"
+}
+
+# Nobody is there to type the password: a clear end, not a wait.
+newcomer_is_refused() {
+    local status=0
+    timeout -k 10 60 setsid chroot --userspec=newcomer:newcomer "$directory/newcomer" \
+        /usr/bin/env -i HOME=/home/newcomer PATH=/usr/local/bin:/usr/bin:/bin \
+        /home/newcomer/repository/dev run 'A & ~B' >"$logs/refused.txt" 2>&1 || status=$?
+    cat -- "$logs/refused.txt"
+    [ "$status" -eq 125 ]
+    grep -F 'sudo: a password is required' "$logs/refused.txt"
+    grep -F 'could not install' "$logs/refused.txt"
+}
+
 newcomer_runs() {
-    in_root newcomer 1200 /repository/dev run 'A & ~B' | grep -x 'init value hex  0x4'
+    as_newcomer 60 sudo -K
+    as_newcomer 1200 /home/newcomer/repository/dev run 'A & ~B' | tee "$logs/newcomer-run.txt"
+    grep -x 'init value hex  0x4' "$logs/newcomer-run.txt"
+    grep -x 'type_password: prompts answered: 1' "$logs/newcomer-run.txt"
 }
 
 newcomer_tests() {
-    in_root newcomer 3600 /repository/dev test | tee "$logs/newcomer.txt"
+    as_newcomer 3600 /home/newcomer/repository/dev test >"$logs/newcomer.all"
+    cat -- "$logs/newcomer.all"
+    grep -v '^type_password: ' "$logs/newcomer.all" >"$logs/newcomer.txt"
     tail -n 1 -- "$logs/newcomer.txt" | grep -E '^[0-9]+ passed, 0 failed'
 }
 
@@ -282,8 +322,10 @@ test_same_bytes() {
 
 test_newcomer() {
     make_root newcomer
-    git clone -q -- "$repository" "$directory/newcomer/repository"
-    try "a newcomer's ./dev run" newcomer_runs
+    try "an ordinary user with a password for sudo" add_newcomer
+    [ "$status" -eq 0 ] || return 0
+    try "without a terminal ./dev says what is missing" newcomer_is_refused
+    try "a newcomer's ./dev run asks for sudo's password" newcomer_runs
     try "a newcomer's ./dev test" newcomer_tests
 }
 

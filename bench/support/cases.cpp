@@ -31,9 +31,10 @@ struct Lazy {
     }
 };
 
-void Register(const std::string& name, std::shared_ptr<Lazy> lazy, Body Case::*body)
+benchmark::internal::Benchmark* Register(const std::string& name, std::shared_ptr<Lazy> lazy,
+                                         Body Case::*body)
 {
-    benchmark::RegisterBenchmark(name.c_str(), [lazy, body](benchmark::State& state) {
+    return benchmark::RegisterBenchmark(name.c_str(), [lazy, body](benchmark::State& state) {
         if (lazy->IsRight())
             (lazy->made.*body)(state);
         else
@@ -53,6 +54,11 @@ void AddPair(const std::string& name, std::function<Case()> make)
 void AddSingle(const std::string& name, std::function<Case()> make)
 {
     Register(name + "/ours", std::make_shared<Lazy>(make), &Case::ours);
+}
+
+void AddByClock(const std::string& name, std::function<Case()> make)
+{
+    Register(name + "/by_clock", std::make_shared<Lazy>(make), &Case::ours)->UseManualTime();
 }
 
 void SetItems(benchmark::State& state, double numItems, const char* unit)

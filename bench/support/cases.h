@@ -23,6 +23,9 @@ struct Case {
 void AddPair(const std::string& name, std::function<Case()> make);
 // Registers NAME/ours alone.
 void AddSingle(const std::string& name, std::function<Case()> make);
+// Registers NAME/by_clock alone, whose 'ours' tells each iteration's time itself: work of several
+// threads, which processor time cannot measure.
+void AddByClock(const std::string& name, std::function<Case()> make);
 
 // Reports the work of one iteration, so that time per item can be told: 'unit' is "token", "row".
 void SetItems(benchmark::State& state, double numItems, const char* unit);

@@ -6,6 +6,7 @@ class Port_Env { // the process environment; no objects of it are needed
   public:
     // The value of the environment variable 'name', or null when it is unset (or 'name' is null).
     // The text belongs to the environment: it is valid until the variable is changed.
+    // Threads: any, while none changes the environment.
     static const char* GetEnv(const char* name);
 };
 

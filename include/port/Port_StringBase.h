@@ -14,6 +14,7 @@ class StringBase; // only for char
 
 // A byte string of any length; bytes of value 0 may stand in it.
 // A null 'const char*' counts as the empty text.  Fails: std::bad_alloc only.
+// Threads: different strings are independent; const members of one string may run at once.
 template <>
 class StringBase<char> {
   public:
@@ -49,6 +50,10 @@ class StringBase<char> {
         m_text += character;
         return *this;
     }
+
+    // Makes room for a text of so many bytes. A host's class need not have it: where it is there,
+    // long texts are written once instead of being moved each time they have doubled.
+    void reserve(std::size_t length) { m_text.reserve(length); }
 
     // Number of bytes, a terminating 0 not counted.
     std::size_t length() const { return m_text.length(); }

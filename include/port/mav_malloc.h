@@ -4,6 +4,8 @@
 
 #include <cstddef>
 
+// Threads: any may ask and give back at any time, what another one got as well.
+
 // 'size' bytes aligned for every type, or null when there are none to be had.
 void* mav_malloc(std::size_t size);
 

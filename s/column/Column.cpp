@@ -111,7 +111,7 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels)
 }
 
 KqColumn::KqColumn(const Node* root, unsigned int numVariables)
-    : m_num_words(numVariables > 6 ? uint64_t(1) << (numVariables - 6) : 1),
+    : m_num_words(numVariables > 6 ? size_t(1) << (numVariables - 6) : 1),
       m_kernel(GetKernel().run), m_joiner(GetKernel().join)
 {
     assert(numVariables <= kKqMaxColumnVariables);
@@ -123,8 +123,9 @@ KqColumn::KqColumn(const Node* root, unsigned int numVariables)
 
 size_t KqColumn::GetNumPieceWords() const
 {
-    uint64_t numWords = m_num_words;
-    while (numWords > NumWords(kKernelLevel) && m_whole.numCodes * numWords > kPieceOperations)
+    size_t numWords = m_num_words;
+    while (numWords > NumWords(kKernelLevel) &&
+           uint64_t(m_whole.numCodes) * numWords > kPieceOperations)
         numWords /= 2;
     return numWords;
 }
@@ -218,7 +219,7 @@ void KqColumn::RunKernel(const Rest& rest, unsigned int level, uint64_t* words)
     std::memcpy(words, tile, numWords * sizeof(uint64_t));
 }
 
-// What is left of 'rest' when 'variable' is 'value'; its codes go behind all others.
+// What is left of 'rest' when 'variable' is 'value'; its codes go after all others.
 KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value)
 {
     if (m_codes.size() < m_num_codes + rest.numCodes)

@@ -48,7 +48,7 @@ class KqColumn {
     KqColumn(const Kq_BoolEquationImp::Node* root, unsigned int numVariables);
 
     // 2^numVariables / 64, at least 1.
-    uint64_t GetNumWords() const { return m_num_words; }
+    size_t GetNumWords() const { return m_num_words; }
 
     // Words of a piece that is filled within some milliseconds, or, with over 100,000 operators, of
     // the smallest that is worth fixing variables for. A power of two that divides GetNumWords().
@@ -96,7 +96,7 @@ class KqColumn {
 
     static constexpr size_t kNumWritten = 128;
 
-    uint64_t m_num_words;
+    size_t m_num_words;
     KqKernel m_kernel;
     KqJoiner m_joiner;
     std::vector<KqCode> m_codes; // the program, then what is left of it

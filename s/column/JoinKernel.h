@@ -55,7 +55,7 @@ inline void SetSteps(const KqJoinOperand& operand, unsigned int firstLevel, unsi
         steps[level - firstLevel] = stride - below;
         below += stride;
     }
-    steps[numLevels - firstLevel] = 0; // behind the last one
+    steps[numLevels - firstLevel] = 0; // after the last one
 }
 
 // All granules, 2^kNumInner of them at a time.

@@ -48,7 +48,11 @@ struct Vectors {
 
     static constexpr unsigned int kWords = kBytes / sizeof(uint64_t);
 
-    static Value Load(const uint64_t* words) { return *reinterpret_cast<const InMemory*>(words); }
+    // By reference: without vector registers, a vector as a value has no agreed way to pass.
+    static const InMemory& Load(const uint64_t* words)
+    {
+        return *reinterpret_cast<const InMemory*>(words);
+    }
     static void Store(const Value& value, uint64_t* words)
     {
         *reinterpret_cast<InMemory*>(words) = value;

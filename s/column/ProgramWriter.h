@@ -30,7 +30,7 @@ class KqValue {
     uint32_t m_word;
 };
 
-// Writes a program into a list behind 'first' codes, one value after another. Keeps the rules that
+// Writes a program into a list after 'first' codes, one value after another. Keeps the rules that
 // make programs short: no constant stands in them, and what a constant decides is taken out again.
 // The steps of a value leave the machine's stack one higher, whatever they simplify to.
 // Requires: room in the list for each step put; fewer than 2^30 of them.

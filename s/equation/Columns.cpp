@@ -30,9 +30,9 @@ std::vector<uint64_t> PackRows(const std::vector<Kq_BoolEquationImp::TruthTable:
 // Appends the column of more than six variables in pieces, from the highest row to the lowest.
 void AppendColumn(KqResults results, KqDigitsText& digits)
 {
-    std::vector<uint64_t> words(std::min<uint64_t>(kPieceWords, results.GetNumWords()));
+    std::vector<uint64_t> words(std::min(kPieceWords, results.GetNumWords()));
     digits.Reserve(results.GetNumWords());
-    for (uint64_t end = results.GetNumWords(); end > 0; end -= words.size()) {
+    for (size_t end = results.GetNumWords(); end > 0; end -= words.size()) {
         results.Fill(end - words.size(), words.size(), words.data());
         digits.AppendWords(words.data(), words.size());
     }

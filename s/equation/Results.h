@@ -20,9 +20,9 @@ class KqResults {
     }
 
     // 2^numVariables / 64, at least 1.
-    uint64_t GetNumWords() const
+    size_t GetNumWords() const
     {
-        return m_num_variables > 6 ? uint64_t(1) << (m_num_variables - 6) : 1;
+        return m_num_variables > 6 ? size_t(1) << (m_num_variables - 6) : 1;
     }
 
     // Words of a piece that is filled within some milliseconds; a power of two that divides them

@@ -24,8 +24,8 @@
 //    m_digits are the first variables of every holder. They never change while others hold them.
 //
 // Threads: const members at any time; they publish the owed tree and what evaluation keeps once,
-// complete. Others want the store alone, but for those that say so: what they change without a
-// root, loose tokens, is behind one lock of the process, which is taken for short.
+// complete. Others want the store alone, but for those that say so: the loose tokens that these
+// change are guarded by one lock of the process, which is held briefly.
 class KqStore {
   public:
     typedef Kq_BoolEquationImp::Node Node;

@@ -29,9 +29,9 @@ void AppendRows(KqResults results, std::vector<unsigned int>& values, std::vecto
     uint64_t words[kWords];
     const uint32_t numRows = uint32_t(1) << values.size();
     for (uint32_t rowIndex = 0; rowIndex < numRows; ++rowIndex) {
-        const uint64_t word = rowIndex / 64;
+        const size_t word = rowIndex / 64;
         if (rowIndex % (64 * kWords) == 0)
-            results.Fill(word, std::min<uint64_t>(kWords, results.GetNumWords() - word), words);
+            results.Fill(word, std::min(kWords, results.GetNumWords() - word), words);
         SetRowValues(rowIndex, values);
         rows.emplace_back(words[word % kWords] >> (rowIndex % 64) & 1u, values);
     }

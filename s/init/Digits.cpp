@@ -276,7 +276,7 @@ unsigned int KqDigits::Eval(const Variables& variables) const
     uint64_t row = 0;
     for (size_t index = 0; index < m_names.size(); ++index)
         row = row << 1 | variables[index].second;
-    return m_words[row / 64] >> (row % 64) & 1u;
+    return m_words[WordOf(row)] >> (row % 64) & 1u;
 }
 
 void KqDigits::Fill(unsigned int numVariables, uint64_t firstWord, size_t numWords,
@@ -291,7 +291,7 @@ void KqDigits::Fill(unsigned int numVariables, uint64_t firstWord, size_t numWor
     }
     for (uint64_t word = firstWord; word < firstWord + numWords; ++word) {
         const uint64_t row = word * 64 >> level;
-        uint64_t results = m_words[row / 64] >> (row % 64);
+        uint64_t results = m_words[WordOf(row)] >> (row % 64);
         for (unsigned int doubled = 0; doubled < std::min(level, 6u); ++doubled)
             results = DoubleBits(results);
         *words++ = results;

@@ -72,17 +72,17 @@ class KqDigits {
         if (m_is_first_lowest) {
             for (uint64_t digit = 0; digit < m_num_digits; ++digit) {
                 const uint64_t row = ReverseBits(digit);
-                if ((GetTermRows(row / 64) >> (row % 64) & 1u) != 0)
+                if ((GetTermRows(WordOf(row)) >> (row % 64) & 1u) != 0)
                     visit(row);
             }
             return;
         }
-        for (uint64_t word = 0; word * 64 < m_num_digits; ++word) {
-            uint64_t rows = GetTermRows(word);
-            if (m_num_digits - word * 64 < 64)
+        for (uint64_t first = 0; first < m_num_digits; first += 64) {
+            uint64_t rows = GetTermRows(WordOf(first));
+            if (m_num_digits - first < 64)
                 rows &= (uint64_t(1) << m_num_digits % 64) - 1;
             for (; rows != 0; rows &= rows - 1)
-                visit(word * 64 + static_cast<uint64_t>(__builtin_ctzll(rows)));
+                visit(first + static_cast<uint64_t>(__builtin_ctzll(rows)));
         }
     }
 
@@ -112,7 +112,9 @@ class KqDigits {
 
     bool ReadDigits(unsigned int bitsPerDigit);
     void ChooseForm();
-    uint64_t GetTermRows(uint64_t word) const { return m_is_sum ? m_words[word] : ~m_words[word]; }
+    // The word that holds a row. All digits are in memory, so its index fits where rows do not.
+    static size_t WordOf(uint64_t row) { return static_cast<size_t>(row / 64); }
+    uint64_t GetTermRows(size_t word) const { return m_is_sum ? m_words[word] : ~m_words[word]; }
     void AddMissingRows();
     void ReverseRows();
     void AppendTerm(uint64_t row, std::string& text) const;

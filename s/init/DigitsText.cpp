@@ -1,4 +1,4 @@
-// Words in, digits out, eight at a time in one machine word.
+// Words in, digits out, in pieces that stay in the processor's cache.
 // Fails: std::bad_alloc.  Cost: O(digits), of which the host's string takes the larger part.
 #include "DigitsText.h"
 
@@ -12,37 +12,53 @@ constexpr char kLowerDigits[] = "0123456789abcdef";
 constexpr char kUpperDigits[] = "0123456789ABCDEF";
 
 // Words whose digits go to the string at a time, from a buffer in the processor's cache.
-constexpr size_t kPieceWords = 64;
+constexpr size_t kPieceWords = 256;
 
-constexpr uint64_t kEachByte = 0x0101010101010101u;
+// The binary digits of a byte of the column, the highest row first.
+struct ByteDigits {
+    char digits[256][8];
+};
 
-// Writes the lowest byte of 'bytes' last.
-void StoreReversed(uint64_t bytes, char* text)
+constexpr ByteDigits MakeByteDigits()
 {
+    ByteDigits table = {};
+    for (unsigned int byte = 0; byte < 256; ++byte) {
+        for (unsigned int digit = 0; digit < 8; ++digit)
+            table.digits[byte][digit] = (byte >> (7 - digit) & 1u) != 0 ? '1' : '0';
+    }
+    return table;
+}
+
+constexpr ByteDigits kBinaryDigits = MakeByteDigits();
+
+// The bytes of the words, the last word's highest first.
+void ReverseBytes(const uint64_t* words, size_t numWords, unsigned char* bytes)
+{
+    for (size_t word = numWords; word-- > 0; bytes += sizeof(uint64_t)) {
+        uint64_t reversed = words[word];
 #if __BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__
-    bytes = __builtin_bswap64(bytes);
+        reversed = __builtin_bswap64(reversed);
 #endif
-    std::memcpy(text, &bytes, sizeof bytes);
+        std::memcpy(bytes, &reversed, sizeof reversed);
+    }
 }
 
-// The hexadecimal digits of 32 rows, lowest digit in the lowest byte. 'letter' is the distance from
-// the digit after 9 to the one that stands for 10.
-uint64_t HexDigits(uint32_t rows, uint64_t letter)
+// Two digits for each byte. 'letter' is how far the digit that stands for 10 is beyond where the
+// others would go on. Written so that the compiler makes it work on many bytes at a time.
+void WriteHex(const unsigned char* bytes, size_t numBytes, unsigned char letter, char* text)
 {
-    uint64_t nibbles = rows;
-    nibbles = (nibbles | nibbles << 16) & 0x0000ffff0000ffffu;
-    nibbles = (nibbles | nibbles << 8) & 0x00ff00ff00ff00ffu;
-    nibbles = (nibbles | nibbles << 4) & 0x0f0f0f0f0f0f0f0fu;
-    const uint64_t isLetter = (nibbles + 6 * kEachByte) >> 4 & kEachByte;
-    return nibbles + '0' * kEachByte + isLetter * letter;
+    for (size_t byte = 0; byte < numBytes; ++byte) {
+        const unsigned char high = bytes[byte] >> 4;
+        const unsigned char low = bytes[byte] & 15;
+        text[2 * byte] = static_cast<char>(high + '0' + (high > 9 ? letter : 0));
+        text[2 * byte + 1] = static_cast<char>(low + '0' + (low > 9 ? letter : 0));
+    }
 }
 
-// The binary digits of 8 rows, lowest row in the lowest byte.
-uint64_t BinaryDigits(uint64_t rows)
+void WriteBinary(const unsigned char* bytes, size_t numBytes, char* text)
 {
-    // Each byte keeps the bit of its own number, which then makes it 1 or 0.
-    const uint64_t kept = rows * kEachByte & 0x8040201008040201u;
-    return ((kept + 0x7f * kEachByte) >> 7 & kEachByte) + '0' * kEachByte;
+    for (size_t byte = 0; byte < numBytes; ++byte)
+        std::memcpy(text + 8 * byte, kBinaryDigits.digits[bytes[byte]], 8);
 }
 
 } // namespace
@@ -63,24 +79,19 @@ void KqDigitsText::AppendFewRows(uint64_t word, unsigned int numVariables)
 
 void KqDigitsText::AppendWords(const uint64_t* words, size_t numWords)
 {
-    constexpr uint64_t kLower = 'a' - '9' - 1;
-    constexpr uint64_t kUpper = 'A' - '9' - 1;
-    const uint64_t letter = m_upper_case ? kUpper : kLower;
-    char buffer[kPieceWords * 64 + 1];
+    constexpr unsigned char kLower = 'a' - '9' - 1;
+    constexpr unsigned char kUpper = 'A' - '9' - 1;
+    unsigned char bytes[kPieceWords * 8];
+    char text[kPieceWords * 64 + 1];
     while (numWords > 0) {
-        char* end = buffer;
-        for (size_t left = std::min(numWords, kPieceWords); left > 0; --left) {
-            const uint64_t word = words[--numWords];
-            if (m_base == KQ_HEXADECIMAL) {
-                StoreReversed(HexDigits(static_cast<uint32_t>(word >> 32), letter), end);
-                StoreReversed(HexDigits(static_cast<uint32_t>(word), letter), end + 8);
-                end += 16;
-                continue;
-            }
-            for (unsigned int byte = 8; byte-- > 0; end += 8)
-                StoreReversed(BinaryDigits(word >> (8 * byte) & 0xffu), end);
-        }
-        *end = '\0';
-        m_text += buffer;
+        const size_t size = std::min(numWords, kPieceWords);
+        numWords -= size;
+        ReverseBytes(words + numWords, size, bytes);
+        if (m_base == KQ_HEXADECIMAL)
+            WriteHex(bytes, 8 * size, m_upper_case ? kUpper : kLower, text);
+        else
+            WriteBinary(bytes, 8 * size, text);
+        text[size * 64 / m_base] = '\0';
+        m_text += text;
     }
 }

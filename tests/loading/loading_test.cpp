@@ -1,8 +1,14 @@
 // The library is loaded and unloaded with a plug-in, again and again: it goes completely, leaves
-// nothing behind, and reads the debug switch each time. This program itself is not linked to it.
+// nothing there, and reads the debug switch each time; by several threads as well. This program
+// itself is not linked to it.
+#include <atomic>
+#include <condition_variable>
 #include <cstdlib>
 #include <dlfcn.h>
 #include <malloc.h>
+#include <mutex>
+#include <thread>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -18,15 +24,22 @@ bool IsLoaded(const char* path)
     return library != nullptr;
 }
 
+// The loader has a lock too, but the thread sanitizer does not know it: without this one it would
+// take two lives of the library at one address for one.
+std::mutex s_loader;
+
 class Plugin {
   public:
-    Plugin() : m_plugin(dlopen(KQ_TEST_PLUGIN, RTLD_NOW | RTLD_LOCAL))
+    Plugin() : m_plugin(nullptr)
     {
+        const std::lock_guard<std::mutex> locked(s_loader);
+        m_plugin = dlopen(KQ_TEST_PLUGIN, RTLD_NOW | RTLD_LOCAL);
         if (!m_plugin)
             ADD_FAILURE() << dlerror();
     }
     ~Plugin()
     {
+        const std::lock_guard<std::mutex> locked(s_loader);
         if (m_plugin)
             dlclose(m_plugin);
     }
@@ -54,12 +67,14 @@ TEST(Loading, LoadedAndUnloadedManyTimes)
         {
             const Plugin plugin;
             ASSERT_TRUE(IsLoaded(KQ_TEST_LIBRARY));
+            ASSERT_TRUE(IsLoaded(KQ_TEST_HOST_LIBRARY));
             EXPECT_TRUE(plugin.Use(round));
         }
         if (round == 20) // what the loader itself keeps is there by now
             numBytes = mallinfo2().uordblks;
     }
     EXPECT_FALSE(IsLoaded(KQ_TEST_LIBRARY));
+    EXPECT_FALSE(IsLoaded(KQ_TEST_HOST_LIBRARY)) << "nothing in it is unique in the process";
     // A life of the library that left its pool of names behind would cost a kilobyte.
     EXPECT_LE(mallinfo2().uordblks, numBytes + 80 * 100);
 }
@@ -73,6 +88,77 @@ TEST(Loading, StaysWhileSomebodyHasIt)
     }
     EXPECT_TRUE(IsLoaded(KQ_TEST_LIBRARY));
     EXPECT_TRUE(first.Use(2));
+}
+
+// Now one thread has it, now another, now several or none.
+TEST(LoadingThreads, LoadUseAndUnload)
+{
+    std::atomic<int> numWrong{0};
+    std::vector<std::thread> threads;
+    for (int thread = 0; thread < 4; ++thread) {
+        threads.emplace_back([&numWrong, thread] {
+            for (int round = 0; round < 50; ++round) {
+                const Plugin plugin;
+                numWrong += !plugin.Use(4 * round + thread);
+            }
+        });
+    }
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(0, numWrong);
+    EXPECT_FALSE(IsLoaded(KQ_TEST_LIBRARY));
+    EXPECT_FALSE(IsLoaded(KQ_TEST_HOST_LIBRARY));
+}
+
+// A thread that has used the library runs on, and ends when the library is no more: what was kept
+// for it must not need any code then, and must not pile up while it lives.
+TEST(LoadingThreads, OutliveTheLibrary)
+{
+    std::mutex lock;
+    std::condition_variable changed;
+    int numLoaded = 0; // odd while it is loaded
+    const Plugin* current = nullptr;
+    std::atomic<int> numWrong{0};
+    const int kNumRounds = 100;
+    std::thread lasting([&] {
+        std::unique_lock<std::mutex> locked(lock);
+        for (int round = 0; round < kNumRounds; ++round) {
+            changed.wait(locked, [&] { return numLoaded == 2 * round + 1; });
+            numWrong += !current->Use(round);
+            ++numLoaded;
+            changed.notify_all();
+        }
+    });
+    size_t numBytes = 0;
+    for (int round = 0; round < kNumRounds; ++round) {
+        std::thread brief;
+        std::atomic<bool> mayEnd{false};
+        {
+            const Plugin plugin;
+            std::unique_lock<std::mutex> locked(lock);
+            current = &plugin;
+            ++numLoaded;
+            changed.notify_all();
+            changed.wait(locked, [&] { return numLoaded == 2 * round + 2; });
+            std::atomic<bool> hasUsed{false};
+            brief = std::thread([&] {
+                numWrong += !plugin.Use(round);
+                hasUsed = true;
+                while (!mayEnd)
+                    std::this_thread::yield();
+            });
+            while (!hasUsed)
+                std::this_thread::yield();
+        }
+        EXPECT_FALSE(IsLoaded(KQ_TEST_LIBRARY)) << round;
+        mayEnd = true;
+        brief.join();
+        if (round == 20)
+            numBytes = mallinfo2().uordblks;
+    }
+    lasting.join();
+    EXPECT_EQ(0, numWrong);
+    EXPECT_LE(mallinfo2().uordblks, numBytes + 80 * 100);
 }
 
 TEST(Loading, DebugSwitchIsReadWheneverTheLibraryIsLoaded)

@@ -1,10 +1,11 @@
 #!/usr/bin/env python3
 """Checks that every exported public member is an operation whose allocations are made to fail.
 
-usage: check_operations.py LIBRARY HEADERS SOURCE...
+usage: check_operations.py [--const] LIBRARY HEADERS SOURCE...
 
 Public members are those that HEADERS, a folder, declares outside of a private part; what is private
 is reached through them. SOURCE holds the operations, named as the symbol table has them.
+With --const only members count that change nothing: those that threads may ask one object at once.
 Prints a line for each member without an operation, and for each operation whose member is no more.
 Exit status: 1 when something was found.
 """
@@ -47,10 +48,13 @@ def exported_functions(library):
 
 
 def main():
-    library, headers, *sources = sys.argv[1:]
+    arguments = sys.argv[1:]
+    is_const = arguments[0] == "--const"
+    library, headers, *sources = arguments[is_const:]
     public = set(public_members(pathlib.Path(headers)))
     exported = {name for name in exported_functions(library)
-                if name not in PRIVATE and re.match(r"(.*?[^:\s])\(", name)[1] in public}
+                if name not in PRIVATE and re.match(r"(.*?[^:\s])\(", name)[1] in public
+                and (name.endswith(") const") or not is_const)}
     text = "".join(pathlib.Path(source).read_text(encoding="utf-8") for source in sources)
     text = re.sub(r'"\s*\n\s*"', "", text)  # names that take two lines
     operations = set(re.findall(r'\{"(Kq_\w+::[^"]*\)(?: const)?)",', text))

@@ -1,5 +1,6 @@
 #include "random/failing_memory.h"
 
+#include <atomic>
 #include <cstdlib>
 #include <cstring>
 #include <malloc.h>
@@ -9,11 +10,13 @@
 
 namespace {
 
-size_t s_numAllocations = 0;
-size_t s_numRawAllocations = 0;
-size_t s_numLive = 0;
-bool s_isArmed = false;
-size_t s_numUntilFailure = 0;
+// Counted and nothing else: no order between threads may come from them, it would hide races.
+constexpr std::memory_order kCountOnly = std::memory_order_relaxed;
+std::atomic<size_t> s_numAllocations{0};
+std::atomic<size_t> s_numRawAllocations{0};
+std::atomic<size_t> s_numLive{0};
+thread_local bool s_isArmed = false;
+thread_local size_t s_numUntilFailure = 0;
 
 void* AllocateOrNull(size_t size)
 {
@@ -24,8 +27,8 @@ void* AllocateOrNull(size_t size)
     void* memory = std::malloc(size ? size : 1);
     if (!memory)
         return nullptr;
-    ++s_numLive;
-    ++s_numAllocations;
+    s_numLive.fetch_add(1, kCountOnly);
+    s_numAllocations.fetch_add(1, kCountOnly);
     return memory;
 }
 
@@ -41,7 +44,7 @@ void Free(void* memory) noexcept
 {
     if (!memory)
         return;
-    --s_numLive;
+    s_numLive.fetch_sub(1, kCountOnly);
     // Large blocks are given back to the system anyway.
     const size_t size = malloc_usable_size(memory);
     if (size <= 4096)
@@ -53,17 +56,17 @@ void Free(void* memory) noexcept
 
 size_t memory::NumAllocations()
 {
-    return s_numAllocations;
+    return s_numAllocations.load(kCountOnly);
 }
 
 size_t memory::NumRawAllocations()
 {
-    return s_numRawAllocations;
+    return s_numRawAllocations.load(kCountOnly);
 }
 
 size_t memory::NumLive()
 {
-    return s_numLive;
+    return s_numLive.load(kCountOnly);
 }
 
 memory::FailingAllocation::FailingAllocation(size_t numBefore)
@@ -105,7 +108,7 @@ void operator delete[](void* memory, size_t) noexcept
 // An executable's own definition comes before the host library's.
 void* mav_malloc(size_t size)
 {
-    ++s_numRawAllocations;
+    s_numRawAllocations.fetch_add(1, kCountOnly);
     return AllocateOrNull(size);
 }
 

@@ -1,6 +1,7 @@
 // Memory whose n-th allocation fails: the global operator new and the host's raw memory, replaced
 // for the whole executable. Both count, so leaks show; freed memory is overwritten, so that what
 // is still used by mistake does not look whole.
+// Threads: any; counts are of all threads together, and each makes its own allocations fail.
 #ifndef FAILING_MEMORY_H
 #define FAILING_MEMORY_H
 
@@ -14,7 +15,8 @@ size_t NumLive();
 // Allocations of the host's raw memory, mav_malloc, so far.
 size_t NumRawAllocations();
 
-// While it lives, allocation number 'numBefore', counted from 0, fails; those behind it do not.
+// While it lives, allocation number 'numBefore' of this thread, counted from 0, fails; those after
+// it do not.
 class FailingAllocation {
   public:
     explicit FailingAllocation(size_t numBefore);

@@ -40,6 +40,12 @@ class Player {
     Player& operator=(const Player&) = delete;
 
     std::string Play(const Step& step);
+    // Makes an object a copy of one from elsewhere.
+    void Take(size_t object, const typename Side::Equation& equation)
+    {
+        m_may_build[object] = false;
+        Replace(object, new Equation(equation));
+    }
     // What can be seen of an object without changing it or printing anything.
     std::string Look(size_t object) const;
 

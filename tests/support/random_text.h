@@ -3,6 +3,7 @@
 #ifndef SUPPORT_RANDOM_TEXT_H
 #define SUPPORT_RANDOM_TEXT_H
 
+#include <cstdint>
 #include <random>
 #include <string>
 #include <vector>
@@ -15,6 +16,7 @@ class RandomText {
 
     // 0 to limit - 1.  Requires: limit > 0.
     size_t Below(size_t limit) { return static_cast<size_t>(m_engine()) % limit; }
+    uint32_t Any() { return static_cast<uint32_t>(m_engine()); }
     bool Chance(size_t percent) { return Below(100) < percent; }
     const std::string& OneOf(const std::vector<std::string>& texts)
     {

@@ -19,8 +19,8 @@ std::string CompareNodeEval(unsigned int seed, const reference::Equation& model,
         std::vector<std::pair<Port::StringBase<char>, unsigned int>> table;
         const size_t numEntries = model.GetNumVariables() + (round == 3 ? 0 : 1);
         while (values.size() + 1 < numEntries) {
-            values.push_back(
-                static_cast<unsigned int>(random.Below(round == 0 ? 4 : size_t(1) << 32)));
+            values.push_back(round == 0 ? static_cast<unsigned int>(random.Below(4))
+                                        : random.Any());
             table.push_back({"unused", values.back()});
         }
         const reference::Store& store = model.GetStore();

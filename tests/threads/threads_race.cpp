@@ -1,31 +1,67 @@
-// Two threads without a lock, on equations that look independent: what README says not to do.
-// usage: threads_race names|copies|program: what they share unknowingly.
-#include <string>
+// Two threads, one object, and at least one of them changes it: what no program may do, and what
+// the thread sanitizer must see. usage: threads_race RACE, the name of an entry of kRaces.
+#include <atomic>
+#include <cstring>
 #include <thread>
 
 #include <Kq_BoolEquation.h>
 
+namespace {
+
+struct Objects {
+    Kq_BoolEquation equation{"A & B"};
+    Kq_BoolEquation other{"C ^ (D | E)"};
+    Kq_BoolEquation::TruthTable table{Kq_BoolEquation("A | B")};
+};
+
+struct Race {
+    const char* name;
+    void (*first)(Objects& objects);
+    void (*second)(Objects& objects);
+};
+
+void Set(Objects& o)
+{
+    o.equation.SetEquation("A & ~B");
+}
+
+const Race kRaces[] = {
+    {"set_and_set", Set, Set},
+    {"set_and_ask", Set, [](Objects& o) { o.equation.GetEquation(false); }},
+    {"value_and_eval", [](Objects& o) { o.equation.SetVariable("A", 1); },
+     [](Objects& o) { o.equation.Eval(); }},
+    {"assign_and_copy", [](Objects& o) { o.equation = o.other; },
+     [](Objects& o) { const Kq_BoolEquation copy(o.equation); }},
+    {"define_and_list", [](Objects& o) { o.equation.DefineVariable("C", 1); },
+     [](Objects& o) { o.equation.GetInitValueTermEquation(); }},
+    {"table_and_rows", [](Objects& o) { o.table = o.other; },
+     [](Objects& o) { o.table.GetRows(); }},
+};
+
+void Run(const Race& race)
+{
+    Objects objects;
+    std::atomic<int> numReady{0};
+    const auto repeat = [&objects, &numReady](void (*use)(Objects&)) {
+        for (++numReady; numReady < 2;)
+            std::this_thread::yield();
+        for (int round = 0; round < 1000; ++round)
+            use(objects);
+    };
+    std::thread other([&] { repeat(race.first); });
+    repeat(race.second);
+    other.join();
+}
+
+} // namespace
+
 int main(int argc, char** argv)
 {
-    const std::string race = argc == 2 ? argv[1] : "";
-    Kq_BoolEquation first("A & B");
-    Kq_BoolEquation second(first);
-    if (race == "names")
-        first.SetEquation("C"); // nodes of its own: the pool of names is left
-
-    const auto use = [&race](Kq_BoolEquation& equation) {
-        for (int round = 0; round < 1000; ++round) {
-            if (race == "names") {
-                equation.SetEquation(("name" + std::to_string(round)).c_str());
-            } else if (race == "copies") {
-                const Kq_BoolEquation copy(equation); // counts the holders of the nodes
-            } else {
-                equation.Eval(); // const, but keeps what it finds out with the nodes
-            }
+    for (const Race& race : kRaces) {
+        if (argc == 2 && std::strcmp(argv[1], race.name) == 0) {
+            Run(race);
+            return 0;
         }
-    };
-    std::thread other([&] { use(first); });
-    use(second);
-    other.join();
-    return 0;
+    }
+    return 2;
 }

@@ -18,15 +18,17 @@ BAD = {
 }
 
 
-def failures(text):
+def failures(text, differing=frozenset()):
     with contextlib.redirect_stdout(io.StringIO()):
-        return run_cases.check(run_cases.read_cases(text)[1], "/bin/sh", "1.0")
+        return run_cases.check(run_cases.read_cases(text)[1], "/bin/sh", "1.0", differing)
 
 
 def main():
     assert failures(GOOD) == 0
     for name, text in BAD.items():
         assert failures(text) == 1, name
+    assert failures(BAD["another output"], {"good"}) == 0
+    assert failures(GOOD, {"good"}) == 1
     for text in ("|text before a case\n", "= no command\n|a\n", GOOD + "stray\n"):
         try:
             run_cases.read_cases(text)

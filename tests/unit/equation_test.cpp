@@ -117,6 +117,64 @@ TEST(Equation, ClearOfACopyLeavesTheOthers)
     EXPECT_EQ(0u, a.Eval());
 }
 
+// References into the variable list stay good.
+TEST(Equation, AssignmentToItselfMovesNothing)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("A & B"));
+    const Engine* const self = &engine;
+    const void* const variables = engine.GetVariables().data();
+    const char* const name = engine.GetVariables()[0].first.c_str();
+    const Node* const root = engine.GetRoot();
+    engine = *self;
+    engine.Copy(*self);
+    EXPECT_EQ(variables, engine.GetVariables().data());
+    EXPECT_EQ(name, engine.GetVariables()[0].first.c_str());
+    EXPECT_EQ(root, engine.GetRoot());
+
+    Kq_BoolEquation equation("A & B");
+    const Kq_BoolEquation* const itself = &equation;
+    const void* const entries = equation.GetVariables().data();
+    equation = *itself;
+    equation.Copy(*itself);
+    equation.SetEquationFromEquation(*itself);
+    EXPECT_EQ(entries, equation.GetVariables().data());
+
+    Engine::TruthTable table = engine.GetTruthTable();
+    const Engine::TruthTable* const sameTable = &table;
+    const void* const rows = table.GetRows().data();
+    const void* const names = table.GetVariableNames().data();
+    table = *sameTable;
+    EXPECT_EQ(rows, table.GetRows().data());
+    EXPECT_EQ(names, table.GetVariableNames().data());
+}
+
+TEST(Equation, VariableListKeepsItsCapacity)
+{
+    Engine engine;
+    ASSERT_TRUE(engine.SetEquation("a|b|c|d|e|f|g|h|i|j|k|l|m|n|o|p|q"));
+    const size_t capacity = engine.GetVariables().capacity();
+    ASSERT_GE(capacity, 17u);
+    const auto expectKept = [&](const char* after) {
+        EXPECT_EQ(capacity, engine.GetVariables().capacity()) << after;
+    };
+    engine.Clear();
+    expectKept("Clear");
+    EXPECT_TRUE(engine.SetEquationWithExplicitTerms({"A", "B"}, "A & B", false, false));
+    expectKept("an expression over terms");
+    EXPECT_TRUE(engine.SetEquationWithExplicitTerms({"A", "B"}, "0x8", false, false));
+    expectKept("an init value over terms");
+    EXPECT_TRUE(engine.SetEquation("0x6"));
+    expectKept("an init value");
+    EXPECT_TRUE(engine.SetEquation("A"));
+    expectKept("an expression");
+    const Messages messages;
+    EXPECT_FALSE(engine.SetEquationWithExplicitTerms({"A", "B"}, "A & (", false, false));
+    expectKept("a refused text");
+    EXPECT_FALSE(engine.SetEquationWithExplicitTerms({"A", "B"}, "0x888", false, false));
+    expectKept("a refused init value");
+}
+
 TEST(Equation, AssignmentToItselfAndToACopyChangesNothing)
 {
     Engine a;

@@ -201,6 +201,32 @@ TEST(Tree, TopNotOfANegatedOperatorKeepsItsParentLink)
     EXPECT_EQ(nullptr, engine.GetRoot()->GetParent());
 }
 
+// The dump of the node that broke a build ends before its bytes exceed one MiB, after a whole line.
+TEST(Tree, FailureDumpIsWholeUpToOneMebibyte)
+{
+    for (const size_t length : {40000u, 200000u, 2000000u}) {
+        const std::string name(length, 'a');
+        std::string text; // six names in a row: the first one breaks the tree
+        for (const char* last : {"b ", "c ", "d ", "e ", "f ", "g "})
+            text += name + last;
+        const Messages messages;
+        Engine engine;
+        EXPECT_FALSE(engine.SetEquation(text.c_str()));
+        const std::string end = "NODE: ...\n";
+        const std::string& dump = messages.Text();
+        EXPECT_LE(dump.size(), (size_t(1) << 20) + end.size());
+        const bool isCut =
+            dump.size() >= end.size() && dump.substr(dump.size() - end.size()) == end;
+        EXPECT_EQ(length > 40000u, isCut);
+        if (isCut && dump.size() > end.size()) {
+            EXPECT_EQ('\n', dump[dump.size() - end.size() - 1]);
+        }
+        if (length == 200000u) { // the next line would have exceeded it
+            EXPECT_GT(dump.size() + length, size_t(1) << 20);
+        }
+    }
+}
+
 // A list that outlives the failure, because another object shares it, is one of loose tokens again.
 TEST(Tree, ListThatFailedCanBeBuiltAgain)
 {

@@ -2,8 +2,17 @@
 // Command line, file or standard input in; answers on standard output, complaints on standard
 // error, one of the statuses of status.h out.
 #include <csignal>
+#include <cstdio>
 #include <new>
 #include <optional>
+
+#ifdef _WIN32
+#include <fcntl.h>
+#include <io.h>
+
+extern "C" int _dowildcard;
+int _dowildcard = 0; // an argument is an equation: its * names no files
+#endif
 
 #include "messages.h"
 #include "options.h"
@@ -45,6 +54,19 @@ int Fail(const char* message, const char* more = "")
     return kWrongUsage;
 }
 
+void PrepareProcess()
+{
+#ifdef _WIN32
+    // The same bytes as elsewhere: a line feed stays one byte, and a control-Z ends nothing.
+    for (std::FILE* stream : {stdin, stdout, stderr})
+        _setmode(_fileno(stream), _O_BINARY);
+#else
+    // A reader that has gone is an error like a full disk, with a message and a status.
+    std::signal(SIGPIPE, SIG_IGN);
+#endif
+    HandleInterrupts();
+}
+
 } // namespace
 
 } // namespace booleq
@@ -52,9 +74,7 @@ int Fail(const char* message, const char* more = "")
 int main(int argc, char** argv)
 {
     using namespace booleq;
-    // A reader that has gone is an error like a full disk, with a message and a status.
-    std::signal(SIGPIPE, SIG_IGN);
-    HandleInterrupts();
+    PrepareProcess();
     try {
         Output output(stdout);
         const std::vector<std::string> arguments(argv + (argc > 0 ? 1 : 0), argv + argc);

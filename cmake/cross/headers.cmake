@@ -1,0 +1,15 @@
+# A target for one folder of headers in /usr/include. A link shows it alone: the other headers there
+# belong to this machine's C library.
+function(kq_headers_of_this_machine package target folder)
+  if(NOT IS_DIRECTORY "/usr/include/${folder}")
+    set(${package}_FOUND FALSE PARENT_SCOPE)
+    return()
+  endif()
+  set(shown "${CMAKE_BINARY_DIR}/headers/${package}")
+  file(MAKE_DIRECTORY "${shown}")
+  file(CREATE_LINK "/usr/include/${folder}" "${shown}/${folder}" SYMBOLIC)
+  if(NOT TARGET ${target})
+    add_library(${target} INTERFACE IMPORTED)
+    target_include_directories(${target} INTERFACE "${shown}")
+  endif()
+endfunction()

@@ -1,0 +1,17 @@
+#!/bin/sh
+# Runs a Windows program under Wine, with a Wine folder of its own and the compiler's libraries.
+# usage: wine.sh FOLDER PROGRAM [ARGUMENT...], or FOLDER --start or --stop: makes the folder, and keeps
+# Wine's services running from one program to the next, so that none is started in a test
+set -eu
+export WINEPREFIX="$1" WINEDEBUG=-all WINEDLLOVERRIDES='mscoree,mshtml='
+shift
+libraries=$(dirname "$(x86_64-w64-mingw32-g++-posix -print-file-name=libstdc++-6.dll)")
+export WINEPATH="$libraries;/usr/x86_64-w64-mingw32/lib"
+case $1 in
+--start)
+    wineserver --persistent=300 # seconds, if nothing stops them
+    exec wine wineboot --init
+    ;;
+--stop) exec wineserver --kill --wait ;;
+esac
+exec wine "$@"

@@ -6,7 +6,7 @@ find_package(Python3 REQUIRED COMPONENTS Interpreter)
 set(kq_docs_script "${CMAKE_CURRENT_SOURCE_DIR}/scripts/build_docs.py")
 set(kq_docs_dir "${CMAKE_CURRENT_BINARY_DIR}/documentation")
 file(GLOB kq_docs_sources CONFIGURE_DEPENDS
-    *.md include/*.h include/port/*.h docs/* docs/pictures/*)
+    *.md include/*.h include/kq_logic/*.h include/port/*.h docs/* docs/pictures/*)
 add_custom_command(OUTPUT "${kq_docs_dir}/index.html"
     COMMAND Python3::Interpreter "${kq_docs_script}" "${CMAKE_CURRENT_SOURCE_DIR}" "${kq_docs_dir}"
     DEPENDS ${kq_docs_sources} CMakeLists.txt "${kq_docs_script}" scripts/doc_filter.py

@@ -1,7 +1,7 @@
 # Installation: the library, its headers, the CMake package, the pkg-config file and the documents.
 # All of it may be moved to another place afterwards, except that a ready-made host library stays
-# where it was. Every install() of this repository names its component: library, development, tool,
-# python or documentation. cmake/Packages.cmake makes a package of each.
+# where it was. Every install() of this repository names its component: library, development, logic,
+# logic_development, tool, python or documentation. cmake/Packages.cmake makes a package of each.
 set(kq_package_dir "${CMAKE_INSTALL_LIBDIR}/cmake/KqBoolEquation")
 set(kq_generated_dir "${CMAKE_CURRENT_BINARY_DIR}/package")
 
@@ -25,6 +25,19 @@ install(FILES
     "${kq_generated_dir}/KqBoolEquationConfig.cmake"
     "${kq_generated_dir}/KqBoolEquationConfigVersion.cmake"
     DESTINATION ${kq_package_dir} COMPONENT development)
+
+if(KQ_BUILD_LOGIC)
+  install(TARGETS kq_logic EXPORT KqBoolLogicTargets
+      LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT logic
+              NAMELINK_COMPONENT logic_development
+      ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT logic_development
+      RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT logic)
+  list(TRANSFORM kq_logic_headers PREPEND include/ OUTPUT_VARIABLE kq_logic_header_files)
+  install(FILES ${kq_logic_header_files} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/kq_logic
+      COMPONENT logic_development)
+  install(EXPORT KqBoolLogicTargets NAMESPACE Kq:: DESTINATION ${kq_package_dir}
+      COMPONENT logic_development)
+endif()
 
 if(kq_port_is_imported)
   file(GENERATE OUTPUT "${kq_generated_dir}/KqBoolEquationHost.cmake" CONTENT
@@ -57,6 +70,11 @@ file(GENERATE OUTPUT "${kq_generated_dir}/kq_boolequation.pc"
     INPUT "${kq_generated_dir}/kq_boolequation.pc.in" TARGET kq_boolequation)
 install(FILES "${kq_generated_dir}/kq_boolequation.pc"
     DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
+if(KQ_BUILD_LOGIC)
+  configure_file(cmake/kq_boollogic.pc.in "${kq_generated_dir}/kq_boollogic.pc" @ONLY)
+  install(FILES "${kq_generated_dir}/kq_boollogic.pc"
+      DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT logic_development)
+endif()
 
 install(FILES README.md CHANGELOG.md CONTRIBUTING.md DESTINATION ${CMAKE_INSTALL_DOCDIR}
     COMPONENT documentation)

@@ -53,6 +53,33 @@ ${kq_about}
 This package holds what programs in C++17 are built with: headers, a package
 for CMake, and one for pkg-config.")
 
+get_cmake_property(kq_components COMPONENTS)
+if(logic IN_LIST kq_components)
+  set(kq_logic_package libkq-logic${PROJECT_VERSION_MAJOR})
+  set(CPACK_DEBIAN_LOGIC_PACKAGE_NAME ${kq_logic_package})
+  set(CPACK_DEBIAN_LOGIC_PACKAGE_SECTION libs)
+  set(CPACK_DEBIAN_LOGIC_PACKAGE_MULTIARCH same)
+  set(CPACK_DEBIAN_LOGIC_PACKAGE_DEPENDS "${kq_library_package} (>= ${PROJECT_VERSION})")
+  set(CPACK_DEBIAN_LOGIC_PACKAGE_CONTROL_EXTRA "${CMAKE_CURRENT_LIST_DIR}/packages/triggers")
+  set(CPACK_COMPONENT_LOGIC_DESCRIPTION "Boolean functions - explain, match, convert, compare
+${kq_about}
+
+This package holds the shared library that explains, matches, permutes,
+shortens, converts and compares the functions of such equations.")
+
+  set(CPACK_DEBIAN_LOGIC_DEVELOPMENT_PACKAGE_NAME libkq-logic-dev)
+  set(CPACK_DEBIAN_LOGIC_DEVELOPMENT_PACKAGE_SECTION libdevel)
+  set(CPACK_DEBIAN_LOGIC_DEVELOPMENT_PACKAGE_MULTIARCH same)
+  set(CPACK_DEBIAN_LOGIC_DEVELOPMENT_PACKAGE_DEPENDS "${kq_logic_package} (= ${PROJECT_VERSION}), \
+${CPACK_DEBIAN_DEVELOPMENT_PACKAGE_NAME} (= ${PROJECT_VERSION})")
+  set(CPACK_DEBIAN_LOGIC_DEVELOPMENT_PACKAGE_SUGGESTS "kq-boolequation-doc")
+  set(CPACK_COMPONENT_LOGIC_DEVELOPMENT_DESCRIPTION "Boolean functions - development files
+${kq_about}
+
+This package holds what programs in C++17 that ask about functions are built
+with: headers, a component of the package for CMake, and one for pkg-config.")
+endif()
+
 set(CPACK_DEBIAN_TOOL_PACKAGE_NAME booleq)
 set(CPACK_DEBIAN_TOOL_PACKAGE_SECTION electronics)
 set(CPACK_DEBIAN_TOOL_PACKAGE_MULTIARCH foreign)
@@ -64,7 +91,6 @@ ${kq_about}
 This package holds booleq, which shows, explains, compares and converts them in
 a terminal and in scripts, with its man page and its completion for bash.")
 
-get_cmake_property(kq_components COMPONENTS)
 if(python IN_LIST kq_components)
   # A compiled module is for one minor version of Python.
   find_package(Python REQUIRED COMPONENTS Interpreter)

@@ -47,8 +47,8 @@ class KQ_EXPORT Kq_BoolEquation {
     // variables of an expression are numbered by first occurrence; all start at 0.
     // Fails: false, and the object is empty.  Cost: in step with the text.
     bool SetEquation(const Port::StringBase<char>& equation);
-    // Sets the equation over the inputs 'terms', the first being the first variable. Names in the
-    // text that are no terms follow them. A term that is no legal name or stands twice is skipped.
+    // Sets the equation over the inputs 'terms', the first being the first variable. Other names
+    // in the text follow them. A term that is not a legal name or stands twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
     // number, not the highest; 'reverseTerms' defines terms from the last.  Fails: as SetEquation.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
@@ -84,8 +84,8 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
-    // row without variables; the debug mode changes nothing. goOn(context), unless null, is asked
-    // every few milliseconds, less often of over 100,000 operators; what it throws passes.
+    // row without variables; never traced. goOn(context), unless null, is asked every few
+    // milliseconds, less often of over 100,000 operators; it may throw, not change the equation.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
@@ -133,7 +133,7 @@ struct Kq_BoolEquation::Refusal {
         NONE = 0,              // nothing: the text is accepted
         EMPTY = 1,             // there is no token in it
         CHARACTER = 2,         // this character begins no token
-        WORD = 3,    // it stands between dots and is no operator, or the second dot is missing
+        WORD = 3,    // it stands between dots and is not an operator, or lacks the second dot
         QUOTE = 4,   // this quote has no second one
         PAREN = 5,   // this parenthesis has no other one
         OPERAND = 6, // an operand where an operator must stand
@@ -143,7 +143,7 @@ struct Kq_BoolEquation::Refusal {
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
         INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b after a first 0
         INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
-        INIT_NAME = 13 // over terms: one's name is no single token, and what it makes is refused
+        INIT_NAME = 13 // over terms: one's name is not a single token, and what it makes is refused
     };
     CODE code = NONE;  // why the text is refused
     size_t offset = 0; // where: the first byte

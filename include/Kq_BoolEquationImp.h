@@ -188,7 +188,8 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
 
     // Tabulates 'equation' over all its variables; values set on it stay as they are.
     // Stays empty without a tree, without variables and, deliberately, with more than 30.
-    // Fails: std::bad_alloc, with the rows appended so far.
+    // In debug mode a message's receiver may change this table, but not destroy it.
+    // Fails: std::bad_alloc, or what a receiver throws, with the rows appended so far.
     void Build(const Kq_BoolEquationImp& equation);
 
     // In the order of variable indices; the reference is valid until the table is set or destroyed.

@@ -78,7 +78,7 @@ def _build_and_install(prefix):
             shutil.rmtree(build)  # the tree was moved
     generator = ["-G", "Ninja"] if shutil.which("ninja") else []
     _run("cmake", "-S", ROOT, "-B", build, *generator, "-DCMAKE_BUILD_TYPE=Release",
-         "-DBUILD_TESTING=OFF", "-DKQ_BUILD_TOOLS=OFF", "-DKQ_BUILD_PYTHON=ON",
+         "-DBUILD_TESTING=OFF", "-DKQ_BUILD_TOOLS=OFF", "-DKQ_BUILD_LOGIC=OFF", "-DKQ_BUILD_PYTHON=ON",
          "-DKQ_PYTHON_BUNDLE=ON", "-DKQ_PYTHON_DIR=.", f"-DPython_EXECUTABLE={sys.executable}")
     _run("cmake", "--build", build, "--target", "_booleq", "--parallel", os.cpu_count() or 1)
     _run("cmake", "--install", build, "--component", "python", "--prefix", prefix, "--strip")

@@ -61,8 +61,7 @@ void Kq_BoolEquationImp::ReplaceStore(KqStore* fresh) noexcept
 {
     KqStore* const old = m_store;
     m_store = fresh;
-    if (old->IsWatched(this))
-        old->Watch(nullptr);
+    old->TellWatchers(this);
     KqStore::Release(old);
 }
 

@@ -1,10 +1,11 @@
 #!/usr/bin/env python3
 """Checks what the built library shows to the dynamic linker; prints one line for each violation.
 
-usage: check_exports.py LIBRARY [--host NAME] [--objects FILE...]
+usage: check_exports.py LIBRARY [--host NAME] [--second FIRST] [--objects FILE...]
 
 Exported names belong to the classes Kq_BoolEquation and Kq_BoolEquationImp; the needed libraries are
-the host library, the C++ library and the C library. With --objects, static objects with a run-time
+the host library, the C++ library and the C library. With --second LIBRARY is the second library: its
+names belong to the namespace kq_logic, and it needs FIRST, the first library, too. With --objects, static objects with a run-time
 initialiser are looked for too: only the engine's main source may have them (and the node model its
 class allocator), because the order of initialisation across files is undefined.
 Exit status: 1 when something was found.
@@ -18,6 +19,7 @@ import sys
 # Mangled, because the demangled name of a template's instance begins with the type it returns: one of
 # a standard template over our classes would look like ours.
 EXPORTED = re.compile(r"_ZNK?(15Kq_BoolEquation|18Kq_BoolEquationImp)")
+SECOND = re.compile(r"_ZNK?8kq_logic")
 NEEDED = re.compile(r"(libstdc\+\+|libc\+\+|libc\+\+abi|libgcc_s|libc|libm|ld-linux[-\w]*)\.so[.\d]*")
 WITH_INITIALISERS = {"Kq_BoolEquationImp.cpp.o", "Kq_BoolEquationImpNode.cpp.o"}
 
@@ -26,22 +28,22 @@ def output_of(*command):
     return subprocess.run(command, stdout=subprocess.PIPE, text=True, check=True).stdout
 
 
-def find_foreign_exports(library):
+def find_foreign_exports(library, exported):
     names = [line.split()[2] for line in
              output_of("nm", "-D", "--defined-only", library).splitlines()]
-    if not any(EXPORTED.match(name) for name in names):
+    if not any(exported.match(name) for name in names):
         yield f"{library} exports nothing of ours"
     for name in names:
-        if not EXPORTED.match(name):
+        if not exported.match(name):
             yield f"exported, but not ours: {output_of('c++filt', name).strip()}"
 
 
-def find_foreign_libraries(library, host):
+def find_foreign_libraries(library, ours, must):
     needed = re.findall(r"\(NEEDED\).*\[(.*)\]", output_of("readelf", "-dW", library))
-    if not any(name.startswith(host + ".") for name in needed):
-        yield f"{host} is not among the needed libraries"
+    if not any(name.startswith(must + ".") for name in needed):
+        yield f"{must} is not among the needed libraries"
     for name in needed:
-        if not name.startswith(host + ".") and not NEEDED.fullmatch(name):
+        if not name.startswith(tuple(each + "." for each in ours)) and not NEEDED.fullmatch(name):
             yield f"needs {name}"
 
 
@@ -56,10 +58,12 @@ def main():
     parser = argparse.ArgumentParser()
     parser.add_argument("library")
     parser.add_argument("--host", default="libkq_port.so")
+    parser.add_argument("--second")
     parser.add_argument("--objects", nargs="*", default=[])
     arguments = parser.parse_args()
-    found = [*find_foreign_exports(arguments.library),
-             *find_foreign_libraries(arguments.library, arguments.host.removesuffix(".so") + ".so"),
+    ours = [name.removesuffix(".so") + ".so" for name in (arguments.host, arguments.second) if name]
+    found = [*find_foreign_exports(arguments.library, SECOND if arguments.second else EXPORTED),
+             *find_foreign_libraries(arguments.library, ours, ours[-1]),
              *find_initialisers(arguments.objects)]
     print("\n".join(found), end="\n" if found else "")
     return 1 if found else 0

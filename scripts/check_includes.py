@@ -196,6 +196,17 @@ def check_rooms(root, report):
         check_sizes(path, lines, report)
 
 
+def check_second_library(root, report):
+    """Headers of the second library show nothing of what is under it."""
+    for path in sorted(root.glob("include/kq_logic/*")):
+        lines = read_lines(path)
+        for number, bracket, name in includes(lines):
+            if is_ours(name) and not (bracket == "<" and (name.startswith("kq_logic/") or
+                                                          name == FACADE)):
+                report.add(path, number, f"may not include {name} here")
+        check_sizes(path, lines, report)
+
+
 def check_all_ascii(root, report):
     files = [root / "dev", root / "CMakeLists.txt"]
     for folder in ("include", "s", "port", "logic", "tools", "scripts", "cmake", "python", "tests", "bench",
@@ -218,6 +229,7 @@ def main():
     check_host(root, report)
     check_users(root, report)
     check_rooms(root, report)
+    check_second_library(root, report)
     check_all_ascii(root, report)
     return 1 if report.count else 0
 

@@ -42,7 +42,7 @@ def check_changelog(version, text):
         return
     if releases[0][0] != version:
         yield (f"CHANGELOG.md: the newest release is {releases[0][0]}, CMakeLists.txt says {version};"
-               f" write '## [{version}] - YYYY-MM-DD' above it, or mend project(VERSION)")
+               f" write '## [{version}] - YYYY-MM-DD' above it, or fix project(VERSION)")
     for name, rest in releases:
         if not RELEASE.fullmatch(name) or not DATE.fullmatch(rest):
             yield f"CHANGELOG.md: '## [{name}]{rest}' is not of the form '## [1.2.3] - YYYY-MM-DD'"

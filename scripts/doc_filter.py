@@ -55,6 +55,17 @@ def as_doc(lines, subject=""):
     return f"/** {text}{subject} */"
 
 
+def as_file_doc(lines):
+    """The comment that opens a file, and the example that it has in indented lines."""
+    text, example = [], []
+    for line in lines:
+        (example if line.startswith("//     ") else text).append(line)
+    code = "<br>".join(escape(line[len("//     "):]) for line in example)
+    subject = f" <pre>{code}</pre> @file" if example else " @file"
+    words = [line[2:].strip() for line in text]
+    return as_doc([line for line in words if line], subject)
+
+
 # --- headers ------------------------------------------------------------------------------------
 
 COPY = re.compile(r"/\*\* As in (\w+)\. \*/")
@@ -131,8 +142,8 @@ class Header:
             self.follow(code)
 
     def filter(self):
-        block, index = self.comment_at(0)
-        self.output[0] = as_doc(block, " @file")
+        _, index = self.comment_at(0)
+        self.output[0] = as_file_doc(self.lines[:index])
         while index < len(self.lines):
             block, after = self.comment_at(index)
             if block and not self.body_depth:

@@ -37,7 +37,8 @@ import sys
 NOT_COPIED = re.compile(r"\.git|build.*")  # of the tree's root
 CONFIGURE = ["-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
              "-DCMAKE_CXX_FLAGS_DEBUG=-O1 -D_GLIBCXX_ASSERTIONS",
-             "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", "-DKQ_BUILD_TOOLS=OFF"]
+             "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", "-DKQ_BUILD_TOOLS=OFF",
+             "-DKQ_BUILD_LOGIC=OFF"]
 LIBRARY = "kq_boolequation"
 
 # Likely killers first; the large texts and what fails allocations take longest.

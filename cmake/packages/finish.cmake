@@ -1,4 +1,4 @@
-# CPack runs this when the packages are made. Each is unpacked, mended and packed again:
+# CPack runs this when the packages are made. Each is unpacked, fixed and packed again:
 #   - The field Multi-Arch is added; CPack knows it from 3.31 on.
 #   - Scripts that call ldconfig go: policy wants the trigger, which the library's package has.
 cmake_minimum_required(VERSION 3.25)

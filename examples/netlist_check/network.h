@@ -13,7 +13,7 @@
 
 typedef Port::StringBase<char> KqString;
 
-// What is wrong with an input file: "FILE:LINE: what; mend".
+// What is wrong with an input file: "FILE:LINE: what; hint".
 struct Fault : std::runtime_error {
     using std::runtime_error::runtime_error;
 };

@@ -1,5 +1,6 @@
 #include "batch.h"
 
+#include <cassert>
 #include <utility>
 
 #include "function.h"
@@ -24,8 +25,8 @@ BatchResult RefuseText(const char* what, const std::string& text, const Reading&
     const RefusalReport report = ExplainRefusal(text, reading);
     std::string message =
         std::string(what) + " refused at " + PlaceName(text, report.offset) + ": " + report.reason;
-    if (!report.mend.empty())
-        message += "; " + report.mend;
+    if (!report.hint.empty())
+        message += "; " + report.hint;
     return Fail(BatchOutcome::kTextRefused, std::move(message));
 }
 
@@ -56,8 +57,23 @@ BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& 
                     "the equation has " + Excerpt(ToStd(name)) + ", which is not among the inputs");
     }
     if (!FunctionOf(equation, function))
-        return Fail(BatchOutcome::kTextRefused, std::to_string(equation.GetNumVariables()) +
-                                                    " inputs: at most 30 have an init value");
+        return Fail(BatchOutcome::kTextRefused, NoFunctionReason(equation.GetNumVariables()));
+    return {};
+}
+
+// Sets equation and function from the row's init value over the inputs of 'reading'.
+BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquation& equation)
+{
+    if (row.init.find('\0') != std::string::npos ||
+        WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
+        !SetFromText(equation, row.init, reading))
+        return RefuseText("the init value is", row.init, reading);
+    // Read over a name like 'a'+b, an init value has the inputs that its expression has.
+    if (equation.GetNumVariables() > reading.inputs.size()) {
+        const auto& name = equation.GetVariables()[reading.inputs.size()].first;
+        return Fail(BatchOutcome::kDiffers, "the init value has " + Excerpt(ToStd(name)) +
+                                                ", which is not among the inputs");
+    }
     return {};
 }
 
@@ -67,9 +83,12 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
     Reading reading;
     reading.hasInputs = true;
     reading.inputs = function.Inputs();
+    Kq_BoolEquation equation;
+    const BatchResult result = ReadInit(row, reading, equation);
     Function given;
-    if (FunctionFromInit(row.init, reading.inputs, false, given).fault != InitFault::kNone)
-        return RefuseText("the init value is", row.init, reading);
+    if (result.outcome != BatchOutcome::kOk || !FunctionOf(equation, given))
+        return result;
+    assert(given.Inputs() == function.Inputs());
     const uint64_t different = function.FirstDifference(given);
     if (different == Function::kNoRow)
         return {};
@@ -89,10 +108,9 @@ BatchResult WriteEquation(BatchRow& row, const Reading& reading)
         return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
     Kq_BoolEquation equation;
-    if (row.init.find('\0') != std::string::npos ||
-        ReadInitText(row.init, reading.inputs.size()).fault != InitFault::kNone ||
-        !SetFromText(equation, row.init, reading))
-        return RefuseText("the init value is", row.init, reading);
+    const BatchResult result = ReadInit(row, reading, equation);
+    if (result.outcome != BatchOutcome::kOk)
+        return result;
     row.equation = ToStd(equation.GetEquationAsExpression(true));
     return {BatchOutcome::kFilled, std::string()};
 }

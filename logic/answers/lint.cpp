@@ -6,6 +6,7 @@
 #include "convert.h"
 #include "foreign_tree.h"
 #include "function.h"
+#include "lint_reason.h"
 #include "notation_writer.h"
 #include "short_form.h"
 #include "text.h"
@@ -16,36 +17,7 @@ namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
 constexpr size_t kMaxShortenedInputs = 8;
-
-bool Contains(const ForeignTree& tree, Meaning meaning)
-{
-    return std::any_of(
-        tree.nodes.begin(), tree.nodes.end(),
-        [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
-}
-
-std::string ReasonOf(const ForeignTree& tree)
-{
-    const bool isInt = tree.notation->values == Values::Int;
-    if (isInt && Contains(tree, Meaning::BitNot))
-        return "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
-    if (Contains(tree, Meaning::Add))
-        return "\"+\" adds there";
-    if (tree.notation == &LibertyNotation())
-        return "\"^\" binds tighter than \"&\" and \"*\" there, these tighter than \"|\" and \"+\"";
-    return "\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"";
-}
-
-Target TargetOf(const Notation* notation)
-{
-    if (notation == &VerilogNotation())
-        return Target::Verilog;
-    if (notation == &CNotation())
-        return Target::C;
-    if (notation == &LibertyNotation())
-        return Target::Liberty;
-    return notation == &VhdlNotation() ? Target::Vhdl : Target::Python;
-}
+constexpr double kMaxCauses = 16; // that lint_reason.h tries
 
 std::string WithoutLineEnd(std::string text)
 {
@@ -82,7 +54,7 @@ std::string TextHere(const ForeignTree& tree, const WordFunction& function)
 }
 
 ForeignReading ReadAs(const Notation& notation, const std::string& text,
-                      const Expression& expression)
+                      const Expression& expression, const Limits& limits)
 {
     ForeignReading reading;
     reading.notation = notation.name;
@@ -91,28 +63,19 @@ ForeignReading ReadAs(const Notation& notation, const std::string& text,
     if (!reading.isRead)
         return reading;
     Renumber(notation, expression.names, tree);
-    const WordFunction foreign = ToWordFunction(tree);
-    std::vector<uint64_t> stack;
-    const auto own = [&](const std::vector<uint64_t>& inputs) {
-        return EvaluateWord(expression, inputs, stack);
-    };
-    Expression inBits;
-    const uint64_t cost = ToExpression(tree, inBits) ? 1 : 64; // a row at a time
-    const auto numInputs = static_cast<unsigned int>(expression.names.size());
-    reading.comparison =
-        CompareWords(own, foreign, numInputs, expression.nodes.size() + cost * tree.nodes.size());
-    if (numInputs <= kMaxLintHexInputs)
-        reading.hex = Tabulate(foreign, expression.names).Hex();
-    if (reading.comparison.isEqual)
+    const Side foreign = SideOf(tree);
+    reading.decision = DecideEqual(SideOf(expression), foreign, limits);
+    if (expression.names.size() <= kMaxLintHexInputs)
+        reading.hex = Tabulate(foreign.evaluate, expression.names).Hex();
+    if (reading.decision.IsEqual())
         return reading;
-    std::vector<uint64_t> inputs;
-    for (const bool value : reading.comparison.first)
-        inputs.push_back(value ? 1 : 0);
-    reading.valueHere = (own(inputs) & 1u) != 0;
     reading.grouping = WriteWhole(tree, expression.names);
-    reading.reason = ReasonOf(tree);
-    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(&notation), "").text);
-    reading.textHere = TextHere(tree, foreign);
+    const Limits each = {limits.seconds / kMaxCauses};
+    reading.reason = FindReason(expression, tree, [&](const ForeignTree& undone) {
+        return DecideEqual(SideOf(expression), SideOf(undone), each).IsEqual();
+    });
+    reading.textThere = WithoutLineEnd(Convert(expression, TargetOf(notation), "", limits).text);
+    reading.textHere = TextHere(tree, foreign.evaluate);
     return reading;
 }
 
@@ -125,18 +88,13 @@ bool IsSameTree(const Expression& left, const Expression& right)
                       });
 }
 
-bool IsInitValue(const Kq_BoolEquation& equation)
-{
-    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
-}
-
 // Looks for what this library alone is about.
 class Linter {
   public:
     Linter(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
-           const Expression& expression, LintReport& report)
+           const Expression& expression, const Limits& limits, LintReport& report)
         : m_text(text), m_equation(equation), m_reading(reading), m_expression(expression),
-          m_report(report)
+          m_limits(limits), m_report(report)
     {
     }
 
@@ -166,21 +124,6 @@ class Linter {
             return false;
         again = ToExpression(equation);
         return again.names == m_expression.names;
-    }
-
-    Comparison CompareWith(const Expression& other) const
-    {
-        std::vector<uint64_t> ownStack;
-        std::vector<uint64_t> otherStack;
-        return CompareWords(
-            [&](const std::vector<uint64_t>& inputs) {
-                return EvaluateWord(m_expression, inputs, ownStack);
-            },
-            [&](const std::vector<uint64_t>& inputs) {
-                return EvaluateWord(other, inputs, otherStack);
-            },
-            static_cast<unsigned int>(m_expression.names.size()),
-            m_expression.nodes.size() + other.nodes.size());
     }
 
     // The same tree, with parentheses wherever a reader may doubt.
@@ -222,11 +165,16 @@ class Linter {
             Add("blank", message).details = {{"without it", "refused"}, {"write", ClearText()}};
             return;
         }
-        const Comparison comparison = CompareWith(other);
-        if (comparison.isEqual)
+        const Decision decision = DecideEqual(m_expression, other, m_limits);
+        if (decision.IsEqual())
             return;
+        const bool isDifferent = decision.IsDifferent();
         Add("blank", message).details = {
-            {"first at", AssignmentText(m_expression.names, comparison.first)},
+            {!isDifferent          ? "not decided"
+             : decision.isFirstRow ? "first at"
+                                   : "differs at",
+             isDifferent ? AssignmentText(m_expression.names, decision.assignment)
+                         : decision.reason},
             {"with it", WriteOwn(m_expression, OwnSyntax::First, Parentheses::Whole)},
             {"without it", WriteOwn(other, OwnSyntax::First, Parentheses::Whole)},
             {"write", ClearText()}};
@@ -249,7 +197,8 @@ class Linter {
                 const std::string text = ToStd((m_equation.*rendering.get)(hasBlanks));
                 Expression again;
                 if (!ReadAgain(text, again) ||
-                    !(IsSameTree(again, m_expression) || CompareWith(again).isEqual))
+                    !(IsSameTree(again, m_expression) ||
+                      DecideEqual(m_expression, again, m_limits).IsEqual()))
                     finding.details.emplace_back(rendering.name, text);
             }
             if (finding.details.empty())
@@ -282,30 +231,33 @@ class Linter {
         const size_t numListed = check.usable.size();
         if (m_expression.names.size() <= numListed)
             return;
-        std::string names;
-        for (size_t input = numListed; input < m_expression.names.size(); ++input)
-            names += (names.empty() ? "" : ", ") + m_expression.names[input];
-        Add("unlisted-input",
-            "inputs that are not listed widen the table behind the others: " + names);
+        const std::vector<std::string> unlisted(
+            m_expression.names.begin() + static_cast<long>(numListed), m_expression.names.end());
+        Add("unlisted-input", "inputs that are not listed widen the table behind the others: " +
+                                  Join(unlisted, ", "));
     }
 
+    // Every input at 1 is the last row, which has no digit where some have none.
     void CheckInitWidth()
     {
         const size_t numInputs = m_expression.names.size();
-        const std::string text = ToStd(m_equation.GetEquation(false));
-        const InitText init = ReadInitText(text, numInputs);
-        if (init.fault != InitFault::kNone || numInputs > kMaxFunctionInputs ||
-            init.numGivenRows >= uint64_t(1) << numInputs)
+        const InitWidth width = WidthOfInit(ToStd(m_equation.GetEquation(false)));
+        if (width.numRows == 0 || numInputs > kMaxFunctionInputs ||
+            width.numRows >= uint64_t(1) << numInputs)
             return;
-        Add("short-init", "the init value gives " + std::to_string(init.numGivenRows) +
-                              " rows of " + std::to_string(uint64_t(1) << numInputs) +
-                              "; the others read as " + (init.missingRows ? "1" : "0"));
+        std::vector<uint64_t> stack;
+        const uint64_t last =
+            EvaluateWord(m_expression, std::vector<uint64_t>(numInputs, 1), stack);
+        Add("short-init", "the init value gives " + std::to_string(width.numRows) + " rows of " +
+                              std::to_string(uint64_t(1) << numInputs) + "; the others read as " +
+                              ((last & 1u) != 0 ? "1" : "0"));
     }
 
     const std::string& m_text;
     const Kq_BoolEquation& m_equation;
     const Reading& m_reading;
     const Expression& m_expression;
+    const Limits& m_limits;
     LintReport& m_report;
 };
 
@@ -315,11 +267,12 @@ bool LintReport::IsClean() const
 {
     return findings.empty() &&
            std::all_of(readings.begin(), readings.end(), [](const ForeignReading& reading) {
-               return !reading.isRead || reading.comparison.isEqual;
+               return !reading.isRead || reading.decision.IsEqual();
            });
 }
 
-LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading)
+LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
+                const Limits& limits)
 {
     LintReport report;
     const Expression expression = ToExpression(equation);
@@ -327,8 +280,8 @@ LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const 
     report.grouping = WriteOwn(expression, OwnSyntax::First, Parentheses::Whole);
     if (!IsInitValue(equation))
         for (const Notation* notation : ForeignNotations())
-            report.readings.push_back(ReadAs(*notation, text, expression));
-    Linter(text, equation, reading, expression, report).Run();
+            report.readings.push_back(ReadAs(*notation, text, expression, limits));
+    Linter(text, equation, reading, expression, limits, report).Run();
     return report;
 }
 

@@ -9,10 +9,10 @@
 
 #include <Kq_BoolEquation.h>
 
+#include "decision.h"
 #include "expression.h"
 #include "listed_inputs.h"
 #include "notation.h"
-#include "word_comparison.h"
 
 namespace booleq {
 
@@ -20,14 +20,14 @@ namespace booleq {
 struct ForeignReading {
     const char* notation = nullptr;
     bool isRead = false;
-    std::string fault;      // why it is not
-    Comparison comparison;  // with this library's function, over its inputs
-    bool valueHere = false; // for the first assignment that differs
-    std::string grouping;   // with parentheses around every operation
-    std::string reason;     // what is different there
-    std::string textThere;  // says there what the text says here
-    std::string textHere;   // says here what the text says there; may be empty
-    std::string hex;        // the function read, up to kMaxShownInputs inputs
+    std::string fault; // why it is not
+    Decision decision; // with this library's function, the left one
+    // Unless they are equal:
+    std::string grouping;  // with parentheses around every operation
+    std::string reason;    // what is different there
+    std::string textThere; // says there what the text says here
+    std::string textHere;  // says here what the text says there; may be empty
+    std::string hex;       // the function read, up to kMaxShownInputs inputs
 };
 
 struct Finding {
@@ -47,8 +47,9 @@ struct LintReport {
 
 constexpr size_t kMaxLintHexInputs = 10;
 
-// 'equation' was set from 'text' as 'reading' says.
-LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading);
+// 'equation' was set from 'text' as 'reading' says. The limits are those of each comparison.
+LintReport Lint(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
+                const Limits& limits);
 
 // "A=1 B=0"; for many inputs only those that are 1 are named.
 std::string AssignmentText(const std::vector<std::string>& names, const std::vector<bool>& values);

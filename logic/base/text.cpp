@@ -56,6 +56,17 @@ std::string Count(uint64_t number, const std::string& noun)
     return std::to_string(number) + " " + noun + (number == 1 ? "" : "s");
 }
 
+std::string Join(const std::vector<std::string>& words, const char* between)
+{
+    std::string text;
+    bool isFirst = true;
+    for (const std::string& word : words) {
+        text += (isFirst ? "" : between) + word;
+        isFirst = false;
+    }
+    return text;
+}
+
 bool IsBlank(const std::string& text)
 {
     return text.find_first_not_of(" \t\n") == std::string::npos;

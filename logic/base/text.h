@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <string>
+#include <vector>
 
 #include <port/Port_StringBase.h>
 
@@ -20,6 +21,8 @@ std::string Visible(const std::string& text);
 std::string Excerpt(const std::string& text);
 // "1 input", "2 inputs".
 std::string Count(uint64_t number, const std::string& noun);
+// The words with 'between' between them.
+std::string Join(const std::vector<std::string>& words, const char* between);
 // True for a text of blanks, tabs and line feeds only; the empty text is one.
 bool IsBlank(const std::string& text);
 

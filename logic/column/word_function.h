@@ -14,10 +14,6 @@ namespace booleq {
 // The values for 64 assignments: element k of the argument holds input k's values, one in each bit.
 typedef std::function<uint64_t(const std::vector<uint64_t>&)> WordFunction;
 
-// Word 'word' of the column of input 'input' of 'numInputs': bit k is the input's value in row
-// 64 * word + k. The first input is the most significant bit of the row number.
-uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word);
-
 // The function over the inputs by trying every assignment.
 // Requires: at most kMaxFunctionInputs inputs.  Cost: 2^inputs / 64 calls.
 Function Tabulate(const WordFunction& function, const std::vector<std::string>& inputs);

@@ -2,6 +2,8 @@
 
 #include <set>
 
+#include "init_literal.h"
+
 namespace booleq {
 
 namespace {
@@ -18,6 +20,11 @@ std::string WithoutOuterBlanks(const std::string& text)
 
 bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
 {
+    return SetVerbatim(equation, LibraryText(text, reading), reading);
+}
+
+bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading)
+{
     if (!reading.hasInputs)
         return equation.SetEquation(text.c_str());
     std::vector<Port::StringBase<char>> terms;
@@ -26,6 +33,33 @@ bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Readi
         terms.push_back(Port::StringBase<char>(input.c_str()));
     return equation.SetEquationWithExplicitTerms(terms, text.c_str(), reading.lsbFirst,
                                                  reading.reverse);
+}
+
+bool IsInitValue(const Kq_BoolEquation& equation)
+{
+    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
+}
+
+InitWidth WidthOfInit(const std::string& text)
+{
+    InitWidth width;
+    const char base = text.size() > 2 && text[0] == '0' ? static_cast<char>(text[1] | 0x20) : ' ';
+    if (base != 'x' && base != 'b')
+        return width;
+    width.isHex = base == 'x';
+    width.numRows = static_cast<uint64_t>(text.size() - 2) * (width.isHex ? 4 : 1);
+    for (uint64_t highestRow = width.numRows - 1; highestRow > 0; highestRow /= 2)
+        ++width.numInputs;
+    return width;
+}
+
+std::string LibraryText(const std::string& text, const Reading& reading)
+{
+    const bool isLoneDigit = text.size() == 3 && text[0] == '0';
+    if (!reading.hasInputs || (!isLoneDigit && !IsSizedLiteral(text)))
+        return text;
+    const InitLiteral literal = ReadInitLiteral(text, CheckInputs(reading.inputs).usable.size());
+    return literal.code ? text : literal.text;
 }
 
 bool SplitInputs(const std::string& list, std::vector<std::string>& inputs)

@@ -2,6 +2,7 @@
 #ifndef BOOLEQ_EXPRESSION_LISTED_INPUTS_H
 #define BOOLEQ_EXPRESSION_LISTED_INPUTS_H
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -17,8 +18,26 @@ struct Reading {
     const char* inputsName = "--inputs"; // what the caller's users write to list inputs
 };
 
-// Sets 'equation' from 'text', which holds no NUL byte.  Fails: false.
+// Sets 'equation' from 'text', which holds no NUL byte. Over listed inputs an init value may also
+// be one that only people write (init_literal.h).  Fails: false.
 bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+// The same without those: what the library itself reads.
+bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
+
+// What the library is given for a text over these inputs; the text where it is refused.
+std::string LibraryText(const std::string& text, const Reading& reading);
+
+// True for an equation that was set from an init value.
+bool IsInitValue(const Kq_BoolEquation& equation);
+
+// What the length of an init value says of its rows. The digits are the library's to read.
+struct InitWidth {
+    uint64_t numRows = 0;   // that have a digit; 0 for a text that is not an init value
+    unsigned numInputs = 0; // the library reads them over exactly so many
+    bool isHex = false;
+};
+// Takes "0x..." and "0b..." for init values, whatever follows.  Cost: none.
+InitWidth WidthOfInit(const std::string& text);
 
 // Names of a list 'A,B,'c,d'': a comma inside single quotes belongs to the name, blanks around a
 // name do not.  Fails: false when a quote is not closed.

@@ -101,9 +101,9 @@ class ComplementSearch {
             uint64_t rows = ~uint64_t(0);
             for (size_t place = 0; place < numActive; ++place) {
                 if (!GetBit(m_stack.At(index), bits[place]))
-                    rows &= kInputRows[place];
+                    rows &= BitPattern(place);
                 if (!GetBit(m_stack.At(index), bits[place] + 1))
-                    rows &= ~kInputRows[place];
+                    rows &= ~BitPattern(place);
             }
             covered |= rows;
         }

@@ -4,11 +4,10 @@
 #include <algorithm>
 #include <unordered_map>
 
-#include "bits.h"
 #include "cover.h"
+#include "listed_inputs.h"
 #include "text.h"
 #include "unate.h"
-#include "word_function.h"
 
 namespace booleq {
 
@@ -20,7 +19,7 @@ void AppendCover(const CubeSpace& space, const Function& function, const Places&
                  size_t output, CubeList& target)
 {
     const size_t numInputs = function.NumInputs();
-    for (const Cube& product : FindCover(Bits(function))) {
+    for (const Cube& product : FindCover(function.GetRows())) {
         target.Resize(target.Size() + 1);
         uint64_t* cube = target.At(target.Size() - 1);
         for (size_t word = 0; word < space.NumWords(); ++word)
@@ -240,8 +239,15 @@ bool TableFromInit(const std::string& text, const std::vector<std::string>& inpu
     }
     Function on;
     Function free;
-    if (FunctionFromInit(onText, inputs, lsbFirst, on).fault != InitFault::kNone ||
-        FunctionFromInit(freeText, inputs, lsbFirst, free).fault != InitFault::kNone) {
+    Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = inputs;
+    reading.lsbFirst = lsbFirst;
+    const auto read = [&reading](const std::string& digits, Function& function) {
+        Kq_BoolEquation equation;
+        return SetFromText(equation, digits, reading) && FunctionOf(equation, function);
+    };
+    if (!read(onText, on) || !read(freeText, free)) {
         reason = "not an init value";
         return false;
     }

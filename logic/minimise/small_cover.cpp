@@ -9,13 +9,13 @@ namespace {
 
 uint64_t Lower(uint64_t rows, size_t input)
 {
-    const uint64_t half = rows & ~kInputRows[input];
+    const uint64_t half = rows & ~BitPattern(input);
     return half | half << (size_t(1) << input);
 }
 
 uint64_t Upper(uint64_t rows, size_t input)
 {
-    const uint64_t half = rows & kInputRows[input];
+    const uint64_t half = rows & BitPattern(input);
     return half | half >> (size_t(1) << input);
 }
 
@@ -48,7 +48,7 @@ uint64_t Cover(uint64_t needed, uint64_t allowed, size_t numInputs, SmallCube pr
     const uint64_t upper = Cover(neededUpper & ~allowedLower, allowedUpper, input, one, cubes);
     const uint64_t both = Cover((neededLower & ~lower) | (neededUpper & ~upper),
                                 allowedLower & allowedUpper, input, prefix, cubes);
-    return (lower & ~kInputRows[input]) | (upper & kInputRows[input]) | both;
+    return (lower & ~BitPattern(input)) | (upper & BitPattern(input)) | both;
 }
 
 } // namespace

@@ -110,7 +110,7 @@ class TautologyCheck {
                     const uint64_t pair = m_stack.At(index)[word] >> LowestBit(rest) & 3;
                     assert(pair != 0);
                     if (pair != 3)
-                        rows &= pair == 2 ? kInputRows[place] : ~kInputRows[place];
+                        rows &= pair == 2 ? BitPattern(place) : ~BitPattern(place);
                 }
             }
             covered |= rows;

@@ -106,9 +106,9 @@ class UncoveredSearch {
             uint64_t rows = ~uint64_t(0);
             for (size_t place = 0; place < numActive; ++place) {
                 if (!GetBit(m_stack.At(index), bits[place]))
-                    rows &= kInputRows[place];
+                    rows &= BitPattern(place);
                 if (!GetBit(m_stack.At(index), bits[place] + 1))
-                    rows &= ~kInputRows[place];
+                    rows &= ~BitPattern(place);
             }
             covered |= rows;
         }
@@ -117,9 +117,9 @@ class UncoveredSearch {
         std::vector<uint64_t>& parts = m_binate; // not needed any more
         parts = m_path;
         for (size_t place = 0; place < numActive; ++place) {
-            if ((~covered & kInputRows[place]) == 0)
+            if ((~covered & BitPattern(place)) == 0)
                 ClearBit(parts.data(), bits[place] + 1);
-            if ((~covered & ~kInputRows[place]) == 0)
+            if ((~covered & ~BitPattern(place)) == 0)
                 ClearBit(parts.data(), bits[place]);
         }
         for (size_t word = 0; word < m_num_words; ++word)

@@ -11,18 +11,18 @@
 
 namespace booleq {
 
-struct NetworkNames {
+struct UnitNames {
     std::vector<std::string> inputs;
     std::string output;
-    std::string model;
+    std::string unit; // a model, a module, a function, a cell
 };
 
 // One gate for each operator, named so that nothing collides.
-std::string WriteBlif(const Expression& expression, const NetworkNames& names);
+std::string WriteBlif(const Expression& expression, const UnitNames& names);
 // One equation; an operand of an exclusive or that is more than a name gets an equation of its own.
-std::string WriteEqn(const Expression& expression, const NetworkNames& names);
+std::string WriteEqn(const Expression& expression, const UnitNames& names);
 // A sum of products.
-std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names);
+std::string WritePla(const std::vector<Cube>& cubes, const UnitNames& names);
 
 // What a text in one of the formats says about its one output, over its inputs in their order.
 // Invariant: a definition uses inputs and signals defined before it.

@@ -13,8 +13,7 @@ namespace {
 // Names for signals inside, "n1" and on, that no input has.
 class FreshNames {
   public:
-    explicit FreshNames(const NetworkNames& names)
-        : m_used(names.inputs.begin(), names.inputs.end())
+    explicit FreshNames(const UnitNames& names) : m_used(names.inputs.begin(), names.inputs.end())
     {
         m_used.insert(names.output);
     }
@@ -75,7 +74,7 @@ const char* BlifRows(Operator op)
 // post-order and starting at its element of m_starts. Links are not set.
 class EqnWriter {
   public:
-    EqnWriter(const Expression& expression, const NetworkNames& names)
+    EqnWriter(const Expression& expression, const UnitNames& names)
         : m_source(expression), m_names(names), m_fresh(names), m_signals(names.inputs)
     {
     }
@@ -164,7 +163,7 @@ class EqnWriter {
     }
 
     const Expression& m_source;
-    const NetworkNames& m_names;
+    const UnitNames& m_names;
     FreshNames m_fresh;
     std::vector<std::string> m_signals;
     std::vector<Expression::Node> m_nodes;
@@ -174,10 +173,10 @@ class EqnWriter {
 
 } // namespace
 
-std::string WriteBlif(const Expression& expression, const NetworkNames& names)
+std::string WriteBlif(const Expression& expression, const UnitNames& names)
 {
-    std::string text = ".model " + names.model + "\n.inputs" + Joined(names.inputs) +
-                       "\n.outputs " + names.output + "\n";
+    std::string text = ".model " + names.unit + "\n.inputs" + Joined(names.inputs) + "\n.outputs " +
+                       names.output + "\n";
     FreshNames fresh(names);
     std::vector<std::string> operands;
     for (size_t node = 0; node < expression.nodes.size(); ++node) {
@@ -204,12 +203,12 @@ std::string WriteBlif(const Expression& expression, const NetworkNames& names)
     return text + ".end\n";
 }
 
-std::string WriteEqn(const Expression& expression, const NetworkNames& names)
+std::string WriteEqn(const Expression& expression, const UnitNames& names)
 {
     return EqnWriter(expression, names).Write();
 }
 
-std::string WritePla(const std::vector<Cube>& cubes, const NetworkNames& names)
+std::string WritePla(const std::vector<Cube>& cubes, const UnitNames& names)
 {
     const size_t numInputs = names.inputs.size();
     std::string text = ".i " + std::to_string(numInputs) + "\n.o 1\n.ilb" + Joined(names.inputs) +

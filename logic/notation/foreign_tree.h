@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "decision.h"
 #include "expression.h"
 #include "notation.h"
 
@@ -38,6 +39,10 @@ bool ToExpression(const ForeignTree& tree, Expression& expression);
 // The function of the tree for inputs 0 or 1, exact also where values are wider. inputs[k] belongs
 // to tree name k.  Requires: the tree outlives the function.
 WordFunction ToWordFunction(const ForeignTree& tree);
+
+// The same function to be decided about, exact in the same way.
+// Requires: the tree outlives the side.
+Side SideOf(const ForeignTree& tree);
 
 // With parentheses around every operation, in the notation's own operators.
 std::string WriteWhole(const ForeignTree& tree, const std::vector<std::string>& names);

@@ -3,7 +3,11 @@
 #include "foreign_tree.h"
 
 #include <algorithm>
+#include <cassert>
 #include <memory>
+
+#include "flatten.h"
+#include "watch.h"
 
 namespace booleq {
 
@@ -84,18 +88,41 @@ Operator OperatorOf(Meaning meaning)
     return Operator::Zero;
 }
 
+constexpr uint64_t kBitMask = 1;
+constexpr uint64_t kNumberMask = 0xffffffff;
+constexpr uint64_t kIntMask = ~uint64_t(0);
+
+// The bits of each node's value. In vectors an operator works in the width of its context: from the
+// root, or the truth value above, down.
+std::vector<uint64_t> MasksOf(const ForeignTree& tree)
+{
+    if (tree.notation->values != Values::Vector)
+        return std::vector<uint64_t>(tree.nodes.size(), kIntMask);
+    const std::vector<bool> isWide = FindWide(tree);
+    const auto maskOf = [](bool wide) { return wide ? kNumberMask : kBitMask; };
+    std::vector<uint64_t> masks(tree.nodes.size());
+    masks.back() = maskOf(isWide.back());
+    for (size_t node = masks.size(); node-- > 0;) {
+        const ForeignTree::Node& own = tree.nodes[node];
+        if (IsLeaf(own.meaning))
+            continue;
+        const bool isOwnContext = own.meaning == Meaning::LogicalNot;
+        masks[own.left] = isOwnContext ? maskOf(isWide[own.left]) : masks[node];
+        if (!IsNot(own.meaning))
+            masks[own.right] = masks[node];
+    }
+    return masks;
+}
+
 // Computes with the values of one assignment, as wide as they are. Sums and products of bits stay
 // far below 64 bits in any text that people write; beyond, they wrap.
 class ValueMachine {
   public:
-    explicit ValueMachine(const ForeignTree& tree) : m_tree(tree), m_masks(tree.nodes.size(), ~0ull)
+    explicit ValueMachine(const ForeignTree& tree)
+        : m_tree(tree), m_masks(MasksOf(tree)), m_values(tree.nodes.size())
     {
-        if (tree.notation->values == Values::Vector)
-            SpreadWidths();
-        m_values.resize(tree.nodes.size());
     }
 
-    // Bit 'lane' of each input is its value.
     bool Run(const std::vector<uint64_t>& inputs, unsigned int lane)
     {
         for (size_t node = 0; node < m_values.size(); ++node)
@@ -105,23 +132,6 @@ class ValueMachine {
     }
 
   private:
-    // An operator works in the width of its context: from the root, or the truth value above, down.
-    void SpreadWidths()
-    {
-        const std::vector<bool> isWide = FindWide(m_tree);
-        const auto maskOf = [](bool wide) { return wide ? 0xffffffffull : 1ull; };
-        m_masks.back() = maskOf(isWide.back());
-        for (size_t node = m_masks.size(); node-- > 0;) {
-            const ForeignTree::Node& own = m_tree.nodes[node];
-            if (IsLeaf(own.meaning))
-                continue;
-            const bool isOwnContext = own.meaning == Meaning::LogicalNot;
-            m_masks[own.left] = isOwnContext ? maskOf(isWide[own.left]) : m_masks[node];
-            if (!IsNot(own.meaning))
-                m_masks[own.right] = m_masks[node];
-        }
-    }
-
     uint64_t Value(const ForeignTree::Node& node, const std::vector<uint64_t>& inputs,
                    unsigned int lane) const
     {
@@ -163,8 +173,124 @@ class ValueMachine {
     }
 
     const ForeignTree& m_tree;
-    std::vector<uint64_t> m_masks; // the bits of each node's value
+    std::vector<uint64_t> m_masks;
     std::vector<uint64_t> m_values;
+};
+
+// Values as gates, one edge for each bit that a value has; bit 0 first.
+class GateMachine {
+  public:
+    GateMachine(const ForeignTree& tree, const std::vector<Edge>& inputs, GateGraph& graph)
+        : m_tree(tree), m_inputs(inputs), m_graph(graph), m_masks(MasksOf(tree))
+    {
+    }
+
+    Edge Run()
+    {
+        std::vector<Bus> values; // of operands that wait for their operator
+        for (size_t index = 0; index < m_tree.nodes.size(); ++index) {
+            Watch();
+            const ForeignTree::Node& node = m_tree.nodes[index];
+            const size_t width = WidthOf(m_masks[index]);
+            Bus value;
+            if (!IsLeaf(node.meaning)) {
+                value = values.back();
+                values.pop_back();
+            }
+            if (IsLeaf(node.meaning)) {
+                value = {LeafOf(node)};
+            } else if (node.meaning == Meaning::LogicalNot) {
+                value = {Inverse(IsAny(value))};
+            } else if (node.meaning != Meaning::BitNot) {
+                value = Binary(node.meaning, values.back(), value);
+                values.pop_back();
+            }
+            value.resize(width, kFalseEdge);
+            if (node.meaning == Meaning::BitNot || IsNegatedBinary(node.meaning))
+                for (Edge& bit : value)
+                    bit = Inverse(bit);
+            values.push_back(std::move(value));
+        }
+        assert(values.size() == 1);
+        return m_tree.notation->values == Values::Int ? IsAny(values.back()) : values.back()[0];
+    }
+
+  private:
+    typedef std::vector<Edge> Bus;
+
+    static size_t WidthOf(uint64_t mask)
+    {
+        return mask == kBitMask ? 1 : mask == kNumberMask ? 32 : 64;
+    }
+
+    static bool IsNegatedBinary(Meaning meaning)
+    {
+        return meaning == Meaning::Nand || meaning == Meaning::Nor || meaning == Meaning::Nxor;
+    }
+
+    Edge LeafOf(const ForeignTree::Node& node) const
+    {
+        if (node.meaning == Meaning::Input)
+            return m_inputs[node.left];
+        return node.meaning == Meaning::One || node.meaning == Meaning::WideOne ? kTrueEdge
+                                                                                : kFalseEdge;
+    }
+
+    Edge IsAny(Bus bits) // a copy: it is sorted
+    {
+        for (Edge& bit : bits)
+            bit = Inverse(bit);
+        return Inverse(m_graph.AndOfAll(bits.data(), bits.data() + bits.size()));
+    }
+
+    // Before the inversion that some operators end with. Both have the same width.
+    Bus Binary(Meaning meaning, const Bus& left, const Bus& right)
+    {
+        assert(left.size() == right.size());
+        if (meaning == Meaning::Add)
+            return Sum(left, right);
+        if (meaning == Meaning::Multiply)
+            return Product(left, right);
+        Bus result;
+        for (size_t bit = 0; bit < left.size(); ++bit) {
+            if (meaning == Meaning::And || meaning == Meaning::Nand)
+                result.push_back(m_graph.And(left[bit], right[bit]));
+            else if (meaning == Meaning::Or || meaning == Meaning::Nor)
+                result.push_back(m_graph.Or(left[bit], right[bit]));
+            else
+                result.push_back(m_graph.Xor(left[bit], right[bit]));
+        }
+        return result;
+    }
+
+    Bus Sum(const Bus& left, const Bus& right)
+    {
+        Bus result;
+        Edge carry = kFalseEdge;
+        for (size_t bit = 0; bit < left.size(); ++bit) {
+            const Edge half = m_graph.Xor(left[bit], right[bit]);
+            result.push_back(m_graph.Xor(half, carry));
+            carry = m_graph.Or(m_graph.And(left[bit], right[bit]), m_graph.And(half, carry));
+        }
+        return result;
+    }
+
+    Bus Product(const Bus& left, const Bus& right)
+    {
+        Bus result(left.size(), kFalseEdge);
+        for (size_t shift = 0; shift < right.size(); ++shift) {
+            Bus addend(left.size(), kFalseEdge);
+            for (size_t bit = shift; bit < left.size(); ++bit)
+                addend[bit] = m_graph.And(left[bit - shift], right[shift]);
+            result = Sum(result, addend);
+        }
+        return result;
+    }
+
+    const ForeignTree& m_tree;
+    const std::vector<Edge>& m_inputs;
+    GateGraph& m_graph;
+    std::vector<uint64_t> m_masks;
 };
 
 } // namespace
@@ -196,6 +322,17 @@ WordFunction ToWordFunction(const ForeignTree& tree)
             word |= uint64_t(machine->Run(inputs, lane) ? 1 : 0) << lane;
         return word;
     };
+}
+
+Side SideOf(const ForeignTree& tree)
+{
+    const auto build = [&tree](const std::vector<Edge>& inputs, GateGraph& graph) {
+        Expression expression;
+        if (ToExpression(tree, expression))
+            return AddExpression(expression, inputs, graph);
+        return GateMachine(tree, inputs, graph).Run();
+    };
+    return {tree.names, build, ToWordFunction(tree)};
 }
 
 } // namespace booleq

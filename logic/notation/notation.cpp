@@ -64,10 +64,13 @@ bool IsAllBetween(const std::string& text, char first, char last)
     });
 }
 
-// The blank ends the name.
+// The blank ends the name. Before they know of escaped names, readers replace what follows a "`"
+// and take a "#" for the start of a directive.
 std::string EscapeForVerilog(const std::string& name)
 {
-    return IsAllBetween(name, '!', '~') ? "\\" + name + " " : std::string();
+    return IsAllBetween(name, '!', '~') && name.find_first_of("`#") == std::string::npos
+               ? "\\" + name + " "
+               : std::string();
 }
 
 std::string EscapeForVhdl(const std::string& name)
@@ -82,7 +85,8 @@ std::string EscapeForVhdl(const std::string& name)
 
 constexpr const char* kNoKeywords[] = {nullptr};
 
-// Verilog and SystemVerilog: a file may be read as either.
+// Verilog and SystemVerilog: a file may be read as either. Some readers also keep "bool", "wone"
+// and "wreal" for themselves.
 constexpr const char* kVerilogKeywords[] = {"accept_on",
                                             "alias",
                                             "always",
@@ -100,6 +104,7 @@ constexpr const char* kVerilogKeywords[] = {"accept_on",
                                             "bins",
                                             "binsof",
                                             "bit",
+                                            "bool",
                                             "break",
                                             "buf",
                                             "bufif0",
@@ -328,7 +333,9 @@ constexpr const char* kVerilogKeywords[] = {"accept_on",
                                             "wire",
                                             "with",
                                             "within",
+                                            "wone",
                                             "wor",
+                                            "wreal",
                                             "xnor",
                                             "xor",
                                             nullptr};
@@ -350,7 +357,8 @@ constexpr const char* kVhdlKeywords[] = {
     // The library and the type that an entity needs.
     "ieee", "std", "work", "std_logic", nullptr};
 
-// C up to 2023, and what stdbool.h defines.
+// C up to 2023, what stdbool.h defines, and the names that compilers define as macros unless a
+// strict standard is asked for.
 constexpr const char* kCKeywords[] = {
     "alignas",       "alignof",      "asm",      "auto",          "bool",
     "break",         "case",         "char",     "const",         "constexpr",
@@ -361,7 +369,8 @@ constexpr const char* kCKeywords[] = {
     "signed",        "sizeof",       "static",   "static_assert", "struct",
     "switch",        "thread_local", "true",     "typedef",       "typeof",
     "typeof_unqual", "union",        "unsigned", "void",          "volatile",
-    "while",         nullptr};
+    "while",         "i386",         "linux",    "mips",          "sparc",
+    "sun",           "unix",         nullptr};
 
 constexpr const char* kPythonKeywords[] = {
     "False",   "None",     "True",     "and",       "as",   "assert", "async",  "await",
@@ -393,6 +402,7 @@ const Notation kVerilog = {"Verilog",
                             {"+", Meaning::Add, 70, Chain::Any, false}},
                            false,
                            false,
+                           false,
                            IsVerilogIdentifier,
                            kVerilogKeywords,
                            EscapeForVerilog};
@@ -411,6 +421,7 @@ const Notation kVhdl = {"VHDL",
                          {"nand", Meaning::Nand, 10, Chain::None, true},
                          {"nor", Meaning::Nor, 10, Chain::None, true},
                          {"xnor", Meaning::Nxor, 10, Chain::Same, true}},
+                        false,
                         false,
                         true,
                         IsVhdlIdentifier,
@@ -431,6 +442,7 @@ const Notation kC = {"C",
                       {"|", Meaning::Or, 40, Chain::Any, true},
                       {"*", Meaning::Multiply, 80, Chain::Any, false},
                       {"+", Meaning::Add, 70, Chain::Any, false}},
+                     true,
                      false,
                      false,
                      IsCIdentifier,
@@ -460,6 +472,7 @@ const Notation kPython = {"Python",
                            {"@", Meaning::Foreign, 80, Chain::Any, false}},
                           false,
                           false,
+                          false,
                           IsSimpleIdentifier,
                           kPythonKeywords,
                           nullptr};
@@ -477,6 +490,7 @@ const Notation kLiberty = {"Liberty",
                             {"*", Meaning::And, 50, Chain::Any, false},
                             {"|", Meaning::Or, 40, Chain::Any, true},
                             {"+", Meaning::Or, 40, Chain::Any, false}},
+                           false,
                            true,
                            false,
                            IsSimpleIdentifier,
@@ -494,6 +508,7 @@ const Notation kEqn = {
     false,
     {},
     {{"*", Meaning::And, 50, Chain::Any, true}, {"+", Meaning::Or, 40, Chain::Any, true}},
+    false,
     false,
     false,
     IsSimpleIdentifier,

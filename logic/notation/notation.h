@@ -59,7 +59,8 @@ struct Notation {
     bool prefixesNest; // two may follow each other
     std::vector<OperatorForm> postfixes;
     std::vector<OperatorForm> binaries;
-    bool hasAdjacentAnd; // operands side by side are joined like "&"
+    bool mixesInParentheses; // the writer never mixes operators without: compilers warn
+    bool hasAdjacentAnd;     // operands side by side are joined like "&"
     bool ignoresCase;
     bool (*isPlainName)(const std::string& name); // a name as it may stand, keywords apart
     const char* const* keywords;                  // ended by null

@@ -24,6 +24,8 @@ class Syntax {
     virtual bool Has(Operator op) const = 0;
     // Two inversions may follow each other.
     virtual bool InversionsNest() const { return true; }
+    // Compilers warn of "!a & (b | c)", lest "!(a & ...)" was meant.
+    virtual bool DoubtsInversions() const { return false; }
     // Every operation gets parentheses.
     virtual bool IsWhole() const { return false; }
 };
@@ -72,11 +74,14 @@ class ForeignSyntax : public Syntax {
             return {text.size() > 1 ? text + " " : text, form.level, form.chain};
         }
         const OperatorForm* form = Find(node.op);
+        if (m_notation.mixesInParentheses)
+            return {std::string(" ") + form->text + " ", 1, Chain::Same};
         return {std::string(" ") + form->text + " ", form->level, form->chain};
     }
 
     bool Has(Operator op) const override { return Find(op) != nullptr; }
     bool InversionsNest() const override { return m_notation.prefixesNest; }
+    bool DoubtsInversions() const override { return m_notation.mixesInParentheses; }
 
   private:
     const OperatorForm* Find(Operator op) const
@@ -208,6 +213,10 @@ class Writer {
                      bool isLeft) const
     {
         const Form form = FormOf(operand);
+        if (isLeft && IsInversion(operand) && m_syntax.DoubtsInversions()) {
+            const Expression::Node& right = m_nodes[node.right];
+            return right.op != Operator::Input && !IsInversion(right);
+        }
         if (form.level >= kLeafLevel - 1)
             return false;
         if (m_syntax.IsWhole())

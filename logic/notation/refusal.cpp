@@ -3,7 +3,9 @@
 #include <algorithm>
 #include <cstring>
 
+#include "foreign_spelling.h"
 #include "function.h"
+#include "init_literal.h"
 #include "text.h"
 
 namespace booleq {
@@ -79,21 +81,26 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
 {
     const char character = context.At(0);
     if (character == '\r') {
-        report.reason = "a carriage return is no blank";
-        report.mend = "remove it (DOS line ends: tr -d '\\r')";
+        report.reason = "a carriage return is not a blank";
+        report.hint = "remove it (DOS line ends: tr -d '\\r')";
         return;
     }
     report.reason = Quoted(context.Token()) + " is not part of the syntax";
     if (character >= '2' && character <= '9')
         report.reason =
-            Quoted(context.Token()) + " is no constant, 0 and 1 are, and begins no name";
+            Quoted(context.Token()) + " is not a constant, 0 and 1 are, and no name begins with it";
     const std::string name = context.WholeName();
-    if (character == '=')
-        report.mend = "leave out what is assigned to, up to the '='";
+    const bool hasLetter = std::any_of(name.begin(), name.end(), IsNamePart);
+    const bool isNumber = name.find_first_not_of("0123456789") == std::string::npos;
+    if (isNumber && !name.empty())
+        report.hint = "of constants there are 0 and 1 only; a name of digits needs single quotes";
+    else if (!hasLetter && IsPrintable(name))
+        report.hint = "the operators are & | ^ ~ and ~& ~| ~^; a name with such a character needs "
+                      "single quotes";
     else if (name.size() > 1 && IsPrintable(name))
-        report.mend = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
+        report.hint = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
     else
-        report.mend = "a name with such a character needs single quotes";
+        report.hint = "a name with such a character needs single quotes";
 }
 
 void ExplainWord(const Context& context, RefusalReport& report)
@@ -101,17 +108,18 @@ void ExplainWord(const Context& context, RefusalReport& report)
     const std::string word = context.Token();
     if (word.size() == 1) {
         report.reason = std::string("the '.' has no second '.'; ") + kWords;
+        report.hint = "a name with a '.' needs single quotes";
         return;
     }
-    report.reason = Excerpt(word) + " is no operator; " + kWords;
+    report.reason = Excerpt(word) + " is not an operator; " + kWords;
     std::string upper = word;
     std::transform(upper.begin(), upper.end(), upper.begin(), [](char character) {
         return character >= 'a' && character <= 'z' ? static_cast<char>(character - 32) : character;
     });
     if (upper == ".XNOR." || upper == ".NXOR.")
-        report.mend = "write .NXOR.";
+        report.hint = "write .NXOR.";
     else if (upper != word && std::strstr(kWords, upper.c_str()))
-        report.mend = "write " + upper;
+        report.hint = "write " + upper;
 }
 
 void ExplainOperand(const Context& context, const std::string& text, const Reading& reading,
@@ -123,14 +131,14 @@ void ExplainOperand(const Context& context, const std::string& text, const Readi
                                report.offset == 1 && !reading.hasInputs;
     const char behindNegation = context.OperatorBehindNegation();
     if (looksLikeInit)
-        report.mend = std::string("for an init value name its inputs with ") + reading.inputsName +
+        report.hint = std::string("for an init value name its inputs with ") + reading.inputsName +
                       ", the most significant first";
     else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
-        report.mend = "write '" + token + behindNegation + "' without a blank in it";
+        report.hint = "write '" + token + behindNegation + "' without a blank in it";
     else if (token[0] == '\'' && !context.NameBefore().empty())
-        report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+        report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
     else
-        report.mend = "put an operator before it, & or |";
+        report.hint = "put an operator before it, & or |";
 }
 
 void ExplainOperator(const Context& context, const char* side, RefusalReport& report)
@@ -138,21 +146,20 @@ void ExplainOperator(const Context& context, const char* side, RefusalReport& re
     const std::string token = context.Token();
     report.reason = "the operator " + Quoted(token) + " has no operand on its " + side;
     if (token.size() == 1 && context.At(1) == token[0])
-        report.mend = "write '" + token + "' for '" + token + token + "'";
+        report.hint = "write '" + token + "' for '" + token + token + "'";
 }
 
 void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalReport& report)
 {
-    const InitText init = ReadInitText(text, 0);
-    const bool isHex = (text[1] | 0x20) == 'x';
+    const InitWidth width = WidthOfInit(text);
     const size_t numGiven = CheckInputs(reading.inputs).usable.size();
-    report.reason = std::to_string(text.size() - 2) + (isHex ? " hexadecimal" : " binary") +
+    report.reason = std::to_string(text.size() - 2) + (width.isHex ? " hexadecimal" : " binary") +
                     (text.size() == 3 ? " digit is" : " digits are") + " read over exactly " +
-                    std::to_string(init.numInputs) + (init.numInputs == 1 ? " input" : " inputs") +
-                    ", and " + std::to_string(numGiven) +
-                    (numGiven == 1 ? " is listed" : " are listed");
-    if (isHex && text.size() == 3 && numGiven == 1)
-        report.mend = "over one input write the two bits as 0b...";
+                    std::to_string(width.numInputs) +
+                    (width.numInputs == 1 ? " input" : " inputs") + ", and " +
+                    std::to_string(numGiven) + (numGiven == 1 ? " is listed" : " are listed");
+    if (width.isHex && text.size() == 3 && numGiven == 1)
+        report.hint = "one input has two rows: write 0x0 to 0x3, or two bits, 0b...";
 }
 
 void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& report)
@@ -161,14 +168,14 @@ void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& rep
     case Refusal::PAREN:
         if (context.At(0) == '(') {
             report.reason = "nothing closes this '('";
-            report.mend = "add a ')' behind the group, or leave it out";
+            report.hint = "add a ')' after the group, or leave it out";
         } else {
             report.reason = "this ')' closes no '('";
-            report.mend = "leave it out, or add a '(' before the group";
+            report.hint = "leave it out, or add a '(' before the group";
         }
         return;
     case Refusal::NO_OPERAND:
-        report.reason = "the negation " + Quoted(context.Token()) + " has no operand behind it";
+        report.reason = "the negation " + Quoted(context.Token()) + " has no operand after it";
         return;
     case Refusal::NEGATED_OPERATOR:
         report.reason = "the negation " + Quoted(context.Token()) +
@@ -224,9 +231,9 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
     case Refusal::QUOTE:
         report.reason = "nothing closes this quote";
         if (!context.NameBefore().empty())
-            report.mend = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+            report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
         else if (context.Before() == ')')
-            report.mend = "the negation of a group stands before it: ~( )";
+            report.hint = "the negation of a group stands before it: ~( )";
         return;
     case Refusal::OPERAND:
         return ExplainOperand(context, text, reading, report);
@@ -242,20 +249,48 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
         if (refusal.offset == 1) {
             report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... "
                             "or 0b...";
-            report.mend = "put an expression that begins so in parentheses";
+            report.hint = "put an expression that begins so in parentheses";
             return;
         }
-        report.reason = Quoted(context.Token()) + " is no " +
+        report.reason = Quoted(context.Token()) + " is not a " +
                         ((text[1] | 0x20) == 'x' ? "hexadecimal" : "binary") + " digit";
         return;
     case Refusal::INIT_WIDTH:
         return ExplainInitWidth(text, reading, report);
     case Refusal::INIT_NAME:
-        report.reason =
-            "an input's name has more behind its second quote, and no init value can be "
-            "read over it";
+        report.reason = "an input's name has more after its second quote, and no init value can be "
+                        "read over it";
         return;
     }
+}
+
+// Refusals where another language's spelling can be the cause.
+bool MayBeForeign(Refusal::CODE code)
+{
+    return code == Refusal::CHARACTER || code == Refusal::WORD || code == Refusal::QUOTE ||
+           code == Refusal::OPERAND;
+}
+
+// The hint is an operator of this library.
+bool IsCorrected(const RefusalReport& report)
+{
+    return report.hint.compare(0, 7, "write .") == 0;
+}
+
+// A sized init value over listed inputs never reaches the library when it is wrong.
+bool ExplainLiteral(const std::string& text, const Reading& reading, RefusalReport& report)
+{
+    if (!reading.hasInputs || !IsSizedLiteral(text))
+        return false;
+    const InitLiteral literal = ReadInitLiteral(text, CheckInputs(reading.inputs).usable.size());
+    if (!literal.code)
+        return false;
+    report.code = literal.code;
+    report.offset = literal.offset;
+    report.length = literal.length;
+    report.reason = literal.reason;
+    report.hint = literal.hint;
+    return true;
 }
 
 } // namespace
@@ -269,9 +304,11 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
         report.code = "nul-byte";
         report.offset = nul;
         report.length = 1;
-        report.reason = "a NUL byte; this is no plain text";
+        report.reason = "a NUL byte; this is not plain text";
         return report;
     }
+    if (ExplainLiteral(text, reading, report))
+        return report;
     std::vector<Port::StringBase<char>> terms;
     for (const std::string& input : reading.inputs)
         terms.push_back(input.c_str());
@@ -281,6 +318,12 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
     report.offset = refusal.offset;
     report.length = refusal.length;
     ExplainCode(text, reading, refusal, report);
+    if (MayBeForeign(refusal.code)) {
+        const std::string hint = HintForForeign(text, refusal.offset, reading);
+        // A word between dots that this library has in capital letters is no part of a name.
+        if (!hint.empty() && !(refusal.code == Refusal::WORD && IsCorrected(report)))
+            report.hint = hint;
+    }
     return report;
 }
 

@@ -1,4 +1,4 @@
-// A refusal for people: the library's code and place, a reason in one sentence, and the mend where
+// A refusal for people: the library's code and place, a reason in one sentence, and the hint where
 // the text shows what was meant.
 #ifndef BOOLEQ_NOTATION_REFUSAL_H
 #define BOOLEQ_NOTATION_REFUSAL_H
@@ -14,7 +14,7 @@ struct RefusalReport {
     size_t offset = 0;          // bytes from 0
     size_t length = 0;
     std::string reason; // one sentence without a full stop
-    std::string mend;   // what to write instead; empty when the text does not show it
+    std::string hint;   // what to write instead; empty when the text does not show it
 };
 
 // Why a text is refused when it is read so.

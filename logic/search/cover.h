@@ -7,7 +7,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "bits.h"
+#include "rows.h"
 
 namespace booleq {
 
@@ -22,7 +22,7 @@ constexpr unsigned int kMaxCoverInputs = 16;
 
 // None for the constant 0; one without inputs for the constant 1.
 // Requires: at most kMaxCoverInputs inputs.
-std::vector<Cube> FindCover(const Bits& function);
+std::vector<Cube> FindCover(const Rows& function);
 
 size_t CountLiterals(const std::vector<Cube>& cubes);
 

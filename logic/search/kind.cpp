@@ -2,32 +2,25 @@
 
 #include <algorithm>
 
-#include "bits.h"
 #include "cover.h"
+#include "rows.h"
+#include "text.h"
 
 namespace booleq {
 
 namespace {
 
-std::string Listed(const std::vector<std::string>& words, const char* between)
-{
-    std::string text;
-    for (const std::string& word : words)
-        text += (text.empty() ? "" : between) + word;
-    return text;
-}
-
 // A function of the inputs that matter, with ways to ask about it.
 class Explainer {
   public:
     explicit Explainer(const Function& function)
-        : m_names(function.Inputs()), m_bits(function), m_support(m_bits.Support())
+        : m_names(function.Inputs()), m_rows(function.GetRows()), m_support(Support(m_rows))
     {
     }
 
     void Run(FunctionKind& found)
     {
-        for (unsigned int input = 0; input < m_bits.NumInputs(); ++input) {
+        for (unsigned int input = 0; input < m_rows.NumInputs(); ++input) {
             const bool matters = std::count(m_support.begin(), m_support.end(), input) != 0;
             (matters ? found.mattering : found.idle).push_back(m_names[input]);
         }
@@ -50,22 +43,22 @@ class Explainer {
     }
 
     // The cofactor for one assignment of the inputs of 'inputs'; bit k of 'values' is the k-th's.
-    Bits FixTo(const std::vector<unsigned int>& inputs, uint32_t values) const
+    Rows FixTo(const std::vector<unsigned int>& inputs, uint32_t values) const
     {
-        Bits result(m_bits);
+        Rows result(m_rows);
         for (size_t place = 0; place < inputs.size(); ++place)
-            result = result.Cofactor(inputs[place], (values >> place & 1u) != 0);
+            result = Cofactor(result, inputs[place], (values >> place & 1u) != 0);
         return result;
     }
 
     // Fails: false for a function that is no single literal.
-    bool AsLiteral(const Bits& bits, unsigned int& input, std::string& literal) const
+    bool AsLiteral(const Rows& rows, unsigned int& input, std::string& literal) const
     {
-        const std::vector<unsigned int> support = bits.Support();
+        const std::vector<unsigned int> support = Support(rows);
         if (support.size() != 1)
             return false;
         input = support[0];
-        literal = Literal(input, bits.At(0));
+        literal = Literal(input, rows.At(0));
         return true;
     }
 
@@ -73,10 +66,10 @@ class Explainer {
     bool FindConstant()
     {
         if (m_support.empty())
-            return Say("constant", m_bits.IsOne() ? "constant 1" : "constant 0");
+            return Say("constant", IsOne(m_rows) ? "constant 1" : "constant 0");
         if (m_support.size() > 1)
             return false;
-        const bool isInverter = m_bits.At(0);
+        const bool isInverter = m_rows.At(0);
         const std::string& name = m_names[m_support[0]];
         return Say(isInverter ? "inverter" : "buffer",
                    (isInverter ? "inverter of " : "buffer of ") + name);
@@ -85,8 +78,8 @@ class Explainer {
     // One row of those that matter is 1, or one is 0.
     bool FindProduct()
     {
-        const std::vector<Cube> cover = FindCover(m_bits);
-        const std::vector<Cube> inverse = FindCover(~m_bits);
+        const std::vector<Cube> cover = FindCover(m_rows);
+        const std::vector<Cube> inverse = FindCover(~m_rows);
         const bool isAnd = cover.size() == 1;
         if (!isAnd && inverse.size() != 1)
             return false;
@@ -102,21 +95,21 @@ class Explainer {
         }
         const bool isAll = numInverted == literals.size();
         const std::string kind = isAnd ? (isAll ? "NOR" : "AND") : (isAll ? "NAND" : "OR");
-        return Say(kind, kind + " of " + Listed(isAll ? plain : literals, ", "));
+        return Say(kind, kind + " of " + Join(isAll ? plain : literals, ", "));
     }
 
     bool FindParity()
     {
-        Bits parity = Bits::OfInput(m_bits.NumInputs(), m_support[0]);
+        Rows parity = InputRows(m_rows.NumInputs(), m_support[0]);
         std::vector<std::string> names = {m_names[m_support[0]]};
         for (size_t place = 1; place < m_support.size(); ++place) {
-            parity = parity ^ Bits::OfInput(m_bits.NumInputs(), m_support[place]);
+            parity = parity ^ InputRows(m_rows.NumInputs(), m_support[place]);
             names.push_back(m_names[m_support[place]]);
         }
-        if (m_bits == parity)
-            return Say("XOR", "XOR of " + Listed(names, ", ") + ": 1 when an odd number is 1");
-        if (m_bits == ~parity)
-            return Say("XNOR", "XNOR of " + Listed(names, ", ") + ": 1 when an even number is 1");
+        if (m_rows == parity)
+            return Say("XOR", "XOR of " + Join(names, ", ") + ": 1 when an odd number is 1");
+        if (m_rows == ~parity)
+            return Say("XNOR", "XNOR of " + Join(names, ", ") + ": 1 when an even number is 1");
         return false;
     }
 
@@ -162,7 +155,7 @@ class Explainer {
         for (const unsigned int select : selects)
             names.push_back(m_names[select]);
         return Say("multiplexer",
-                   "multiplexer, select " + Listed(names, ", ") + ": " + Listed(choices, "; "));
+                   "multiplexer, select " + Join(names, ", ") + ": " + Join(choices, "; "));
     }
 
     // For each input that matters, whether it has to be inverted for the function to rise with it.
@@ -171,8 +164,8 @@ class Explainer {
     {
         inverted = 0;
         for (const unsigned int input : m_support) {
-            const Bits low = m_bits.Cofactor(input, false);
-            const Bits high = m_bits.Cofactor(input, true);
+            const Rows low = Cofactor(m_rows, input, false);
+            const Rows high = Cofactor(m_rows, input, true);
             if ((low & high) == high)
                 inverted |= uint32_t(1) << input;
             else if ((low & high) != low)
@@ -186,13 +179,13 @@ class Explainer {
     std::vector<int> ByCount(uint32_t inverted) const
     {
         std::vector<int> values(m_support.size() + 1, -1);
-        for (uint64_t row = 0; row < m_bits.NumRows(); ++row) {
+        for (uint64_t row = 0; row < m_rows.NumRows(); ++row) {
             size_t count = 0;
             for (const unsigned int input : m_support) {
-                const bool bit = (row >> (m_bits.NumInputs() - 1 - input) & 1u) != 0;
+                const bool bit = (row >> (m_rows.NumInputs() - 1 - input) & 1u) != 0;
                 count += bit != ((inverted >> input & 1u) != 0) ? 1 : 0;
             }
-            const int value = m_bits.At(row) ? 1 : 0;
+            const int value = m_rows.At(row) ? 1 : 0;
             if (values[count] != -1 && values[count] != value)
                 return {};
             values[count] = value;
@@ -217,7 +210,7 @@ class Explainer {
         if (values.empty())
             return false;
         const auto needed = std::find(values.begin(), values.end(), 1) - values.begin();
-        const std::string literals = Listed(Literals(inverted), ", ");
+        const std::string literals = Join(Literals(inverted), ", ");
         if (2 * needed == static_cast<std::ptrdiff_t>(m_support.size()) + 1)
             return Say("majority", "majority of " + literals);
         return Say("threshold",
@@ -233,14 +226,14 @@ class Explainer {
         for (size_t count = 0; count < values.size(); ++count)
             if (values[count] == 1)
                 counts.push_back(std::to_string(count));
-        return Say("symmetric", "1 when the number of ones among " + Listed(Literals(0), ", ") +
-                                    " is " + Listed(counts, " or "));
+        return Say("symmetric", "1 when the number of ones among " + Join(Literals(0), ", ") +
+                                    " is " + Join(counts, " or "));
     }
 
     // Products without a common input, summed: and-or; the other three forms are its inversions.
     bool FindAndOr()
     {
-        return IsAndOr(FindCover(m_bits), false) || IsAndOr(FindCover(~m_bits), true);
+        return IsAndOr(FindCover(m_rows), false) || IsAndOr(FindCover(~m_rows), true);
     }
 
     bool IsAndOr(const std::vector<Cube>& cover, bool isInverse)
@@ -263,7 +256,7 @@ class Explainer {
                 if ((cube.used >> input & 1u) != 0)
                     literals.push_back(
                         Literal(input, ((cube.values >> input & 1u) != 0) == isOrAnd));
-            const std::string group = Listed(literals, isOrAnd ? " | " : " & ");
+            const std::string group = Join(literals, isOrAnd ? " | " : " & ");
             groups.emplace_back(literals.size(), literals.size() > 1 ? "(" + group + ")" : group);
         }
         std::stable_sort(groups.begin(), groups.end(), [](const auto& left, const auto& right) {
@@ -275,7 +268,7 @@ class Explainer {
             sizes += std::to_string(group.first);
             texts.push_back(group.second);
         }
-        std::string text = Listed(texts, isOrAnd ? " & " : " | ");
+        std::string text = Join(texts, isOrAnd ? " & " : " | ");
         if (hasInvertedOutput)
             text = "~(" + text + ")";
         const std::string kind =
@@ -286,7 +279,7 @@ class Explainer {
     }
 
     const std::vector<std::string>& m_names;
-    Bits m_bits;
+    Rows m_rows;
     std::vector<unsigned int> m_support;
     FunctionKind* m_found = nullptr;
 };

@@ -1,143 +1,332 @@
+// Inputs are coloured by the spectra's numbers of all sets that they are in, again and again as the
+// colours of the others in these sets become known; where some stay alike, one is singled out on
+// both sides. This is how isomorphisms of graphs are found: McKay and Piperno, Practical Graph
+// Isomorphism II, 2014. Inversions are not tried: the signs of the spectra give them, by equations.
 #include "match.h"
 
 #include <algorithm>
+#include <array>
+#include <cassert>
+#include <chrono>
+#include <utility>
 
+#include "spectrum.h"
 #include "watch.h"
 
 namespace booleq {
 
 namespace {
 
-typedef std::vector<uint8_t> Rows; // one value each
+typedef std::vector<uint64_t> Colours; // of inputs, by the bit of the row number
 
-Rows RowsOf(const Function& function)
+uint64_t Mix(uint64_t value)
 {
-    Rows rows(function.NumRows());
-    for (size_t row = 0; row < rows.size(); ++row)
-        rows[row] = function.At(row) ? 1 : 0;
-    return rows;
+    value = (value ^ value >> 30) * 0xbf58476d1ce4e5b9u;
+    value = (value ^ value >> 27) * 0x94d049bb133111ebu;
+    return value ^ value >> 31;
 }
+
+// Equations between bits: the exclusive or of the bits of a set is a value.
+class ParityEquations {
+  public:
+    // Fails: false for one that contradicts the others.
+    bool Add(uint32_t set, bool value)
+    {
+        for (unsigned int bit = 0; bit < m_rows.size() && set != 0; ++bit) {
+            if ((set >> bit & 1u) == 0)
+                continue;
+            if (m_rows[bit].set == 0) {
+                m_rows[bit] = {set, value};
+                return true;
+            }
+            set ^= m_rows[bit].set;
+            value = value != m_rows[bit].value;
+        }
+        return !value;
+    }
+
+    // A solution; bits that are free are 0.
+    uint32_t Solve() const
+    {
+        uint32_t solution = 0;
+        for (size_t bit = m_rows.size(); bit-- > 0;) {
+            const bool others = (__builtin_popcount(m_rows[bit].set & solution) & 1) != 0;
+            if (m_rows[bit].set != 0 && others != m_rows[bit].value)
+                solution |= uint32_t(1) << bit;
+        }
+        return solution;
+    }
+
+  private:
+    struct Row {
+        uint32_t set = 0; // its lowest bit is the row's place
+        bool value = false;
+    };
+    std::array<Row, kMaxMatchInputs + 1> m_rows;
+};
+
+// One of the two functions: its spectrum, and a number for each set of inputs that the changes
+// allowed leave alone.
+struct Side {
+    Side(const Rows& rows, bool allowInversions) : spectrum(WalshSpectrum(rows))
+    {
+        const std::vector<uint32_t> weights =
+            allowInversions ? DerivativeWeights(rows) : std::vector<uint32_t>();
+        for (size_t set = 0; set < spectrum.size(); ++set) {
+            const int32_t value = allowInversions ? std::abs(spectrum[set]) : spectrum[set];
+            const uint64_t weight = allowInversions ? weights[set] : 0;
+            marks.push_back(Mix(static_cast<uint32_t>(value) | weight << 32));
+        }
+    }
+
+    // The colours told apart by one more look at all sets.
+    Colours Refined(const Colours& colours, std::vector<uint64_t>& scratch) const
+    {
+        scratch.resize(marks.size());
+        scratch[0] = 0;
+        for (size_t set = 1; set < marks.size(); ++set)
+            scratch[set] = scratch[set & (set - 1)] + colours[__builtin_ctzll(set)];
+        for (size_t set = 0; set < marks.size(); ++set)
+            scratch[set] = Mix(scratch[set] ^ marks[set]);
+        Colours refined(colours.size());
+        for (size_t input = 0; input < colours.size(); ++input) {
+            uint64_t sum = 0;
+            const size_t bit = size_t(1) << input;
+            for (size_t start = bit; start < marks.size(); start += 2 * bit)
+                for (size_t set = start; set < start + bit; ++set)
+                    sum += scratch[set];
+            refined[input] = Mix(sum ^ Mix(colours[input]));
+        }
+        return refined;
+    }
+
+    std::vector<int32_t> spectrum;
+    std::vector<uint64_t> marks;
+};
+
+Colours Sorted(Colours colours)
+{
+    std::sort(colours.begin(), colours.end());
+    return colours;
+}
+
+size_t CountColours(const Colours& colours)
+{
+    Colours sorted = Sorted(colours);
+    return static_cast<size_t>(std::unique(sorted.begin(), sorted.end()) - sorted.begin());
+}
+
+enum class Outcome { kFound, kNone, kTimeIsUp };
 
 class MatchSearch {
   public:
-    MatchSearch(const Rows& second, unsigned int numInputs, bool allowInversions)
-        : m_second(second), m_num_inputs(numInputs), m_allow_inversions(allowInversions)
+    MatchSearch(const Rows& first, const Rows& second, bool allowInversions, double seconds)
+        : m_first(first, allowInversions), m_second(second, allowInversions),
+          m_num_inputs(first.NumInputs()), m_allow_inversions(allowInversions), m_seconds(seconds),
+          m_start(std::chrono::steady_clock::now())
     {
-        for (unsigned int input = 0; input < numInputs; ++input)
-            m_order.push_back(input);
-        m_inverted.resize(numInputs);
     }
 
-    // 'first' has its inputs in the order of m_order; those before 'place' are settled.
-    // The depth is the number of inputs.
-    bool Find(const Rows& first, unsigned int place)
+    Outcome Run()
     {
-        if (place == m_num_inputs)
-            return first == m_second;
-        std::vector<Rows> tried;
-        for (unsigned int source = place; source < m_num_inputs; ++source) {
-            Watch();
-            for (const bool isInverted : {false, true}) {
-                if (isInverted && !m_allow_inversions)
-                    continue;
-                Rows rows = Moved(first, place, source, isInverted);
-                const bool isNew = std::find(tried.begin(), tried.end(), rows) == tried.end();
-                if (!isNew || !HasSameCounts(rows, place))
-                    continue;
-                std::swap(m_order[place], m_order[source]);
-                m_inverted[place] = isInverted;
-                if (Find(rows, place + 1))
-                    return true;
-                std::swap(m_order[place], m_order[source]);
-                tried.push_back(std::move(rows));
-            }
-        }
-        return false;
+        if (Sorted(m_first.marks) != Sorted(m_second.marks))
+            return Outcome::kNone;
+        return Find(Colours(m_num_inputs), Colours(m_num_inputs));
     }
 
-    const std::vector<unsigned int>& Order() const { return m_order; }
-    const std::vector<bool>& Inverted() const { return m_inverted; }
+    // For each bit of the second's row number the bit of the first's.
+    const std::vector<unsigned int>& Map() const { return m_map; }
+    // Bit k: the second's input at bit k is inverted; bit numInputs: the output is.
+    uint32_t Inversions() const { return m_inversions; }
 
   private:
-    // The inputs at two places trade them; the one that is now at 'place' is inverted on demand.
-    Rows Moved(const Rows& first, unsigned int place, unsigned int source, bool isInverted) const
+    bool IsTimeUp() const
     {
-        const unsigned int placeBit = m_num_inputs - 1 - place;
-        const unsigned int sourceBit = m_num_inputs - 1 - source;
-        Rows rows(first.size());
-        for (size_t row = 0; row < rows.size(); ++row) {
-            const size_t value = (row >> placeBit & 1u) ^ (isInverted ? 1u : 0u);
-            const size_t other = row >> sourceBit & 1u;
-            size_t from = row & ~(size_t(1) << placeBit) & ~(size_t(1) << sourceBit);
-            if (place == source)
-                from |= value << placeBit;
-            else
-                from |= value << sourceBit | other << placeBit;
-            rows[row] = first[from];
-        }
-        return rows;
+        Watch();
+        const std::chrono::duration<double> passed = std::chrono::steady_clock::now() - m_start;
+        return m_seconds > 0 && passed.count() >= m_seconds;
     }
 
-    // Every cofactor by the inputs up to 'place' has as many ones in both.
-    bool HasSameCounts(const Rows& rows, unsigned int place) const
+    // Tells apart what can be told apart.  Fails: false where the two sides differ.
+    bool Refine(Colours& first, Colours& second)
     {
-        const auto length = static_cast<std::ptrdiff_t>(uint64_t(1) << (m_num_inputs - 1 - place));
-        for (auto own = rows.begin(), other = m_second.begin(); own != rows.end();
-             own += length, other += length)
-            if (std::count(own, own + length, 1) != std::count(other, other + length, 1))
+        for (size_t numColours = 0; numColours != CountColours(first);) {
+            numColours = CountColours(first);
+            first = m_first.Refined(first, m_scratch);
+            second = m_second.Refined(second, m_scratch);
+            if (Sorted(first) != Sorted(second))
                 return false;
+        }
         return true;
     }
 
-    const Rows& m_second;
+    // The depth is the number of inputs.
+    Outcome Find(Colours first, Colours second)
+    {
+        if (IsTimeUp())
+            return Outcome::kTimeIsUp;
+        if (!Refine(first, second) || !HoldsForSingles(first, second))
+            return Outcome::kNone;
+        const unsigned int pivot = SmallestGroup(second);
+        if (pivot == m_num_inputs)
+            return Outcome::kFound;
+        const uint64_t colour = second[pivot];
+        second[pivot] = kSingledOut;
+        std::vector<unsigned int> failed;
+        for (unsigned int turn = 0; turn < m_num_inputs; ++turn) {
+            const unsigned int candidate = (pivot + turn) % m_num_inputs; // itself first
+            if (first[candidate] != colour || IsLikeOneOf(failed, candidate))
+                continue;
+            Colours singled(first);
+            singled[candidate] = kSingledOut;
+            const Outcome outcome = Find(singled, second);
+            if (outcome != Outcome::kNone)
+                return outcome;
+            failed.push_back(candidate);
+        }
+        return Outcome::kNone;
+    }
+
+    // The first input of the smallest group of one colour, of two at least; the number of inputs
+    // when every input has its own.
+    unsigned int SmallestGroup(const Colours& colours) const
+    {
+        std::ptrdiff_t least = PTRDIFF_MAX;
+        unsigned int pivot = m_num_inputs;
+        for (unsigned int input = m_num_inputs; input-- > 0;) {
+            const auto size = std::count(colours.begin(), colours.end(), colours[input]);
+            if (size > 1 && size <= least) {
+                least = size;
+                pivot = input;
+            }
+        }
+        return pivot;
+    }
+
+    // Whether the inputs that have a colour of their own, mapped by it, agree in all their sets;
+    // keeps map and inversions.
+    bool HoldsForSingles(const Colours& first, const Colours& second)
+    {
+        std::vector<unsigned int> singles;
+        m_map.assign(m_num_inputs, 0);
+        for (unsigned int input = 0; input < m_num_inputs; ++input) {
+            if (std::count(second.begin(), second.end(), second[input]) != 1)
+                continue;
+            singles.push_back(input);
+            m_map[input] = static_cast<unsigned int>(
+                std::find(first.begin(), first.end(), second[input]) - first.begin());
+        }
+        return Holds(m_second, singles, m_map, m_inversions);
+    }
+
+    // Whether the sets of 'inputs' of 'side' have the first side's values of the sets mapped, and
+    // the signs follow from inversions.
+    bool Holds(const Side& side, const std::vector<unsigned int>& inputs,
+               const std::vector<unsigned int>& map, uint32_t& inversions) const
+    {
+        ParityEquations equations;
+        const size_t numSets = size_t(1) << inputs.size();
+        std::vector<uint32_t> own(numSets);
+        std::vector<uint32_t> other(numSets);
+        for (size_t number = 0; number < numSets; ++number) {
+            if (number > 0) {
+                const unsigned int input = inputs[__builtin_ctzll(number)];
+                own[number] = own[number & (number - 1)] | uint32_t(1) << input;
+                other[number] = other[number & (number - 1)] | uint32_t(1) << map[input];
+            }
+            const int32_t value = side.spectrum[own[number]];
+            const int32_t mapped = m_first.spectrum[other[number]];
+            if (value == mapped && (!m_allow_inversions || value == 0))
+                continue;
+            if (!m_allow_inversions || std::abs(value) != std::abs(mapped))
+                return false;
+            const uint32_t output = uint32_t(1) << m_num_inputs;
+            if (!equations.Add(own[number] | output, (value < 0) != (mapped < 0)))
+                return false;
+        }
+        inversions = equations.Solve();
+        return true;
+    }
+
+    // Whether the first function stays itself when the candidate and one of these trade places.
+    bool IsLikeOneOf(const std::vector<unsigned int>& others, unsigned int candidate) const
+    {
+        return std::any_of(others.begin(), others.end(), [&](unsigned int other) {
+            std::vector<unsigned int> all;
+            for (unsigned int input = 0; input < m_num_inputs; ++input)
+                all.push_back(input);
+            std::vector<unsigned int> map(all);
+            std::swap(map[other], map[candidate]);
+            uint32_t inversions = 0;
+            return Holds(m_first, all, map, inversions);
+        });
+    }
+
+    static constexpr uint64_t kSingledOut = 0x9e3779b97f4a7c15;
+
+    Side m_first;
+    Side m_second;
     unsigned int m_num_inputs;
     bool m_allow_inversions;
-    std::vector<unsigned int> m_order;
-    std::vector<bool> m_inverted;
+    double m_seconds;
+    std::chrono::steady_clock::time_point m_start;
+    std::vector<uint64_t> m_scratch;
+    std::vector<unsigned int> m_map;
+    uint32_t m_inversions = 0;
 };
 
 } // namespace
 
-Matching Match(const Function& first, const Function& second, bool allowInversions)
+std::vector<unsigned int> EffectiveInputs(const Function& function)
 {
-    const auto numInputs = static_cast<unsigned int>(first.NumInputs());
-    const Rows target = RowsOf(second);
+    return Support(function.GetRows());
+}
+
+Matching Match(const Function& first, const Function& second, bool allowInversions, double seconds)
+{
+    const std::vector<unsigned int> ownInputs = EffectiveInputs(first);
+    const std::vector<unsigned int> otherInputs = EffectiveInputs(second);
     Matching matching;
-    for (const bool isInverted : {false, true}) {
-        if (isInverted && !allowInversions)
-            break;
-        Rows rows = RowsOf(first);
-        if (isInverted)
-            for (uint8_t& value : rows)
-                value ^= 1u;
-        const auto count = [](const Rows& counted) {
-            return std::count(counted.begin(), counted.end(), 1);
-        };
-        MatchSearch search(target, numInputs, allowInversions);
-        if (count(rows) != count(target) || !search.Find(rows, 0))
-            continue;
-        matching = {true, search.Order(), search.Inverted(), isInverted};
-        break;
+    if (ownInputs.size() != otherInputs.size())
+        return matching;
+    assert(ownInputs.size() <= kMaxMatchInputs);
+    const auto numInputs = static_cast<unsigned int>(ownInputs.size());
+    MatchSearch search(Restrict(first.GetRows(), ownInputs),
+                       Restrict(second.GetRows(), otherInputs), allowInversions, seconds);
+    const Outcome outcome = search.Run();
+    matching.isFound = outcome == Outcome::kFound;
+    matching.isDecided = outcome != Outcome::kTimeIsUp;
+    if (!matching.isFound)
+        return matching;
+    matching.sources.assign(second.NumInputs(), Matching::kIdle);
+    matching.inverted.assign(second.NumInputs(), false);
+    for (unsigned int place = 0; place < numInputs; ++place) {
+        const unsigned int bit = numInputs - 1 - place;
+        matching.sources[otherInputs[place]] = ownInputs[numInputs - 1 - search.Map()[bit]];
+        matching.inverted[otherInputs[place]] = (search.Inversions() >> bit & 1u) != 0;
     }
+    matching.isInverted = (search.Inversions() >> numInputs & 1u) != 0;
+    assert(Apply(matching, first, second.Inputs()) == second);
     return matching;
 }
 
 Function Apply(const Matching& matching, const Function& first,
                const std::vector<std::string>& inputs)
 {
-    std::vector<uint64_t> words(first.Words().size());
-    const size_t numInputs = first.NumInputs();
-    for (size_t row = 0; row < first.NumRows(); ++row) {
-        size_t from = 0;
+    const size_t numInputs = inputs.size();
+    Rows rows(static_cast<unsigned int>(numInputs));
+    for (size_t row = 0; row < rows.NumRows(); ++row) {
+        uint64_t from = 0;
         for (size_t place = 0; place < numInputs; ++place) {
+            if (matching.sources[place] == Matching::kIdle)
+                continue;
             const bool value =
                 ((row >> (numInputs - 1 - place) & 1u) != 0) != matching.inverted[place];
-            from |= size_t(value ? 1 : 0) << (numInputs - 1 - matching.sources[place]);
+            from |= uint64_t(value ? 1 : 0) << (first.NumInputs() - 1 - matching.sources[place]);
         }
-        if (first.At(from) != matching.isInverted)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+        rows.Set(row, first.At(from) != matching.isInverted);
     }
-    return Function(inputs, std::move(words));
+    return {inputs, std::move(rows)};
 }
 
 } // namespace booleq

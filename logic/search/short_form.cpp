@@ -3,9 +3,9 @@
 #include <algorithm>
 #include <map>
 
-#include "bits.h"
 #include "cover.h"
 #include "formula.h"
+#include "rows.h"
 #include "shortest.h"
 #include "watch.h"
 
@@ -18,22 +18,22 @@ constexpr unsigned int kMaxSplitInputs = 10;  // two sets of these are tried eac
 constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of these are compared
 
 // Some input of 'inputs' being 1 or 0 makes it 1 (isSome), or both do.
-Bits Quantify(const Bits& function, const std::vector<unsigned int>& inputs, bool isSome)
+Rows Quantify(const Rows& function, const std::vector<unsigned int>& inputs, bool isSome)
 {
-    Bits result(function);
+    Rows result(function);
     for (const unsigned int input : inputs) {
-        const Bits low = result.Cofactor(input, false);
-        const Bits high = result.Cofactor(input, true);
+        const Rows low = Cofactor(result, input, false);
+        const Rows high = Cofactor(result, input, true);
         result = isSome ? (low | high) : (low & high);
     }
     return result;
 }
 
-Bits FixAll(const Bits& function, const std::vector<unsigned int>& inputs)
+Rows FixAll(const Rows& function, const std::vector<unsigned int>& inputs)
 {
-    Bits result(function);
+    Rows result(function);
     for (const unsigned int input : inputs)
-        result = result.Cofactor(input, false);
+        result = Cofactor(result, input, false);
     return result;
 }
 
@@ -81,9 +81,9 @@ class Search {
     explicit Search(unsigned int numInputs) : m_num_inputs(numInputs) {}
 
     // False when a cover is too long. The depth is at most the number of inputs.
-    bool Find(const Bits& function, Formula& formula)
+    bool Find(const Rows& function, Formula& formula)
     {
-        const std::vector<unsigned int> support = function.Support();
+        const std::vector<unsigned int> support = Support(function);
         if (support.size() <= kMaxShortestInputs) {
             formula = FindShortest(function);
             return true;
@@ -102,21 +102,21 @@ class Search {
 
   private:
     // An AND, OR or exclusive OR of one input and the rest.
-    bool FindByInput(const Bits& function, const std::vector<unsigned int>& support,
+    bool FindByInput(const Rows& function, const std::vector<unsigned int>& support,
                      Formula& formula)
     {
         for (const unsigned int input : support) {
-            const Bits low = function.Cofactor(input, false);
-            const Bits high = function.Cofactor(input, true);
+            const Rows low = Cofactor(function, input, false);
+            const Rows high = Cofactor(function, input, true);
             const Formula plain = MakeInput(input);
             Formula rest;
-            if (low.IsZero())
+            if (IsZero(low))
                 return Find(high, rest) && Set(formula, Join(Operator::And, plain, rest));
-            if (high.IsZero())
+            if (IsZero(high))
                 return Find(low, rest) && Set(formula, Join(Operator::And, MakeNot(plain), rest));
-            if (low.IsOne())
+            if (IsOne(low))
                 return Find(high, rest) && Set(formula, Join(Operator::Or, MakeNot(plain), rest));
-            if (high.IsOne())
+            if (IsOne(high))
                 return Find(low, rest) && Set(formula, Join(Operator::Or, plain, rest));
             if (low == ~high)
                 return Find(low, rest) && Set(formula, Join(Operator::Xor, plain, rest));
@@ -125,7 +125,7 @@ class Search {
     }
 
     // Two functions without a common input. The first input is always on the first side.
-    bool FindSplit(const Bits& function, const std::vector<unsigned int>& support, Formula& formula)
+    bool FindSplit(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
         if (support.size() > kMaxSplitInputs)
             return false;
@@ -142,23 +142,23 @@ class Search {
         return false;
     }
 
-    bool Split(const Bits& function, const std::vector<unsigned int>& first,
+    bool Split(const Rows& function, const std::vector<unsigned int>& first,
                const std::vector<unsigned int>& second, Formula& formula)
     {
-        const Bits product[2] = {Quantify(function, second, true), Quantify(function, first, true)};
+        const Rows product[2] = {Quantify(function, second, true), Quantify(function, first, true)};
         if ((product[0] & product[1]) == function)
             return JoinParts(Operator::And, product[0], product[1], formula);
-        const Bits sum[2] = {Quantify(function, second, false), Quantify(function, first, false)};
+        const Rows sum[2] = {Quantify(function, second, false), Quantify(function, first, false)};
         if ((sum[0] | sum[1]) == function)
             return JoinParts(Operator::Or, sum[0], sum[1], formula);
-        const Bits left = FixAll(function, second);
-        const Bits right = function.At(0) ? ~FixAll(function, first) : FixAll(function, first);
+        const Rows left = FixAll(function, second);
+        const Rows right = function.At(0) ? ~FixAll(function, first) : FixAll(function, first);
         if ((left ^ right) == function)
             return JoinParts(Operator::Xor, left, right, formula);
         return false;
     }
 
-    bool JoinParts(Operator op, const Bits& left, const Bits& right, Formula& formula)
+    bool JoinParts(Operator op, const Rows& left, const Rows& right, Formula& formula)
     {
         Formula leftFormula;
         Formula rightFormula;
@@ -167,7 +167,7 @@ class Search {
     }
 
     // The shortest of the factored covers and an expansion.
-    bool FindBest(const Bits& function, const std::vector<unsigned int>& support, Formula& formula)
+    bool FindBest(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
         bool isFound = false;
         for (const bool isInverted : {false, true}) {
@@ -184,15 +184,15 @@ class Search {
 
     // By the input whose parts have the shortest covers: as a multiplexer, or as one part that the
     // input turns into the other.
-    void Expand(const Bits& function, const std::vector<unsigned int>& support, bool& isFound,
+    void Expand(const Rows& function, const std::vector<unsigned int>& support, bool& isFound,
                 Formula& formula)
     {
         size_t leastLiterals = SIZE_MAX;
         unsigned int best = 0;
         int bestKind = 0;
         for (const unsigned int input : support) {
-            const Bits low = function.Cofactor(input, false);
-            const Bits high = function.Cofactor(input, true);
+            const Rows low = Cofactor(function, input, false);
+            const Rows high = Cofactor(function, input, true);
             const size_t lowLiterals = CountLiterals(FindCover(low));
             const size_t highLiterals = CountLiterals(FindCover(high));
             const size_t changeLiterals = CountLiterals(FindCover(low ^ high));
@@ -207,8 +207,8 @@ class Search {
                 bestKind = kind;
             }
         }
-        const Bits low = function.Cofactor(best, false);
-        const Bits high = function.Cofactor(best, true);
+        const Rows low = Cofactor(function, best, false);
+        const Rows high = Cofactor(function, best, true);
         const Formula plain = MakeInput(best);
         Formula first;
         Formula second;
@@ -240,7 +240,7 @@ class Search {
     }
 
     unsigned int m_num_inputs;
-    std::map<Bits, Formula> m_known;
+    std::map<Rows, Formula> m_known;
 };
 
 } // namespace
@@ -248,14 +248,14 @@ class Search {
 ShortForm FindShortForm(const Function& function)
 {
     ShortForm result;
-    const Bits bits(function);
+    const Rows& rows = function.GetRows();
     Formula formula;
-    if (!Search(bits.NumInputs()).Find(bits, formula))
+    if (!Search(rows.NumInputs()).Find(rows, formula))
         return result;
     result.expression = ToExpression(formula, function.Inputs());
     // What is printed is proved, not what was meant to be written.
-    result.isFound = ToFunction(result.expression).Words() == function.Words();
-    const size_t numMattering = bits.Support().size();
+    result.isFound = ToFunction(result.expression) == function;
+    const size_t numMattering = Support(rows).size();
     result.numLiterals = CountLiterals(formula);
     // Every input that matters must be mentioned, so once each is the least there is.
     result.isMinimal = numMattering <= kMaxShortestInputs || result.numLiterals == numMattering;

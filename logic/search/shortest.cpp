@@ -1,7 +1,7 @@
 #include "shortest.h"
 
-#include <array>
-#include <memory>
+#include <cassert>
+#include <utility>
 
 #include "watch.h"
 
@@ -9,10 +9,17 @@ namespace booleq {
 
 namespace {
 
-typedef uint16_t Column; // of four inputs; the one whose row 0 is 0 stands for its inversion too
+// The rows of four inputs as the number of a function; the one whose row 0 is 0 stands for its
+// inversion too.
+typedef uint16_t Column;
 
 constexpr size_t kNumColumns = 65536;
-constexpr std::array<Column, 4> kInputColumns = {0xff00, 0xf0f0, 0xcccc, 0xaaaa};
+
+constexpr Column InputColumn(unsigned int input)
+{
+    return static_cast<Column>(InputWord(kMaxShortestInputs, input, 0) &
+                               RowMask(kMaxShortestInputs));
+}
 
 Column Normal(Column column)
 {
@@ -36,7 +43,8 @@ class ShortestTable {
     ShortestTable() : m_origins(kNumColumns), m_by_weight(kLiteralWeight)
     {
         m_by_weight.emplace_back();
-        for (const Column column : kInputColumns) {
+        for (unsigned int input = 0; input < kMaxShortestInputs; ++input) {
+            const Column column = InputColumn(input);
             m_origins[column] = {Operator::Input, column, 0};
             m_by_weight.back().push_back(column);
         }
@@ -114,7 +122,7 @@ class ShortestTable {
         Formula formula;
         if (origin.op == Operator::Input) {
             uint32_t input = 0;
-            while (kInputColumns[input] != normal)
+            while (InputColumn(input) != normal)
                 ++input;
             formula = MakeInput(input);
         } else {
@@ -138,20 +146,21 @@ void Renumber(Formula& formula, const std::vector<unsigned int>& support)
 
 } // namespace
 
-Formula FindShortest(const Bits& function)
+Formula FindShortest(const Rows& function)
 {
-    if (function.IsZero() || function.IsOne())
-        return MakeConstant(function.IsOne());
-    const std::vector<unsigned int> support = function.Support();
-    Column column = 0;
-    for (unsigned int row = 0; row < 16; ++row) {
-        uint64_t ownRow = 0;
-        for (size_t place = 0; place < support.size(); ++place)
-            if ((row >> (3 - place) & 1u) != 0)
-                ownRow |= uint64_t(1) << (function.NumInputs() - 1 - support[place]);
-        if (function.At(ownRow))
-            column = static_cast<Column>(column | 1u << row);
-    }
+    if (IsZero(function) || IsOne(function))
+        return MakeConstant(IsOne(function));
+    const std::vector<unsigned int> support = Support(function);
+    assert(support.size() <= kMaxShortestInputs);
+    // The inputs that matter come first, the others after them.
+    Rows rows = Restrict(function, support);
+    std::vector<unsigned int> order;
+    while (rows.NumInputs() < kMaxShortestInputs)
+        rows = Widen(rows);
+    const auto numIdle = static_cast<unsigned int>(kMaxShortestInputs - support.size());
+    for (unsigned int place = 0; place < kMaxShortestInputs; ++place)
+        order.push_back((place + numIdle) % kMaxShortestInputs);
+    const auto column = static_cast<Column>(PermuteInputs(std::move(rows), order).Words()[0]);
     static ShortestTable table; // it grows as far as it was asked for
     Formula formula = table.Find(column);
     Renumber(formula, support);

@@ -2,8 +2,8 @@
 #ifndef BOOLEQ_SEARCH_SHORTEST_H
 #define BOOLEQ_SEARCH_SHORTEST_H
 
-#include "bits.h"
 #include "formula.h"
+#include "rows.h"
 
 namespace booleq {
 
@@ -14,7 +14,7 @@ constexpr unsigned int kMaxShortestInputs = 4;
 // with as many literals, fewer exclusive ORs come first. Inversions are free, so a function and its
 // inversion are one.
 // Requires: at most kMaxShortestInputs inputs matter.
-Formula FindShortest(const Bits& function);
+Formula FindShortest(const Rows& function);
 
 } // namespace booleq
 

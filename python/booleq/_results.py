@@ -16,19 +16,19 @@ class ParseError(ValueError):
     >>> try:
     ...     Equation("A && B")
     ... except ParseError as error:
-    ...     print(error.offset, error.length, error.code, error.mend, sep="; ")
+    ...     print(error.offset, error.length, error.code, error.hint, sep="; ")
     2; 1; no-right-operand; write '&' for '&&'
     """
 
     def __init__(self, message: str, text: str, offset: int, length: int, code: str, reason: str,
-                 mend: str) -> None:
-        super().__init__(message, text, offset, length, code, reason, mend)
+                 hint: str) -> None:
+        super().__init__(message, text, offset, length, code, reason, hint)
         self.text = text
         self.offset = offset
         self.length = length
         self.code = code
         self.reason = reason
-        self.mend = mend
+        self.hint = hint
 
     def __str__(self) -> str:
         return str(self.args[0])

@@ -19,7 +19,7 @@ constexpr size_t kNodesLikeLookUps = 40;
 
 // A packed column that an array shows.
 struct Words {
-    std::vector<uint64_t> words;
+    booleq::Rows rows;
 };
 
 py::module_ NumPy()
@@ -94,12 +94,12 @@ void EvalByWords(const booleq::Expression& expression, const Table& table, const
 void EvalByColumn(const Equation& equation, const Table& table, const py::object& array,
                   uint8_t* results)
 {
-    const std::vector<uint64_t> column = ColumnOf(equation);
+    const booleq::Rows column = RowsOf(equation);
     ForEachBlock(table, array, results, [&](const RowPacker& packer) {
         uint64_t word = 0;
         for (size_t row = 0; row < packer.NumRows(); ++row) {
             const uint64_t number = packer.RowNumber(row);
-            word |= (column[number / 64] >> (number % 64) & 1u) << row;
+            word |= static_cast<uint64_t>(column.At(number) ? 1 : 0) << row;
         }
         return word;
     });
@@ -164,13 +164,13 @@ py::object TruthTable(const Equation& equation)
     const uint64_t numRows = uint64_t(1) << numInputs;
     py::object table = NewArray(py::make_tuple(numRows, numInputs + 1));
     const py::buffer_info info = py::buffer(table).request(true);
-    const std::vector<uint64_t> column = ColumnOf(equation);
+    const booleq::Rows column = RowsOf(equation);
     uint8_t* byte = DataOf(info);
     for (uint64_t row = 0; row < numRows; ++row) {
         // The first input is the highest bit of the row number.
         for (size_t input = 0; input < numInputs; ++input)
             *byte++ = static_cast<uint8_t>(row >> (numInputs - 1 - input) & 1u);
-        *byte++ = static_cast<uint8_t>(column[row / 64] >> (row % 64) & 1u);
+        *byte++ = column.At(row) ? 1 : 0;
         if (row % 4096 == 0)
             CheckSignals();
     }
@@ -179,12 +179,13 @@ py::object TruthTable(const Equation& equation)
 
 py::object Column(const Equation& equation)
 {
-    const std::vector<uint64_t> words = ColumnOf(equation);
+    const booleq::Rows rows = RowsOf(equation);
     const uint64_t numRows = uint64_t(1) << equation.NumInputs();
     py::object column = NewArray(py::make_tuple(numRows));
     const py::buffer_info info = py::buffer(column).request(true);
     for (uint64_t row = 0; row < numRows; row += 64) {
-        UnpackBits(words[row / 64], std::min<uint64_t>(64, numRows - row), DataOf(info) + row);
+        UnpackBits(rows.Words()[row / 64], std::min<uint64_t>(64, numRows - row),
+                   DataOf(info) + row);
         CheckSignals();
     }
     return column;
@@ -192,8 +193,8 @@ py::object Column(const Equation& equation)
 
 py::object PackedColumn(const Equation& equation)
 {
-    auto words = std::make_unique<Words>(Words{ColumnOf(equation)});
-    return NumPy().attr("frombuffer")(py::cast(std::move(words)), "uint64");
+    auto owner = std::make_unique<Words>(Words{RowsOf(equation)});
+    return NumPy().attr("frombuffer")(py::cast(std::move(owner)), "uint64");
 }
 
 } // namespace
@@ -203,7 +204,7 @@ void BindArrays(py::module_& module, EquationClass& type)
     // What owns a packed column while an array shows it; nobody makes one by hand.
     py::class_<Words>(module, "_Words", py::buffer_protocol(), py::module_local())
         .def_buffer([](Words& self) {
-            return py::buffer_info(self.words.data(), static_cast<py::ssize_t>(self.words.size()));
+            return py::buffer_info(self.rows.Words(), static_cast<py::ssize_t>(self.rows.Size()));
         });
     type.def("eval_many", &EvalMany, py::arg("assignments"),
              R"doc(eval_many($record, self, assignments)

@@ -152,17 +152,17 @@ size_t Equation::Hash() const
     return m_hash;
 }
 
-std::vector<uint64_t> ColumnOf(const Equation& equation)
+booleq::Rows RowsOf(const Equation& equation)
 {
-    std::vector<uint64_t> words;
-    if (!equation.Get().GetColumn(words, booleq::WatchAndGoOn, nullptr))
+    booleq::Rows rows;
+    if (!booleq::RowsOf(equation.Get(), rows))
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
-    return words;
+    return rows;
 }
 
 booleq::Function FunctionOf(const Equation& equation)
 {
-    return booleq::Function(equation.InputBytes(), ColumnOf(equation));
+    return {equation.InputBytes(), RowsOf(equation)};
 }
 
 unsigned int RequireBit(const py::handle& value, const py::handle& name)

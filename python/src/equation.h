@@ -80,9 +80,8 @@ std::unique_ptr<Equation> MakeEquation(const Arguments&... arguments)
     return std::unique_ptr<Equation>(::new Equation(arguments...));
 }
 
-// Row k of the equation's table is bit k % 64 of word k / 64.
 // Fails: ValueError for more than 30 inputs; what a signal's handler raises.
-std::vector<uint64_t> ColumnOf(const Equation& equation);
+booleq::Rows RowsOf(const Equation& equation);
 booleq::Function FunctionOf(const Equation& equation);
 
 // 'value' as 0 or 1.  Fails: TypeError, ValueError.

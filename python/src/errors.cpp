@@ -29,11 +29,11 @@ void RaiseParseError(const py::str& text, const booleq::RefusalReport& report)
     if (report.length != 0)
         message += " at " + booleq::PlaceName(ByteForCharacter(text), place.offset);
     message += ": " + report.reason;
-    if (!report.mend.empty())
-        message += "; " + report.mend;
+    if (!report.hint.empty())
+        message += "; " + report.hint;
     const py::object type = ResultClass("ParseError");
     const py::object error = type(Decode(message), text, place.offset, place.length, report.code,
-                                  Decode(report.reason), Decode(report.mend));
+                                  Decode(report.reason), Decode(report.hint));
     PyErr_SetObject(type.ptr(), error.ptr());
     throw py::error_already_set();
 }

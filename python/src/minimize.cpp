@@ -54,7 +54,7 @@ py::object MinimizeEquation(const Equation& equation, const py::object& dontCare
     const booleq::Pla table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
     const booleq::Sum sum = Minimised(table, Options(isExact, seconds));
     const booleq::Conversion conversion =
-        Convert(ExpressionOf(table, sum.cubes, 0, false), booleq::Target::Primary, "");
+        Convert(ExpressionOf(table, sum.cubes, 0, false), *booleq::FindTarget("primary"), "", {10});
     if (!conversion.fault.empty())
         throw py::value_error(conversion.fault);
     py::list cubes;

@@ -28,7 +28,7 @@ An equation is a mapping of its inputs to their values, all 0 at first.
 >>> Equation("0x4", ["A", "B"]).expression
 '( A & ~ B )'
 
-A text that is refused raises ParseError, which knows the place and often the mend. A name that is
+A text that is refused raises ParseError, which knows the place and often the hint. A name that is
 none, or is listed twice, is a ValueError.
 
 >>> Equation("A && B")

@@ -2,10 +2,13 @@
 #include <string>
 #include <vector>
 
+#include <kq_logic/explain.h>
+#include <kq_logic/short_form.h>
+
 #include "bind.h"
-#include "describe.h"
 #include "equality.h"
 #include "errors.h"
+#include "function_access.h"
 #include "lint.h"
 #include "permute.h"
 #include "text.h"
@@ -22,6 +25,8 @@ using namespace pybind11::literals; // "name"_a
 constexpr size_t kMaxShownNodes = 300;
 constexpr size_t kMaxShownText = 10000;
 constexpr size_t kMaxShownInitInputs = 5;
+
+constexpr double kLintSeconds = 10; // for each reader
 
 py::object Link(size_t index)
 {
@@ -72,18 +77,18 @@ py::object Equivalent(const Equation& equation, const py::object& otherObject)
         throw py::type_error("other must be an Equation, not " +
                              std::string(Py_TYPE(otherObject.ptr())->tp_name));
     const auto& other = otherObject.cast<const Equation&>();
-    const booleq::Equality equality = CompareFunctions(FunctionOf(equation), FunctionOf(other));
-    if (!equality.fault.empty())
-        throw py::value_error(equality.fault);
+    const booleq::Decision decision = booleq::DecideEquations(equation.Get(), other.Get(), {});
+    if (decision.verdict == booleq::Verdict::Undecided)
+        throw py::value_error(booleq::UndecidedText(decision, {}));
     py::object counterexample = py::none();
     py::object values = py::none();
-    if (!equality.IsEqual()) {
+    if (decision.IsDifferent()) {
         counterexample = py::dict();
-        for (size_t input = 0; input < equality.inputs.size(); ++input)
-            counterexample[Decode(equality.inputs[input])] = equality.InputAt(input) ? 1 : 0;
-        values = py::make_tuple(equality.left ? 1 : 0, equality.right ? 1 : 0);
+        for (size_t input = 0; input < decision.inputs.size(); ++input)
+            counterexample[Decode(decision.inputs[input])] = decision.assignment[input] ? 1 : 0;
+        values = py::make_tuple(decision.left ? 1 : 0, decision.right ? 1 : 0);
     }
-    return ResultClass("Equivalence")(equality.IsEqual(), counterexample, values);
+    return ResultClass("Equivalence")(decision.IsEqual(), counterexample, values);
 }
 
 std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& inputs)
@@ -115,29 +120,30 @@ py::object OrNone(const std::string& text)
 py::object Explain(const Equation& equation)
 {
     const booleq::Function function = FunctionOf(equation);
-    const booleq::Description description = Describe(function);
-    if (!description.fault.empty())
-        throw py::value_error(description.fault);
-    const bool hasExpression = !description.expression.empty();
+    const kq_logic::Function asked = kq_logic::FunctionAccess::Make(function);
+    const kq_logic::Explanation explanation = kq_logic::Explain(asked);
+    if (!explanation.fault.empty())
+        throw py::value_error(explanation.fault);
+    const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(asked);
     const py::object operands =
-        hasExpression ? py::object(py::int_(description.numOperands)) : py::none();
+        shortForm.fault.empty() ? py::object(py::int_(shortForm.numOperands)) : py::none();
     return ResultClass("Explanation")(
         "inputs"_a = equation.Inputs(), "hex"_a = function.Hex(), "binary"_a = function.Binary(),
-        "without_effect"_a = DecodeAll(description.idle), "kind"_a = OrNone(description.kind),
-        "function"_a = description.kind.empty() ? py::none() : py::object(Decode(description.text)),
-        "expression"_a = OrNone(description.expression), "operands"_a = operands,
-        "minimal"_a = description.isMinimal);
+        "without_effect"_a = DecodeAll(explanation.idle), "kind"_a = OrNone(explanation.kind),
+        "function"_a = explanation.kind.empty() ? py::none() : py::object(Decode(explanation.text)),
+        "expression"_a = OrNone(shortForm.text), "operands"_a = operands,
+        "minimal"_a = shortForm.isMinimal);
 }
 
 py::object DifferenceOf(const booleq::LintReport& report, const booleq::ForeignReading& reading)
 {
-    if (!reading.isRead || reading.comparison.isEqual)
+    if (!reading.decision.IsDifferent())
         return py::none();
     py::dict assignment;
     for (size_t input = 0; input < report.inputs.size(); ++input)
-        assignment[Decode(report.inputs[input])] = reading.comparison.first[input] ? 1 : 0;
+        assignment[Decode(report.inputs[input])] = reading.decision.assignment[input] ? 1 : 0;
     return ResultClass("Difference")(
-        "assignment"_a = assignment, "here"_a = reading.valueHere ? 1 : 0,
+        "assignment"_a = assignment, "here"_a = reading.decision.left ? 1 : 0,
         "grouping"_a = Decode(reading.grouping), "reason"_a = Decode(reading.reason),
         "write_there"_a = Decode(reading.textThere), "write_here"_a = OrNone(reading.textHere));
 }
@@ -148,8 +154,10 @@ py::object ReadingOf(const booleq::LintReport& report, const booleq::ForeignRead
     py::object same = py::none();
     py::object comparedAll = py::none();
     if (reading.isRead) {
-        same = py::bool_(reading.comparison.isEqual);
-        comparedAll = py::bool_(reading.comparison.isExhaustive);
+        const bool isDecided = reading.decision.verdict != booleq::Verdict::Undecided;
+        comparedAll = py::bool_(isDecided);
+        if (isDecided)
+            same = py::bool_(reading.decision.IsEqual());
     } else {
         refusal = Decode(reading.fault);
     }
@@ -170,8 +178,8 @@ py::object FindingOf(const booleq::Finding& finding)
 
 py::object LintEquation(const Equation& equation)
 {
-    const booleq::LintReport report =
-        booleq::Lint(Encode(equation.Text()), equation.Get(), equation.GetReading());
+    const booleq::LintReport report = booleq::Lint(Encode(equation.Text()), equation.Get(),
+                                                   equation.GetReading(), {kLintSeconds});
     py::list readers;
     for (const booleq::ForeignReading& reading : report.readings)
         readers.append(ReadingOf(report, reading));

@@ -321,11 +321,11 @@ def test_what_is_too_large_is_refused_before_it_is_made() -> None:
     many = Equation("^".join(f"n{place}" for place in range(31)))
     questions: List[Callable[[], Any]] = [
         many.column, many.packed_column, many.truth_table, many.explain, lambda: many.hex_init,
-        lambda: many.binary_init, lambda: many.equivalent(many),
-        lambda: many.permute(many.inputs)]
+        lambda: many.binary_init, lambda: many.permute(many.inputs)]
     for question in questions:
         with pytest.raises(ValueError, match="30|24"):
             question()
+    assert many.equivalent(many)  # is decided without rows
 
 
 @pytest.mark.parametrize("question", [

@@ -40,7 +40,18 @@ class TestConstruction:
     def test_an_init_value_needs_a_list(self) -> None:
         assert Equation("0x8", ["A", "B"])(A=1, B=1) == 1
         error = refusal("0x8")
-        assert "inputs=" in error.mend and "--" not in error.mend
+        assert "inputs=" in error.hint and "--" not in error.hint
+
+    def test_an_init_value_may_have_a_size(self) -> None:
+        inputs = ["S", "A", "B"]
+        assert Equation("8'hca", inputs) == Equation("0xca", inputs)
+        assert Equation.from_init("8'b1100_1010", inputs).hex_init == "0xca"
+        assert Equation("0x2", ["A"])(A=1) == 1
+        assert Equation("2'h1", ["A"])(A=1) == 0
+        with pytest.raises(ParseError) as caught:
+            Equation("16'hca", inputs)
+        assert (caught.value.offset, caught.value.length, caught.value.code) == (0, 2, "init-width")
+        assert caught.value.hint == "write 8'hca, or list 4 inputs"
 
     def test_lsb_first_turns_the_bits(self) -> None:
         assert Equation("0x2", ["A", "B"]).hex_init == "0x2"
@@ -120,7 +131,7 @@ class TestRefusals:
         assert (error.offset, error.length) == (2, 1)
         assert error.code == "no-right-operand"
         assert error.reason == "the operator '&' has no operand on its right"
-        assert error.mend == "write '&' for '&&'"
+        assert error.hint == "write '&' for '&&'"
         assert str(error) == ("refused at character 3: the operator '&' has no operand on its "
                               "right; write '&' for '&&'")
 
@@ -146,7 +157,7 @@ class TestRefusals:
         assert (error.code, error.offset, error.length) == (code, offset, length)
         assert str(error).startswith("refused: " if length == 0 else
                                      f"refused at character {offset + 1}: ")
-        assert error.reason in str(error) and str(error).endswith(error.mend)
+        assert error.reason in str(error) and str(error).endswith(error.hint)
 
     def test_a_name_that_makes_another_text(self) -> None:
         assert refusal("0x8", ["'a'+", "B"]).code == "init-name"

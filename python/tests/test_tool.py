@@ -87,9 +87,9 @@ def check_refusal(text: str, error: ParseError, refusal: Dict[str, Any]) -> None
                                                          refusal["length"])
     assert error.text == text and error.code == refusal["code"]
     assert shown(error.reason) == refusal["reason"]
-    assert shown(error.mend) == (refusal["mend"] or "")
+    assert shown(error.hint) == (refusal["hint"] or "")
     words = f"refused at character {error.offset + 1}: {error.reason}"
-    assert str(error) == words + (f"; {error.mend}" if error.mend else "")
+    assert str(error) == words + (f"; {error.hint}" if error.hint else "")
     again = pickle.loads(pickle.dumps(error))
     assert (str(again), again.__dict__) == (str(error), error.__dict__)
 
@@ -112,8 +112,8 @@ def compare(path: pathlib.Path, texts: Sequence[str], command: str, check: Check
         except ParseError as error:
             assert answer["status"] == "refused", text
             refusal = dict(answer["refusal"])
-            if refusal["mend"]:
-                refusal["mend"] = refusal["mend"].replace("--inputs", "inputs=")
+            if refusal["hint"]:
+                refusal["hint"] = refusal["hint"].replace("--inputs", "inputs=")
             refusal["reason"] = refusal["reason"].replace("--inputs", "inputs=")
             check_refusal(text, error, refusal)
             continue
@@ -182,7 +182,12 @@ def check_lint(equation: Equation, answer: Dict[str, Any]) -> None:
 
 
 def check_explain(equation: Equation, answer: Dict[str, Any]) -> None:
-    assert all_shown(equation.explain()) == answer["result"]
+    result = dict(answer["result"])
+    lsb_first = result.pop("lsb_first")
+    assert all_shown(equation.explain()) == result
+    if 0 < len(equation.inputs) < 12:
+        turned = equation.permute(equation.inputs[::-1])
+        assert lsb_first == {"hex": turned.hex_init, "binary": turned.binary_init}
 
 
 def check_nothing(_equation: Equation, _answer: Dict[str, Any]) -> None:

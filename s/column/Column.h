@@ -43,8 +43,8 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels);
 class KqColumn {
   public:
     // Compiles the tree at 'root', which may be null and then counts as 0.
-    // Requires: a checked tree; numVariables <= kKqMaxColumnVariables. An ID whose index is no
-    // variable counts as 0. Fails: std::bad_alloc.  Cost: O(nodes).
+    // Requires: a checked tree; numVariables <= kKqMaxColumnVariables. An ID whose index is not
+    // that of a variable counts as 0.  Fails: std::bad_alloc.  Cost: O(nodes).
     KqColumn(const Kq_BoolEquationImp::Node* root, unsigned int numVariables);
 
     // 2^numVariables / 64, at least 1.

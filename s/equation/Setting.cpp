@@ -28,25 +28,24 @@ constexpr size_t kFirstVariables = 8;
 // message's receiver may have set, cleared or destroyed it.
 class Watch {
   public:
-    Watch(const void* object, KqStore* store) : m_object(object), m_store(store)
+    Watch(const void* object, KqStore* store) : m_watcher{object, nullptr}, m_store(store)
     {
         m_store->Hold(); // so that clearing the object gives it another store
-        m_store->Watch(object);
+        m_store->AddWatcher(m_watcher);
     }
     ~Watch()
     {
-        if (m_store->IsWatched(m_object))
-            m_store->Watch(nullptr);
+        m_store->RemoveWatcher(m_watcher);
         KqStore::Release(m_store);
     }
     Watch(const Watch&) = delete;
     Watch& operator=(const Watch&) = delete;
 
-    bool IsUntouched() const { return m_store->IsWatched(m_object); }
+    bool IsUntouched() const { return m_store->HasHolder(m_watcher); }
     KqStore& GetStore() const { return *m_store; }
 
   private:
-    const void* m_object;
+    KqStore::Watcher m_watcher;
     KqStore* m_store;
 };
 

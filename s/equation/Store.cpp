@@ -17,14 +17,14 @@ namespace {
 constexpr size_t kKeptSlots = 3000;
 
 // Guards what changes in stores that several objects may share: the list and the links as long as
-// there is no root, and the moment in which a tree that was owed appears. Never held while memory
-// is freed or a message goes out.
-std::mutex s_looseNodes;
+// there is no root, the moment in which a tree that was owed appears, and the watchers. Never held
+// while memory is allocated or freed, which may use equations, or a message goes out.
+std::mutex s_sharedStores;
 
 // Takes the lock where nodes are loose: below a root they and their list no longer change.
 std::unique_lock<std::mutex> LockLoose(const std::atomic<Node*>& root)
 {
-    std::unique_lock<std::mutex> lock(s_looseNodes, std::defer_lock);
+    std::unique_lock<std::mutex> lock(s_sharedStores, std::defer_lock);
     if (!root.load(std::memory_order_acquire))
         lock.lock();
     return lock;
@@ -83,7 +83,7 @@ const Node* KqStore::PayTree() const
     KqTree made;
     KqMakeDigitsTree(*m_digits, made);
     // After 'made', so that what is thrown away is freed without the lock.
-    const std::lock_guard<std::mutex> paying(s_looseNodes);
+    const std::lock_guard<std::mutex> paying(s_sharedStores);
     if (!m_root.load(std::memory_order_relaxed)) {
         m_list.swap(made.list);
         m_block.Swap(made.block);
@@ -96,7 +96,7 @@ bool KqStore::TakeTokens(const KqTokens& tokens)
 {
     KqTree made;
     made.MakeNodes(tokens);
-    const std::lock_guard<std::mutex> taking(s_looseNodes);
+    const std::lock_guard<std::mutex> taking(s_sharedStores);
     if (HasEquation() || !m_list.empty())
         return false;
     m_list.swap(made.list);
@@ -120,7 +120,7 @@ void KqStore::CopyTokens(KqTree& copy) const
 void KqStore::TakeLinks(const KqTree& tree) noexcept
 {
     // Both blocks hold the nodes side by side in the order of the tokens.
-    const std::lock_guard<std::mutex> linking(s_looseNodes);
+    const std::lock_guard<std::mutex> linking(s_sharedStores);
     if (m_root.load(std::memory_order_relaxed))
         return;
     assert(m_list.size() == tree.list.size());
@@ -197,8 +197,8 @@ std::vector<unsigned int> KqStore::MakeHandle(const String& name, unsigned int v
             KqAppendDigitsPositions(*m_digits, static_cast<size_t>(found - names.begin()), values);
         return values;
     }
-    const std::unique_lock<std::mutex> reading = LockLoose(m_root);
-    for (size_t position = 0; position < m_list.size(); ++position) {
+    const size_t numNodes = CountNodes(); // once they are there, their texts stay
+    for (size_t position = 0; position < numNodes; ++position) {
         // Deliberate: the node's type is not asked for, only its token.
         if (KqIsSameText(m_list[position]->GetToken(), name))
             values.push_back(static_cast<unsigned int>(position));
@@ -208,22 +208,61 @@ std::vector<unsigned int> KqStore::MakeHandle(const String& name, unsigned int v
 
 std::vector<KqStore::Place> KqStore::ListPlaces(size_t& root) const
 {
-    const Node* const rootNode = GetRoot(); // makes the nodes
-    const std::unique_lock<std::mutex> reading = LockLoose(m_root);
+    GetRoot(); // makes the nodes
+    std::vector<Place> places(CountNodes());
     std::unordered_map<const Node*, size_t> positions;
-    for (const Node* node : m_list)
-        positions.emplace(node, positions.size());
+    positions.reserve(places.size());
+    for (size_t position = 0; position < places.size(); ++position)
+        positions.emplace(m_list[position], position);
     const auto positionOf = [&](const Node* node) {
         const auto found = positions.find(node);
         return found == positions.end() ? size_t(Place::kNowhere) : found->second;
     };
-    std::vector<Place> places;
-    places.reserve(m_list.size());
-    for (const Node* node : m_list)
-        places.push_back({node, positionOf(node->GetParent()), positionOf(node->GetLeftChild()),
-                          positionOf(node->GetRightChild())});
-    root = positionOf(rootNode);
+    const std::unique_lock<std::mutex> reading = LockLoose(m_root);
+    for (size_t position = 0; position < places.size(); ++position) {
+        const Node* const node = m_list[position];
+        places[position] = {node, positionOf(node->GetParent()), positionOf(node->GetLeftChild()),
+                            positionOf(node->GetRightChild())};
+    }
+    root = positionOf(m_root.load(std::memory_order_relaxed));
     return places;
+}
+
+void KqStore::AddWatcher(Watcher& watcher) noexcept
+{
+    const std::lock_guard<std::mutex> adding(s_sharedStores);
+    watcher.next = m_watchers.load(std::memory_order_relaxed);
+    m_watchers.store(&watcher, std::memory_order_relaxed);
+}
+
+void KqStore::RemoveWatcher(const Watcher& watcher) noexcept
+{
+    const std::lock_guard<std::mutex> removing(s_sharedStores);
+    Watcher* const first = m_watchers.load(std::memory_order_relaxed);
+    if (first == &watcher) {
+        m_watchers.store(watcher.next, std::memory_order_relaxed);
+        return;
+    }
+    Watcher* before = first;
+    while (before->next != &watcher)
+        before = before->next;
+    before->next = watcher.next;
+}
+
+bool KqStore::HasHolder(const Watcher& watcher) const noexcept
+{
+    const std::lock_guard<std::mutex> reading(s_sharedStores);
+    return watcher.holder != nullptr;
+}
+
+void KqStore::TellEachWatcher(const void* holder) noexcept
+{
+    const std::lock_guard<std::mutex> telling(s_sharedStores);
+    for (Watcher* watcher = m_watchers.load(std::memory_order_relaxed); watcher;
+         watcher = watcher->next) {
+        if (watcher->holder == holder)
+            watcher->holder = nullptr;
+    }
 }
 
 uint64_t KqStore::GetWord(unsigned int numVariables) const

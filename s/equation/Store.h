@@ -24,8 +24,8 @@
 //    m_digits are the first variables of every holder. They never change while others hold them.
 //
 // Threads: const members at any time; they publish the owed tree and what evaluation keeps once,
-// complete. Others want the store alone, but for those that say so: the loose tokens that these
-// change are guarded by one lock of the process, which is held briefly.
+// complete. Others want the store alone, but for those that say so: the loose tokens and watchers
+// that these change are guarded by one lock of the process. Nothing is allocated or freed under it.
 class KqStore {
   public:
     typedef Kq_BoolEquationImp::Node Node;
@@ -107,16 +107,28 @@ class KqStore {
     // The results as read, null for an equation that was not read from digits.
     const KqDigits* GetDigits() const { return m_digits.get(); }
 
-    // Who is building here while messages go out; null once it has let the store go.
-    void Watch(const void* holder) { m_watched.store(holder, std::memory_order_relaxed); }
-    bool IsWatched(const void* holder) const
+    // Who is building here while messages go out. Several may be: the receiver of one's messages,
+    // or another thread, builds a copy.
+    struct Watcher {
+        const void* holder; // null once it has let the store go
+        Watcher* next;
+    };
+    // Any thread may ask these of a shared store.
+    void AddWatcher(Watcher& watcher) noexcept;
+    void RemoveWatcher(const Watcher& watcher) noexcept;
+    bool HasHolder(const Watcher& watcher) const noexcept;
+    // The holder lets the store go. Without the lock a watcher of this holder is seen: it was added
+    // before, and it stays.
+    void TellWatchers(const void* holder) noexcept
     {
-        return m_watched.load(std::memory_order_relaxed) == holder;
+        if (m_watchers.load(std::memory_order_relaxed))
+            TellEachWatcher(holder);
     }
 
   private:
     const Node* PayTree() const;
     size_t CountNodes() const;
+    void TellEachWatcher(const void* holder) noexcept;
     unsigned int EvalOther(const Variables& variables) const;
 
     // The first three fields are what an equation is made of, in this order.
@@ -126,7 +138,7 @@ class KqStore {
     mutable KqNodeBlock m_block;
     mutable KqEvaluation m_evaluation;
     std::unique_ptr<const KqDigits> m_digits;
-    std::atomic<const void*> m_watched{nullptr};
+    std::atomic<Watcher*> m_watchers{nullptr}; // owned by none
 };
 
 #endif

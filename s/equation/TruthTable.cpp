@@ -125,25 +125,31 @@ void TruthTable::Build(const Kq_BoolEquationImp& equation)
     // Deliberate: a constant has no table, not one of a single row.
     if (!equation || numVariables > kKqMaxColumnVariables || numVariables == 0)
         return;
-    m_equation = equation.GetEquation(false);
-    m_variable_names = equation.GetVariableNames();
+    const bool isTraced = KqDebugMode::IsOn();
+    // Apart from this table, which a message's receiver may change.
+    TruthTable apart;
+    TruthTable& built = isTraced ? apart : *this;
+    built.m_equation = equation.GetEquation(false);
+    built.m_variable_names = equation.GetVariableNames();
     std::vector<unsigned int> values(numVariables);
-    m_rows.reserve(size_t(1) << numVariables);
-    if (!KqDebugMode::IsOn()) {
-        AppendRows(KqResults(*equation.m_store, numVariables), values, m_rows);
+    built.m_rows.reserve(size_t(1) << numVariables);
+    if (!isTraced) {
+        AppendRows(KqResults(*equation.m_store, numVariables), values, built.m_rows);
         return;
     }
-    // Of a copy and apart from this table: a message's receiver may change both.
-    const Kq_BoolEquationImp held(equation);
-    std::vector<Row> rows;
-    rows.swap(m_rows);
+    const auto takeBuilt = [&] {
+        m_equation = built.m_equation; // all that can fail comes first
+        m_variable_names.swap(built.m_variable_names);
+        m_rows.swap(built.m_rows);
+    };
+    const Kq_BoolEquationImp held(equation); // the receiver may change the equation, too
     try {
-        AppendTracedRows(*held.GetRoot(), held.GetVariables(), values, rows);
+        AppendTracedRows(*held.GetRoot(), held.GetVariables(), values, built.m_rows);
     } catch (...) {
-        m_rows.swap(rows);
+        takeBuilt();
         throw;
     }
-    m_rows.swap(rows);
+    takeBuilt();
 }
 
 const std::vector<String>& TruthTable::GetVariableNames() const

@@ -11,22 +11,13 @@
 typedef Port::StringBase<char> String;
 typedef std::pair<String, unsigned int> Variable;
 
-namespace {
-
-size_t FindName(const std::vector<Variable>& variables, const String& name)
+size_t Kq_BoolEquationImp::FindVariable(const String& name) const
 {
-    for (size_t index = 0; index < variables.size(); ++index) {
-        if (KqIsSameText(variables[index].first, name))
+    for (size_t index = 0; index < m_variables.size(); ++index) {
+        if (KqIsSameText(m_variables[index].first, name))
             return index;
     }
     return kKqNotFound;
-}
-
-} // namespace
-
-size_t Kq_BoolEquationImp::FindVariable(const String& name) const
-{
-    return FindName(m_variables, name);
 }
 
 inline size_t Kq_BoolEquationImp::FindVariable(const Kq_BoolEquation::Handle& handle) const

@@ -4,6 +4,7 @@
 
 #include <cassert>
 #include <string>
+#include <utility>
 
 namespace {
 
@@ -71,9 +72,21 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
     // The host's string is made of a text with a NUL byte at its end.
     const std::string text(name, length);
     assert(text.find('\0') == std::string::npos);
-    std::unique_ptr<const KqName> entry(new KqName{text.c_str(), hash}); // outlives the lock
-    const std::lock_guard<std::mutex> adding(shard.lock);
-    Table& table = MakeRoom(shard);
+    // Both outlive the lock.
+    std::unique_ptr<const KqName> entry(new KqName{text.c_str(), hash});
+    std::unique_ptr<Table> larger;
+    std::unique_lock<std::mutex> adding(shard.lock);
+    while (const size_t numSlots = CountSlotsToMake(shard)) {
+        if (larger && larger->mask + 1 == numSlots) {
+            TakeTable(shard, std::move(larger));
+            break;
+        }
+        // Others may add names meanwhile, and tables for them.
+        adding.unlock();
+        larger.reset(new Table(numSlots));
+        adding.lock();
+    }
+    const Table& table = *shard.table.load(std::memory_order_relaxed);
     Slot* const slot = table.SlotOf(name, length, hash);
     const KqName* const other = slot->load(std::memory_order_relaxed);
     if (other)
@@ -81,25 +94,32 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
     const KqName& added = *entry;
     slot->store(entry.release(), std::memory_order_release);
     ++shard.numNames;
+    assert(2 * shard.numNames <= table.mask + 1);
     return added;
 }
 
-// The shard's table, with a free slot for one more name.
+// The size of the table that the shard needs for one more name; 0 when the present one has room.
 // Requires: the shard's lock.
-KqNamePool::Table& KqNamePool::MakeRoom(Shard& shard)
+size_t KqNamePool::CountSlotsToMake(const Shard& shard)
+{
+    const Table* const table = shard.table.load(std::memory_order_relaxed);
+    if (!table)
+        return kFirstSlots;
+    const size_t numSlots = table->mask + 1;
+    return 2 * (shard.numNames + 1) <= numSlots ? 0 : 4 * numSlots;
+}
+
+// Shows all names in a larger table from now on.
+// Requires: the shard's lock.
+void KqNamePool::TakeTable(Shard& shard, std::unique_ptr<Table> larger) noexcept
 {
     Table* const table = shard.table.load(std::memory_order_relaxed);
-    const size_t numSlots = table ? table->mask + 1 : 0;
-    if (2 * (shard.numNames + 1) <= numSlots)
-        return *table;
-    std::unique_ptr<Table> larger(new Table(numSlots == 0 ? kFirstSlots : 4 * numSlots));
-    for (size_t position = 0; position < numSlots; ++position) {
+    for (size_t position = 0; table && position <= table->mask; ++position) {
         const KqName* const entry = table->slots[position].load(std::memory_order_relaxed);
         if (entry)
             larger->SlotOf(entry->text.c_str(), entry->text.length(), entry->hash)
                 ->store(entry, std::memory_order_relaxed);
     }
     larger->outgrown.reset(table);
-    shard.table.store(larger.get(), std::memory_order_release);
-    return *larger.release();
+    shard.table.store(larger.release(), std::memory_order_release);
 }

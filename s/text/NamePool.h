@@ -9,8 +9,9 @@
 #include "Name.h"
 
 // A hash table in shards, each with a table of its own.
-// Threads: all at any time. A name that is there is found without a lock. A new one is made before
-// its shard's lock is taken; a thread that loses the race throws its own away afterwards.
+// Threads: all at any time. A name that is there is found without a lock. A new one, and a larger
+// table, is made before its shard's lock is taken; a thread that loses the race throws its own away
+// afterwards. So whoever serves or takes back memory may use the pool.
 // Invariants:
 // 1. An entry that a table shows is complete and never changes, moves or goes.
 // 2. A shard's table shows every name of the shard; it is at most half full. Tables it has outgrown
@@ -69,7 +70,8 @@ class KqNamePool {
     };
 
     const KqName& Add(Shard& shard, const char* name, size_t length, uint64_t hash);
-    static Table& MakeRoom(Shard& shard);
+    static size_t CountSlotsToMake(const Shard& shard);
+    static void TakeTable(Shard& shard, std::unique_ptr<Table> larger) noexcept;
 
     static constexpr unsigned int kShardShift = 58;
     static constexpr size_t kNumShards = size_t(1) << (64 - kShardShift);

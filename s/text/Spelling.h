@@ -14,7 +14,7 @@ struct KqSpelling {
 };
 
 // What the tokenizer accepts. A spelling is one character, an inversion's character directly before
-// an operator's, or a word between dots; text/Tokenizer.cpp checks that.
+// an operator's, or a word between dots; SpellingTables.h checks that.
 constexpr KqSpelling kKqSpellings[] = {
     {"&", Kq_BoolEquationImp::Node::AND},     {"*", Kq_BoolEquationImp::Node::AND},
     {".AND.", Kq_BoolEquationImp::Node::AND}, {"|", Kq_BoolEquationImp::Node::OR},

@@ -161,7 +161,7 @@ def check_ghdl(bench):
     bench.compare("vhdl, GHDL", run(["ghdl", "-r", "bench"], cwd=bench.directory).split())
 
 
-def c_columns(bench, functions):
+def c_columns(bench, functions, *flags):
     calls = ""
     for number, case in enumerate(bench.cases, 1):
         count = num_inputs(case)
@@ -171,12 +171,12 @@ def c_columns(bench, functions):
     source = bench.write("export.c", "#include <stdio.h>\n" + functions +
                          f"int main(void)\n{{\n{calls}    return 0;\n}}\n")
     program = os.path.join(bench.directory, "export")
-    run([shutil.which("cc"), "-std=c11", "-w", "-o", program, source])
+    run([shutil.which("cc"), *flags, "-o", program, source])
     return run([program]).split()
 
 
 def check_c(bench):
-    bench.compare("c, C compiler", c_columns(bench, bench.convert("c", "--unit")))
+    bench.compare("c, C compiler", c_columns(bench, bench.convert("c", "--unit"), "-Wall", "-Werror"))
 
 
 def check_python(bench):

@@ -8,7 +8,8 @@ import shutil
 import subprocess
 import sys
 
-COMPONENTS = ("library", "development", "tool", "python", "documentation")
+COMPONENTS = ("library", "development", "logic", "logic_development", "tool", "python",
+              "documentation")
 
 
 def files_below(top):

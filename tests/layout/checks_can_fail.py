@@ -131,16 +131,20 @@ class Includes(InCopy):
         self.expect("logic/search/match.cpp", "is internal")
 
     def test_room_that_is_named(self):
-        self.append("logic/search/match.cpp", '#include "../column/bits.h"\n')
+        self.append("logic/search/match.cpp", '#include "../column/rows.h"\n')
         self.expect("logic/search/match.cpp", "rooms are not named")
 
+    def test_header_of_the_second_library_that_looks_up(self):
+        self.append("include/kq_logic/match.h", '#include "rows.h"\n')
+        self.expect("include/kq_logic/match.h", "may not include")
+
     def test_two_headers_of_one_name(self):
-        self.append("logic/search/bits.h", "")
-        self.expect("logic/search/bits.h", "logic/column/bits.h has the same name")
+        self.append("logic/search/rows.h", "")
+        self.expect("logic/search/rows.h", "logic/column/rows.h has the same name")
 
     def test_header_of_the_tool_named_like_a_room_s(self):
-        self.append("tools/booleq/bits.h", "")
-        self.expect("tools/booleq/bits.h", "logic/column/bits.h has the same name")
+        self.append("tools/booleq/rows.h", "")
+        self.expect("tools/booleq/rows.h", "logic/column/rows.h has the same name")
 
     def test_long_function_of_a_room(self):
         self.append("logic/search/match.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")

@@ -4,7 +4,6 @@
 #include "expression.h"
 #include "logic_support.h"
 #include "notation_writer.h"
-#include "word_comparison.h"
 
 namespace {
 
@@ -95,30 +94,6 @@ TEST(Writer, TakesDeepExpressions)
     EXPECT_TRUE(Needed(text) == text);
     const std::string inversions = std::string(100000, '~') + "a";
     EXPECT_TRUE(Needed(inversions) == inversions);
-}
-
-TEST(Compare, FindsTheFirstRow)
-{
-    const auto both = [](const std::vector<uint64_t>& inputs) { return inputs[0] & inputs[1]; };
-    const auto first = [](const std::vector<uint64_t>& inputs) { return inputs[0]; };
-    const Comparison comparison = CompareWords(both, first, 2, 1);
-    EXPECT_FALSE(comparison.isEqual);
-    EXPECT_EQ(comparison.first, (std::vector<bool>{true, false}));
-    EXPECT_TRUE(CompareWords(both, both, 2, 1).isEqual);
-    EXPECT_EQ(CompareWords(both, both, 2, 1).numAssignments, 4u);
-}
-
-TEST(Compare, SaysWhenItOnlyTried)
-{
-    const auto first = [](const std::vector<uint64_t>& inputs) { return inputs[0]; };
-    const auto inverse = [](const std::vector<uint64_t>& inputs) { return ~inputs[0]; };
-    const Comparison same = CompareWords(first, first, 40, 1);
-    EXPECT_TRUE(same.isEqual);
-    EXPECT_FALSE(same.isExhaustive);
-    EXPECT_GT(same.numAssignments, 100000u);
-    const Comparison other = CompareWords(first, inverse, 40, 1);
-    EXPECT_FALSE(other.isEqual);
-    EXPECT_EQ(other.first.size(), 40u);
 }
 
 } // namespace

@@ -69,17 +69,17 @@ TEST(Function, AnotherOrderOfInputsIsTheSameFunctionRowByRow)
 TEST(Function, DependsOnAnInputThatChangesSomeRow)
 {
     std::mt19937_64 random(2);
-    for (size_t numInputs = 1; numInputs <= 8; ++numInputs) {
+    for (unsigned int numInputs = 1; numInputs <= 8; ++numInputs) {
         const Function function = RandomFunction(Names(numInputs), random);
         const Function wide = function.Over(Names(numInputs + 1));
-        EXPECT_FALSE(wide.DependsOn(numInputs));
-        for (size_t index = 0; index < numInputs; ++index) {
+        EXPECT_FALSE(DependsOn(wide.GetRows(), numInputs));
+        for (unsigned int index = 0; index < numInputs; ++index) {
             bool depends = false;
             const uint64_t step = uint64_t(1) << (numInputs - 1 - index);
             for (uint64_t row = 0; row < function.NumRows(); ++row)
                 depends = depends || function.At(row) != function.At(row ^ step);
-            EXPECT_EQ(depends, function.DependsOn(index));
-            EXPECT_EQ(depends, wide.DependsOn(index));
+            EXPECT_EQ(depends, DependsOn(function.GetRows(), index));
+            EXPECT_EQ(depends, DependsOn(wide.GetRows(), index));
         }
     }
 }
@@ -90,61 +90,38 @@ TEST(Function, FirstDifferenceIsTheLowestRow)
     const Function function = RandomFunction(Names(9), random);
     EXPECT_EQ(Function::kNoRow, function.FirstDifference(function));
     for (const uint64_t row : {0u, 63u, 64u, 300u, 511u}) {
-        std::vector<uint64_t> words = function.Words();
-        words[row / 64] ^= uint64_t(1) << (row % 64);
-        words.back() ^= uint64_t(1) << 63;
-        const Function other(function.Inputs(), words);
+        Rows rows = function.GetRows();
+        rows.Set(row, !rows.At(row));
+        rows.Set(511, !rows.At(511));
+        const Function other(function.Inputs(), rows);
         EXPECT_EQ(row == 511 ? Function::kNoRow : row, function.FirstDifference(other));
     }
 }
 
-// Every binary text and, with one digit more or less, every hexadecimal one of a few inputs.
-TEST(Function, InitTextsReadAsTheLibraryReadsThem)
+TEST(Function, WidthOfAnInitValueIsWhatTheLibraryTakes)
 {
-    std::mt19937_64 random(4);
-    size_t numAccepted = 0;
-    for (int repeat = 0; repeat < 4000; ++repeat) {
-        const bool isHex = random() % 2 == 0;
-        std::string text = isHex ? "0x" : "0b";
-        const size_t numDigits = 1 + random() % (isHex ? 10 : 36);
-        const uint64_t few = random() % 3; // some are all zeros or all ones, or nearly
-        for (size_t digit = 0; digit < numDigits; ++digit) {
-            const uint64_t value = random() % 8 == 0 || few == 2 ? random() : few == 0 ? 0 : 15;
-            text += "0123456789abcdef"[value % (isHex ? 16 : 2)];
+    for (size_t numDigits = 1; numDigits <= 40; ++numDigits) {
+        for (const bool isHex : {true, false}) {
+            const std::string text = (isHex ? "0X" : "0b") + std::string(numDigits, '1');
+            const InitWidth width = WidthOfInit(text);
+            EXPECT_EQ(isHex, width.isHex);
+            EXPECT_EQ(numDigits * (isHex ? 4 : 1), width.numRows);
+            for (size_t numInputs = 0; numInputs <= 9; ++numInputs) {
+                Reading reading;
+                reading.hasInputs = true;
+                reading.inputs = Names(numInputs);
+                Kq_BoolEquation equation;
+                EXPECT_EQ(numInputs == width.numInputs, SetVerbatim(equation, text, reading))
+                    << text << " over " << numInputs;
+            }
         }
-        if (random() % 16 == 0)
-            text[2 + random() % numDigits] = 'g';
-        Reading reading;
-        reading.hasInputs = true;
-        reading.inputs = Names(random() % 6);
-        reading.lsbFirst = random() % 2 == 0;
-        if (reading.inputs.empty())
-            continue; // the library makes an empty group of "0b0" and "0b1"
-        Kq_BoolEquation equation;
-        const bool isAccepted = SetFromText(equation, text, reading);
-        Function function;
-        const InitText init = FunctionFromInit(text, reading.inputs, reading.lsbFirst, function);
-        ASSERT_EQ(isAccepted, init.fault == InitFault::kNone) << text;
-        if (!isAccepted)
-            continue;
-        ++numAccepted;
-        Function expected;
-        ASSERT_TRUE(FunctionOf(equation, expected));
-        ASSERT_EQ(expected, function) << text << (reading.lsbFirst ? " lsb first" : "");
     }
-    EXPECT_GT(numAccepted, 300u);
 }
 
-TEST(Function, FaultsOfInitTexts)
+TEST(Function, OtherTextsAreNoInitValuesByTheirBeginning)
 {
-    EXPECT_EQ(InitFault::kPrefix, ReadInitText("0y1", 1).fault);
-    EXPECT_EQ(InitFault::kPrefix, ReadInitText("A", 1).fault);
-    EXPECT_EQ(InitFault::kPrefix, ReadInitText("0x", 1).fault);
-    EXPECT_EQ(InitFault::kDigit, ReadInitText("0x1g", 3).fault);
-    EXPECT_EQ(3u, ReadInitText("0x1g", 3).faultPosition);
-    EXPECT_EQ(InitFault::kDigit, ReadInitText("0b12", 1).fault);
-    EXPECT_EQ(InitFault::kWidth, ReadInitText("0x8", 3).fault);
-    EXPECT_EQ(2u, ReadInitText("0x8", 3).numInputs);
+    for (const char* text : {"", "0", "0x", "0b", "0y1", "A", "x10", " 0x1"})
+        EXPECT_EQ(0u, WidthOfInit(text).numRows) << text;
 }
 
 TEST(Function, TwentyFourInputsFromDigitsAndBack)
@@ -153,8 +130,7 @@ TEST(Function, TwentyFourInputsFromDigitsAndBack)
     std::mt19937_64 random(5);
     for (int digit = 0; digit < 1 << 22; ++digit)
         text += "0123456789abcdef"[random() % 16];
-    Function function;
-    ASSERT_EQ(InitFault::kNone, FunctionFromInit(text, Names(24), false, function).fault);
+    const Function function = FromInit(text, Names(24));
     EXPECT_EQ(text, function.Hex());
     EXPECT_EQ(function, function.Reversed().Reversed());
 }

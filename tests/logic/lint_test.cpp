@@ -1,9 +1,12 @@
 // Findings about texts: each once where it is, and none where nothing is.
 #include <algorithm>
+#include <random>
 
 #include <gtest/gtest.h>
 
+#include "foreign_tree.h"
 #include "lint.h"
+#include "notation_writer.h"
 
 namespace {
 
@@ -16,7 +19,7 @@ LintReport Linted(const std::string& text, const std::vector<std::string>& input
     reading.inputs = inputs;
     Kq_BoolEquation equation;
     EXPECT_TRUE(SetFromText(equation, text, reading)) << text;
-    return Lint(text, equation, reading);
+    return Lint(text, equation, reading, {});
 }
 
 std::vector<std::string> Codes(const LintReport& report)
@@ -48,9 +51,9 @@ TEST(Lint, TellsWhoGroupsDifferently)
     EXPECT_FALSE(report.IsClean());
     const ForeignReading& verilog = ReadingOf(report, "Verilog");
     EXPECT_TRUE(verilog.isRead);
-    EXPECT_FALSE(verilog.comparison.isEqual);
-    EXPECT_EQ(AssignmentText(report.inputs, verilog.comparison.first), "a=1 b=0 c=0");
-    EXPECT_FALSE(verilog.valueHere);
+    EXPECT_FALSE(verilog.decision.IsEqual());
+    EXPECT_EQ(AssignmentText(report.inputs, verilog.decision.assignment), "a=1 b=0 c=0");
+    EXPECT_FALSE(verilog.decision.left);
     EXPECT_EQ(report.grouping, "((a | b) & c)");
     EXPECT_EQ(verilog.grouping, "(a | (b & c))");
     EXPECT_EQ(verilog.textThere, "(a | b) & c");
@@ -97,9 +100,137 @@ TEST(Lint, FindsAnInitValueThatIsTooShort)
 TEST(Lint, SaysWhatAnInversionOfNumbersIs)
 {
     const LintReport report = Linted("~A");
-    EXPECT_FALSE(ReadingOf(report, "C").comparison.isEqual);
+    EXPECT_FALSE(ReadingOf(report, "C").decision.IsEqual());
     EXPECT_EQ(ReadingOf(report, "C").textThere, "!A");
-    EXPECT_TRUE(ReadingOf(report, "Verilog").comparison.isEqual);
+    EXPECT_TRUE(ReadingOf(report, "Verilog").decision.IsEqual());
+}
+
+// "x0 & !x1 & x2 ...": 1 for one assignment of so many inputs.
+std::string Literals(const std::string& name, int numInputs)
+{
+    std::string text;
+    for (int input = 0; input < numInputs; ++input)
+        text += std::string(input == 0 ? "" : " & ") + (input % 2 == 0 ? "" : "!") + name +
+                std::to_string(input);
+    return text;
+}
+
+TEST(Lint, SeesADifferenceThatNoSampleMeets)
+{
+    for (const int numLiterals : {20, 40}) {
+        const LintReport report = Linted("(" + Literals("x", numLiterals) + ") | y & (" +
+                                         Literals("z", numLiterals) + ")");
+        ASSERT_EQ(report.inputs.size(), 2u * static_cast<size_t>(numLiterals) + 1);
+        for (const char* name : {"Verilog", "C", "Liberty"}) {
+            const Decision& decision = ReadingOf(report, name).decision;
+            ASSERT_TRUE(decision.IsDifferent()) << name;
+            EXPECT_NE(decision.left, decision.right);
+        }
+        EXPECT_FALSE(report.IsClean());
+    }
+}
+
+TEST(Lint, ComputesWithNumbersOfAnyNumberOfInputs)
+{
+    // "+" adds: in Verilog two ones are 0, in C they are not.
+    std::string sum = "v0";
+    for (int input = 1; input < 40; ++input)
+        sum += " + v" + std::to_string(input);
+    const LintReport report = Linted(sum);
+    EXPECT_TRUE(ReadingOf(report, "Verilog").decision.IsDifferent());
+    EXPECT_TRUE(ReadingOf(report, "C").decision.IsEqual());
+    EXPECT_TRUE(ReadingOf(report, "Liberty").decision.IsEqual());
+}
+
+TEST(Lint, SaysWhatItDoesNotDecide)
+{
+    std::string sums;
+    for (int term = 0; term < 60; ++term)
+        sums += (term == 0 ? "((v" : " ^ (v") + std::to_string(term) + " | v" +
+                std::to_string((term * 7 + 3) % 60) + " & v" +
+                std::to_string((term * 13 + 5) % 60) + ")";
+    const std::string text = sums + ")";
+    Kq_BoolEquation equation(text.c_str());
+    const LintReport report = Lint(text, equation, Reading(), {1e-9});
+    const Decision& decision = ReadingOf(report, "Verilog").decision;
+    EXPECT_EQ(decision.verdict, Verdict::Undecided);
+    EXPECT_TRUE(decision.isTimeOver);
+    EXPECT_FALSE(report.IsClean());
+    EXPECT_NE(ReadingOf(report, "Verilog").grouping, "");
+}
+
+std::string ReasonIn(const std::string& text, const std::string& notation)
+{
+    const LintReport report = Linted(text);
+    return ReadingOf(report, notation).reason;
+}
+
+constexpr char kSumReason[] = "\"+\" adds there";
+constexpr char kInversionReason[] =
+    "\"~\" inverts every bit of a number there, so ~1 is -2, which counts as true";
+
+TEST(Lint, NamesTheReasonThatAloneExplainsTheDifference)
+{
+    EXPECT_EQ(ReasonIn("a | b & ~c", "C"), "\"&\" binds tighter than \"|\" there");
+    EXPECT_EQ(ReasonIn("a | b & ~c", "Python"), "\"&\" binds tighter than \"|\" there");
+    EXPECT_EQ(ReasonIn("a + b * c", "C"), "\"*\" binds tighter than \"+\" there");
+    EXPECT_EQ(ReasonIn("~A + B", "C"), kInversionReason);
+    EXPECT_EQ(ReasonIn("~A + B", "Verilog"), kSumReason);
+    EXPECT_EQ(ReasonIn("(a + b) * c", "Verilog"), kSumReason);
+    EXPECT_EQ(ReasonIn("!(~a ^ 1)", "Verilog"),
+              "0 and 1 are numbers of 32 bits there, and \"!\" asks for all of their bits");
+}
+
+TEST(Lint, NamesTwoReasonsWhereNoneExplainsAlone)
+{
+    EXPECT_EQ(ReasonIn("a + b * c", "Verilog"),
+              std::string("\"*\" binds tighter than \"+\" there; ") + kSumReason);
+    EXPECT_EQ(ReasonIn("a ^ b | c & d ^ ~e", "C"),
+              std::string("\"&\" binds tighter than \"^\" there, and \"^\" tighter than \"|\"; ") +
+                  kInversionReason);
+}
+
+// Whether 'notation' has this library's function for the text.
+bool Agrees(const std::string& text, const Notation& notation, const Expression& expression)
+{
+    ForeignTree tree;
+    std::string fault;
+    if (!Read(text, notation, tree, fault))
+        return false;
+    return Tabulate(ToWordFunction(tree), tree.names).Over(expression.names) ==
+           ToFunction(expression);
+}
+
+TEST(Lint, BlamesGroupingAloneWhereParenthesesAloneHelp)
+{
+    std::mt19937_64 random(20);
+    const std::string binaries[] = {"&", "|", "^", "+", "*"};
+    size_t numGroupings = 0;
+    size_t numOthers = 0;
+    for (int round = 0; round < 3000; ++round) {
+        std::string text;
+        for (int operand = 0; operand < 5; ++operand) {
+            if (operand > 0)
+                text += " " + binaries[random() % 5] + " ";
+            text += std::string(random() % 3 == 0 ? "~" : "") + static_cast<char>('a' + operand);
+        }
+        const LintReport report = Linted(text);
+        Kq_BoolEquation equation(text.c_str());
+        const Expression expression = ToExpression(equation);
+        const std::string whole = WriteOwn(expression, OwnSyntax::AsTyped, Parentheses::Whole);
+        for (const Notation* notation : ForeignNotations()) {
+            const ForeignReading& reading = ReadingOf(report, notation->name);
+            if (!reading.isRead || reading.decision.IsEqual())
+                continue;
+            const bool helps = Agrees(whole, *notation, expression);
+            const bool isBlamedAlone = reading.reason.find("binds tighter") != std::string::npos &&
+                                       reading.reason.find(';') == std::string::npos;
+            EXPECT_EQ(isBlamedAlone, helps) << text << " in " << notation->name;
+            ++(helps ? numGroupings : numOthers);
+        }
+    }
+    EXPECT_GT(numGroupings, 1000u);
+    EXPECT_GT(numOthers, 1000u);
 }
 
 } // namespace

@@ -10,6 +10,7 @@
 
 #include "expression.h"
 #include "function.h"
+#include "listed_inputs.h"
 
 namespace logic_support {
 
@@ -29,16 +30,27 @@ inline std::vector<std::string> Names(size_t numInputs)
     return names;
 }
 
+// The function that the library reads an init value as.
+inline booleq::Function FromInit(const std::string& text, const std::vector<std::string>& inputs)
+{
+    booleq::Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = inputs;
+    Kq_BoolEquation equation;
+    booleq::Function function;
+    EXPECT_TRUE(SetFromText(equation, text, reading) && FunctionOf(equation, function)) << text;
+    return function;
+}
+
 // Half of the rows are ones, or, for 'isSparse', a quarter.
 inline booleq::Function RandomFunction(const std::vector<std::string>& inputs,
                                        std::mt19937_64& random, bool isSparse = false)
 {
-    std::vector<uint64_t> words(inputs.size() > 6 ? size_t(1) << (inputs.size() - 6) : 1);
-    for (uint64_t& word : words)
-        word = isSparse ? random() & random() : random();
-    if (inputs.size() < 6)
-        words[0] &= (uint64_t(1) << (1u << inputs.size())) - 1;
-    return {inputs, words};
+    booleq::Rows rows(static_cast<unsigned int>(inputs.size()));
+    for (size_t word = 0; word < rows.Size(); ++word)
+        rows.Words()[word] =
+            (isSparse ? random() & random() : random()) & booleq::RowMask(rows.NumInputs());
+    return {inputs, rows};
 }
 
 } // namespace logic_support

@@ -5,13 +5,13 @@
 
 #include <gtest/gtest.h>
 
-#include "bits.h"
 #include "cover.h"
 #include "kind.h"
 #include "logic_support.h"
 #include "match.h"
 #include "notation_writer.h"
 #include "short_form.h"
+#include "spectrum.h"
 
 namespace {
 
@@ -27,13 +27,12 @@ std::vector<std::string> FirstNames(size_t numInputs)
 
 Function Make(size_t numInputs, uint64_t column)
 {
-    return Function(FirstNames(numInputs), {column});
+    return {FirstNames(numInputs), Rows::OfWord(static_cast<unsigned int>(numInputs), column)};
 }
 
 std::string Shortest(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
+    const Function function = FromInit(init, inputs);
     const ShortForm shortForm = FindShortForm(function);
     EXPECT_TRUE(shortForm.isFound);
     EXPECT_TRUE(ToFunction(shortForm.expression) == function);
@@ -138,7 +137,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
     std::mt19937_64 random(2);
     for (size_t numInputs = 1; numInputs <= 8; ++numInputs)
         for (int count = 0; count < 20; ++count) {
-            const Bits function(RandomFunction(FirstNames(numInputs), random, true));
+            const Rows function = RandomFunction(FirstNames(numInputs), random, true).GetRows();
             const std::vector<Cube> cubes = FindCover(function);
             const auto covers = [&](const Cube& cube, uint64_t row) {
                 for (size_t input = 0; input < numInputs; ++input)
@@ -164,9 +163,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
 
 std::string Said(const std::string& init, const std::vector<std::string>& inputs)
 {
-    Function function;
-    FunctionFromInit(init, inputs, false, function);
-    return FindKind(function).text;
+    return FindKind(FromInit(init, inputs)).text;
 }
 
 TEST(FindKind, NamesFunctions)
@@ -200,9 +197,7 @@ TEST(FindKind, NamesFunctions)
 
 TEST(FindKind, TellsIdleInputs)
 {
-    Function function;
-    FunctionFromInit("0x3c", kNames.empty() ? kNames : std::vector<std::string>{"A", "B", "C"},
-                     false, function);
+    const Function function = FromInit("0x3c", {"A", "B", "C"});
     EXPECT_EQ(FindKind(function).idle, std::vector<std::string>{"C"});
     EXPECT_EQ(FindKind(function).mattering, (std::vector<std::string>{"A", "B"}));
 }
@@ -275,19 +270,124 @@ TEST(Match, FindsShuffledFunctionsOfTenInputs)
 TEST(Match, IsQuickForInputsThatAreAlike)
 {
     // A majority against itself with one row changed: every order fails for the same reason.
-    std::vector<uint64_t> words(size_t(1) << 6);
-    for (uint64_t row = 0; row < 4096; ++row)
-        if (__builtin_popcountll(row) > 6)
-            words[row / 64] |= uint64_t(1) << (row % 64);
+    Rows rows(12);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
+        rows.Set(row, __builtin_popcountll(row) > 6);
     std::vector<std::string> names;
     for (int input = 0; input < 12; ++input)
         names.push_back("v" + std::to_string(input));
-    const Function first(names, words);
-    words[0] ^= 1;
-    words[63] ^= uint64_t(1) << 63;
-    const Function second(names, words);
+    const Function first(names, rows);
+    rows.Set(0, !rows.At(0));
+    rows.Set(4095, !rows.At(4095));
+    const Function second(names, rows);
     EXPECT_TRUE(Match(first, first, true).isFound);
     EXPECT_FALSE(Match(first, second, true).isFound);
+}
+
+TEST(Match, LeavesInputsWithoutEffectOut)
+{
+    const Function narrow = Make(3, 0xca);
+    const Function wide = Make(4, 0xcaca);
+    const Matching matching = Match(narrow, wide, false);
+    ASSERT_TRUE(matching.isFound);
+    EXPECT_EQ(matching.sources, (std::vector<unsigned int>{Matching::kIdle, 0, 1, 2}));
+    EXPECT_TRUE(Apply(matching, narrow, wide.Inputs()) == wide);
+    const Matching back = Match(wide, narrow, true);
+    ASSERT_TRUE(back.isFound);
+    EXPECT_TRUE(Apply(back, wide, narrow.Inputs()) == narrow);
+    EXPECT_FALSE(Match(narrow, Make(4, 0xcacb), true).isFound);
+}
+
+TEST(Match, FindsAMappingOfFourInputsWheneverThereIsOne)
+{
+    std::mt19937_64 random(5);
+    size_t numMatches = 0;
+    for (int count = 0; count < 400; ++count) {
+        // Few ones, so that many pairs match.
+        const Function first = Make(4, random() & random() & random() & 0xffff);
+        const Function second = Make(4, random() & random() & random() & 0xffff);
+        const Matching matching = Match(first, second, true);
+        ASSERT_EQ(matching.isFound, MatchesSomehow(first, second, true))
+            << first.Hex() << " " << second.Hex();
+        numMatches += matching.isFound ? 1 : 0;
+    }
+    EXPECT_GT(numMatches, 10u);
+}
+
+// Sixteen inputs, alike in all that a single one or a pair shows: two strongly regular graphs with
+// the same numbers, an OR of the edges' products.
+Function OfGraph(bool isShrikhande)
+{
+    const auto isEdge = [isShrikhande](unsigned int one, unsigned int other) {
+        const unsigned int row = (one / 4 + 4 - other / 4) % 4;
+        const unsigned int column = (one + 4 - other % 4) % 4;
+        if (isShrikhande)
+            return row * 4 + column == 1 || row * 4 + column == 3 || row * 4 + column == 4 ||
+                   row * 4 + column == 12 || row * 4 + column == 5 || row * 4 + column == 15;
+        return (row == 0) != (column == 0);
+    };
+    Rows rows(16);
+    for (size_t row = 0; row < rows.NumRows(); ++row)
+        for (unsigned int one = 0; one < 16; ++one)
+            for (unsigned int other = 0; other < one; ++other)
+                if ((row >> one & row >> other & 1u) != 0 && isEdge(one, other))
+                    rows.Set(row, true);
+    return {Names(16), rows};
+}
+
+TEST(Match, TellsGraphsOfSixteenInputsApart)
+{
+    EXPECT_TRUE(Match(OfGraph(true), OfGraph(true), true).isFound);
+    EXPECT_FALSE(Match(OfGraph(true), OfGraph(false), true).isFound);
+}
+
+TEST(Match, TellsLargeRandomFunctionsApart)
+{
+    std::mt19937_64 random(6);
+    const Function first = RandomFunction(Names(16), random);
+    Rows rows = first.GetRows();
+    // As many ones, but two rows have traded places.
+    rows.Words()[0] ^= uint64_t(1) << __builtin_ctzll(rows.Words()[0]);
+    rows.Words()[1] ^= uint64_t(1) << __builtin_ctzll(~rows.Words()[1]);
+    EXPECT_FALSE(Match(first, Function(first.Inputs(), rows), true).isFound);
+}
+
+TEST(Match, EndsWithItsTime)
+{
+    std::mt19937_64 random(7);
+    const Function function = RandomFunction(Names(16), random);
+    const Matching matching = Match(function, function, true, 1e-9);
+    EXPECT_FALSE(matching.isDecided);
+    EXPECT_FALSE(matching.isFound);
+}
+
+TEST(Spectrum, IsTheSumOfItsDefinition)
+{
+    std::mt19937_64 random(8);
+    for (unsigned int numInputs = 0; numInputs <= 8; ++numInputs) {
+        const Function function = RandomFunction(FirstNames(numInputs), random);
+        const std::vector<int32_t> spectrum = WalshSpectrum(function.GetRows());
+        const std::vector<uint32_t> weights = DerivativeWeights(function.GetRows());
+        for (uint64_t set = 0; set < function.NumRows(); ++set) {
+            int32_t sum = 0;
+            uint32_t weight = 0;
+            for (uint64_t row = 0; row < function.NumRows(); ++row) {
+                const bool parity = (__builtin_popcountll(row & set) & 1) != 0;
+                sum += function.At(row) != parity ? -1 : 1;
+                if (set == 0 || (row & set) != 0)
+                    continue;
+                bool difference = false; // over all rows that differ from this one in 'set' only
+                for (uint64_t part = set;; part = (part - 1) & set) {
+                    difference = difference != function.At(row | part);
+                    if (part == 0)
+                        break;
+                }
+                weight += difference ? 1 : 0;
+            }
+            ASSERT_EQ(spectrum[set], sum) << numInputs << " " << set;
+            ASSERT_EQ(weights[set], weight) << numInputs << " " << set;
+        }
+    }
 }
 
 } // namespace

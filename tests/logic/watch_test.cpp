@@ -55,7 +55,7 @@ void ExpectItCanBeEnded(const std::function<std::string()>& work)
 // as every test has that ctest starts.
 TEST(Watch, EndsTheSearchForTheShortestAndItsTableStaysWhole)
 {
-    const Bits hard(Function(Names(4), {0x1668}));
+    const Rows hard = Rows::OfWord(4, 0x1668);
     size_t numEnded = 0;
     SetWatch(CountAndEnd);
     for (callToEndAt = 1; callToEndAt < 10000; callToEndAt += callToEndAt / 4 + 1) {
@@ -75,7 +75,7 @@ TEST(Watch, EndsTheSearchForTheShortestAndItsTableStaysWhole)
     // Of all functions together, as it is when nothing is interrupted.
     size_t numLiterals = 0;
     for (uint64_t column = 0; column < 65536; ++column)
-        numLiterals += CountLiterals(FindShortest(Bits(Function(Names(4), {column}))));
+        numLiterals += CountLiterals(FindShortest(Rows::OfWord(4, column)));
     EXPECT_EQ(406800u, numLiterals);
 }
 
@@ -122,11 +122,12 @@ TEST(Watch, EndsComparisonsOfLintAndConvert)
     const Kq_BoolEquation equation(text.c_str());
     ExpectItCanBeEnded([&] {
         std::string found;
-        for (const ForeignReading& reading : Lint(text, equation, Reading()).readings)
+        for (const ForeignReading& reading : Lint(text, equation, Reading(), {}).readings)
             found += reading.grouping + reading.textHere;
         return found;
     });
-    ExpectItCanBeEnded([&] { return Convert(ToExpression(equation), Target::Verilog, "").text; });
+    ExpectItCanBeEnded(
+        [&] { return Convert(ToExpression(equation), *FindTarget("verilog"), "", {}).text; });
 }
 
 } // namespace

@@ -187,6 +187,47 @@ TEST(Allocation, AskingIsSafeWhateverFails)
     ExpectSafe("dump", [](Objects& o) { o.a.Dbg(); });
 }
 
+// New names, tokens, a tree that is owed, a handle.
+void UseEquations()
+{
+    static size_t s_number = 0;
+    std::string text;
+    for (size_t count = 0; count < 20; ++count)
+        text += "(served_" + std::to_string(s_number++) + ")&";
+    Engine engine;
+    EXPECT_TRUE(engine.SetEquation((text + "A").c_str()));
+    engine.Clear();
+    engine.TokenizeNodes("A | B");
+    engine.BuildTree();
+    engine.DefineVariable("B", 1);
+    EXPECT_EQ(2u, engine.GetVariableHandle("B").size());
+    EXPECT_TRUE(engine.SetEquation("0b10"));
+    EXPECT_NE(nullptr, engine.GetRoot());
+}
+
+// No lock is held while memory is asked for or given back.
+TEST(Allocation, WhoeverServesMemoryMayUseEquations)
+{
+    const Messages messages;
+    std::string text = "A";
+    for (size_t count = 0; count < 2000; ++count)
+        text += "&name_" + std::to_string(count);
+    const memory::UsingMemory served(UseEquations);
+    Engine engine;
+    EXPECT_TRUE(engine.SetEquation(text.c_str()));
+    EXPECT_EQ(2001u, engine.GetNumVariables());
+    engine.Clear();
+    engine.TokenizeNodes("A & B & A");
+    Engine copy(engine);
+    copy.DefineVariable("A", 1);
+    EXPECT_EQ(3u, copy.GetVariableHandle("A").size());
+    copy.Dbg();
+    copy.BuildTree();
+    EXPECT_EQ("AND(AND(A, B), A)", TreeText(engine.GetRoot()));
+    EXPECT_TRUE(engine.SetEquationWithExplicitTerms({"A", "B"}, "0x6", false, false));
+    EXPECT_EQ("(A|B)&(~A|~B)", Std(engine.GetEquationAsExpression(false)));
+}
+
 TEST(Allocation, PoolOfNamesStaysWhole)
 {
     const char* names[] = {"abcdefghijklmnopqrstuvwxyz", "abcdefghijklmnop",

@@ -17,9 +17,21 @@ std::atomic<size_t> s_numRawAllocations{0};
 std::atomic<size_t> s_numLive{0};
 thread_local bool s_isArmed = false;
 thread_local size_t s_numUntilFailure = 0;
+thread_local void (*s_use)() = nullptr;
+
+void Use()
+{
+    if (!s_use)
+        return;
+    void (*const use)() = s_use;
+    s_use = nullptr;
+    use();
+    s_use = use;
+}
 
 void* AllocateOrNull(size_t size)
 {
+    Use();
     if (s_isArmed && s_numUntilFailure-- == 0) {
         s_isArmed = false;
         return nullptr;
@@ -44,6 +56,7 @@ void Free(void* memory) noexcept
 {
     if (!memory)
         return;
+    Use();
     s_numLive.fetch_sub(1, kCountOnly);
     // Large blocks are given back to the system anyway.
     const size_t size = malloc_usable_size(memory);
@@ -78,6 +91,16 @@ memory::FailingAllocation::FailingAllocation(size_t numBefore)
 memory::FailingAllocation::~FailingAllocation()
 {
     s_isArmed = false;
+}
+
+memory::UsingMemory::UsingMemory(void (*use)())
+{
+    s_use = use;
+}
+
+memory::UsingMemory::~UsingMemory()
+{
+    s_use = nullptr;
 }
 
 void* operator new(size_t size)

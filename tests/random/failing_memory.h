@@ -25,6 +25,16 @@ class FailingAllocation {
     FailingAllocation& operator=(const FailingAllocation&) = delete;
 };
 
+// While it lives, 'use' runs before each allocation and each release of this thread, but for its
+// own: what a program may do that serves memory itself.
+class UsingMemory {
+  public:
+    explicit UsingMemory(void (*use)());
+    ~UsingMemory();
+    UsingMemory(const UsingMemory&) = delete;
+    UsingMemory& operator=(const UsingMemory&) = delete;
+};
+
 } // namespace memory
 
 #endif

@@ -215,4 +215,23 @@ TEST(Threads, ObjectsPassFromThreadToThread)
     EXPECT_EQ(20u, equations.size());
 }
 
+// Copies share their tokens, and each is left as if it were alone.
+TEST(Threads, BuildCopiesOfTheSameTokens)
+{
+    const threads::CountingSink sink;
+    for (unsigned int round = 0; round < 100; ++round) {
+        const bool isRefused = round % 2 != 0;
+        Engine tokens;
+        tokens.TokenizeNodes(isRefused ? "A & B ~ | C D" : "A & B ~ | C");
+        std::vector<Engine> copies(kNumThreads, tokens);
+        InThreads(kNumThreads, [&](size_t thread) {
+            Engine& copy = copies[thread];
+            copy.BuildTree();
+            copy.TokenizeNodes("P"); // into a list that is empty, if the text was refused
+            copy.BuildTree();
+            EXPECT_EQ(isRefused ? "P" : "AND(A, NOT(OR(B, C)))", TreeText(copy.GetRoot()));
+        });
+    }
+}
+
 } // namespace

@@ -287,4 +287,80 @@ TEST(Receiver, ChangesTheHandleTableAndRowThatAreDumped)
     }
 }
 
+// Every message's receiver is somebody else's copy at work: both builds end as they would alone.
+TEST(Receiver, BuildsACopyOfTheTokensThatAreBuilt)
+{
+    for (const char* text : {"A & B", "A & B C"}) {
+        const bool isRefused = Std(text).back() == 'C';
+        Engine engine;
+        engine.TokenizeNodes(text);
+        Engine copy(engine);
+        {
+            const DebugMode debugMode;
+            const Receiver receiver([&copy](size_t number) {
+                if (number != 1)
+                    return;
+                SwitchOff(0);
+                copy.BuildTree();
+                Engine::SetInternalDebugMode(true);
+            });
+            engine.BuildTree();
+        }
+        for (Engine* built : {&engine, &copy}) {
+            EXPECT_EQ(isRefused ? "-" : "AND(A, B)", TreeText(built->GetRoot()));
+            built->TokenizeNodes("P"); // into a list that is empty, if the text was refused
+            built->BuildTree();
+            EXPECT_EQ(isRefused ? "P" : "AND(A, B)", TreeText(built->GetRoot()));
+        }
+    }
+}
+
+TEST(Receiver, BuildsACopyOfTheEquationThatIsBuilt)
+{
+    for (const char* text : {"X ^ Y", "X Y"}) {
+        Engine engine;
+        Engine copy;
+        {
+            const DebugMode debugMode;
+            const Receiver receiver([&](size_t number) {
+                if (number != 0)
+                    return;
+                SwitchOff(0);
+                copy = engine;
+                copy.TokenizeNodes(text);
+                copy.BuildTree();
+                Engine::SetInternalDebugMode(true);
+            });
+            EXPECT_TRUE(engine.SetEquationWithExplicitTerms({"B"}, "A & B", false, false));
+        }
+        EXPECT_EQ("AND(A, B)", TreeText(engine.GetRoot()));
+        EXPECT_EQ("B0 A0", VariablesOf(engine));
+        EXPECT_EQ(Std(text) == "X Y" ? "-" : "XOR(X, Y)", TreeText(copy.GetRoot()));
+    }
+}
+
+TEST(Receiver, ChangesTheTableThatIsBuilt)
+{
+    Engine equation;
+    ASSERT_TRUE(equation.SetEquation("A & B"));
+    const Engine::TruthTable expected(equation);
+    for (const char* text : {"", "C | D | E"}) {
+        Engine other;
+        other.SetEquation(text);
+        Engine::TruthTable table;
+        const DebugMode debugMode;
+        const Receiver receiver([&](size_t number) {
+            if (number != 3)
+                return;
+            SwitchOff(0);
+            table = other;
+            Engine::SetInternalDebugMode(true);
+        });
+        table = equation;
+        EXPECT_EQ(2u, table.GetVariableNames().size());
+        EXPECT_EQ(4u, table.GetRows().size());
+        EXPECT_TRUE(table == expected);
+    }
+}
+
 } // namespace

@@ -43,20 +43,11 @@ void SayRefusal(const Text& text, const Request& request, Output& output,
     std::string message = line + "refused at " + PlaceName(text.text, report.offset) + ": " +
                           report.reason + "\n" +
                           MarkPlace(text.text, report.offset, report.length, "  ");
-    if (report.mend.empty())
+    if (report.hint.empty())
         message.pop_back(); // the line end is Complain's
     else
-        message += "  " + report.mend;
+        message += "  " + report.hint;
     Complain(output, message);
-}
-
-// An init value is read over the usable inputs in the order that the request gives.
-std::vector<std::string> UsableInputs(const Reading& reading)
-{
-    std::vector<std::string> inputs = CheckInputs(reading.inputs).usable;
-    if (reading.reverse)
-        std::reverse(inputs.begin(), inputs.end());
-    return inputs;
 }
 
 } // namespace
@@ -98,13 +89,6 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
 
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function)
 {
-    if (request.reading.hasInputs) {
-        const std::vector<std::string> inputs = UsableInputs(request.reading);
-        if (inputs.size() <= kMaxFunctionInputs &&
-            FunctionFromInit(text.text, inputs, request.reading.lsbFirst, function).fault ==
-                InitFault::kNone)
-            return true;
-    }
     Kq_BoolEquation equation;
     if (!SetEquation(text, request, output, equation))
         return false;
@@ -135,7 +119,7 @@ Json RefusalAsJson(const RefusalReport& report)
     json["offset"] = report.offset;
     json["length"] = report.length;
     json["reason"] = report.reason;
-    json["mend"] = report.mend.empty() ? Json() : Json(report.mend);
+    json["hint"] = report.hint.empty() ? Json() : Json(report.hint);
     return json;
 }
 
@@ -145,6 +129,32 @@ void PutJson(const Text& text, const Request& request, const char* status, const
     Json json = Envelope(text, request, status);
     json["result"] = result;
     output.Put(JsonLine(json) + "\n");
+}
+
+int Say(const Text& text, const Request& request, Output& output, const Reply& reply)
+{
+    if (request.json) {
+        PutJson(text, request, reply.word, reply.toJson(), output);
+        return reply.status;
+    }
+    const LineMark mark = text.line > 0 ? reply.mark : LineMark::Nothing;
+    switch (mark) {
+    case LineMark::Nothing:
+        break;
+    case LineMark::Prefix:
+        output.Put("line " + std::to_string(text.line) + ": ");
+        break;
+    case LineMark::Heading:
+        output.Put("line " + std::to_string(text.line) + "\n");
+        break;
+    case LineMark::Block:
+        PutField(output, "line", std::to_string(text.line));
+        break;
+    }
+    reply.putText();
+    if (mark == LineMark::Block)
+        output.Put("\n");
+    return reply.status;
 }
 
 std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,

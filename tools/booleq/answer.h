@@ -37,9 +37,8 @@ int ForEachText(const Request& request, Output& output,
 // Fails: false, and the refusal has been said or, with --json, answered: return kRefused.
 bool SetEquation(const Text& text, const Request& request, Output& output,
                  Kq_BoolEquation& equation);
-// The same, and the function over the equation's inputs in their order. Init values over listed
-// inputs do not take the way through an expression, so 30 inputs are no trouble.
-// Fails: false as above, also for more than 30 inputs.
+// The same, and the function over the equation's inputs in their order.
+// Fails: false as above, also for more than kMaxFunctionInputs inputs.
 bool SetFunction(const Text& text, const Request& request, Output& output, Function& function);
 
 // Fails: UsageError, when both --json and 'option', which asks for another format, are given.
@@ -53,6 +52,26 @@ Json RefusalAsJson(const RefusalReport& report);
 // The envelope around 'result'. 'status' is "done", "yes", "no" or "findings".
 void PutJson(const Text& text, const Request& request, const char* status, const Json& result,
              Output& output);
+// What marks an answer as that of a line, where there are many.
+enum class LineMark {
+    Nothing,
+    Prefix,  // "line 3: " in front
+    Heading, // "line 3" on a line of its own
+    Block    // a field, and an empty line at the end
+};
+
+// What a command found for one text.
+struct Reply {
+    int status;
+    const char* word; // the same in JSON: "done", "yes", "no", "findings", "undecided"
+    LineMark mark;
+    std::function<Json()> toJson;
+    std::function<void()> putText;
+};
+// Says it in the format that was asked for, and gives back its status. Every command whose answer
+// is an object or a text ends so.
+int Say(const Text& text, const Request& request, Output& output, const Reply& reply);
+
 // The same object in two halves, for a result whose last member is written piece by piece between
 // them: 'result' ends with an empty array, and the pieces are its elements.
 std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Request& request,

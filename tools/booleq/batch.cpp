@@ -9,7 +9,7 @@
 #include "commands.h"
 #include "lines.h"
 #include "progress.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {
@@ -44,14 +44,6 @@ bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
             return false;
     }
     return true;
-}
-
-std::string JoinNames(const std::vector<std::string>& names)
-{
-    std::string list;
-    for (const std::string& name : names)
-        list += (list.empty() ? "" : ",") + name;
-    return list;
 }
 
 BatchResult Refused(std::string message)
@@ -100,7 +92,7 @@ class CsvFormat : public Format {
             throw UsageError("the first line of the table names its columns; none is called "
                              "inputs, equation or init");
         fields.emplace_back("result");
-        answer = Join(fields);
+        answer = CsvLine(fields);
         return true;
     }
 
@@ -133,12 +125,12 @@ class CsvFormat : public Format {
             m_fields.front() = WithoutLineEnd(line);
         }
         if (isComplete) {
-            m_fields[m_inputs] = JoinNames(row.inputs);
+            m_fields[m_inputs] = Join(row.inputs, ",");
             m_fields[m_equation] = row.equation;
             m_fields[m_init] = row.init;
         }
         m_fields.emplace_back(OutcomeName(result.outcome));
-        return Join(m_fields);
+        return CsvLine(m_fields);
     }
 
   private:
@@ -148,7 +140,7 @@ class CsvFormat : public Format {
         return !line.empty() && line.back() == '\r' ? line.substr(0, line.size() - 1) : line;
     }
 
-    static std::string Join(const std::vector<std::string>& fields)
+    static std::string CsvLine(const std::vector<std::string>& fields)
     {
         std::string line;
         for (size_t index = 0; index < fields.size(); ++index)

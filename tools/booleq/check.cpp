@@ -1,7 +1,7 @@
 // The command 'check': accepted, or the refusal that every command gives.
 #include "answer.h"
 #include "commands.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {
@@ -22,20 +22,13 @@ int RunCheck(const Request& request, Output& output)
         if (!SetEquation(text, request, output, equation))
             return kRefused;
         const std::vector<std::string> names = InputNames(equation);
-        if (request.json) {
-            Json result;
-            result["kind"] = Kind(equation);
-            result["inputs"] = names;
-            PutJson(text, request, "yes", result, output);
-            return kDone;
-        }
-        std::string list;
-        for (const std::string& name : names)
-            list += (list.empty() ? ": " : ", ") + Visible(name);
-        const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
-        output.Put(place + "accepted: " + Kind(equation) + " over " +
-                   (names.empty() ? "no inputs" : Count(names.size(), "input")) + list + "\n");
-        return kDone;
+        const auto toJson = [&] { return Json{{"kind", Kind(equation)}, {"inputs", names}}; };
+        const auto putText = [&] {
+            const std::string list = names.empty() ? "" : ": " + Visible(Join(names, ", "));
+            output.Put("accepted: " + Kind(equation) + " over " +
+                       (names.empty() ? "no inputs" : Count(names.size(), "input")) + list + "\n");
+        };
+        return Say(text, request, output, {kDone, "yes", LineMark::Prefix, toJson, putText});
     });
 }
 
@@ -50,7 +43,7 @@ Command CheckCommand()
         1,
         "Tell whether a text is accepted, and where and why not",
         "A refusal, here and in all commands, marks the place, gives the reason and, where the\n"
-        "text shows what was meant, the mend. Status 0: accepted, 3: refused.\n",
+        "text shows what was meant, the hint. Status 0: accepted, 3: refused.\n",
         {},
         {"booleq check 'A && B'", "booleq check \"A'\"", "booleq check --file equations.txt"},
         RunCheck};

@@ -12,6 +12,7 @@ Command EvalCommand();
 Command TableCommand();
 Command InitCommand();
 Command EqualCommand();
+Command SatCommand();
 Command TreeCommand();
 Command KmapCommand();
 Command ExplainCommand();

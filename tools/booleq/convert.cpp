@@ -2,34 +2,34 @@
 // printed.
 #include "convert.h"
 
-#include "answer.h"
 #include "commands.h"
+#include "decide.h"
 #include "text.h"
 
 namespace booleq {
 
 namespace {
 
-Target ParseTarget(const std::string& word)
+constexpr double kDefaultSeconds = 10; // for each equation
+
+const Target& ParseTarget(const std::string& word)
 {
-    std::string known;
-    for (const char* name : TargetNames())
-        known += (known.empty() ? "" : ", ") + std::string(name);
+    const std::string known = Join(TargetNames(), ", ");
     if (word.empty())
         throw UsageError("convert needs --to with one of: " + known);
-    Target target = Target::Primary;
-    if (!FindTarget(word, target))
+    const Target* const target = FindTarget(word);
+    if (!target)
         throw UsageError("--to takes one of " + known + ", not '" + Visible(word) + "'");
-    return target;
+    return *target;
 }
 
 // A word that every target takes for the name of what is put around an expression.
-std::string ParseUnit(const Request& request, Target target)
+std::string ParseUnit(const Request& request, const Target& target)
 {
     const std::string name = request.Get("--name");
     if (!request.Has("--unit") && !request.Has("--name"))
         return std::string();
-    if (WrappingOf(target) == Wrapping::Never)
+    if (target.wrapping == Wrapping::Never)
         throw UsageError("--unit and --name are for other targets: --to " + request.Get("--to") +
                          " has no modules");
     const bool isWord = !name.empty() && name.find_first_not_of("abcdefghijklmnopqrstuvwxyz"
@@ -55,8 +55,7 @@ Json ToJson(const Expression& expression, const Request& request, const Conversi
     for (size_t input = 0; input < conversion.names.size(); ++input)
         json["inputs"].push_back(
             {{"input", expression.names[input]}, {"name", conversion.names[input]}});
-    json["compared_assignments"] = conversion.numAssignments;
-    json["compared_all"] = conversion.isExhaustive;
+    json["compared_all"] = conversion.isProved;
     return json;
 }
 
@@ -66,35 +65,36 @@ void PutText(const Expression& expression, const Conversion& conversion, Output&
     if (!conversion.saysNames)
         for (const auto& change : ChangedNames(expression, conversion))
             Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
-    if (!conversion.isExhaustive)
-        Complain(output, "note: too large to compare all assignments; " +
-                             std::to_string(conversion.numAssignments) + " were compared");
+    if (!conversion.isProved)
+        Complain(output, "warning: not decided whether this reads back as the same function: " +
+                             conversion.doubt);
     output.Put(conversion.text);
 }
 
 int RunConvert(const Request& request, Output& output)
 {
-    const Target target = ParseTarget(request.Get("--to"));
+    const Target& target = ParseTarget(request.Get("--to"));
     std::string unit = ParseUnit(request, target);
+    const Limits limits = ParseLimits(request, kDefaultSeconds);
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
         const Expression expression = ToExpression(equation);
         std::string ownUnit = unit;
-        if (text.line > 0 && WrappingOf(target) != Wrapping::Never &&
-            (!unit.empty() || WrappingOf(target) == Wrapping::Always))
+        if (text.line > 0 && target.wrapping != Wrapping::Never &&
+            (!unit.empty() || target.wrapping == Wrapping::Always))
             ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
-        const Conversion conversion = Convert(expression, target, ownUnit);
+        const Conversion conversion = Convert(expression, target, ownUnit, limits);
         if (!conversion.fault.empty()) {
             Refuse(text, request, output, conversion.fault);
             return kRefused;
         }
-        if (request.json)
-            PutJson(text, request, "done", ToJson(expression, request, conversion), output);
-        else
-            PutText(expression, conversion, output);
-        return kDone;
+        return Say(text, request, output,
+                   {conversion.isProved ? kDone : kUndecided,
+                    conversion.isProved ? "done" : "undecided", LineMark::Nothing,
+                    [&] { return ToJson(expression, request, conversion); },
+                    [&] { PutText(expression, conversion, output); }});
     });
 }
 
@@ -111,11 +111,14 @@ Command ConvertCommand()
         "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
         "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
         "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
-        "the answer says how. Before it is printed the text is read again and compared.\n"
+        "the answer says how. Before it is printed the text is read again and compared; where "
+        "that\n"
+        "takes over 10 seconds, or what --seconds says, a warning says so, and the status is 4.\n"
         "Of lines, each module gets its line's number behind its name.\n",
         {{"--to", "TARGET", "What to write"},
          {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
-         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"}},
+         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"},
+         SecondsOption()},
         {"booleq convert 'a | b & c' --to verilog",
          "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",
          "booleq convert --inputs A,B 0x6 --to python"},

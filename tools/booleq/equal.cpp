@@ -1,73 +1,94 @@
 // The command 'equal': are two equations the same function.
 #include "equality.h"
 
-#include "answer.h"
+#include <algorithm>
+
 #include "commands.h"
+#include "decide.h"
 #include "text.h"
 
 namespace booleq {
 
 namespace {
 
-std::string AssignmentText(const Equality& equality)
+const char* StatusWord(const Decision& decision)
 {
-    std::string text;
-    for (size_t index = 0; index < equality.inputs.size(); ++index)
-        text += (index == 0 ? "" : " ") + Visible(equality.inputs[index]) +
-                (equality.InputAt(index) ? "=1" : "=0");
-    return text.empty() ? "no inputs" : text;
+    if (decision.verdict == Verdict::Undecided)
+        return "undecided";
+    return decision.IsEqual() ? "yes" : "no";
 }
 
-Json AsJson(const Equality& equality)
+int StatusOf(const Decision& decision)
+{
+    if (decision.verdict == Verdict::Undecided)
+        return kUndecided;
+    return decision.IsEqual() ? kDone : kFindings;
+}
+
+Json AsJson(const Decision& decision)
 {
     Json result;
-    result["equal"] = equality.IsEqual();
-    result["inputs"] = equality.inputs;
+    const bool isDecided = decision.verdict != Verdict::Undecided;
+    result["equal"] = isDecided ? Json(decision.IsEqual()) : Json();
+    result["inputs"] = decision.inputs;
     result["first_difference"] = nullptr;
-    if (!equality.IsEqual()) {
+    if (decision.IsDifferent()) {
         Json& difference = result["first_difference"] = Json::object();
-        difference["row"] = equality.row;
-        difference["assignment"] = Json::object();
-        for (size_t index = 0; index < equality.inputs.size(); ++index)
-            difference["assignment"][equality.inputs[index]] = equality.InputAt(index) ? 1 : 0;
-        difference["values"] = {equality.left ? 1 : 0, equality.right ? 1 : 0};
+        difference["row"] = RowJson(decision);
+        difference["is_first"] = decision.isFirstRow;
+        difference["assignment"] = AssignmentJson(decision);
+        difference["values"] = {decision.left ? 1 : 0, decision.right ? 1 : 0};
     }
+    if (!isDecided)
+        result["reason"] = decision.reason;
     return result;
 }
 
-void PutText(const Text& text, const Equality& equality, Output& output)
+void PutText(const Decision& decision, const Limits& limits, Output& output)
 {
-    const std::string place = text.line > 0 ? "line " + std::to_string(text.line) + ": " : "";
-    if (equality.IsEqual()) {
-        output.Put(place + "equal, over " + Count(equality.inputs.size(), "input") + "\n");
-        return;
-    }
-    output.Put(place + "not equal, first at row " + std::to_string(equality.row) + " of " +
-               std::to_string(equality.NumRows()) + "\n  " + AssignmentText(equality) + ": " +
-               (equality.left ? "1" : "0") + " and " + (equality.right ? "1" : "0") + "\n");
+    if (decision.IsEqual())
+        output.Put("equal, over " + Count(decision.inputs.size(), "input") + "\n");
+    else if (decision.IsDifferent())
+        output.Put("not equal, " + PlaceText(decision) + "\n  " + AssignmentLine(decision) + ": " +
+                   (decision.left ? "1" : "0") + " and " + (decision.right ? "1" : "0") + "\n");
+    else
+        output.Put(UndecidedText(decision, limits) + "\n");
 }
 
 int RunEqual(const Request& request, Output& output)
 {
+    CheckClauseOptions(request);
+    const Limits limits = ParseLimits(request, 0);
     const Text other{request.operands.back(), 0};
-    Function right;
-    if (!SetFunction(other, request, output, right))
+    Kq_BoolEquation right;
+    if (!SetEquation(other, request, output, right))
         return kRefused;
     return ForEachText(request, output, [&](const Text& text) {
-        Function left;
-        if (!SetFunction(text, request, output, left))
+        Kq_BoolEquation left;
+        if (!SetEquation(text, request, output, left))
             return kRefused;
-        const Equality equality = CompareFunctions(left, right);
-        if (!equality.fault.empty()) {
-            Refuse(text, request, output, equality.fault);
-            return kRefused;
+        Decision decision;
+        int status = kDone;
+        {
+            const DecidingProgress progress;
+            decision = DecideEquations(left, right, limits);
+            if (WantsClauses(request))
+                status = WriteClauses(request, output,
+                                      ClausesOfDifference(ToExpression(left), ToExpression(right)),
+                                      decision.verdict, limits);
         }
-        if (request.json)
-            PutJson(text, request, equality.IsEqual() ? "yes" : "no", AsJson(equality), output);
-        else
-            PutText(text, equality, output);
-        return equality.IsEqual() ? kDone : kFindings;
+        return Say(text, request, output,
+                   {std::max(status, StatusOf(decision)), StatusWord(decision), LineMark::Prefix,
+                    [&] { return AsJson(decision); }, [&] { PutText(decision, limits, output); }});
     });
+}
+
+std::vector<Option> Options()
+{
+    std::vector<Option> options = {SecondsOption()};
+    for (const Option& option : ClauseOptions())
+        options.push_back(option);
+    return options;
 }
 
 } // namespace
@@ -80,10 +101,14 @@ Command EqualCommand()
         2,
         2,
         "Tell whether two equations are one function",
-        "They are compared for every assignment of the inputs of both, at most 30 together; the\n"
-        "first assignment that differs is printed. Status 0: equal, 1: not. With '-' or --file\n"
-        "each line is compared with the one equation that is given.\n",
-        {},
+        "The answer is for every assignment of the inputs of both, however many they are. Up to "
+        "30\n"
+        "inputs the first assignment that differs is printed, above that one that differs. Status\n"
+        "0: equal, 1: not, 4: not decided, when --seconds came first. With '-' or --file each "
+        "line\n"
+        "is compared with the one equation that is given. The clauses of --cnf can be satisfied\n"
+        "when the equations differ; any solver reads them, and any checker the proof.\n",
+        Options(),
         {"booleq equal '~(A & B)' '~A | ~B'", "booleq equal --inputs A,B 0x8 'A & B'",
          "booleq equal --file equations.txt 'A & B'"},
         RunEqual};

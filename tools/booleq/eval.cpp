@@ -3,7 +3,7 @@
 
 #include "answer.h"
 #include "commands.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {

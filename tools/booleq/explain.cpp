@@ -1,72 +1,76 @@
 // The command 'explain': what a function is, and a short expression for it.
-#include "describe.h"
+#include <kq_logic/explain.h>
+#include <kq_logic/short_form.h>
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
+#include "function_access.h"
 #include "options.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {
 
 namespace {
 
+constexpr size_t kMaxShownInputs = 10; // 1024 binary digits; 'init' writes longer ones
+
 std::string Listed(const std::vector<std::string>& names)
 {
-    std::string text;
-    for (const std::string& name : names)
-        text += (text.empty() ? "" : ", ") + Visible(name);
-    return text.empty() ? "none" : text;
+    return names.empty() ? "none" : Visible(Join(names, ", "));
 }
 
-std::string ShortNote(const Description& description)
+std::string ShortNote(const kq_logic::ShortForm& shortForm)
 {
-    const std::string count = Count(description.numOperands, "operand");
-    if (description.isMinimal)
+    const std::string count = Count(shortForm.numOperands, "operand");
+    if (shortForm.isMinimal)
         return count + "; no expression of & | ^ ~ and their negated forms has fewer";
     return count + "; shorter ones may exist";
 }
 
-void PutText(const Text& text, const Function& function, const Description& description,
-             uint64_t maxRows, Output& output)
+void PutText(const Function& function, const kq_logic::Explanation& explanation,
+             const kq_logic::ShortForm& shortForm, uint64_t maxRows, Output& output)
 {
-    if (text.line > 0)
-        PutField(output, "line", std::to_string(text.line));
     const std::vector<std::string>& inputs = function.Inputs();
     std::string order = Listed(inputs);
     if (inputs.size() > 1)
         order += "; " + Visible(inputs.front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", order);
-    PutField(output, "without effect", Listed(description.idle));
+    if (inputs.empty())
+        PutField(output, "init value", "none: there are no rows to number");
+    else if (inputs.size() <= kMaxShownInputs)
+        PutBitOrders(function, function.Reversed(), output);
+    PutField(output, "without effect", Listed(explanation.idle));
     PutField(output, "function",
-             description.kind.empty() ? "none with a common name" : Visible(description.text));
-    if (!description.expression.empty()) {
-        PutField(output, "expression", Visible(description.expression));
-        PutField(output, "", ShortNote(description));
+             explanation.kind.empty() ? "none with a common name" : Visible(explanation.text));
+    if (shortForm.fault.empty()) {
+        PutField(output, "expression", Visible(shortForm.text));
+        PutField(output, "", ShortNote(shortForm));
     } else {
         PutField(output, "expression", "none of bearable length was found");
     }
     PrintRows(
         inputs, maxRows, RowFormat::kText, [&function](uint64_t row) { return function.At(row); },
         output);
-    if (text.line > 0)
-        output.Put("\n");
 }
 
-Json ToJson(const Function& function, const Description& description)
+Json ToJson(const Function& function, const kq_logic::Explanation& explanation,
+            const kq_logic::ShortForm& shortForm)
 {
-    const bool isNamed = !description.kind.empty();
-    const bool hasExpression = !description.expression.empty();
+    const bool isNamed = !explanation.kind.empty();
+    const bool hasExpression = shortForm.fault.empty();
     Json json;
     json["inputs"] = function.Inputs();
     json["hex"] = function.Hex();
     json["binary"] = function.Binary();
-    json["without_effect"] = description.idle;
-    json["kind"] = isNamed ? Json(description.kind) : Json(nullptr);
-    json["function"] = isNamed ? Json(description.text) : Json(nullptr);
-    json["expression"] = hasExpression ? Json(description.expression) : Json(nullptr);
-    json["operands"] = hasExpression ? Json(description.numOperands) : Json(nullptr);
-    json["minimal"] = description.isMinimal;
+    json["lsb_first"] = LsbFirstJson(function);
+    json["without_effect"] = explanation.idle;
+    json["kind"] = isNamed ? Json(explanation.kind) : Json(nullptr);
+    json["function"] = isNamed ? Json(explanation.text) : Json(nullptr);
+    json["expression"] = hasExpression ? Json(shortForm.text) : Json(nullptr);
+    json["operands"] = hasExpression ? Json(shortForm.numOperands) : Json(nullptr);
+    json["minimal"] = shortForm.isMinimal;
     return json;
 }
 
@@ -77,16 +81,17 @@ int RunExplain(const Request& request, Output& output)
         Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
-        const Description description = Describe(function);
-        if (!description.fault.empty()) {
-            Refuse(text, request, output, description.fault);
+        const kq_logic::Function asked = kq_logic::FunctionAccess::Make(function);
+        const kq_logic::Explanation explanation = kq_logic::Explain(asked);
+        if (!explanation.fault.empty()) {
+            Refuse(text, request, output, explanation.fault);
             return kRefused;
         }
-        if (request.json)
-            PutJson(text, request, "done", ToJson(function, description), output);
-        else
-            PutText(text, function, description, maxRows, output);
-        return kDone;
+        const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(asked);
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block,
+                    [&] { return ToJson(function, explanation, shortForm); },
+                    [&] { PutText(function, explanation, shortForm, maxRows, output); }});
     });
 }
 

@@ -15,9 +15,12 @@ constexpr char kSyntax[] =
     "Init values: 0x... or 0b..., row k is bit k; the first input is the most significant bit of "
     "k.\n";
 
-constexpr char kStatuses[] =
-    "Exit status: 0 done or yes, 1 no or findings, 2 wrong usage or reading or writing failed,\n"
-    "3 a text was refused.\n";
+constexpr char kStatuses[] = "Exit status; of many lines the highest counts:\n"
+                             "  0  done, or yes\n"
+                             "  1  no, or there are findings\n"
+                             "  2  wrong usage; or reading or writing failed, or memory ran out\n"
+                             "  3  a text was refused; the others were answered\n"
+                             "  4  not decided in the time of --seconds\n";
 
 // Options of the tool itself.
 const std::vector<Option>& ToolOptions()
@@ -188,7 +191,7 @@ std::string ManPage()
     roff += ".SH COMMANDS\nWithout a command, the first one is meant.\n";
     for (const Command& command : Commands())
         roff += RoffCommand(command);
-    return roff + ".SH EXIT STATUS\n" + Roff(kStatuses);
+    return roff + ".SH EXIT STATUS\n" + RoffVerbatim(kStatuses);
 }
 
 std::string BashCompletion()

@@ -2,6 +2,7 @@
 #include <algorithm>
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "picture.h"
 #include "text.h"
@@ -9,9 +10,6 @@
 namespace booleq {
 
 namespace {
-
-// The library reads an init value by way of an expression; above, that takes long.
-constexpr size_t kMaxTriedInputs = 12;
 
 // Above, the digits are too long to be one text in JSON.
 constexpr size_t kMaxJsonInputs = 24;
@@ -34,54 +32,31 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     reading.reverse = reverse;
     Kq_BoolEquation equation;
     Function read;
-    if (!SetFromText(equation, text, reading) || !FunctionOf(equation, read))
+    // Over a name like 'a'+b the library reads the inputs of the expression that it stands for.
+    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read) ||
+        read.NumInputs() != function.NumInputs() || read.Over(function.Inputs()) != function)
         return false;
-    const std::string rendered =
-        ToStd(rendering[1] == 'x' ? equation.GetEquationAsHexInitValue(false)
-                                  : equation.GetEquationAsBinaryInitValue());
-    return rendered == rendering && read.Over(function.Inputs()) == function;
+    const Port::StringBase<char> rendered = rendering[1] == 'x'
+                                                ? equation.GetEquationAsHexInitValue(false)
+                                                : equation.GetEquationAsBinaryInitValue();
+    return rendering.compare(0, std::string::npos, rendered.c_str(), rendered.length()) == 0;
 }
 
 std::string Names(const Function& function)
 {
-    std::string names;
-    for (const std::string& name : function.Inputs())
-        names += (names.empty() ? "" : ", ") + Visible(name);
-    return names;
+    return Visible(Join(function.Inputs(), ", "));
+}
+
+// The digits are printed in full once.
+std::string Shortened(const std::string& digits)
+{
+    return digits.size() <= 40 ? digits : digits.substr(0, 40) + "...";
 }
 
 std::string Call(const Function& function, const std::string& text, bool lsbFirst, bool reverse)
 {
-    const std::string shown = text.size() <= 40 ? text : text.substr(0, 40) + "...";
-    return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + shown + "\", " +
+    return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + Shortened(text) + "\", " +
            (lsbFirst ? "true" : "false") + ", " + (reverse ? "true" : "false") + ")";
-}
-
-// Two columns; the digits of the second are made when those of the first are written.
-void PutBoth(const char* label, const Order& msb, const Order& lsb, size_t width,
-             std::string (Function::*digits)() const, Output& output)
-{
-    PutLabel(output, label);
-    {
-        const std::string first = (msb.column.*digits)();
-        output.Put(first);
-        output.Put(std::string(std::max(width, first.size()) - first.size() + 2, ' '));
-    }
-    output.Put((lsb.column.*digits)());
-    output.Put("\n");
-}
-
-void PutDigits(const Order& msb, const Order& lsb, Output& output)
-{
-    const std::string name = Visible(msb.column.Inputs().front());
-    const std::string first = name + " most significant";
-    // Longer digits are not aligned.
-    const size_t width = std::max(first.size(), std::min<size_t>(34, 2 + msb.column.NumRows()));
-    PutLabel(output, "");
-    output.Put(first + std::string(width - first.size() + 2, ' ') + name +
-               " least (--lsb-first)\n");
-    PutBoth("hexadecimal", msb, lsb, width, &Function::Hex, output);
-    PutBoth("binary", msb, lsb, width, &Function::Binary, output);
 }
 
 void PutTried(const Function& function, const std::string& text, bool lsbFirst, bool reverse,
@@ -94,11 +69,6 @@ void PutTried(const Function& function, const std::string& text, bool lsbFirst, 
 void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
 {
     const Function& function = msb.column;
-    if (function.NumInputs() > kMaxTriedInputs) {
-        PutField(output, "reads back",
-                 "not tried over more than " + std::to_string(kMaxTriedInputs) + " inputs");
-        return;
-    }
     const std::string hex = function.Hex();
     if (function.NumInputs() == 1) {
         PutTried(function, function.Binary(), false, false, function.Binary(), output);
@@ -111,10 +81,11 @@ void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
     const std::string turned = lsb.column.Hex();
     PutTried(function, hex, false, false, hex, output);
     PutTried(function, turned, true, false, hex, output);
-    PutField(output, "", "  which renders " + hex + ", the first input most significant again");
+    PutField(output, "",
+             "  which renders " + Shortened(hex) + ", the first input most significant again");
     PutTried(function, turned, false, true, turned, output);
     PutField(output, "",
-             "  which renders " + turned + ", " + Visible(function.Inputs().back()) +
+             "  which renders " + Shortened(turned) + ", " + Visible(function.Inputs().back()) +
                  " being the first variable now");
 }
 
@@ -141,12 +112,7 @@ void PutInit(const Order& msb, const Order& lsb, Output& output)
              names.size() == 1 ? "bit k, from the right, is row k: " + Visible(names[0]) + "=k"
                                : "bit k, from the right, is row k; bit 0 is all inputs 0, bit " +
                                      std::to_string(function.NumRows() - 1) + " all inputs 1");
-    if (names.size() == 1) {
-        PutField(output, "hexadecimal", function.Hex());
-        PutField(output, "binary", function.Binary());
-    } else {
-        PutDigits(msb, lsb, output);
-    }
+    PutBitOrders(msb.column, lsb.column, output);
     PutReadsBack(msb, lsb, output);
 }
 
@@ -158,7 +124,7 @@ Json AsJson(const Order& msb, const Order& lsb)
     result["num_rows"] = function.NumInputs() == 0 ? 0 : function.NumRows();
     if (function.NumInputs() == 0)
         result["value"] = function.At(0) ? 1 : 0;
-    const bool isTried = function.NumInputs() > 0 && function.NumInputs() <= kMaxTriedInputs;
+    const bool isTried = function.NumInputs() > 0;
     for (const Order* order : {&msb, &lsb}) {
         Json& json = result[order->lsbFirst ? "lsb_first" : "msb_first"];
         for (const bool isHex : {true, false}) {
@@ -294,16 +260,9 @@ int RunInit(const Request& request, Output& output)
                        " inputs the digits are too long for one object: print them without --json");
             return kRefused;
         }
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(msb, lsb), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        PutInit(msb, lsb, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return kDone;
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block, [&] { return AsJson(msb, lsb); },
+                    [&] { PutInit(msb, lsb, output); }});
     });
 }
 

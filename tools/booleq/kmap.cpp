@@ -88,18 +88,11 @@ int RunMap(const Request& request, Output& output)
         if (!HasPicture(function, "a map", text, request, output))
             return kRefused;
         const Map map(function);
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(map), output);
-            return kDone;
-        }
-        if (request.Has("--svg")) {
-            PutSvg(map, output);
-            return kDone;
-        }
-        if (text.line > 0)
-            output.Put("line " + std::to_string(text.line) + "\n");
-        PutText(map, output);
-        return kDone;
+        const bool isPicture = request.Has("--svg");
+        return Say(text, request, output,
+                   {kDone, "done", isPicture ? LineMark::Nothing : LineMark::Heading,
+                    [&] { return AsJson(map); },
+                    [&] { isPicture ? PutSvg(map, output) : PutText(map, output); }});
     });
 }
 

@@ -1,13 +1,15 @@
 // The command 'lint': who reads the text as another function, and where the library surprises.
 #include "lint.h"
 
-#include "answer.h"
 #include "commands.h"
+#include "decide.h"
 #include "text.h"
 
 namespace booleq {
 
 namespace {
+
+constexpr double kDefaultSeconds = 10; // for each reader
 
 // The parts of a difference as lines, the same for notations that read alike.
 std::string DifferenceText(const LintReport& report, const ForeignReading& reading)
@@ -16,8 +18,11 @@ std::string DifferenceText(const LintReport& report, const ForeignReading& readi
         return "  " + label + std::string(14 - label.size(), ' ') + Visible(value) + "\n";
     };
     std::string text =
-        line("first at", AssignmentText(report.inputs, reading.comparison.first) + ": " +
-                             (reading.valueHere ? "1 here, 0 there" : "0 here, 1 there"));
+        reading.decision.IsDifferent()
+            ? line(reading.decision.isFirstRow ? "first at" : "differs at",
+                   AssignmentText(report.inputs, reading.decision.assignment) + ": " +
+                       (reading.decision.left ? "1 here, 0 there" : "0 here, 1 there"))
+            : line("not decided", "the groupings differ: " + reading.decision.reason);
     text += line("here", report.grouping);
     text += line("there", reading.grouping);
     text += line("because", reading.reason);
@@ -31,7 +36,7 @@ void PutDifferences(const LintReport& report, Output& output)
 {
     std::vector<std::pair<std::string, std::string>> groups; // notations, and their lines
     for (const ForeignReading& reading : report.readings) {
-        if (!reading.isRead || reading.comparison.isEqual)
+        if (!reading.isRead || reading.decision.IsEqual())
             continue;
         const std::string text = DifferenceText(report, reading);
         bool isKnown = false;
@@ -45,7 +50,9 @@ void PutDifferences(const LintReport& report, Output& output)
             groups.emplace_back(reading.notation, text);
     }
     for (const auto& group : groups)
-        output.Put("another function in " + group.first + "\n" + group.second);
+        output.Put(group.second.rfind("  not decided", 0) == 0
+                       ? "perhaps another function in " + group.first + "\n" + group.second
+                       : "another function in " + group.first + "\n" + group.second);
 }
 
 void PutFindings(const LintReport& report, Output& output)
@@ -63,12 +70,8 @@ void PutOthers(const LintReport& report, Output& output)
 {
     std::string same;
     for (const ForeignReading& reading : report.readings)
-        if (reading.isRead && reading.comparison.isEqual)
-            same += std::string(same.empty() ? "" : ", ") + reading.notation +
-                    (reading.comparison.isExhaustive
-                         ? ""
-                         : " (" + std::to_string(reading.comparison.numAssignments) +
-                               " assignments tried)");
+        if (reading.isRead && reading.decision.IsEqual())
+            same += std::string(same.empty() ? "" : ", ") + reading.notation;
     if (!same.empty())
         PutField(output, "the same in", same);
     for (const ForeignReading& reading : report.readings)
@@ -77,13 +80,12 @@ void PutOthers(const LintReport& report, Output& output)
                      std::string(reading.notation) + ": " + Visible(reading.fault));
 }
 
-Json DifferenceJson(const LintReport& report, const ForeignReading& reading)
+Json DifferenceJson(const ForeignReading& reading)
 {
     Json json;
-    json["assignment"] = Json::object();
-    for (size_t input = 0; input < report.inputs.size(); ++input)
-        json["assignment"][report.inputs[input]] = reading.comparison.first[input] ? 1 : 0;
-    json["here"] = reading.valueHere ? 1 : 0;
+    const bool isKnown = reading.decision.IsDifferent();
+    json["assignment"] = isKnown ? AssignmentJson(reading.decision) : Json();
+    json["here"] = isKnown ? Json(reading.decision.left ? 1 : 0) : Json();
     json["grouping"] = reading.grouping;
     json["reason"] = reading.reason;
     json["write_there"] = reading.textThere;
@@ -102,13 +104,12 @@ Json ToJson(const LintReport& report)
         reader["notation"] = reading.notation;
         reader["reads"] = reading.isRead;
         reader["refusal"] = reading.isRead ? Json(nullptr) : Json(reading.fault);
-        reader["same"] = reading.isRead ? Json(reading.comparison.isEqual) : Json(nullptr);
-        reader["compared_all"] =
-            reading.isRead ? Json(reading.comparison.isExhaustive) : Json(nullptr);
+        const bool isDecided = reading.decision.verdict != Verdict::Undecided;
+        reader["same"] = isDecided ? Json(reading.decision.IsEqual()) : Json(nullptr);
+        reader["compared_all"] = reading.isRead ? Json(isDecided) : Json(nullptr);
         reader["hex"] = reading.hex.empty() ? Json(nullptr) : Json(reading.hex);
-        reader["difference"] = reading.isRead && !reading.comparison.isEqual
-                                   ? DifferenceJson(report, reading)
-                                   : Json(nullptr);
+        reader["difference"] =
+            reading.isRead && !reading.decision.IsEqual() ? DifferenceJson(reading) : Json(nullptr);
         json["readers"].push_back(reader);
     }
     json["findings"] = Json::array();
@@ -124,26 +125,23 @@ Json ToJson(const LintReport& report)
 
 int RunLint(const Request& request, Output& output)
 {
+    const Limits limits = ParseLimits(request, kDefaultSeconds);
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const LintReport report = Lint(text.text, equation, request.reading);
+        const LintReport report = Lint(text.text, equation, request.reading, limits);
         const int status = report.IsClean() ? kDone : kFindings;
-        if (request.json) {
-            PutJson(text, request, status == kDone ? "done" : "findings", ToJson(report), output);
-            return status;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        if (status == kDone)
-            output.Put("no findings\n");
-        PutDifferences(report, output);
-        PutFindings(report, output);
-        PutOthers(report, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return status;
+        const auto putText = [&] {
+            if (status == kDone)
+                output.Put("no findings\n");
+            PutDifferences(report, output);
+            PutFindings(report, output);
+            PutOthers(report, output);
+        };
+        return Say(text, request, output,
+                   {status, status == kDone ? "done" : "findings", LineMark::Block,
+                    [&] { return ToJson(report); }, putText});
     });
 }
 
@@ -163,8 +161,10 @@ Command LintCommand()
         "groupings, and the text to write there instead, or here if the other was meant. Also:\n"
         "blanks inside negated operators, renderings that do not read back, a text that begins\n"
         "with 0, listed inputs that are skipped or missing, init values that are too short.\n"
-        "Status 0: no findings, 1: findings.\n",
-        {},
+        "A comparison that takes over 10 seconds, or what --seconds says, is a finding too. "
+        "Status\n"
+        "0: no findings, 1: findings.\n",
+        {SecondsOption()},
         {"booleq lint 'a | b & c'", "booleq lint 'P & X ~ | Y'",
          "booleq lint --inputs A,B 'A & C'"},
         RunLint};

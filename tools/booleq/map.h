@@ -48,10 +48,8 @@ struct Map {
     std::string ColumnNames() const { return Names(numRowInputs, function.NumInputs()); }
     std::string Names(size_t from, size_t to) const
     {
-        std::string names;
-        for (size_t index = from; index < to; ++index)
-            names += (index == from ? "" : " ") + Visible(function.Inputs()[index]);
-        return names;
+        const auto begin = function.Inputs().begin();
+        return Visible(Join({begin + static_cast<long>(from), begin + static_cast<long>(to)}, " "));
     }
 
     const Function& function;

@@ -8,6 +8,7 @@
 
 #include "commands.h"
 #include "convert.h"
+#include "options.h"
 #include "progress.h"
 #include "text.h"
 #include "watch.h"
@@ -16,12 +17,15 @@ namespace booleq {
 
 namespace {
 
+const char* const kDefaultTarget = "primary";
+constexpr Limits kReadingLimits = {10}; // for reading a written equation again
+
 struct Format {
     bool isPla = false;
     bool isMap = false;
     bool isPicture = false;
-    bool isOwn = false; // lines that this tool reads: a comment may follow
-    Target target = Target::Primary;
+    bool isOwn = false;             // lines that this tool reads: a comment may follow
+    const Target* target = nullptr; // of equations
 };
 
 Format ParseFormat(const Request& request, bool isPlaIn)
@@ -36,11 +40,12 @@ Format ParseFormat(const Request& request, bool isPlaIn)
     if (format.isPla || format.isMap || format.isPicture)
         return format;
     std::string known = "pla, map, svg";
-    for (const char* name : TargetNames())
-        known += std::string(name) == "pla" ? "" : ", " + std::string(name);
-    if (!word.empty() && !FindTarget(word, format.target))
+    for (const std::string& name : TargetNames())
+        known += name == "pla" ? "" : ", " + name;
+    format.target = FindTarget(word.empty() ? kDefaultTarget : word);
+    if (!format.target)
         throw UsageError("--to takes one of " + known + ", not '" + Visible(word) + "'");
-    format.isOwn = format.target <= Target::Paren;
+    format.isOwn = !format.target->notation && format.target->wrapping == Wrapping::Never;
     return format;
 }
 
@@ -52,15 +57,7 @@ SumOptions ParseOptions(const Request& request)
     if (request.Has("--terms") && request.Has("--literals"))
         throw UsageError("--terms and --literals: one of them counts first");
     options.goal = request.Has("--literals") ? Goal::Literals : Goal::Terms;
-    const std::string seconds = request.Get("--seconds");
-    if (!request.Has("--seconds"))
-        return options;
-    const bool isNumber = !seconds.empty() && seconds.size() <= 9 &&
-                          seconds.find_first_not_of("0123456789.") == std::string::npos &&
-                          seconds.find('.') == seconds.rfind('.') && seconds != ".";
-    options.seconds = isNumber ? std::stod(seconds) : 0;
-    if (options.seconds <= 0)
-        throw UsageError("--seconds takes a number above 0, not '" + Visible(seconds) + "'");
+    options.seconds = ParseSeconds(request);
     return options;
 }
 
@@ -99,7 +96,8 @@ Json AsJson(const Pla& table, const Sum& sum, const SumOptions& options)
     json["equations"] = Json::object();
     for (size_t output = 0; output < table.outputs.size(); ++output) {
         const Expression expression = ExpressionOf(table, sum.cubes, output, options.isInverted);
-        const Conversion conversion = Convert(expression, Target::Primary, "");
+        const Conversion conversion =
+            Convert(expression, *FindTarget(kDefaultTarget), "", kReadingLimits);
         json["equations"][table.outputs[output]] =
             conversion.text.substr(0, conversion.text.find('\n'));
     }
@@ -109,15 +107,16 @@ Json AsJson(const Pla& table, const Sum& sum, const SumOptions& options)
 int PutEquations(const MinimizeInput& input, const Request& request, const Format& format,
                  const Sum& sum, const SumOptions& options, Output& output)
 {
-    const bool isFile = WrappingOf(format.target) == Wrapping::Always;
+    const bool isFile = format.target->wrapping == Wrapping::Always;
     if (isFile && input.table.outputs.size() > 1)
         throw UsageError("--to " + request.Get("--to") + " holds one output, and there are " +
                          std::to_string(input.table.outputs.size()) + "; --to pla holds all");
+    int status = kDone;
     for (size_t index = 0; index < input.table.outputs.size(); ++index) {
         const Expression expression =
             ExpressionOf(input.table, sum.cubes, index, options.isInverted);
-        const Conversion conversion =
-            Convert(expression, format.target, isFile ? input.table.outputs[index] : "");
+        const Conversion conversion = Convert(
+            expression, *format.target, isFile ? input.table.outputs[index] : "", kReadingLimits);
         if (!conversion.fault.empty()) {
             Refuse(input.text, request, output, conversion.fault);
             return kRefused;
@@ -125,9 +124,14 @@ int PutEquations(const MinimizeInput& input, const Request& request, const Forma
         if (!conversion.saysNames)
             for (const auto& change : ChangedNames(expression, conversion))
                 Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
+        if (!conversion.isProved) {
+            Complain(output, "warning: not decided whether this reads back as the same function: " +
+                                 conversion.doubt);
+            status = kUndecided;
+        }
         output.Put((isFile ? "" : Visible(input.table.outputs[index]) + " = ") + conversion.text);
     }
-    return kDone;
+    return status;
 }
 
 int PutSum(const MinimizeInput& input, const Request& request, const Format& format, const Sum& sum,
@@ -152,9 +156,9 @@ int PutSum(const MinimizeInput& input, const Request& request, const Format& for
         return kDone;
     }
     const int status = PutEquations(input, request, format, sum, options, output);
-    if (status == kDone && format.isOwn)
+    if (status != kRefused && format.isOwn)
         output.Put("# " + verdict + "\n");
-    else if (status == kDone)
+    else if (status != kRefused)
         Complain(output, "note: " + verdict);
     return status;
 }

@@ -16,18 +16,13 @@ constexpr int kAnsiColours[kNumColours] = {34, 31, 32, 35, 33, 36};
 // The cells of one output: in the map's row and column order.
 struct Cells {
     Cells(const Pla& itsTable, const Sum& sum, size_t itsOutput)
-        : table(itsTable), output(itsOutput), function(table.inputs, Words(itsTable)), map(function)
+        : table(itsTable), output(itsOutput),
+          function(table.inputs, Rows(static_cast<unsigned int>(itsTable.inputs.size()))),
+          map(function)
     {
         for (size_t index = 0; index < sum.cubes.Size(); ++index)
             if (GetBit(sum.cubes.At(index), table.space.OutputBit(output)))
                 terms.push_back(sum.cubes.At(index));
-    }
-
-    static std::vector<uint64_t> Words(const Pla& table)
-    {
-        assert(table.inputs.size() <= 6);
-        static_cast<void>(table);
-        return {0};
     }
 
     // Whether a cube has the row of the map's cell.

@@ -175,4 +175,18 @@ uint64_t ParseRows(const std::string& text)
     return std::stoull(text);
 }
 
+double ParseSeconds(const Request& request)
+{
+    if (!request.Has("--seconds"))
+        return 0;
+    const std::string text = request.Get("--seconds");
+    const bool isNumber = !text.empty() && text.size() <= 12 &&
+                          text.find_first_not_of("0123456789.") == std::string::npos &&
+                          std::count(text.begin(), text.end(), '.') <= 1;
+    const double seconds = isNumber && text != "." ? std::stod(text) : 0;
+    if (seconds <= 0)
+        throw UsageError("--seconds takes a number above 0, not '" + Visible(text) + "'");
+    return seconds;
+}
+
 } // namespace booleq

@@ -21,6 +21,9 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments);
 
 // A number of --rows: "all" is the highest.  Fails: UsageError.
 uint64_t ParseRows(const std::string& text);
+// A number of --seconds, of which parts count; 0, no bound, where the option was not given.
+// Fails: UsageError.
+double ParseSeconds(const Request& request);
 
 } // namespace booleq
 

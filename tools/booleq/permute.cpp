@@ -2,6 +2,7 @@
 #include "permute.h"
 
 #include "answer.h"
+#include "bit_orders.h"
 #include "commands.h"
 #include "text.h"
 
@@ -27,21 +28,14 @@ std::vector<std::string> ParseNames(const Request& request, const char* option)
     return names;
 }
 
-void PutText(const Text& text, const Function& function, Output& output)
+void PutText(const Function& function, Output& output)
 {
-    if (text.line > 0)
-        PutField(output, "line", std::to_string(text.line));
-    std::string names;
-    for (const std::string& name : function.Inputs())
-        names += (names.empty() ? "" : ", ") + Visible(name);
+    std::string names = Visible(Join(function.Inputs(), ", "));
     if (function.NumInputs() > 1)
         names +=
             "; " + Visible(function.Inputs().front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", names);
-    PutField(output, "init value hex", function.Hex());
-    PutField(output, "init value bin", function.Binary());
-    if (text.line > 0)
-        output.Put("\n");
+    PutBitOrders(function, function.Reversed(), output);
 }
 
 int RunPermute(const Request& request, Output& output)
@@ -65,16 +59,15 @@ int RunPermute(const Request& request, Output& output)
             return kRefused;
         }
         const Function permuted = function.Over(to);
-        if (own.json) {
-            const Json result = {{"from", {{"inputs", function.Inputs()}, {"hex", function.Hex()}}},
-                                 {"inputs", to},
-                                 {"hex", permuted.Hex()},
-                                 {"binary", permuted.Binary()}};
-            PutJson(text, own, "done", result, output);
-        } else {
-            PutText(text, permuted, output);
-        }
-        return kDone;
+        const auto toJson = [&] {
+            return Json{{"from", {{"inputs", function.Inputs()}, {"hex", function.Hex()}}},
+                        {"inputs", to},
+                        {"hex", permuted.Hex()},
+                        {"binary", permuted.Binary()},
+                        {"lsb_first", LsbFirstJson(permuted)}};
+        };
+        return Say(text, own, output,
+                   {kDone, "done", LineMark::Block, toJson, [&] { PutText(permuted, output); }});
     });
 }
 

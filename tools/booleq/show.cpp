@@ -2,7 +2,7 @@
 #include "answer.h"
 #include "commands.h"
 #include "options.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {
@@ -12,11 +12,6 @@ namespace {
 typedef std::vector<std::string> Notes;
 
 constexpr unsigned int kMaxShownInitInputs = 10; // 256 hexadecimal and 1024 binary digits
-
-bool IsInitValue(const Kq_BoolEquation& equation)
-{
-    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
-}
 
 std::string InputName(const Kq_BoolEquation& equation, size_t index)
 {
@@ -52,10 +47,8 @@ void PutInputs(const Kq_BoolEquation& equation, Output& output)
         PutField(output, "inputs", "none");
         return;
     }
-    std::string names = std::to_string(numInputs) + ": " + InputName(equation, 0);
-    for (size_t index = 1; index < numInputs; ++index)
-        names += ", " + InputName(equation, index);
-    PutField(output, "inputs", names);
+    PutField(output, "inputs",
+             std::to_string(numInputs) + ": " + Visible(Join(InputNames(equation), ", ")));
     const std::string rows = "row k is bit k of the init value";
     if (numInputs == 1)
         PutField(output, "bit order", "one input only; " + rows);
@@ -75,7 +68,7 @@ void PutMissingTable(const Kq_BoolEquation& equation, Output& output)
         reason = "none: there are no inputs";
     } else {
         reason = "none: " + std::to_string(numInputs) + " inputs, more than " +
-                 std::to_string(kMaxTableInputs);
+                 std::to_string(kMaxFunctionInputs);
     }
     PutField(output, "init value", reason);
     PutField(output, "term equation",
@@ -121,10 +114,9 @@ void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& not
         notes.push_back("an init value over no inputs is an empty group, which is 0");
         return;
     }
-    const size_t numDigits = equation.GetEquation(false).length() - 2;
-    const uint64_t numGiven = uint64_t(numDigits) * (equation.IsHexInitValue() ? 4 : 1);
+    const uint64_t numGiven = WidthOfInit(ToStd(equation.GetEquation(false))).numRows;
     const unsigned int numInputs = equation.GetNumVariables();
-    if (numInputs <= kMaxTableInputs && numGiven < uint64_t(1) << numInputs)
+    if (numInputs <= kMaxFunctionInputs && numGiven < uint64_t(1) << numInputs)
         notes.push_back("the value given has " + std::to_string(numGiven) +
                         " rows, the table more: the others read as " +
                         std::to_string(HighestRow(equation)));
@@ -148,10 +140,10 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
             "--lsb-first and --reverse say how an init value is read; this is an expression");
     const size_t numListed = reading.hasInputs ? CheckInputs(reading.inputs).usable.size() : 0;
     if (reading.hasInputs && equation.GetNumVariables() > numListed) {
-        std::string names = InputName(equation, numListed);
-        for (size_t index = numListed + 1; index < equation.GetNumVariables(); ++index)
-            names += ", " + InputName(equation, index);
-        notes.push_back("not in --inputs, so behind them: " + names);
+        const std::vector<std::string> names = InputNames(equation);
+        const std::vector<std::string> others(names.begin() + static_cast<long>(numListed),
+                                              names.end());
+        notes.push_back("not in --inputs, so after them: " + Visible(Join(others, ", ")));
     }
     if (!ReadsBack(equation, reading))
         notes.push_back(
@@ -174,7 +166,7 @@ Notes NotesFor(Kq_BoolEquation& equation, const Reading& reading, bool hasTable)
     else
         NoteExpression(equation, reading, notes);
     if (equation.GetNumVariables() == 1)
-        notes.push_back("over one input only the binary init value reads back");
+        notes.push_back("over one input the library reads the binary init value only");
     NoteNames(equation, hasTable, notes);
     return notes;
 }
@@ -185,7 +177,7 @@ void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t ma
     PutRenderings(equation, request.reading, output);
     PutInputs(equation, output);
     const unsigned int numInputs = equation.GetNumVariables();
-    const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
+    const bool hasTable = numInputs >= 1 && numInputs <= kMaxFunctionInputs;
     if (hasTable) {
         PutInitValues(equation, request.Has("--whole"), output);
         PutField(output, "truth table", std::to_string(uint64_t(1) << numInputs) + " rows");
@@ -202,7 +194,7 @@ void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t ma
 Json ShowAsJson(Kq_BoolEquation& equation, const Request& request)
 {
     const unsigned int numInputs = equation.GetNumVariables();
-    const bool hasTable = numInputs >= 1 && numInputs <= kMaxTableInputs;
+    const bool hasTable = numInputs >= 1 && numInputs <= kMaxFunctionInputs;
     Json json;
     json["equation"] = ToStd(equation.GetEquation(true));
     json["kind"] = !IsInitValue(equation)      ? "expression"
@@ -234,16 +226,9 @@ int RunShow(const Request& request, Output& output)
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        if (request.json) {
-            PutJson(text, request, "done", ShowAsJson(equation, request), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            PutField(output, "line", std::to_string(text.line));
-        ShowEquation(equation, request, maxRows, output);
-        if (text.line > 0)
-            output.Put("\n");
-        return kDone;
+        return Say(text, request, output,
+                   {kDone, "done", LineMark::Block, [&] { return ShowAsJson(equation, request); },
+                    [&] { ShowEquation(equation, request, maxRows, output); }});
     });
 }
 

@@ -5,7 +5,7 @@
 #include "answer.h"
 #include "commands.h"
 #include "options.h"
-#include "rows.h"
+#include "table_rows.h"
 #include "text.h"
 
 namespace booleq {

@@ -55,18 +55,16 @@ int RunTree(const Request& request, Output& output)
         if (!SetEquation(text, request, output, equation))
             return kRefused;
         const TreeList list(equation);
-        if (request.json) {
-            PutJson(text, request, "done", AsJson(list), output);
-            return kDone;
-        }
-        if (text.line > 0)
-            output.Put((request.Has("--dot") ? "// line " : "line ") + std::to_string(text.line) +
-                       "\n");
-        if (request.Has("--dot"))
+        const auto putText = [&] {
+            if (!request.Has("--dot"))
+                return PutText(list, output);
+            if (text.line > 0)
+                output.Put("// line " + std::to_string(text.line) + "\n");
             PutDot(list, [&output](const std::string& piece) { output.Put(piece); });
-        else
-            PutText(list, output);
-        return kDone;
+        };
+        return Say(text, request, output,
+                   {kDone, "done", request.Has("--dot") ? LineMark::Nothing : LineMark::Heading,
+                    [&] { return AsJson(list); }, putText});
     });
 }
 

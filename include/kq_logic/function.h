@@ -1,0 +1,75 @@
+// A Boolean function over named inputs: what is explained, matched, permuted and shortened.
+//
+//     kq_logic::Function function;
+//     if (!function.Set(Kq_BoolEquation("A & ~B")))
+//         return 1;
+//     std::cout << function.Inputs().size() << '\n'; // 2
+//     std::cout << function.Hex() << '\n'; // 0x4
+//     std::cout << function.At(2) << '\n'; // 1
+//
+// Row k assigns the binary digits of k to the inputs, the first input the highest digit.
+#ifndef KQ_LOGIC_FUNCTION_H
+#define KQ_LOGIC_FUNCTION_H
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include <Kq_BoolEquation.h>
+
+namespace kq_logic {
+
+constexpr size_t kMaxFunctionInputs = 30; // 128 MB; an equation has no column above
+
+// A value: copies share what nobody changes.
+// Fails: std::bad_alloc, and what a watcher throws (watch.h); otherwise as the members say.
+// Threads: one at a time for all calls of this library: searches share a table, work its watcher.
+class KQ_EXPORT Function {
+  public:
+    // The constant 0 over no inputs.
+    Function();
+
+    // Becomes the function of a set equation over its variables.
+    // Fails: false without an equation or with more than kMaxFunctionInputs variables; the function
+    // is as it was.  Cost: that of the column.
+    bool Set(const Kq_BoolEquation& equation);
+    // Becomes the function whose row k is bit k % 64 of word k / 64.
+    // Fails: false, unless the inputs are all different and the words are as many as their rows
+    // need, one at least, without a bit beyond the last row.
+    bool Set(const std::vector<std::string>& inputs, const std::vector<uint64_t>& words);
+
+    // The first one is the most significant bit of a row's number.
+    const std::vector<std::string>& Inputs() const;
+    size_t NumInputs() const { return Inputs().size(); }        // at most kMaxFunctionInputs
+    size_t NumRows() const { return size_t(1) << NumInputs(); } // one without inputs
+    // Requires: row < NumRows().
+    bool At(size_t row) const;
+    // The value of input 'input' in row 'row'.
+    bool InputAt(size_t row, size_t input) const
+    {
+        return (row >> (NumInputs() - 1 - input) & 1u) != 0;
+    }
+    // The packed rows, 64 to a word, zeros beyond the last one; as long as this function lives.
+    const uint64_t* Words() const;
+    size_t NumWords() const; // one at least
+
+    // "0x..." and "0b...", the highest row first, zeros kept: init values over these inputs.
+    std::string Hex() const;
+    std::string Binary() const;
+
+    // Same inputs in the same order and the same rows.
+    bool operator==(const Function& other) const;
+    bool operator!=(const Function& other) const { return !(*this == other); }
+
+    struct Imp; // internal
+
+  private:
+    friend struct FunctionAccess;
+    std::shared_ptr<const Imp> m_imp;
+};
+
+} // namespace kq_logic
+
+#endif

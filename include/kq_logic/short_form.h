@@ -1,0 +1,33 @@
+// A short expression for a function.
+//
+//     kq_logic::Function function;
+//     function.Set(Kq_BoolEquation("(a & b) | (a & c)"));
+//     const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(function);
+//     std::cout << shortForm.text << '\n'; // a & (b | c)
+//     std::cout << shortForm.numOperands << shortForm.isMinimal << '\n'; // 31
+#ifndef KQ_LOGIC_SHORT_FORM_H
+#define KQ_LOGIC_SHORT_FORM_H
+
+#include <string>
+
+#include <kq_logic/function.h>
+
+namespace kq_logic {
+
+constexpr size_t kMaxShortFormInputs = 16; // more are refused
+
+// What was found.
+struct ShortForm {
+    std::string fault;      // not empty: none was found, and why
+    std::string text;       // a text for Kq_BoolEquation, compared with the function row by row
+    size_t numOperands = 0; // how often it mentions inputs
+    bool isMinimal = false; // proved: no expression of & | ^ ~ and their negated forms has fewer
+};
+
+// Up to four inputs that matter the shortest there is; with more a search that may miss it.
+// Fails: fault, for more than kMaxShortFormInputs inputs or where no bearable length was found.
+KQ_EXPORT ShortForm FindShortForm(const Function& function);
+
+} // namespace kq_logic
+
+#endif

@@ -1,0 +1,57 @@
+#include "equality.h"
+
+#include <cassert>
+#include <cstdio>
+
+#include "column_decision.h"
+#include "function.h"
+#include "joined_inputs.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+bool IsInitValue(const Kq_BoolEquation& equation)
+{
+    return equation.IsHexInitValue() || equation.IsBinaryInitValue();
+}
+
+size_t NumInputsTogether(const Kq_BoolEquation& left, const Kq_BoolEquation& right)
+{
+    std::vector<std::string> inputs;
+    for (const auto& variable : left.GetVariables())
+        inputs.push_back(ToStd(variable.first));
+    std::vector<std::string> others;
+    for (const auto& variable : right.GetVariables())
+        others.push_back(ToStd(variable.first));
+    JoinInputs(others, inputs);
+    return inputs.size();
+}
+
+} // namespace
+
+Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
+                         const Limits& limits)
+{
+    // An init value has its rows at hand, and as an expression it may be huge.
+    Function leftColumn;
+    Function rightColumn;
+    if ((IsInitValue(left) || IsInitValue(right)) &&
+        NumInputsTogether(left, right) <= kMaxFunctionInputs && FunctionOf(left, leftColumn) &&
+        FunctionOf(right, rightColumn))
+        return DecideColumns(leftColumn, rightColumn);
+    return DecideEqual(ToExpression(left), ToExpression(right), limits);
+}
+
+std::string UndecidedText(const Decision& decision, const Limits& limits)
+{
+    assert(decision.verdict == Verdict::Undecided);
+    if (!decision.isTimeOver)
+        return "not decided: " + decision.reason;
+    char number[32];
+    std::snprintf(number, sizeof number, "%g", limits.seconds);
+    return "not decided in " + std::string(number) + (limits.seconds == 1 ? " second" : " seconds");
+}
+
+} // namespace booleq

@@ -1,0 +1,142 @@
+// The second library through its public headers alone: values, limits and refusals.
+#include <random>
+
+#include <gtest/gtest.h>
+
+#include <kq_logic/convert.h>
+#include <kq_logic/decide.h>
+#include <kq_logic/explain.h>
+#include <kq_logic/match.h>
+#include <kq_logic/permute.h>
+#include <kq_logic/short_form.h>
+#include <kq_logic/watch.h>
+
+namespace {
+
+using namespace kq_logic;
+
+Function Of(const std::string& text)
+{
+    Function function;
+    EXPECT_TRUE(function.Set(Kq_BoolEquation(text.c_str()))) << text;
+    return function;
+}
+
+// "v0 ^ v1 ^ ..."
+std::string Parity(size_t numInputs)
+{
+    std::string text = "v0";
+    for (size_t input = 1; input < numInputs; ++input)
+        text += " ^ v" + std::to_string(input);
+    return text;
+}
+
+TEST(LogicFunction, IsTheLibrarysColumn)
+{
+    for (const char* text : {"A & ~B", "a", "'x y' ^ b ^ c ^ d ^ e ^ f ^ g", "1"}) {
+        const Kq_BoolEquation equation(text);
+        Function function;
+        ASSERT_TRUE(function.Set(equation));
+        std::vector<uint64_t> words;
+        ASSERT_TRUE(equation.GetColumn(words));
+        ASSERT_EQ(function.NumWords(), words.size());
+        EXPECT_EQ(std::vector<uint64_t>(function.Words(), function.Words() + words.size()), words);
+        EXPECT_EQ(function.NumInputs(), equation.GetNumVariables());
+        for (size_t row = 0; row < function.NumRows(); ++row)
+            EXPECT_EQ(function.At(row), (words[row / 64] >> (row % 64) & 1u) != 0);
+        Function again;
+        ASSERT_TRUE(again.Set(function.Inputs(), words));
+        EXPECT_TRUE(again == function);
+    }
+}
+
+TEST(LogicFunction, StaysAsItWasWhenRefused)
+{
+    Function function = Of("A & B");
+    EXPECT_FALSE(function.Set(Kq_BoolEquation()));
+    EXPECT_FALSE(function.Set(Kq_BoolEquation(Parity(31).c_str())));
+    EXPECT_FALSE(function.Set({"A", "A"}, {1}));
+    EXPECT_FALSE(function.Set({"A"}, {4})); // a bit beyond the last row
+    EXPECT_FALSE(function.Set({"A"}, {}));
+    EXPECT_FALSE(function.Set({"A"}, {1, 0}));
+    EXPECT_FALSE(function.Set(std::vector<std::string>(31, "A"), {1}));
+    EXPECT_EQ(function.Hex(), "0x8");
+    const Function copy = function;
+    ASSERT_TRUE(function.Set({"A"}, {2}));
+    EXPECT_EQ(copy.Binary(), "0b1000");
+    EXPECT_NE(copy, function);
+}
+
+TEST(LogicQuestions, SayWhenThereAreTooManyInputs)
+{
+    const Function large = Of(Parity(17));
+    EXPECT_EQ(Explain(large).fault, "17 inputs: at most 16 are explained");
+    EXPECT_NE(FindShortForm(large).fault, "");
+    EXPECT_EQ(Match(Of("A"), large, MatchScope::Order).fault, "17 inputs: at most 16 are matched");
+    Function permuted;
+    EXPECT_EQ(Permute(Of("A"), {"A", "A"}, permuted), "A is listed twice");
+    EXPECT_NE(Permute(Of("A"), {"A", "1x"}, permuted), "");
+    EXPECT_NE(Permute(Of("A & B"), {"A"}, permuted), "");
+}
+
+TEST(LogicQuestions, AnswerWithFunctionsThatAreEqual)
+{
+    std::mt19937_64 random(11);
+    for (int repeat = 0; repeat < 200; ++repeat) {
+        const std::vector<std::string> inputs = {"a", "b", "c", "d", "e"};
+        Function function;
+        ASSERT_TRUE(function.Set(inputs, {random() & 0xffffffff}));
+        const ShortForm shortForm = FindShortForm(function);
+        ASSERT_EQ(shortForm.fault, "");
+        Function shortened = Of(shortForm.text);
+        ASSERT_EQ(Permute(shortened, inputs, shortened), "");
+        ASSERT_TRUE(shortened == function) << shortForm.text;
+
+        Function turned;
+        ASSERT_EQ(Permute(function, {"c", "e", "a", "d", "b"}, turned), "");
+        ASSERT_TRUE(turned.Set(inputs, {*turned.Words()}));
+        const Matching matching = Match(function, turned, MatchScope::Order);
+        ASSERT_TRUE(matching.isFound);
+        ASSERT_TRUE(Apply(matching, function, inputs) == turned);
+        const Explanation explanation = Explain(function);
+        ASSERT_EQ(explanation.mattering.size() + explanation.idle.size(), inputs.size());
+    }
+}
+
+TEST(LogicConvert, WritesEveryTargetOrSaysWhyNot)
+{
+    const Kq_BoolEquation equation("a | b & ~'c d'");
+    for (const std::string& target : ConversionTargets()) {
+        const Conversion conversion = Convert(equation, target, "gate");
+        EXPECT_EQ(conversion.fault, "") << target;
+        EXPECT_TRUE(conversion.isProved) << target;
+        EXPECT_EQ(conversion.text.back(), '\n') << target;
+        EXPECT_EQ(conversion.inputs.size(), 3u);
+        EXPECT_EQ(conversion.names.size(), 3u);
+    }
+    EXPECT_NE(Convert(Kq_BoolEquation(), "c").fault, "");
+    EXPECT_NE(Convert(equation, "").fault, "");
+    EXPECT_NE(Convert(Kq_BoolEquation(Parity(17).c_str()), "pla").fault, "");
+}
+
+TEST(LogicDecide, FindsADifferenceThatIsOne)
+{
+    const Kq_BoolEquation left("a | b & c");
+    const Kq_BoolEquation right("a | (b & c)");
+    const Decision decision = DecideEqual(left, right);
+    ASSERT_EQ(decision.verdict, Verdict::Different);
+    ASSERT_EQ(decision.assignment.size(), decision.inputs.size());
+    for (const bool isLeft : {true, false}) {
+        Kq_BoolEquation equation(isLeft ? left : right);
+        for (size_t input = 0; input < decision.inputs.size(); ++input)
+            equation.SetVariable(decision.inputs[input].c_str(), decision.assignment[input]);
+        EXPECT_EQ(equation.Eval() != 0, isLeft ? decision.left : decision.right);
+    }
+    EXPECT_NE(decision.left, decision.right);
+    EXPECT_EQ(DecideEqual(left, Kq_BoolEquation("c & (b | a)")).verdict, Verdict::Equal);
+    EXPECT_EQ(DecideConstant(Kq_BoolEquation("a & ~a"), false).verdict, Verdict::Equal);
+    EXPECT_EQ(DecideConstant(left, true).verdict, Verdict::Different);
+    EXPECT_EQ(DecideEqual(left, Kq_BoolEquation()).verdict, Verdict::Undecided);
+}
+
+} // namespace

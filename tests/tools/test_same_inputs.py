@@ -1,0 +1,240 @@
+#!/usr/bin/env python3
+# Random texts, init values and odd names: every command of the tool, and with --python every member
+# of the module that is on the path, reports the inputs and the column that the library itself has.
+import argparse
+import json
+import random
+import subprocess
+import sys
+
+NAMES = ["A", "B", "C", "a", "b", "'a'", "'a b'", "'a'+b", "'x,y'", "n1", "'a'&'b'", "'a'b", "'q'~"]
+OPERATORS = ["&", "|", "^", "~&", "~|", "!^", "+", "*", "@", ".AND.", ".NOR."]
+COMMANDS = ["check", "show", "init", "table", "explain", "match", "equal", "convert", "lint", "kmap",
+            "tree"]
+
+
+def random_text(rng):
+    if rng.random() < 0.45:
+        is_hex = rng.random() < 0.6
+        digits = rng.choice([1, 1, 2, 2, 4, 8, 16] if is_hex else [1, 2, 3, 4, 7, 8, 16])
+        return ("0x" if is_hex else "0b") + "".join(
+            rng.choice("0123456789abcdefF" if is_hex else "01") for _ in range(digits))
+    operands = [rng.choice(["", "~"]) + rng.choice(NAMES + ["1", "0"])
+                for _ in range(rng.randrange(1, 5))]
+    text = operands[0]
+    for operand in operands[1:]:
+        text = f"{text} {rng.choice(OPERATORS)} {operand}"
+        if rng.random() < 0.3:
+            text = f"({text})"
+    return text
+
+
+class Group:
+    """Texts that are read over one list of inputs, and what the library says of each."""
+
+    def __init__(self, rng, helper):
+        self.inputs = rng.sample(NAMES, rng.randrange(1, 5)) if rng.random() < 0.8 else None
+        flags = ["--lsb-first", "--reverse"]
+        self.flags = rng.sample(flags, rng.randrange(0, 3)) if self.inputs else []
+        self.texts = [random_text(rng) for _ in range(12)]
+        # One digit over one input is read by tool and module alone.
+        if self.inputs and len(self.inputs) == 1:
+            self.texts = [text for text in self.texts if not (text[:1] == "0" and len(text) == 3)]
+        if self.inputs: # one init value of each width that may fit
+            for width in range(1, 7):
+                self.texts.append("0b" + "".join(rng.choice("01") for _ in range(1 << width)))
+        listed = ["--inputs", *self.inputs] if self.inputs else []
+        answer = run([helper, *self.flags, *listed], self.texts)
+        self.known = [None if line == "refused" else line.split("\t") for line in answer]
+        assert len(self.known) == len(self.texts)
+
+    def options(self):
+        return self.flags + (["--inputs", ",".join(self.inputs)] if self.inputs else [])
+
+    def column(self, index):
+        return self.known[index][0]
+
+    def names(self, index):
+        return self.known[index][1:]
+
+
+def run(command, lines):
+    done = subprocess.run(command, input="".join(line + "\n" for line in lines), text=True,
+                          capture_output=True, check=False)
+    assert done.returncode in (0, 1, 2, 3), (command, done.returncode, done.stderr)
+    return done.stdout.splitlines()
+
+
+# What the answer of a command says of inputs and column, as far as it does.
+def reported(command, result):
+    if command == "kmap":
+        return result["row_inputs"] + result["column_inputs"], None
+    if command == "init":
+        return result["inputs"], result["msb_first"]["hex"]
+    if command == "convert":
+        return [pair["input"] for pair in result["inputs"]], None
+    if command == "match":
+        return result["first_inputs"], None
+    if command == "table":
+        rows = result["rows"]
+        ones = sum(row[-1] << number for number, row in enumerate(rows))
+        return result["inputs"], f"0x{ones:0{max(1, len(rows) // 4)}x}"
+    return result["inputs"], result.get("hex")
+
+
+class Comparison:
+    def __init__(self):
+        self.differences = []
+        self.num_compared = 0
+
+    def expect(self, expected, found, *where):
+        self.num_compared += 1
+        if expected != found:
+            self.differences.append(f"{' '.join(map(str, where))}: {found}, not {expected}")
+
+
+def compare_commands(tool, group, comparison):
+    for command in COMMANDS:
+        more = {"equal": ["(1)"], "match": ["(1)"], "convert": ["--to", "alt1"]}.get(command, [])
+        answers = run([tool, command, "--json", "--file", "-", *group.options(), *more],
+                      group.texts)
+        comparison.expect(len(group.texts), len(answers), command, group.options())
+        for index, line in enumerate(answers):
+            answer = json.loads(line)
+            text = group.texts[index]
+            where = (command, group.options(), text)
+            known = group.known[index]
+            is_init = text[:2] in ("0x", "0b")
+            if known is None and command == "match" and is_init:
+                continue # inputs that nobody named for it get letters there
+            if known is None:
+                comparison.expect("refused", answer["status"], *where)
+                continue
+            if "refusal" in answer:
+                assert answer["refusal"]["code"] == "unsuitable", (where, answer)
+                continue
+            if command == "tree":
+                continue
+            names, column = reported(command, answer["result"])
+            if command == "equal":
+                comparison.expect(True, set(group.names(index)) <= set(names), *where)
+                continue
+            comparison.expect(group.names(index), names, *where)
+            if column is not None and known[0] != "-":
+                comparison.expect(known[0], column, *where)
+
+
+def compare_values(tool, group, comparison):
+    for index, known in enumerate(group.known):
+        if known is None or known[0] == "-":
+            continue
+        row = index % (1 << len(group.names(index)))
+        values = [f"{name}={row >> place & 1}"
+                  for place, name in enumerate(reversed(group.names(index)))]
+        answer = run([tool, "eval", *group.options(), "--", group.texts[index], *values], [])
+        comparison.expect([str(int(known[0], 16) >> row & 1)], answer, "eval", group.options(),
+                          group.texts[index], values)
+
+
+def compare_batch(tool, group, comparison):
+    if group.flags or not group.inputs: # the table has neither
+        return
+    rows = [{"inputs": group.inputs, "init" if text[:2] in ("0x", "0b") else "equation": text}
+            for text in group.texts]
+    lines = run([tool, "batch", "--format", "jsonl", "-"], [json.dumps(row) for row in rows])
+    for index, line in enumerate(lines):
+        row = json.loads(line)
+        where = ("batch", group.inputs, group.texts[index])
+        if group.known[index] is None:
+            comparison.expect("refused", row["result"], *where)
+        elif row["result"] == "filled":
+            comparison.expect(group.names(index), row["inputs"], *where)
+            comparison.expect(int(group.column(index), 16), int(row["init"], 0), *where)
+
+
+def compare_permute(tool, group, comparison):
+    if not group.inputs or "--reverse" in group.flags:
+        return
+    order = ",".join(reversed(group.inputs))
+    lines = run([tool, "permute", "--json", "--file", "-", *group.flags, "--from",
+                 ",".join(group.inputs), "--to", order], group.texts)
+    for index, line in enumerate(lines):
+        answer = json.loads(line)
+        where = ("permute", group.options(), group.texts[index])
+        if group.known[index] is None:
+            comparison.expect("refused", answer["status"], *where)
+        elif answer["status"] == "done":
+            comparison.expect(group.names(index), answer["result"]["from"]["inputs"], *where)
+            comparison.expect(group.column(index), answer["result"]["from"]["hex"], *where)
+        else:
+            comparison.expect(True, len(group.names(index)) > len(group.inputs), *where)
+
+
+def compare_members(group, comparison):
+    import booleq
+    if "--reverse" in group.flags: # which the module does not have
+        return
+    for index, text in enumerate(group.texts):
+        where = ("Equation", group.options(), text)
+        try:
+            equation = booleq.Equation(text, group.inputs, lsb_first="--lsb-first" in group.flags)
+        except booleq.ParseError:
+            comparison.expect(group.known[index], None, *where)
+            continue
+        if group.known[index] is None:
+            comparison.expect("refused", equation, *where)
+            continue
+        names, column = group.names(index), group.column(index)
+        comparison.expect(tuple(names), equation.inputs, *where)
+        comparison.expect(names, list(equation), "iter", *where)
+        comparison.expect(len(names), len(equation), "len", *where)
+        comparison.expect(names, list(equation.explain().inputs), "explain", *where)
+        comparison.expect(names, list(equation.lint().inputs), "lint", *where)
+        comparison.expect((1 << len(names), len(names) + 1), equation.truth_table().shape,
+                          "truth_table", *where)
+        if column == "-":
+            continue
+        value = int(column, 16)
+        bits = [value >> row & 1 for row in range(1 << len(names))]
+        comparison.expect(column, equation.hex_init, "hex_init", *where)
+        comparison.expect(value, int(equation.binary_init, 2), "binary_init", *where)
+        comparison.expect(bits, equation.column().tolist(), "column", *where)
+        comparison.expect(bits, equation.truth_table()[:, -1].tolist(), "truth_table", *where)
+        comparison.expect(bits, equation.eval_many(equation.truth_table()[:, :-1]).tolist(),
+                          "eval_many", *where)
+        words = [int(word) for word in equation.packed_column()]
+        comparison.expect(value, sum(word << 64 * place for place, word in enumerate(words)),
+                          "packed_column", *where)
+
+
+def main():
+    parser = argparse.ArgumentParser()
+    parser.add_argument("--tool")
+    parser.add_argument("--helper", required=True)
+    parser.add_argument("--python", action="store_true")
+    parser.add_argument("--seed", type=int, default=1)
+    parser.add_argument("--groups", type=int, default=40)
+    options = parser.parse_args()
+    rng = random.Random(options.seed)
+    comparison = Comparison()
+    num_accepted = 0
+    for _ in range(options.groups):
+        group = Group(rng, options.helper)
+        num_accepted += sum(known is not None for known in group.known)
+        if options.python:
+            compare_members(group, comparison)
+        else:
+            compare_commands(options.tool, group, comparison)
+            compare_values(options.tool, group, comparison)
+            compare_batch(options.tool, group, comparison)
+            compare_permute(options.tool, group, comparison)
+    for difference in comparison.differences[:20]:
+        print(difference)
+    print(f"{num_accepted} accepted texts, {comparison.num_compared} comparisons, "
+          f"{len(comparison.differences)} differences")
+    assert num_accepted > 3 * options.groups
+    return 1 if comparison.differences else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

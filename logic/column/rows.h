@@ -28,7 +28,7 @@ constexpr uint64_t RowMask(unsigned int numInputs)
 }
 
 // The bits of a word whose number has bit 'bit' set.  Requires: bit < 6.
-constexpr uint64_t BitPattern(unsigned int bit)
+constexpr uint64_t BitPattern(size_t bit)
 {
     constexpr uint64_t kPatterns[6] = {0xaaaaaaaaaaaaaaaa, 0xcccccccccccccccc, 0xf0f0f0f0f0f0f0f0,
                                        0xff00ff00ff00ff00, 0xffff0000ffff0000, 0xffffffff00000000};

@@ -5,8 +5,8 @@ from typing import Dict, Optional, Tuple
 
 from ._booleq import Equation
 
-__all__ = ["Difference", "Equivalence", "Explanation", "Finding", "LintReport", "Node",
-           "ParseError", "Reading"]
+__all__ = ["Difference", "Equivalence", "Explanation", "Finding", "LintReport", "Minimum",
+           "Node", "ParseError", "Reading"]
 
 
 class ParseError(ValueError):
@@ -70,6 +70,19 @@ class Explanation:
     expression: Optional[str]
     operands: Optional[int]
     minimal: bool
+
+
+@dataclass(frozen=True)
+class Minimum:
+    """What Equation.minimize() finds; no sum has fewer terms than lower_bound."""
+
+    inputs: Tuple[str, ...]
+    expression: str
+    cubes: Tuple[str, ...]
+    terms: int
+    literals: int
+    lower_bound: int
+    proved: bool
 
 
 @dataclass(frozen=True)

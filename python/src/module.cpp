@@ -53,6 +53,7 @@ PYBIND11_MODULE(_booleq, module)
     BindTexts(type);
     BindMapping(type);
     BindArrays(module, type);
+    BindMinimize(module, type);
     BindReports(type);
     py::module_::import("collections.abc").attr("Mapping").attr("register")(type);
 }

@@ -22,9 +22,10 @@ const std::vector<Option>& CommonOptions()
 const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
-        ShowCommand(),    CheckCommand(), EvalCommand(),    TableCommand(),   InitCommand(),
-        EqualCommand(),   SatCommand(),   ExplainCommand(), PermuteCommand(), MatchCommand(),
-        ConvertCommand(), LintCommand(),  TreeCommand(),    KmapCommand(),    BatchCommand(),
+        ShowCommand(),    CheckCommand(), EvalCommand(),    TableCommand(),
+        InitCommand(),    EqualCommand(), SatCommand(),     ExplainCommand(),
+        PermuteCommand(), MatchCommand(), ConvertCommand(), LintCommand(),
+        TreeCommand(),    KmapCommand(),  BatchCommand(),   MinimizeCommand(),
     };
     return commands;
 }

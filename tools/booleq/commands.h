@@ -21,6 +21,7 @@ Command MatchCommand();
 Command BatchCommand();
 Command ConvertCommand();
 Command LintCommand();
+Command MinimizeCommand();
 
 } // namespace booleq
 

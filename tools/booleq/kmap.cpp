@@ -4,54 +4,12 @@
 
 #include "answer.h"
 #include "commands.h"
+#include "map.h"
 #include "picture.h"
-#include "text.h"
 
 namespace booleq {
 
 namespace {
-
-size_t GrayCode(size_t place)
-{
-    return place ^ (place >> 1);
-}
-
-std::string Bits(size_t value, size_t width)
-{
-    std::string bits;
-    for (size_t bit = width; bit-- > 0;)
-        bits += (value >> bit & 1u) ? '1' : '0';
-    return bits;
-}
-
-// The first half of the inputs, rounded down, numbers the rows, the others the columns.
-struct Map {
-    explicit Map(const Function& map)
-        : function(map), numRowInputs(map.NumInputs() / 2),
-          numColumnInputs(map.NumInputs() - numRowInputs)
-    {
-    }
-
-    size_t NumRows() const { return size_t(1) << numRowInputs; }
-    size_t NumColumns() const { return size_t(1) << numColumnInputs; }
-    std::string RowLabel(size_t row) const { return Bits(GrayCode(row), numRowInputs); }
-    std::string ColumnLabel(size_t column) const { return Bits(GrayCode(column), numColumnInputs); }
-    bool At(size_t row, size_t column) const
-    {
-        return function.At(GrayCode(row) << numColumnInputs | GrayCode(column));
-    }
-    std::string RowNames() const { return Names(0, numRowInputs); }
-    std::string ColumnNames() const { return Names(numRowInputs, function.NumInputs()); }
-    std::string Names(size_t from, size_t to) const
-    {
-        const auto begin = function.Inputs().begin();
-        return Visible(Join({begin + static_cast<long>(from), begin + static_cast<long>(to)}, " "));
-    }
-
-    const Function& function;
-    size_t numRowInputs;
-    size_t numColumnInputs;
-};
 
 void PutText(const Map& map, Output& output)
 {

@@ -1,0 +1,218 @@
+// Blocking sets, signatures, and primes as complements of minimal hitting sets.
+#include "blocking.h"
+
+#include <algorithm>
+#include <numeric>
+
+namespace booleq {
+
+namespace {
+
+// Drops sets that hold another one.
+void KeepMinimal(CubeList& sets, Work& work)
+{
+    sets.SortAndUnite();
+    const size_t numWords = sets.NumWords();
+    std::vector<uint32_t> sizes(sets.Size());
+    for (size_t index = 0; index < sets.Size(); ++index)
+        for (size_t word = 0; word < numWords; ++word)
+            sizes[index] += static_cast<uint32_t>(CountBits(sets.At(index)[word]));
+    std::vector<uint32_t> order(sets.Size());
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(),
+                     [&](uint32_t left, uint32_t right) { return sizes[left] < sizes[right]; });
+    CubeList minimal(numWords);
+    for (const uint32_t index : order) {
+        bool isMinimal = true;
+        for (size_t other = 0; other < minimal.Size() && isMinimal; ++other)
+            isMinimal = !Contains(sets.At(index), minimal.At(other), numWords);
+        work.Spend(minimal.Size() + 1);
+        if (isMinimal)
+            minimal.Append(sets.At(index));
+    }
+    sets = minimal;
+}
+
+} // namespace
+
+CubeList FindBlockingSets(const CubeSpace& space, const CubeList& off, const uint64_t* cube,
+                          Work& work)
+{
+    const size_t numWords = space.NumWords();
+    CubeList sets(numWords);
+    std::vector<uint64_t> set(numWords);
+    work.Spend(off.Size() * numWords);
+    for (size_t index = 0; index < off.Size(); ++index) {
+        for (size_t word = 0; word < numWords; ++word)
+            set[word] = off.At(index)[word] & InputConflicts(space, off.At(index), cube, word) * 3;
+        if (HasCommonOutput(space, off.At(index), cube)) {
+            sets.Append(set.data());
+            continue;
+        }
+        for (size_t word = space.FirstOutputWord(); word < numWords; ++word) {
+            for (uint64_t rest = off.At(index)[word] & space.Outputs(word); rest != 0;
+                 rest &= rest - 1) {
+                sets.Append(set.data());
+                SetBit(sets.At(sets.Size() - 1), 64 * word + LowestBit(rest));
+            }
+        }
+    }
+    KeepMinimal(sets, work);
+    return sets;
+}
+
+void FindSignature(const CubeSpace& space, const CubeList& blocking, uint64_t* signature)
+{
+    for (size_t word = 0; word < space.NumWords(); ++word) {
+        signature[word] = space.All(word);
+        for (size_t index = 0; index < blocking.Size(); ++index)
+            signature[word] &= ~blocking.At(index)[word];
+    }
+}
+
+namespace {
+
+class HittingSearch {
+  public:
+    HittingSearch(const CubeSpace& space, const CubeList& blocking, size_t maxCount, Work& work,
+                  CubeList& primes)
+        : m_space(space), m_blocking(blocking), m_work(work), m_primes(primes),
+          m_max_size(primes.Size() + maxCount), m_num_row_words((blocking.Size() + 63) / 64),
+          m_candidates(space.NumWords()), m_chosen(space.NumWords()),
+          m_rows_of(64 * space.NumWords())
+    {
+    }
+
+    bool Run(const uint64_t* parts)
+    {
+        Rows uncovered(m_num_row_words);
+        for (size_t row = 0; row < m_blocking.Size(); ++row) {
+            bool isOpen = true; // not met by a part that counts as chosen
+            for (size_t word = 0; word < m_space.NumWords(); ++word)
+                isOpen = isOpen && (m_blocking.At(row)[word] & ~parts[word]) == 0;
+            if (!isOpen)
+                continue;
+            SetBit(uncovered.data(), row);
+            for (size_t word = 0; word < m_space.NumWords(); ++word) {
+                m_candidates[word] |= m_blocking.At(row)[word];
+                for (uint64_t rest = m_blocking.At(row)[word]; rest != 0; rest &= rest - 1) {
+                    Rows& rows = m_rows_of[64 * word + LowestBit(rest)];
+                    rows.resize(m_num_row_words);
+                    SetBit(rows.data(), row);
+                }
+            }
+        }
+        for (size_t word = 0; word < m_space.NumWords(); ++word)
+            m_parts.push_back(parts[word]);
+        return Find(uncovered);
+    }
+
+  private:
+    typedef std::vector<uint64_t> Rows;
+
+    // Invariant: each chosen part has a row that only it meets (m_critical).
+    bool Find(const Rows& uncovered)
+    {
+        m_work.Spend(m_num_row_words * (m_critical.size() + 1) + 1);
+        size_t row = SIZE_MAX;
+        if (!ChooseRow(uncovered, row))
+            return AddPrime();
+        std::vector<size_t> parts;
+        for (size_t word = 0; word < m_space.NumWords(); ++word) {
+            uint64_t common = m_blocking.At(row)[word] & m_candidates[word];
+            m_candidates[word] &= ~common;
+            for (; common != 0; common &= common - 1)
+                parts.push_back(64 * word + LowestBit(common));
+        }
+        bool isAll = true;
+        for (const size_t part : parts) {
+            isAll = isAll && Choose(part, uncovered);
+            SetBit(m_candidates.data(), part);
+        }
+        return isAll;
+    }
+
+    bool Choose(size_t part, const Rows& uncovered)
+    {
+        const Rows& rows = m_rows_of[part];
+        Rows rest(m_num_row_words);
+        Rows own(m_num_row_words);
+        for (size_t word = 0; word < m_num_row_words; ++word) {
+            rest[word] = uncovered[word] & ~rows[word];
+            own[word] = uncovered[word] & rows[word];
+        }
+        m_work.Spend(m_num_row_words * (m_critical.size() + 1));
+        std::vector<Rows> saved = m_critical;
+        bool isMinimal = true;
+        for (Rows& critical : m_critical) {
+            uint64_t any = 0;
+            for (size_t word = 0; word < m_num_row_words; ++word)
+                any |= critical[word] &= ~rows[word];
+            isMinimal = isMinimal && any != 0;
+        }
+        bool isAll = true;
+        if (isMinimal) {
+            m_critical.push_back(std::move(own));
+            SetBit(m_chosen.data(), part);
+            isAll = Find(rest);
+            ClearBit(m_chosen.data(), part);
+        }
+        m_critical.swap(saved);
+        return isAll;
+    }
+
+    // The uncovered row with the fewest candidates; false when there is none.
+    bool ChooseRow(const Rows& uncovered, size_t& best) const
+    {
+        size_t fewest = SIZE_MAX;
+        for (size_t word = 0; word < m_num_row_words; ++word) {
+            for (uint64_t rest = uncovered[word]; rest != 0; rest &= rest - 1) {
+                const size_t row = 64 * word + LowestBit(rest);
+                size_t count = 0;
+                for (size_t part = 0; part < m_space.NumWords(); ++part)
+                    count += CountBits(m_blocking.At(row)[part] & m_candidates[part]);
+                if (count < fewest) {
+                    fewest = count;
+                    best = row;
+                }
+                if (fewest <= 1)
+                    return true;
+            }
+        }
+        return fewest != SIZE_MAX;
+    }
+
+    bool AddPrime()
+    {
+        if (m_primes.Size() >= m_max_size)
+            return false;
+        m_primes.Resize(m_primes.Size() + 1);
+        uint64_t* prime = m_primes.At(m_primes.Size() - 1);
+        for (size_t word = 0; word < m_space.NumWords(); ++word)
+            prime[word] = m_parts[word] & ~m_chosen[word];
+        return true;
+    }
+
+    const CubeSpace& m_space;
+    const CubeList& m_blocking;
+    Work& m_work;
+    CubeList& m_primes;
+    size_t m_max_size;
+    size_t m_num_row_words;
+    std::vector<uint64_t> m_candidates; // parts that may still be chosen
+    std::vector<uint64_t> m_chosen;
+    std::vector<uint64_t> m_parts;
+    std::vector<Rows> m_rows_of;  // of each part
+    std::vector<Rows> m_critical; // of each chosen part
+};
+
+} // namespace
+
+bool FindPrimes(const CubeSpace& space, const CubeList& blocking, const uint64_t* parts,
+                size_t maxCount, Work& work, CubeList& primes)
+{
+    assert(primes.NumWords() == space.NumWords());
+    return HittingSearch(space, blocking, maxCount, work, primes).Run(parts);
+}
+
+} // namespace booleq

@@ -1,0 +1,32 @@
+// What keeps a row of an output from growing into larger products: for each off cube the parts one
+// of which must stay out. The smallest sets of parts that meet all of these belong to the primes
+// that hold the row; the parts that are in none of the smallest sets belong to all of its primes
+// (P. McGeer, J. Sanghavi, R. Brayton, A. Sangiovanni-Vincentelli, ESPRESSO-SIGNATURE: a new exact
+// minimizer for logic functions, 1993).
+#ifndef BOOLEQ_MINIMISE_BLOCKING_H
+#define BOOLEQ_MINIMISE_BLOCKING_H
+
+#include "cube.h"
+#include "work.h"
+
+namespace booleq {
+
+// One set of parts for each way in which 'cube', which meets no off cube, would meet one if all of
+// the set were raised; no set holds another one.
+CubeList FindBlockingSets(const CubeSpace& space, const CubeList& off, const uint64_t* cube,
+                          Work& work);
+
+// The parts that all primes that hold the cube have: those in no blocking set.
+void FindSignature(const CubeSpace& space, const CubeList& blocking, uint64_t* signature);
+
+// Appends the complements of all minimal sets that have a part in common with each of 'blocking',
+// up to 'maxCount' of them: the primes, when 'blocking' is of one cube. Parts outside 'parts' count
+// as chosen already. (K. Murakami, T. Uno, Efficient algorithms for dualizing large-scale
+// hypergraphs, 2014.) False when there are more. Recursion: one level for each part chosen, at most
+// inputs + outputs.
+bool FindPrimes(const CubeSpace& space, const CubeList& blocking, const uint64_t* parts,
+                size_t maxCount, Work& work, CubeList& primes);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,272 @@
+// Complement by unate recursion. What both halves of a split have is merged again; parts of up to
+// six inputs are covered as a word of rows.
+#include <algorithm>
+
+#include "small_cover.h"
+#include "unate.h"
+#include "unate_walk.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr size_t kMaxPairsToLift = size_t(1) << 20;
+
+class ComplementSearch {
+  public:
+    ComplementSearch(const CubeSpace& space, CubeList& stack, Work& work)
+        : m_space(space), m_stack(stack), m_work(work), m_num_words(space.NumInputWords()),
+          m_zeros(m_num_words), m_ones(m_num_words), m_candidates(m_num_words),
+          m_full(m_num_words, ~uint64_t(0))
+    {
+    }
+
+    // Depth: one level for each input.
+    CubeList Find(StackPart part)
+    {
+        CubeList result(m_num_words);
+        m_work.Spend(2 * part.count * m_num_words + 1);
+        if (part.count == 0)
+            result.Append(m_full.data());
+        if (part.count == 0 || HasUniversal(part))
+            return result;
+        const std::vector<uint64_t> common = TakeOutCommon(part, result);
+        if (!HasUniversal(part))
+            AppendRest(part, common, result);
+        return result;
+    }
+
+  private:
+    bool HasUniversal(StackPart part) const
+    {
+        for (size_t index = part.first; index < part.first + part.count; ++index)
+            if (IsUniversal(m_stack.At(index), m_num_words))
+                return true;
+        return false;
+    }
+
+    // Literals that all cubes have: the opposite of each is a cube of the complement, and the cubes
+    // lose them. Returns the cube of these literals.
+    std::vector<uint64_t> TakeOutCommon(StackPart part, CubeList& result)
+    {
+        std::vector<uint64_t> common(m_num_words);
+        for (size_t index = part.first; index < part.first + part.count; ++index)
+            for (size_t word = 0; word < m_num_words; ++word)
+                common[word] |= m_stack.At(index)[word];
+        for (size_t word = 0; word < m_num_words; ++word) {
+            const uint64_t absent = ~common[word];
+            for (uint64_t rest = absent; rest != 0; rest &= rest - 1) {
+                const size_t bit = LowestBit(rest);
+                result.Append(m_full.data());
+                ClearBit(result.At(result.Size() - 1), 64 * word + (bit ^ 1));
+            }
+            for (size_t index = part.first; index < part.first + part.count; ++index)
+                m_stack.At(index)[word] |= absent;
+        }
+        return common;
+    }
+
+    void AppendRest(StackPart part, const std::vector<uint64_t>& common, CubeList& result)
+    {
+        size_t numActive = 0;
+        uint64_t anyBinate = 0;
+        for (size_t word = 0; word < m_num_words; ++word) {
+            const Occurrence occurrence = FindOccurrence(m_space, m_stack, part, word);
+            m_zeros[word] = occurrence.zeros;
+            m_ones[word] = occurrence.ones;
+            numActive += CountBits(occurrence.zeros | occurrence.ones);
+            anyBinate |= occurrence.zeros & occurrence.ones;
+        }
+        assert(numActive > 0);
+        CubeList rest(m_num_words);
+        if (numActive <= kWordInputs)
+            CoverRows(part, rest);
+        else
+            Split(part, anyBinate != 0, rest);
+        for (size_t index = 0; index < rest.Size(); ++index)
+            for (size_t word = 0; word < m_num_words; ++word)
+                rest.At(index)[word] &= common[word];
+        result.Append(rest);
+    }
+
+    void CoverRows(StackPart part, CubeList& result)
+    {
+        size_t bits[kWordInputs] = {};
+        size_t numActive = 0;
+        for (size_t word = 0; word < m_num_words; ++word)
+            for (uint64_t rest = m_zeros[word] | m_ones[word]; rest != 0; rest &= rest - 1)
+                bits[numActive++] = 64 * word + LowestBit(rest);
+        uint64_t covered = 0;
+        for (size_t index = part.first; index < part.first + part.count; ++index) {
+            uint64_t rows = ~uint64_t(0);
+            for (size_t place = 0; place < numActive; ++place) {
+                if (!GetBit(m_stack.At(index), bits[place]))
+                    rows &= BitPattern(place);
+                if (!GetBit(m_stack.At(index), bits[place] + 1))
+                    rows &= ~BitPattern(place);
+            }
+            covered |= rows;
+        }
+        m_small.clear();
+        FindSmallCover(~covered, numActive, m_small);
+        for (const SmallCube& cube : m_small) {
+            result.Append(m_full.data());
+            for (size_t place = 0; place < numActive; ++place) {
+                if ((cube.zeros >> place & 1) != 0)
+                    ClearBit(result.At(result.Size() - 1), bits[place] + 1);
+                if ((cube.ones >> place & 1) != 0)
+                    ClearBit(result.At(result.Size() - 1), bits[place]);
+            }
+        }
+    }
+
+    void Split(StackPart part, bool hasBinate, CubeList& result)
+    {
+        for (size_t word = 0; word < m_num_words; ++word)
+            m_candidates[word] =
+                hasBinate ? m_zeros[word] & m_ones[word] : m_zeros[word] | m_ones[word];
+        const size_t bit = ChooseInput(m_space, m_stack, part, m_candidates.data(), m_counts);
+        const bool hasZeros = GetBit(m_zeros.data(), bit);
+        const bool hasOnes = GetBit(m_ones.data(), bit);
+        CubeList halves[2] = {CubeList(m_num_words), CubeList(m_num_words)};
+        for (const size_t value : {0u, 1u}) {
+            const StackPart half = PushCofactor(m_stack, part, bit, value == 1);
+            halves[value] = Find(half);
+            m_stack.Resize(half.first);
+        }
+        // A row that is left out where the input covers more is left out for both values.
+        if (!hasZeros)
+            Unite(halves[1], halves[0], bit + 1, result);
+        else if (!hasOnes)
+            Unite(halves[0], halves[1], bit, result);
+        else
+            Merge(halves[0], halves[1], bit, result);
+    }
+
+    // 'both' for either value; those of 'one' that do not lie in it for one value only.
+    void Unite(const CubeList& both, const CubeList& one, size_t bitToClear, CubeList& result)
+    {
+        result.Append(both);
+        const bool doCompare = both.Size() * one.Size() <= kMaxPairsToLift;
+        if (doCompare)
+            m_work.Spend(both.Size() * one.Size());
+        for (size_t index = 0; index < one.Size(); ++index) {
+            if (doCompare && IsInOne(both, one.At(index)))
+                continue;
+            result.Append(one.At(index));
+            ClearBit(result.At(result.Size() - 1), bitToClear);
+        }
+    }
+
+    bool IsInOne(const CubeList& list, const uint64_t* cube) const
+    {
+        for (size_t index = 0; index < list.Size(); ++index)
+            if (Contains(list.At(index), cube, m_num_words))
+                return true;
+        return false;
+    }
+
+    void Merge(CubeList& zero, CubeList& one, size_t bit, CubeList& result)
+    {
+        std::vector<uint8_t> isLifted[2];
+        isLifted[0].resize(zero.Size());
+        isLifted[1].resize(one.Size());
+        if (zero.Size() * one.Size() <= kMaxPairsToLift) {
+            m_work.Spend(2 * zero.Size() * one.Size());
+            for (size_t index = 0; index < zero.Size(); ++index)
+                isLifted[0][index] = IsInOne(one, zero.At(index)) ? 1 : 0;
+            for (size_t index = 0; index < one.Size(); ++index)
+                isLifted[1][index] = IsInOne(zero, one.At(index)) ? 1 : 0;
+        }
+        CubeList lifted(m_num_words);
+        for (size_t index = 0; index < zero.Size(); ++index)
+            if (isLifted[0][index] != 0)
+                lifted.Append(zero.At(index));
+        for (size_t index = 0; index < one.Size(); ++index)
+            if (isLifted[1][index] != 0)
+                lifted.Append(one.At(index));
+        lifted.SortAndUnite(); // equal cubes of both halves are one
+        for (size_t index = 0; index < zero.Size(); ++index)
+            if (isLifted[0][index] == 0)
+                AppendWithout(zero.At(index), bit + 1, result);
+        for (size_t index = 0; index < one.Size(); ++index)
+            if (isLifted[1][index] == 0)
+                AppendWithout(one.At(index), bit, result);
+        result.Append(lifted);
+    }
+
+    static void AppendWithout(const uint64_t* cube, size_t bit, CubeList& result)
+    {
+        result.Append(cube);
+        ClearBit(result.At(result.Size() - 1), bit);
+    }
+
+    const CubeSpace& m_space;
+    CubeList& m_stack;
+    Work& m_work;
+    size_t m_num_words;
+    std::vector<uint64_t> m_zeros;
+    std::vector<uint64_t> m_ones;
+    std::vector<uint64_t> m_candidates;
+    std::vector<uint64_t> m_full;
+    std::vector<uint32_t> m_counts;
+    std::vector<SmallCube> m_small;
+};
+
+} // namespace
+
+CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work)
+{
+    assert(cubes.NumWords() == space.NumInputWords());
+    return ComplementSearch(space, cubes, work).Find({0, cubes.Size()});
+}
+
+void UniteOutputs(const CubeSpace& space, CubeList& cubes)
+{
+    const size_t numWords = space.NumWords();
+    std::vector<uint32_t> order(cubes.Size());
+    for (size_t index = 0; index < order.size(); ++index)
+        order[index] = static_cast<uint32_t>(index);
+    const auto compare = [&](uint32_t left, uint32_t right) {
+        for (size_t word = 0; word < space.NumInputWords(); ++word) {
+            const uint64_t leftInputs = cubes.At(left)[word] & space.Inputs(word);
+            const uint64_t rightInputs = cubes.At(right)[word] & space.Inputs(word);
+            if (leftInputs != rightInputs)
+                return leftInputs < rightInputs ? -1 : 1;
+        }
+        return 0;
+    };
+    std::stable_sort(order.begin(), order.end(),
+                     [&](uint32_t left, uint32_t right) { return compare(left, right) < 0; });
+    CubeList united(numWords);
+    for (size_t place = 0; place < order.size(); ++place) {
+        if (place == 0 || compare(order[place - 1], order[place]) != 0)
+            united.Append(cubes.At(order[place]));
+        for (size_t word = 0; word < numWords; ++word)
+            united.At(united.Size() - 1)[word] |= cubes.At(order[place])[word];
+    }
+    cubes = united;
+}
+
+CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeList& second,
+                    Work& work)
+{
+    CubeList result(space.NumWords());
+    for (size_t output = 0; output < space.NumOutputs(); ++output) {
+        CubeList cubes(space.NumInputWords());
+        AppendOfOutput(space, first, output, cubes);
+        AppendOfOutput(space, second, output, cubes);
+        const CubeList rows = ComplementInputs(space, cubes, work);
+        for (size_t index = 0; index < rows.Size(); ++index) {
+            result.Resize(result.Size() + 1);
+            uint64_t* cube = result.At(result.Size() - 1);
+            for (size_t word = 0; word < space.NumInputWords(); ++word)
+                cube[word] = rows.At(index)[word] & space.Inputs(word);
+            SetBit(cube, space.OutputBit(output));
+        }
+    }
+    UniteOutputs(space, result);
+    return result;
+}
+
+} // namespace booleq

@@ -1,0 +1,178 @@
+// REDUCE, LAST GASP, and what takes literals out of a finished cover.
+#include "reduce.h"
+
+#include <algorithm>
+#include <numeric>
+
+#include "unate.h"
+
+namespace booleq {
+
+void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, const CubeList& free,
+                Work& work, uint64_t* reduced)
+{
+    const uint64_t* cube = cubes.At(index);
+    const size_t numInputWords = space.NumInputWords();
+    // Inputs that the cube fixes stay as they are, so they count as found.
+    std::vector<uint64_t> found(numInputWords);
+    for (size_t word = 0; word < numInputWords; ++word) {
+        const uint64_t both = cube[word] & cube[word] >> 1 & space.InputLow(word);
+        found[word] = ~(both * 3);
+    }
+    std::fill(reduced, reduced + space.NumWords(), 0);
+    bool isEmpty = true;
+    CubeList meeting(space.NumWords());
+    work.Spend((cubes.Size() + free.Size()) * space.NumWords());
+    AppendMeeting(space, cubes, cube, index, meeting);
+    AppendMeeting(space, free, cube, free.Size(), meeting);
+    CubeList cofactor(numInputWords);
+    for (size_t output = 0; output < space.NumOutputs(); ++output) {
+        if (!GetBit(cube, space.OutputBit(output)))
+            continue;
+        cofactor.Resize(0);
+        work.Spend(meeting.Size());
+        AppendOfOutput(space, meeting, output, cofactor);
+        CubeList scratch = cofactor;
+        if (IsTautology(space, scratch, work))
+            continue;
+        isEmpty = false;
+        SetBit(reduced, space.OutputBit(output));
+        AddUncovered(space, cofactor, work, found.data());
+    }
+    if (isEmpty)
+        return;
+    for (size_t word = 0; word < numInputWords; ++word)
+        reduced[word] |= cube[word] & found[word] & space.Inputs(word);
+    assert(Contains(cube, reduced, space.NumWords()));
+}
+
+namespace {
+
+size_t SizeOf(const CubeSpace& space, const uint64_t* cube)
+{
+    size_t size = 0;
+    for (size_t word = 0; word < space.NumWords(); ++word)
+        size += CountBits(cube[word]);
+    return size;
+}
+
+std::vector<uint32_t> OrderToReduce(const CubeSpace& space, const CubeList& cubes, bool isBySize)
+{
+    std::vector<uint32_t> order = OrderByWeight(space, cubes);
+    std::reverse(order.begin(), order.end());
+    if (isBySize || cubes.IsEmpty())
+        return order;
+    size_t largest = 0;
+    std::vector<size_t> sizes(cubes.Size());
+    for (size_t index = 0; index < cubes.Size(); ++index) {
+        sizes[index] = SizeOf(space, cubes.At(index));
+        if (sizes[index] > sizes[largest])
+            largest = index;
+    }
+    std::vector<size_t> keys(cubes.Size());
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        keys[index] =
+            ((Distance(space, cubes.At(largest), cubes.At(index)) + 1) << 32) - sizes[index];
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(),
+                     [&](uint32_t left, uint32_t right) { return keys[left] < keys[right]; });
+    return order;
+}
+
+void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept)
+{
+    cover.cubes.Keep(isKept);
+    size_t numKept = 0;
+    for (size_t index = 0; index < isKept.size(); ++index)
+        if (isKept[index] != 0)
+            cover.isPrime[numKept++] = cover.isPrime[index];
+    cover.isPrime.resize(numKept);
+}
+
+} // namespace
+
+void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,
+                 Work& work)
+{
+    CubeList& cubes = cover.cubes;
+    std::vector<uint64_t> reduced(space.NumWords());
+    std::vector<uint8_t> isKept(cubes.Size(), 1);
+    for (const uint32_t index : OrderToReduce(space, cubes, isBySize)) {
+        ReduceCube(space, cubes, index, free, work, reduced.data());
+        if (IsSameCube(reduced.data(), cubes.At(index), space.NumWords()))
+            continue;
+        CopyCube(cubes.At(index), reduced.data(), space.NumWords());
+        cover.isPrime[index] = 0;
+        if (!HasCommonOutput(space, reduced.data(), reduced.data()))
+            isKept[index] = 0;
+    }
+    KeepInCover(cover, isKept);
+}
+
+size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
+                   Work& work)
+{
+    const size_t numWords = space.NumWords();
+    CubeList reduced(numWords);
+    for (size_t index = 0; index < cover.cubes.Size(); ++index) {
+        reduced.Resize(reduced.Size() + 1);
+        ReduceCube(space, cover.cubes, index, free, work, reduced.At(reduced.Size() - 1));
+        if (IsSameCube(reduced.At(reduced.Size() - 1), cover.cubes.At(index), numWords))
+            reduced.Resize(reduced.Size() - 1); // a prime that nothing shrinks takes in no other
+    }
+    const std::vector<uint8_t> isOpen(reduced.Size(), 1);
+    std::vector<uint64_t> cube(numWords);
+    CubeList added(numWords);
+    for (size_t left = 0; left < reduced.Size(); ++left) {
+        for (size_t right = left + 1; right < reduced.Size(); ++right) {
+            for (size_t word = 0; word < numWords; ++word)
+                cube[word] = reduced.At(left)[word] | reduced.At(right)[word];
+            if (!expander.IsImplicant(cube.data()))
+                continue;
+            expander.Expand(cube.data(), nullptr, reduced, isOpen);
+            added.Append(cube.data());
+        }
+    }
+    added.SortAndUnite();
+    cover.cubes.Append(added);
+    cover.isPrime.resize(cover.cubes.Size(), 1);
+    return added.Size();
+}
+
+void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
+                Work& work)
+{
+    CubeList& cubes = cover.cubes;
+    // Cubes with many literals lose outputs first: to keep them there costs most.
+    std::vector<uint32_t> order(cubes.Size());
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
+        return CountCubeLiterals(space, cubes.At(left)) > CountCubeLiterals(space, cubes.At(right));
+    });
+    for (const uint32_t index : order) {
+        CubeList meeting(space.NumWords());
+        work.Spend((cubes.Size() + free.Size()) * space.NumWords());
+        AppendMeeting(space, cubes, cubes.At(index), index, meeting);
+        AppendMeeting(space, free, cubes.At(index), free.Size(), meeting);
+        for (size_t output = 0; output < space.NumOutputs(); ++output) {
+            const size_t bit = space.OutputBit(output);
+            if (!GetBit(cubes.At(index), bit) || CountOutputs(space, cubes.At(index)) == 1)
+                continue;
+            CubeList cofactor(space.NumInputWords());
+            work.Spend(meeting.Size());
+            AppendOfOutput(space, meeting, output, cofactor);
+            if (IsTautology(space, cofactor, work))
+                ClearBit(cubes.At(index), bit);
+        }
+    }
+    const std::vector<uint8_t> isOpen(cubes.Size(), 0);
+    std::vector<uint64_t> allowed(space.NumWords());
+    for (size_t index = 0; index < cubes.Size(); ++index) {
+        for (size_t word = 0; word < space.NumWords(); ++word)
+            allowed[word] = space.Inputs(word);
+        expander.Expand(cubes.At(index), allowed.data(), cubes, isOpen);
+        cover.isPrime[index] = 0;
+    }
+}
+
+} // namespace booleq

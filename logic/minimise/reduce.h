@@ -1,0 +1,41 @@
+// REDUCE, IRREDUNDANT, ESSENTIAL PRIMES and LAST GASP of the classical loop (R. Brayton, G.
+// Hachtel, C. McMullen, A. Sangiovanni-Vincentelli, Logic Minimization Algorithms for VLSI
+// Synthesis, 1984; R. Rudell, Multiple-valued logic minimization for PLA synthesis, 1986).
+#ifndef BOOLEQ_MINIMISE_REDUCE_H
+#define BOOLEQ_MINIMISE_REDUCE_H
+
+#include "expand.h"
+
+namespace booleq {
+
+// The smallest cube that has what neither the other cubes of 'cubes' nor 'free' cover of cube
+// 'index'. All words 0 when nothing is left.
+void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, const CubeList& free,
+                Work& work, uint64_t* reduced);
+
+// Each cube in turn becomes as small as the others, as they are then, let it be. 'isBySize': the
+// largest first; otherwise the one that is largest and then those that are nearest to it.
+void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,
+                 Work& work);
+
+// Takes out cubes so that the others and 'free' cover the same, at the least cost: the number of
+// cubes, then of literals.
+void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free, Work& work);
+
+// Flags the cubes that no other prime could replace.
+// Requires: all cubes are primes; cubes and 'free' cover what is on and not free, and nothing off.
+std::vector<uint8_t> FindEssential(const CubeSpace& space, const CubeList& cubes,
+                                   const CubeList& free, Work& work);
+
+// Appends primes that each cover two cubes of the cover after each has been reduced as if the
+// others stayed as they are; returns how many.
+size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
+                   Work& work);
+
+// Outputs of cubes that others cover go, then inputs grow as far as the outputs left let them.
+void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
+                Work& work);
+
+} // namespace booleq
+
+#endif

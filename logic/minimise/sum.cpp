@@ -1,0 +1,122 @@
+// From a table to a proved sum.
+#include "sum.h"
+
+#include <algorithm>
+#include <stdexcept>
+
+#include "unate.h"
+
+namespace booleq {
+
+namespace {
+
+// Without --exact an exact search is tried with a few times the work that the heuristic took, and a
+// little; where that was much it would need far more, so there is a limit.
+constexpr uint64_t kTrialShare = 3;
+constexpr uint64_t kTrialUnits = 4u << 20;
+constexpr uint64_t kMaxTrialUnits = 10u << 20;
+
+void SetSeconds(double seconds, Work& work)
+{
+    if (seconds > 0)
+        work.SetDeadline(Work::Clock::now() + std::chrono::duration_cast<Work::Clock::duration>(
+                                                  std::chrono::duration<double>(seconds)));
+}
+
+bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
+{
+    const CubeSpace& space = table.space;
+    for (size_t index = 0; index < table.on.Size(); ++index)
+        if (!IsCovered(space, table.on.At(index), sum, sum.Size(), table.free, work))
+            return false;
+    if (table.type == PlaType::Fr || table.type == PlaType::Fdr) {
+        size_t left = 0;
+        size_t right = 0;
+        return !FindMeeting(space, sum, table.off, work, left, right);
+    }
+    for (size_t index = 0; index < sum.Size(); ++index) // everything else is off
+        if (!IsCovered(space, sum.At(index), table.on, table.on.Size(), table.free, work))
+            return false;
+    return true;
+}
+
+// The inverted sum: 1 on every row that nothing is said of or that is off; 0 where on and not free.
+bool IsInversionRight(const Pla& table, const CubeList& sum, Work& work)
+{
+    const CubeSpace& space = table.space;
+    const bool areZerosGiven = table.type == PlaType::Fr || table.type == PlaType::Fdr;
+    if (areZerosGiven) {
+        for (size_t index = 0; index < table.off.Size(); ++index)
+            if (!IsCovered(space, table.off.At(index), sum, sum.Size(), CubeList(space.NumWords()),
+                           work))
+                return false;
+    } else {
+        CubeList known = table.on;
+        known.Append(table.free);
+        std::vector<uint64_t> all(space.NumWords());
+        for (size_t word = 0; word < all.size(); ++word)
+            all[word] = space.All(word);
+        if (!IsCovered(space, all.data(), sum, sum.Size(), known, work))
+            return false;
+    }
+    const CubeList none(space.NumWords());
+    std::vector<uint64_t> common(space.NumWords());
+    for (size_t index = 0; index < table.on.Size(); ++index) {
+        work.Spend(sum.Size());
+        for (size_t term = 0; term < sum.Size(); ++term) {
+            if (IsDisjoint(space, table.on.At(index), sum.At(term)))
+                continue;
+            for (size_t word = 0; word < common.size(); ++word)
+                common[word] = table.on.At(index)[word] & sum.At(term)[word];
+            if (!IsCovered(space, common.data(), table.free, table.free.Size(), none, work))
+                return false;
+        }
+    }
+    return true;
+}
+
+void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum, Work& work)
+{
+    const uint64_t limit = work.Limit();
+    if (!options.isExact)
+        work.SetLimit(work.Spent() +
+                      std::min(kMaxTrialUnits, kTrialUnits + kTrialShare * work.Spent()));
+    const ExactResult exact = FindSmallestSum(problem, sum.cubes, options.goal, work);
+    work.SetLimit(limit);
+    work.SetDeadline(Work::Clock::time_point::max());
+    sum.cubes = exact.sum;
+    ShedOutputs(problem, sum.cubes, work);
+    sum.cost = CostOf(problem.space, sum.cubes);
+    sum.lowerBound = exact.lowerBound;
+    sum.isProved = exact.isProved;
+    sum.isSecondProved = exact.isSecondProved;
+}
+
+} // namespace
+
+bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& fault, Work& work)
+{
+    TwoLevelProblem problem(table.space);
+    if (!ToProblem(table, problem, fault, work))
+        return false;
+    if (options.isInverted) {
+        TwoLevelProblem inverted(table.space);
+        inverted.on = problem.off;
+        inverted.free = problem.free;
+        inverted.off = Complement(table.space, problem.off, problem.free, work);
+        problem = inverted;
+    }
+    SetSeconds(options.seconds, work);
+    sum.cubes = FindSmallSum(problem, work);
+    Improve(problem, options, sum, work);
+    if (!IsSumOf(table, sum.cubes, options.isInverted, work))
+        throw std::logic_error("the sum found is not the function: please report this");
+    return true;
+}
+
+bool IsSumOf(const Pla& table, const CubeList& sum, bool isInverted, Work& work)
+{
+    return isInverted ? IsInversionRight(table, sum, work) : IsSumRight(table, sum, work);
+}
+
+} // namespace booleq

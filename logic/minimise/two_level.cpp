@@ -1,0 +1,192 @@
+// The classical loop: expand, irredundant, essential primes set aside, then reduce, expand and
+// irredundant as long as that gains, then last gasp.
+#include "two_level.h"
+
+#include <algorithm>
+
+#include "expand.h"
+#include "reduce.h"
+#include "unate.h"
+
+namespace booleq {
+
+CoverCost CostOf(const CubeSpace& space, const CubeList& cubes)
+{
+    return {cubes.Size(), CountLiterals(space, cubes)};
+}
+
+bool IsCheaper(const CoverCost& left, const CoverCost& right)
+{
+    if (left.numTerms != right.numTerms)
+        return left.numTerms < right.numTerms;
+    return left.numLiterals < right.numLiterals;
+}
+
+namespace {
+
+constexpr uint64_t kPoolShare = 1;
+constexpr uint64_t kMaxSpentForPool = 30u << 20; // where the loop took longer, more turns would too
+constexpr int kPoolRounds = 1;
+constexpr int kPoolTurns = 3;
+
+class SmallSumSearch {
+  public:
+    SmallSumSearch(const TwoLevelProblem& problem, Work& work)
+        : m_space(problem.space), m_work(work), m_free(problem.free),
+          m_expander(m_space, problem.off, work), m_cover(m_space.NumWords()),
+          m_best(m_space.NumWords()), m_pool(m_space.NumWords()), m_essential(m_space.NumWords())
+    {
+        m_cover.cubes = problem.on;
+    }
+
+    CubeList Run()
+    {
+        Work& work = m_work;
+        const Work::Clock::time_point deadline = work.Deadline();
+        work.SetDeadline(Work::Clock::time_point::max()); // there is to be an answer
+        UniteOutputs(m_space, m_cover.cubes);
+        RemoveContained(m_cover.cubes, m_work);
+        m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
+        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
+        MakeIrredundant(m_space, m_cover, m_free, m_work);
+        SetEssentialAside();
+        m_best = m_cover;
+        work.SetDeadline(deadline);
+        try {
+            do
+                Improve();
+            while (GainByLastGasp());
+            ChooseFromPool();
+        } catch (const OutOfWork&) {
+            m_cover = m_best; // what was under way is lost
+        }
+        work.SetDeadline(Work::Clock::time_point::max());
+        m_cover.cubes.Append(m_essential);
+        m_cover.isPrime.resize(m_cover.cubes.Size(), 1);
+        m_free.Resize(m_num_given_free);
+        MakeSparse(m_space, m_expander, m_cover, m_free, m_work);
+        work.SetDeadline(deadline);
+        return m_cover.cubes;
+    }
+
+  private:
+    void SetEssentialAside()
+    {
+        std::vector<uint8_t> isEssential = FindEssential(m_space, m_cover.cubes, m_free, m_work);
+        m_num_given_free = m_free.Size();
+        for (size_t index = 0; index < isEssential.size(); ++index) {
+            if (isEssential[index] != 0) {
+                m_essential.Append(m_cover.cubes.At(index));
+                m_free.Append(m_cover.cubes.At(index));
+            }
+            isEssential[index] ^= 1;
+        }
+        m_cover.cubes.Keep(isEssential);
+        m_cover.isPrime.assign(m_cover.cubes.Size(), 1);
+    }
+
+    void Improve()
+    {
+        bool isBySize = false;
+        int numStale = 0;
+        m_best = m_cover;
+        while (numStale < 2 && !m_cover.cubes.IsEmpty()) {
+            Turn(isBySize);
+            isBySize = !isBySize;
+            ++numStale;
+            const CoverCost cost = CostOf(m_space, m_cover.cubes);
+            const CoverCost bestCost = CostOf(m_space, m_best.cubes);
+            if (IsCheaper(cost, bestCost)) {
+                if (cost.numTerms < bestCost.numTerms)
+                    numStale = 0;
+                m_best = m_cover;
+            }
+        }
+        m_cover = m_best;
+    }
+
+    // Reduce, expand, irredundant. The primes on the way are remembered.
+    void Turn(bool isBySize)
+    {
+        ReduceCover(m_space, m_cover, m_free, isBySize, m_work);
+        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
+        m_pool.Append(m_cover.cubes);
+        MakeIrredundant(m_space, m_cover, m_free, m_work);
+    }
+
+    // The best cover by any of the primes seen so far; more turns bring more of them. Spends at
+    // most a share of what has been spent before.
+    void ChooseFromPool()
+    {
+        if (m_work.Spent() > kMaxSpentForPool)
+            return;
+        const uint64_t limit = m_work.Limit();
+        m_work.SetLimit(std::min(limit, m_work.Spent() + m_work.Spent() * kPoolShare));
+        bool isBySize = true;
+        try {
+            for (int numStale = 0; numStale < kPoolRounds && m_cover.cubes.Size() > 1; ++numStale) {
+                for (int turn = 0; turn < kPoolTurns; ++turn, isBySize = !isBySize)
+                    Turn(isBySize);
+                m_pool.Append(m_best.cubes);
+                m_pool.SortAndUnite();
+                m_cover.cubes = m_pool;
+                m_cover.isPrime.assign(m_pool.Size(), 1);
+                MakeIrredundant(m_space, m_cover, m_free, m_work);
+                const CoverCost cost = CostOf(m_space, m_cover.cubes);
+                if (cost.numTerms < m_best.cubes.Size())
+                    numStale = -1;
+                if (IsCheaper(cost, CostOf(m_space, m_best.cubes)))
+                    m_best = m_cover;
+            }
+        } catch (const OutOfWork& out) {
+            if (out.isTime)
+                throw;
+        }
+        m_work.SetLimit(limit);
+        m_cover = m_best;
+    }
+
+    bool GainByLastGasp()
+    {
+        if (m_cover.cubes.Size() < 2)
+            return false;
+        Cover gasp = m_cover;
+        if (AddLastGasp(m_space, m_expander, gasp, m_free, m_work) == 0)
+            return false;
+        m_pool.Append(gasp.cubes);
+        MakeIrredundant(m_space, gasp, m_free, m_work);
+        const bool isGain = gasp.cubes.Size() < m_cover.cubes.Size();
+        if (isGain)
+            m_cover = gasp;
+        return isGain;
+    }
+
+    const CubeSpace& m_space;
+    Work& m_work;
+    CubeList m_free; // as given, then the essential primes
+    size_t m_num_given_free = 0;
+    Expander m_expander;
+    Cover m_cover;
+    Cover m_best;
+    CubeList m_pool; // primes, some more than once
+    CubeList m_essential;
+};
+
+} // namespace
+
+CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work)
+{
+    return SmallSumSearch(problem, work).Run();
+}
+
+void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)
+{
+    Expander expander(problem.space, problem.off, work);
+    Cover cover(problem.space.NumWords());
+    cover.cubes = cubes;
+    cover.isPrime.assign(cubes.Size(), 0);
+    MakeSparse(problem.space, expander, cover, problem.free, work);
+    cubes = cover.cubes;
+}
+
+} // namespace booleq

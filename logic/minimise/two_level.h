@@ -1,0 +1,45 @@
+// Sums of products for several outputs at once: the problem, and the heuristic search for a small
+// answer. Input: what is on, what is free, what is off, as cubes. Output: a cover with as few
+// terms, then as few literals, as the search finds; every answer is proved right by Prove before it
+// leaves.
+#ifndef BOOLEQ_MINIMISE_TWO_LEVEL_H
+#define BOOLEQ_MINIMISE_TWO_LEVEL_H
+
+#include "cube.h"
+#include "work.h"
+
+namespace booleq {
+
+// Invariants: for each output every row is in 'on', 'free' or 'off'; 'off' meets neither of the
+// others; rows in both 'on' and 'free' are free.
+struct TwoLevelProblem {
+    explicit TwoLevelProblem(const CubeSpace& itsSpace)
+        : space(itsSpace), on(space.NumWords()), free(space.NumWords()), off(space.NumWords())
+    {
+    }
+    CubeSpace space;
+    CubeList on;
+    CubeList free;
+    CubeList off;
+};
+
+struct CoverCost {
+    size_t numTerms;
+    size_t numLiterals;
+};
+
+CoverCost CostOf(const CubeSpace& space, const CubeList& cubes);
+bool IsCheaper(const CoverCost& left, const CoverCost& right);
+
+// An irredundant cover, by the classical loop. Repeatable: the same problem gives the same cover,
+// unless the work has a deadline, which ends the loop early.
+CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work);
+
+// Outputs that other cubes cover go, then inputs that are not needed for those left: fewer literals
+// for the same terms.
+// Requires: an irredundant cover of the problem.
+void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,53 @@
+// Tautology and complement of single-output covers by the unate recursive paradigm (R. Brayton, G.
+// Hachtel, C. McMullen, A. Sangiovanni-Vincentelli, Logic Minimization Algorithms for VLSI
+// Synthesis, 1984). A cover comes as a list of input cubes: NumInputWords() words each, bits that
+// belong to no input all 1. Recursion is as deep as there are inputs, no deeper.
+#ifndef BOOLEQ_MINIMISE_UNATE_H
+#define BOOLEQ_MINIMISE_UNATE_H
+
+#include "cube.h"
+#include "work.h"
+
+namespace booleq {
+
+// Appends to 'target' the cofactors with respect to 'by' of the cubes that meet it: their inputs as
+// far as 'by' leaves them open, all others admitted, and the outputs that both have. 'left' is left
+// out (cubes.Size() for none).
+void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
+                   CubeList& target);
+
+// Appends the inputs of each cube that has the output to 'target', as the functions below want
+// them.
+void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
+
+// Whether the cubes cover all rows. 'cubes' is scratch space afterwards.
+bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);
+
+// A cover of the rows that no cube covers; not always of primes. 'cubes' is scratch space
+// afterwards.
+CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work);
+
+// Adds to 'found' the parts of input cube that occur in rows that no cube covers; what 'found' has
+// already is not looked for, so it starts with the parts that are of no interest. 'cubes' is
+// scratch space afterwards.
+void AddUncovered(const CubeSpace& space, CubeList& cubes, Work& work, uint64_t* found);
+
+// A row of an output of 'cube' that no cube of the list covers: all inputs fixed, one output.
+// Fails: false when there is none.
+bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
+                      Work& work, uint64_t* row);
+
+// Cubes of the same inputs become one, with the outputs of all.
+void UniteOutputs(const CubeSpace& space, CubeList& cubes);
+
+// For each output the rows that no cube of the two lists has; cubes of the same inputs are one.
+CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeList& second,
+                    Work& work);
+
+// Whether the two lists together cover 'cube', without cube 'left' of the first.
+bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
+               const CubeList& second, Work& work);
+
+} // namespace booleq
+
+#endif

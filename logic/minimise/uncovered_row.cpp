@@ -1,0 +1,118 @@
+// One row that a cover leaves out.
+#include "unate.h"
+#include "unate_walk.h"
+
+namespace booleq {
+
+namespace {
+
+class RowSearch {
+  public:
+    RowSearch(const CubeSpace& space, CubeList& stack, Work& work, uint64_t* row)
+        : m_space(space), m_stack(stack), m_work(work), m_num_words(space.NumInputWords()),
+          m_row(row), m_binate(m_num_words)
+    {
+    }
+
+    // Narrows m_row to values that leave a row out; the inputs it still leaves open then do not
+    // matter. Depth: one level for each input.
+    bool Find(StackPart part)
+    {
+        const std::vector<uint64_t> before(m_row, m_row + m_num_words);
+        for (;;) {
+            m_work.Spend(part.count * m_num_words + 1);
+            if (part.count == 0)
+                return true;
+            uint64_t anyUnate = 0;
+            size_t numBinate = 0;
+            for (size_t word = 0; word < m_num_words; ++word) {
+                const Occurrence occurrence = FindOccurrence(m_space, m_stack, part, word);
+                m_binate[word] = occurrence.zeros & occurrence.ones;
+                numBinate += CountBits(m_binate[word]);
+                const uint64_t onlyZeros = occurrence.zeros & ~occurrence.ones;
+                const uint64_t onlyOnes = occurrence.ones & ~occurrence.zeros;
+                m_row[word] &= ~onlyZeros & ~(onlyOnes << 1); // the value that covers less
+                anyUnate |= onlyZeros | onlyOnes;
+            }
+            if (HasUniversal(part) || (anyUnate == 0 && numBinate == 0)) {
+                CopyCube(m_row, before.data(), m_num_words);
+                return false;
+            }
+            if (anyUnate == 0)
+                break;
+            DropUnate(part);
+        }
+        const size_t bit = ChooseInput(m_space, m_stack, part, m_binate.data(), m_counts);
+        for (const bool value : {false, true}) {
+            const StackPart half = PushCofactor(m_stack, part, bit, value);
+            ClearBit(m_row, value ? bit : bit + 1);
+            const bool isFound = Find(half);
+            m_stack.Resize(half.first);
+            if (isFound)
+                return true;
+            SetBit(m_row, value ? bit : bit + 1);
+        }
+        CopyCube(m_row, before.data(), m_num_words);
+        return false;
+    }
+
+  private:
+    bool HasUniversal(StackPart part) const
+    {
+        for (size_t index = part.first; index < part.first + part.count; ++index)
+            if (IsUniversal(m_stack.At(index), m_num_words))
+                return true;
+        return false;
+    }
+
+    void DropUnate(StackPart& part)
+    {
+        size_t count = 0;
+        for (size_t index = part.first; index < part.first + part.count; ++index) {
+            const uint64_t* cube = m_stack.At(index);
+            uint64_t fixed = 0;
+            for (size_t word = 0; word < m_num_words; ++word)
+                fixed |= ~cube[word] & ~(m_binate[word] * 3);
+            if (fixed == 0)
+                CopyCube(m_stack.At(part.first + count++), cube, m_num_words);
+        }
+        part.count = count;
+    }
+
+    const CubeSpace& m_space;
+    CubeList& m_stack;
+    Work& m_work;
+    size_t m_num_words;
+    uint64_t* m_row;
+    std::vector<uint64_t> m_binate;
+    std::vector<uint32_t> m_counts;
+};
+
+} // namespace
+
+bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
+                      Work& work, uint64_t* row)
+{
+    CubeList meeting(space.NumWords());
+    work.Spend(cubes.Size() * space.NumWords());
+    AppendMeeting(space, cubes, cube, cubes.Size(), meeting);
+    for (size_t output = 0; output < space.NumOutputs(); ++output) {
+        if (!GetBit(cube, space.OutputBit(output)))
+            continue;
+        CubeList ofOutput(space.NumInputWords());
+        AppendOfOutput(space, meeting, output, ofOutput);
+        for (size_t word = 0; word < space.NumWords(); ++word)
+            row[word] = cube[word] & space.Inputs(word);
+        if (!RowSearch(space, ofOutput, work, row).Find({0, ofOutput.Size()}))
+            continue;
+        for (size_t input = 0; input < space.NumInputs(); ++input)
+            if (GetBit(row, 2 * input) && GetBit(row, 2 * input + 1))
+                ClearBit(row, 2 * input + 1);
+        SetBit(row, space.OutputBit(output));
+        assert(Contains(cube, row, space.NumWords()));
+        return true;
+    }
+    return false;
+}
+
+} // namespace booleq

@@ -14,14 +14,14 @@ constexpr size_t kMaxPairsToLift = size_t(1) << 20;
 
 class ComplementSearch {
   public:
-    ComplementSearch(const CubeSpace& space, CubeList& stack, Work& work)
-        : m_space(space), m_stack(stack), m_work(work), m_num_words(space.NumInputWords()),
-          m_zeros(m_num_words), m_ones(m_num_words), m_candidates(m_num_words),
-          m_full(m_num_words, ~uint64_t(0))
+    ComplementSearch(const CubeSpace& space, CubeList& stack, size_t maxCubes, Work& work)
+        : m_space(space), m_stack(stack), m_max_cubes(maxCubes), m_work(work),
+          m_num_words(space.NumInputWords()), m_zeros(m_num_words), m_ones(m_num_words),
+          m_candidates(m_num_words), m_full(m_num_words, ~uint64_t(0))
     {
     }
 
-    // Depth: one level for each input.
+    // Once IsTooLarge() the result means nothing.  Depth: one level for each input.
     CubeList Find(StackPart part)
     {
         CubeList result(m_num_words);
@@ -33,8 +33,11 @@ class ComplementSearch {
         const std::vector<uint64_t> common = TakeOutCommon(part, result);
         if (!HasUniversal(part))
             AppendRest(part, common, result);
+        m_is_too_large = m_is_too_large || result.Size() > m_max_cubes;
         return result;
     }
+
+    bool IsTooLarge() const { return m_is_too_large; }
 
   private:
     bool HasUniversal(StackPart part) const
@@ -133,6 +136,8 @@ class ComplementSearch {
             const StackPart half = PushCofactor(m_stack, part, bit, value == 1);
             halves[value] = Find(half);
             m_stack.Resize(half.first);
+            if (m_is_too_large)
+                return;
         }
         // A row that is left out where the input covers more is left out for both values.
         if (!hasZeros)
@@ -203,6 +208,8 @@ class ComplementSearch {
 
     const CubeSpace& m_space;
     CubeList& m_stack;
+    size_t m_max_cubes;
+    bool m_is_too_large = false;
     Work& m_work;
     size_t m_num_words;
     std::vector<uint64_t> m_zeros;
@@ -218,7 +225,7 @@ class ComplementSearch {
 CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work)
 {
     assert(cubes.NumWords() == space.NumInputWords());
-    return ComplementSearch(space, cubes, work).Find({0, cubes.Size()});
+    return ComplementSearch(space, cubes, SIZE_MAX, work).Find({0, cubes.Size()});
 }
 
 void UniteOutputs(const CubeSpace& space, CubeList& cubes)
@@ -252,11 +259,26 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
                     Work& work)
 {
     CubeList result(space.NumWords());
+    const bool isWhole = FindComplement(space, first, second, SIZE_MAX, work, result);
+    assert(isWhole);
+    static_cast<void>(isWhole);
+    return result;
+}
+
+bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
+                    size_t maxCubes, Work& work, CubeList& result)
+{
+    result.Resize(0);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         CubeList cubes(space.NumInputWords());
         AppendOfOutput(space, first, output, cubes);
         AppendOfOutput(space, second, output, cubes);
-        const CubeList rows = ComplementInputs(space, cubes, work);
+        ComplementSearch search(space, cubes, maxCubes, work);
+        const CubeList rows = search.Find({0, cubes.Size()});
+        if (search.IsTooLarge()) {
+            result.Resize(0);
+            return false;
+        }
         for (size_t index = 0; index < rows.Size(); ++index) {
             result.Resize(result.Size() + 1);
             uint64_t* cube = result.At(result.Size() - 1);
@@ -266,7 +288,7 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
         }
     }
     UniteOutputs(space, result);
-    return result;
+    return true;
 }
 
 } // namespace booleq

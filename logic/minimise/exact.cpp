@@ -21,7 +21,7 @@ class ExactSearch {
   public:
     ExactSearch(const TwoLevelProblem& problem, const CubeList& start, Goal goal, Work& work)
         : m_space(problem.space), m_problem(problem), m_goal(goal), m_work(work),
-          m_expander(m_space, problem.off, work), m_start(start), m_essential(m_space.NumWords()),
+          m_expander(problem, work), m_start(start), m_essential(m_space.NumWords()),
           m_fixed(problem.free), m_rows(m_space.NumWords()), m_signatures(m_space.NumWords()),
           m_result(m_space)
     {

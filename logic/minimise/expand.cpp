@@ -4,18 +4,22 @@
 #include <algorithm>
 #include <numeric>
 
+#include "unate.h"
+
 namespace booleq {
 
-Expander::Expander(const CubeSpace& space, const CubeList& off, Work& work)
-    : m_space(space), m_off(off), m_work(work), m_num_words(space.NumWords()),
-      m_raised(m_num_words), m_free(m_num_words), m_blocked(m_num_words), m_scratch(m_num_words),
-      m_order(off.Size())
+Expander::Expander(const TwoLevelProblem& problem, Work& work)
+    : m_problem(problem), m_space(problem.space), m_off(problem.off), m_work(work),
+      m_num_words(m_space.NumWords()), m_raised(m_num_words), m_free(m_num_words),
+      m_blocked(m_num_words), m_scratch(m_num_words), m_order(m_off.Size())
 {
     std::iota(m_order.begin(), m_order.end(), 0u);
 }
 
 bool Expander::IsImplicant(const uint64_t* cube)
 {
+    if (!m_problem.hasOff)
+        return IsCovered(m_space, cube, m_problem.on, m_problem.on.Size(), m_problem.free, m_work);
     for (size_t place = 0; place < m_order.size(); ++place) {
         if (IsDisjoint(m_space, cube, m_off.At(m_order[place])))
             continue;
@@ -40,6 +44,10 @@ void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const CubeList& o
     for (size_t index = 0; index < others.Size(); ++index)
         if (isOpen[index] != 0)
             m_candidates.push_back(static_cast<uint32_t>(index));
+    if (!m_problem.hasOff) {
+        ExpandByTautology(cube, others);
+        return;
+    }
     Settle();
     CoverOthers(others);
     while (!m_active.empty())

@@ -5,17 +5,18 @@
 #ifndef BOOLEQ_MINIMISE_EXPAND_H
 #define BOOLEQ_MINIMISE_EXPAND_H
 
-#include "cube.h"
-#include "work.h"
+#include "two_level.h"
 
 namespace booleq {
 
-// Grows one cube at a time against an off-set, which must stay as it is as long as this lives.
+// Grows one cube at a time against the off-set of a problem, which must stay as it is as long as
+// this lives. Where the problem has no off-set, a cube may grow as far as 'on' and 'free' cover it,
+// which is one question of tautology for each part.
 class Expander {
   public:
-    Expander(const CubeSpace& space, const CubeList& off, Work& work);
+    Expander(const TwoLevelProblem& problem, Work& work);
 
-    // Whether the cube meets no cube of the off-set.
+    // Whether the cube meets no row that is off.
     bool IsImplicant(const uint64_t* cube);
     // 'cube' becomes a prime that has only parts that 'allowed' has, or that it had; null allows
     // all. It is steered to take in cubes of 'others' whose flag in 'isOpen' is set.
@@ -29,6 +30,9 @@ class Expander {
     // 2. m_active has the off cubes that m_raised and m_free together meet.
     // 3. m_blocked has the free parts that an active cube needs to come nearer; when Settle is done
     //    these are all the free parts.
+    void ExpandByTautology(uint64_t* cube, const CubeList& others);
+    void TakeInNearest(uint64_t* cube, const CubeList& others);
+
     void Settle();
     bool LowerAndDrop();
     template <size_t kNumWords>
@@ -42,6 +46,7 @@ class Expander {
     void RaiseLeastBlocked();
     void Raise(size_t bit);
 
+    const TwoLevelProblem& m_problem;
     const CubeSpace& m_space;
     const CubeList& m_off;
     Work& m_work;

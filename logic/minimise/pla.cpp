@@ -11,6 +11,9 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxPairsToTry = 4096;
+// The cubes that a complement may have for each output.
+constexpr size_t kManyCubes = size_t(1) << 17;
+constexpr size_t kMaxCubes = size_t(1) << 20;
 
 // Finds a cube of one list and one of another that have a row of an output in common.
 class MeetingSearch {
@@ -151,12 +154,22 @@ void AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
 
 } // namespace
 
+void SetOff(TwoLevelProblem& problem, Work& work)
+{
+    // Growing a cube looks at all off cubes, or asks the other lists as often as there are inputs.
+    const size_t numGiven = problem.on.Size() + problem.free.Size();
+    const size_t maxCubes =
+        std::min(kMaxCubes, std::max(kManyCubes, numGiven * problem.space.NumInputs()));
+    problem.hasOff =
+        FindComplement(problem.space, problem.on, problem.free, maxCubes, work, problem.off);
+}
+
 bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& work)
 {
     problem.on = pla.on;
     problem.free = pla.free;
     if (pla.type == PlaType::F || pla.type == PlaType::Fd) {
-        problem.off = Complement(pla.space, pla.on, pla.free, work);
+        SetOff(problem, work);
         return true;
     }
     size_t onIndex = 0;
@@ -177,7 +190,13 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
     }
     problem.off = pla.off;
     // Free is what is neither on nor off, and what is said to be free as long as it is not off.
-    problem.free = Complement(pla.space, pla.on, pla.off, work);
+    if (!FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free)) {
+        fault = {0,
+                 "the rows that nothing is said of need over " + std::to_string(kMaxCubes) +
+                     " cubes for an output",
+                 "write them with '-' and leave the rows that are 0 out (.type fd)"};
+        return false;
+    }
     if (!pla.free.IsEmpty())
         AppendFree(pla, problem, work);
     return true;

@@ -50,6 +50,9 @@ bool ReadPla(const std::string& text, Pla& pla, PlaFault& fault);
 // two lines in the fault.
 bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& work);
 
+// Sets 'off' from the other lists, or says that it has too many cubes to be of use.
+void SetOff(TwoLevelProblem& problem, Work& work);
+
 // Whether a cube of one list and one of the other have a row of an output in common; their places.
 // Cost: far below one step for each pair, unless nearly all pairs meet.
 bool FindMeeting(const CubeSpace& space, const CubeList& left, const CubeList& right, Work& work,

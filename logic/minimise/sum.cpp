@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <stdexcept>
 
+#include "reduce.h"
 #include "unate.h"
 
 namespace booleq {
@@ -75,6 +76,34 @@ bool IsInversionRight(const Pla& table, const CubeList& sum, Work& work)
     return true;
 }
 
+// Where nothing is known of the off-set an exact search has no rows to start from, but a sum of
+// essential primes has no rival: each has a row that no other prime covers, so each sum has a term
+// within it for that row, with no fewer literals.
+void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work& work)
+{
+    const CubeSpace& space = problem.space;
+    work.SetDeadline(Work::Clock::time_point::max()); // less than the search before
+    Expander expander(problem, work);
+    Cover primes(space.NumWords());
+    primes.cubes = sum.cubes;
+    primes.isPrime.assign(sum.cubes.Size(), 0);
+    ExpandCover(space, expander, nullptr, primes, work);
+    std::vector<uint8_t> isEssential = FindEssential(space, primes.cubes, problem.free, work);
+    primes.cubes.Keep(isEssential);
+    ShedOutputs(problem, sum.cubes, work);
+    sum.cost = CostOf(space, sum.cubes);
+    const bool areAllEssential = primes.cubes.Size() == sum.cost.numTerms;
+    if (goal == Goal::Terms) {
+        sum.lowerBound = primes.cubes.Size();
+        sum.isProved = areAllEssential;
+    } else {
+        sum.lowerBound = CountLiterals(space, primes.cubes);
+        sum.isProved = sum.lowerBound == sum.cost.numLiterals;
+    }
+    sum.isSecondProved =
+        areAllEssential && CountLiterals(space, primes.cubes) == sum.cost.numLiterals;
+}
+
 void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum, Work& work)
 {
     const uint64_t limit = work.Limit();
@@ -99,16 +128,24 @@ bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& f
     TwoLevelProblem problem(table.space);
     if (!ToProblem(table, problem, fault, work))
         return false;
+    if (options.isInverted && !problem.hasOff) {
+        fault = {0, "a product of sums needs the rows that are 0 as cubes, and these are too many",
+                 "ask for a sum of products"};
+        return false;
+    }
     if (options.isInverted) {
         TwoLevelProblem inverted(table.space);
         inverted.on = problem.off;
         inverted.free = problem.free;
-        inverted.off = Complement(table.space, problem.off, problem.free, work);
+        SetOff(inverted, work);
         problem = inverted;
     }
     SetSeconds(options.seconds, work);
     sum.cubes = FindSmallSum(problem, work);
-    Improve(problem, options, sum, work);
+    if (problem.hasOff)
+        Improve(problem, options, sum, work);
+    else
+        ProveByEssential(problem, options.goal, sum, work);
     if (!IsSumOf(table, sum.cubes, options.isInverted, work))
         throw std::logic_error("the sum found is not the function: please report this");
     return true;

@@ -32,9 +32,9 @@ constexpr int kPoolTurns = 3;
 class SmallSumSearch {
   public:
     SmallSumSearch(const TwoLevelProblem& problem, Work& work)
-        : m_space(problem.space), m_work(work), m_free(problem.free),
-          m_expander(m_space, problem.off, work), m_cover(m_space.NumWords()),
-          m_best(m_space.NumWords()), m_pool(m_space.NumWords()), m_essential(m_space.NumWords())
+        : m_space(problem.space), m_work(work), m_free(problem.free), m_expander(problem, work),
+          m_cover(m_space.NumWords()), m_best(m_space.NumWords()), m_pool(m_space.NumWords()),
+          m_essential(m_space.NumWords())
     {
         m_cover.cubes = problem.on;
     }
@@ -181,7 +181,7 @@ CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work)
 
 void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)
 {
-    Expander expander(problem.space, problem.off, work);
+    Expander expander(problem, work);
     Cover cover(problem.space.NumWords());
     cover.cubes = cubes;
     cover.isPrime.assign(cubes.Size(), 0);

@@ -11,7 +11,8 @@
 namespace booleq {
 
 // Invariants: for each output every row is in 'on', 'free' or 'off'; 'off' meets neither of the
-// others; rows in both 'on' and 'free' are free.
+// others; rows in both 'on' and 'free' are free. Without 'hasOff', 'off' is empty and off is
+// whatever is in neither of the others.
 struct TwoLevelProblem {
     explicit TwoLevelProblem(const CubeSpace& itsSpace)
         : space(itsSpace), on(space.NumWords()), free(space.NumWords()), off(space.NumWords())
@@ -21,6 +22,7 @@ struct TwoLevelProblem {
     CubeList on;
     CubeList free;
     CubeList off;
+    bool hasOff = true;
 };
 
 struct CoverCost {

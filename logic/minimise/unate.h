@@ -44,6 +44,11 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes);
 CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     Work& work);
 
+// The same, as long as no output has more than 'maxCubes'.
+// Fails: false; 'result' is empty then.  Requires: 'result' is neither of the lists.
+bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
+                    size_t maxCubes, Work& work, CubeList& result);
+
 // Whether the two lists together cover 'cube', without cube 'left' of the first.
 bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
                const CubeList& second, Work& work);

@@ -86,7 +86,8 @@ void BindMinimize(py::module_& module, EquationClass& type)
 {
     type.def("minimize", &MinimizeEquation, py::kw_only(), py::arg("dont_care") = py::none(),
              py::arg("exact") = false, py::arg("seconds") = py::none(),
-             R"doc(minimize(*, dont_care=None, exact=False, seconds=None) -> Minimum
+             R"doc(minimize($record, self, *, dont_care=None, exact=False, seconds=None)
+--
 
 A smallest sum of products, proved to be the same function before it is returned. In rows in which
 dont_care is 1 it may be either. exact searches until nothing smaller can be, or for so many seconds.
@@ -97,7 +98,8 @@ dont_care is 1 it may be either. exact searches until nothing smaller can be, or
 )doc");
     module.def("minimize_pla", &MinimizePla, py::arg("text"), py::kw_only(),
                py::arg("exact") = false, py::arg("seconds") = py::none(),
-               R"doc(minimize_pla(text, *, exact=False, seconds=None) -> str
+               R"doc(minimize_pla($module, text, *, exact=False, seconds=None)
+--
 
 The text of a PLA file minimised, as one of type f. A fault is a ValueError that names its line.
 

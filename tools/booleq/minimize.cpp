@@ -8,6 +8,7 @@
 
 #include "commands.h"
 #include "convert.h"
+#include "decide.h"
 #include "options.h"
 #include "progress.h"
 #include "text.h"
@@ -57,7 +58,7 @@ SumOptions ParseOptions(const Request& request)
     if (request.Has("--terms") && request.Has("--literals"))
         throw UsageError("--terms and --literals: one of them counts first");
     options.goal = request.Has("--literals") ? Goal::Literals : Goal::Terms;
-    options.seconds = ParseSeconds(request);
+    options.seconds = ParseLimits(request, 0).seconds;
     return options;
 }
 

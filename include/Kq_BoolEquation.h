@@ -12,8 +12,8 @@
 
 #include <port/Port_StringBase.h>
 
-#ifndef KQ_EXPORT // defined by the build where that is a DLL's
-#define KQ_EXPORT __attribute__((visibility("default"))) // seen outside the shared library
+#ifndef KQ_EXPORT
+#define KQ_EXPORT __attribute__((visibility("default")))
 #endif
 
 class Kq_BoolEquationImp;
@@ -154,8 +154,9 @@ struct Kq_BoolEquation::Refusal {
 // Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    Handle();                    // empty
-    Handle(const Handle& other); // a value: each copy has elements of its own
+    // Empty; or a value: each copy has elements of its own.
+    Handle();
+    Handle(const Handle& other);
     ~Handle();
     Handle& operator=(const Handle& other);
 

@@ -20,6 +20,8 @@ from hypothesis import strategies as st
 
 BUILT = pathlib.Path(booleq.__file__).absolute().parents[2] / "tools/booleq/booleq"
 TOOL = os.environ.get("BOOLEQ_TOOL") or shutil.which(str(BUILT)) or shutil.which("booleq")
+# In another locale the tool shows bytes beyond ASCII as characters, the module escapes them.
+PLAIN = {**os.environ, "LC_ALL": "C"}
 LISTED = ["S", "A", "'a,b'", "b"]
 # What a mutation puts into a text: pieces of tokens, characters of one to four bytes, stray bytes.
 PIECES = ["&", "&&", "|", "~", "!", "^", "(", ")", "()", "'", "''", ".", ".XNOR.", ".and.", ".NOT.",
@@ -49,7 +51,8 @@ def ask(path: pathlib.Path, texts: Sequence[str], command: str,
     assert TOOL is not None
     path.write_bytes(b"".join(text.encode("utf-8", "surrogateescape") + b"\n" for text in texts))
     done = subprocess.run([TOOL, command, "--json", "--file", str(path), *arguments],
-                          stdout=subprocess.PIPE, stderr=subprocess.PIPE, timeout=300, check=False)
+                          env=PLAIN, stdout=subprocess.PIPE, stderr=subprocess.PIPE, timeout=300,
+                          check=False)
     assert done.returncode in (0, 1, 3), done.stderr
     answers = [json.loads(line) for line in done.stdout.splitlines()]
     assert [answer["line"] for answer in answers] == list(range(1, len(texts) + 1))
@@ -252,5 +255,5 @@ def test_tree_dot() -> None:
     for text in collect(good_texts(), 25):
         done = subprocess.run([os.fsencode(TOOL), b"tree", b"--dot", b"--",
                                text.encode("utf-8", "surrogateescape")],
-                              stdout=subprocess.PIPE, timeout=60, check=True)
+                              env=PLAIN, stdout=subprocess.PIPE, timeout=60, check=True)
         assert Equation(text).tree_dot() == done.stdout.decode("utf-8", "surrogateescape")

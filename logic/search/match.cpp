@@ -85,7 +85,7 @@ struct Side {
         scratch.resize(marks.size());
         scratch[0] = 0;
         for (size_t set = 1; set < marks.size(); ++set)
-            scratch[set] = scratch[set & (set - 1)] + colours[__builtin_ctzll(set)];
+            scratch[set] = scratch[set & (set - 1)] + colours[size_t(__builtin_ctzll(set))];
         for (size_t set = 0; set < marks.size(); ++set)
             scratch[set] = Mix(scratch[set] ^ marks[set]);
         Colours refined(colours.size());
@@ -230,7 +230,7 @@ class MatchSearch {
         std::vector<uint32_t> other(numSets);
         for (size_t number = 0; number < numSets; ++number) {
             if (number > 0) {
-                const unsigned int input = inputs[__builtin_ctzll(number)];
+                const unsigned int input = inputs[size_t(__builtin_ctzll(number))];
                 own[number] = own[number & (number - 1)] | uint32_t(1) << input;
                 other[number] = other[number & (number - 1)] | uint32_t(1) << map[input];
             }

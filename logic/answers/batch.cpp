@@ -105,7 +105,7 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
     reading.hasInputs = true;
     reading.inputs = function.Inputs();
     Kq_BoolEquation equation;
-    const BatchResult result = ReadInit(row, reading, equation);
+    BatchResult result = ReadInit(row, reading, equation);
     Function given;
     if (result.outcome != BatchOutcome::kOk || !FunctionOf(equation, given))
         return result;
@@ -142,7 +142,7 @@ BatchResult WriteEquation(BatchRow& row, const Reading& reading)
         return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
     Kq_BoolEquation equation;
-    const BatchResult result = ReadInit(row, reading, equation);
+    BatchResult result = ReadInit(row, reading, equation);
     if (result.outcome != BatchOutcome::kOk)
         return result;
     row.equation = ShortText(equation);

@@ -99,6 +99,7 @@ class Decider {
     {
         assert(assignment.size() == m_decision.inputs.size());
         std::vector<uint64_t> inputs;
+        inputs.reserve(assignment.size());
         for (const bool value : assignment)
             inputs.push_back(value ? 1 : 0);
         std::vector<uint64_t> rightInputs;

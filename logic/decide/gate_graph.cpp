@@ -84,7 +84,7 @@ Edge GateGraph::FindOrAdd(GateKind kind, Edge left, Edge right)
 
 // 'side' may make 'other', a gate of which it is an operand, smaller. True when something was
 // found: the result, or another pair of operands.
-bool GateGraph::FoldInto(Edge& side, Edge& other, Folding& folding) const
+bool GateGraph::FoldInto(Edge side, Edge& other, Folding& folding) const
 {
     const Gate& gate = m_gates[GateOf(other)];
     if (gate.kind == GateKind::And && !IsInverted(other)) {
@@ -114,7 +114,7 @@ bool GateGraph::FoldInto(Edge& side, Edge& other, Folding& folding) const
 }
 
 // The same for two gates that share operands.
-bool GateGraph::FoldGates(Edge& left, Edge& right, Folding& folding) const
+bool GateGraph::FoldGates(Edge left, Edge& right, Folding& folding) const
 {
     const Gate& gate = m_gates[GateOf(left)];
     const Gate& other = m_gates[GateOf(right)];

@@ -87,8 +87,8 @@ class GateGraph {
         Edge result;
     };
     bool FoldPair(Edge& left, Edge& right, Folding& folding) const;
-    bool FoldInto(Edge& side, Edge& other, Folding& folding) const;
-    bool FoldGates(Edge& left, Edge& right, Folding& folding) const;
+    bool FoldInto(Edge side, Edge& other, Folding& folding) const;
+    bool FoldGates(Edge left, Edge& right, Folding& folding) const;
 
     uint32_t m_num_inputs;
     std::vector<Gate> m_gates;

@@ -175,6 +175,7 @@ Pla TableOf(const std::vector<TableOutput>& outputs, const std::vector<std::stri
             Work& work)
 {
     std::vector<std::string> names;
+    names.reserve(outputs.size());
     for (const TableOutput& output : outputs)
         names.push_back(output.name);
     Pla table = EmptyTable(inputs, names);

@@ -14,9 +14,9 @@ typedef py::class_<Equation> EquationClass;
 
 void BindTexts(EquationClass& type);   // construction, renderings, equality, copies
 void BindMapping(EquationClass& type); // values of inputs, evaluation
-void BindArrays(py::module_& module, EquationClass& type); // many rows at once
+void BindArrays(py::module_& module, EquationClass& type);   // many rows at once
 void BindMinimize(py::module_& module, EquationClass& type); // smallest sums
-void BindReports(EquationClass& type);                     // trees and what the searches find
+void BindReports(EquationClass& type);                       // trees and what the searches find
 
 } // namespace booleq_python
 

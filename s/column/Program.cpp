@@ -146,7 +146,7 @@ struct CompilerByNeed {
         KqValue first;
     };
 
-    unsigned int Enter(Place& place, Place& first, Place& second)
+    unsigned int Enter(const Place& place, Place& first, Place& second)
     {
         const Item& item = *place.item;
         if (item.left == 0) {

@@ -91,11 +91,11 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
     const KqName* const other = slot->load(std::memory_order_relaxed);
     if (other)
         return *other;
-    const KqName& added = *entry;
-    slot->store(entry.release(), std::memory_order_release);
+    const KqName* const added = entry.release();
+    slot->store(added, std::memory_order_release);
     ++shard.numNames;
     assert(2 * shard.numNames <= table.mask + 1);
-    return added;
+    return *added;
 }
 
 // The size of the table that the shard needs for one more name; 0 when the present one has room.

@@ -126,7 +126,7 @@ Function Apply(const Matching& matching, const Function& first,
 std::string Permute(const Function& function, const std::vector<std::string>& inputs,
                     Function& permuted)
 {
-    const std::string fault = booleq::OrderFault(inputs);
+    std::string fault = booleq::OrderFault(inputs);
     if (!fault.empty())
         return fault;
     const std::string unlisted = booleq::FirstUnlisted(function.Inputs(), inputs);

@@ -44,9 +44,9 @@ class Writer {
         return left.node ? KQ_ONE : KQ_NONE;
     }
 
-    void Between(Place& place) { WriteTokens(place); }
+    void Between(const Place& place) { WriteTokens(place); }
 
-    void Leave(Place& place)
+    void Leave(const Place& place)
     {
         if (!place.node->GetRightChild())
             WriteTokens(place);

@@ -24,7 +24,7 @@ enum class Verdict {
     Undecided  // neither was found
 };
 
-// A verdict and what stands behind it.
+// A verdict and what supports it.
 struct Decision {
     Verdict verdict = Verdict::Undecided; // only Equal and Different are answers
     std::string reason;                   // not empty: why it is undecided

@@ -39,7 +39,7 @@ struct Target {
 
 // In the order in which they are listed for people.
 const std::vector<Target>& Targets();
-// Null for a word that is no target.
+// Null for a word that is not a target.
 const Target* FindTarget(const std::string& name);
 // The target that writes expressions in the notation.  Requires: there is one.
 const Target& TargetOf(const Notation& notation);

@@ -22,7 +22,7 @@ class NetworkBuilder {
     bool Find(const std::string& name, uint32_t& signal) const;
     // The signal that was added last becomes the expression, whose inputs are signals.
     void DefineLast(Expression expression);
-    // Fails: false for an output that is no signal.
+    // Fails: false for an output that is not a signal.
     bool Take(const std::string& output, Network& network);
 
     size_t NumInputs() const { return m_network.numInputs; }

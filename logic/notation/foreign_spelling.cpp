@@ -150,7 +150,7 @@ std::string Place::ImplicationHint() const
     return isArrow ? "x implies y is written (~x | y)" : "";
 }
 
-// "6 " for a size of 64 rows, nothing for one that is no number of rows.
+// "6 " for a size of 64 rows, nothing for one that is not a number of rows.
 std::string NumInputsOf(const std::string& literal)
 {
     for (size_t numInputs = 1; numInputs <= 30; ++numInputs)

@@ -320,7 +320,7 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
     ExplainCode(text, reading, refusal, report);
     if (MayBeForeign(refusal.code)) {
         const std::string hint = HintForForeign(text, refusal.offset, reading);
-        // A word between dots that this library has in capital letters is no part of a name.
+        // A word between dots that this library has in capital letters is not part of a name.
         if (!hint.empty() && !(refusal.code == Refusal::WORD && IsCorrected(report)))
             report.hint = hint;
     }

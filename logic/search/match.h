@@ -28,7 +28,7 @@ constexpr size_t kMaxMatchInputs = 16; // that have an effect
 std::vector<unsigned int> EffectiveInputs(const Function& function);
 
 // A search that tells inputs apart by what neither order nor inversions change, and tries only
-// those that it cannot tell apart. 'seconds' bounds it; 0 is no bound.
+// those that it cannot tell apart. 'seconds' bounds it; 0 means no limit.
 // Requires: at most kMaxMatchInputs inputs with an effect in each.
 // Cost: some milliseconds for 16 inputs as a rule; functions that are all but alike, without being
 // symmetric, can take as many tries as there are orders.

@@ -44,18 +44,18 @@ constexpr bool operator<(TwoWords left, TwoWords right)
 {
     return left.upper != right.upper ? left.upper < right.upper : left.lower < right.lower;
 }
-// Requires, in both: 0 < distance < 128.
+// Requires, in both: distance < 128.
 constexpr TwoWords operator>>(TwoWords word, unsigned int distance)
 {
     if (distance >= 64)
         return {word.upper >> (distance - 64), 0};
-    return {word.lower >> distance | word.upper << (64 - distance), word.upper >> distance};
+    return {word.lower >> distance | word.upper << 1 << (63 - distance), word.upper >> distance};
 }
 constexpr TwoWords operator<<(TwoWords word, unsigned int distance)
 {
     if (distance >= 64)
         return {0, word.lower << (distance - 64)};
-    return {word.lower << distance, word.upper << distance | word.lower >> (64 - distance)};
+    return {word.lower << distance, word.upper << distance | word.lower >> 1 >> (63 - distance)};
 }
 
 // How a table of words of 64 bits is the same table as a Word, and back.

@@ -23,40 +23,99 @@ constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of these are
 // Sets of inputs: bit k is input k.
 typedef uint32_t InputSet;
 
-// Some input of 'inputs' being 1 or 0 makes it 1 (isSome), or both do.
-Rows Quantify(const Rows& function, InputSet inputs, bool isSome)
-{
-    Rows result(function);
-    for (; inputs != 0; inputs &= inputs - 1) {
-        const auto input = static_cast<unsigned int>(__builtin_ctz(inputs));
-        const Rows low = Cofactor(result, input, false);
-        const Rows high = Cofactor(result, input, true);
-        result = isSome ? (low | high) : (low & high);
-    }
-    return result;
-}
+// What is left of a function when inputs are taken from it: Some is 1 where any values of theirs
+// make it 1, All where all do, Fixed where they are 0.
+class Parts {
+  public:
+    explicit Parts(const Rows& function) : m_function(function) {}
 
-Rows FixAll(const Rows& function, InputSet inputs)
-{
-    Rows result(function);
-    for (; inputs != 0; inputs &= inputs - 1)
-        result =
-            Cofactor(std::move(result), static_cast<unsigned int>(__builtin_ctz(inputs)), false);
-    return result;
-}
+    Rows Some(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& high) { return low | high; });
+    }
+    Rows All(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& high) { return low & high; });
+    }
+    Rows Fixed(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& /*high*/) { return low; });
+    }
+
+  private:
+    template <class Merge>
+    Rows Without(InputSet inputs, const Merge& merge) const
+    {
+        Rows result(m_function);
+        for (; inputs != 0; inputs &= inputs - 1) {
+            const auto input = static_cast<unsigned int>(__builtin_ctz(inputs));
+            result = merge(Cofactor(result, input, false), Cofactor(result, input, true));
+        }
+        return result;
+    }
+
+    const Rows& m_function;
+};
+
+// The same of a function in one word, made for all sets at once: each of one with an input less.
+class WordParts {
+  public:
+    static constexpr unsigned int kMaxInputs = 6;
+
+    explicit WordParts(const Rows& function) : m_num_inputs(function.NumInputs())
+    {
+        assert(m_num_inputs <= kMaxInputs);
+        m_some[0] = m_all[0] = m_fixed[0] = function.Words()[0];
+        for (InputSet inputs = 1; inputs < InputSet(1) << m_num_inputs; ++inputs) {
+            const InputSet others = inputs & (inputs - 1);
+            const unsigned int bit =
+                m_num_inputs - 1 - static_cast<unsigned int>(__builtin_ctz(inputs));
+            m_some[inputs] = Low(m_some[others], bit) | High(m_some[others], bit);
+            m_all[inputs] = Low(m_all[others], bit) & High(m_all[others], bit);
+            m_fixed[inputs] = Low(m_fixed[others], bit);
+        }
+    }
+
+    Rows Some(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_some[inputs]); }
+    Rows All(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_all[inputs]); }
+    Rows Fixed(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_fixed[inputs]); }
+
+  private:
+    typedef std::array<uint64_t, size_t(1) << kMaxInputs> OfSets;
+
+    static uint64_t Low(uint64_t word, unsigned int bit)
+    {
+        const uint64_t half = word & ~BitPattern(bit);
+        return half | half << (1u << bit);
+    }
+    static uint64_t High(uint64_t word, unsigned int bit)
+    {
+        const uint64_t half = word & BitPattern(bit);
+        return half | half >> (1u << bit);
+    }
+
+    unsigned int m_num_inputs;
+    OfSets m_some;
+    OfSets m_all;
+    OfSets m_fixed;
+};
 
 // Brings the products with the literal that most share to the front, and takes it out of them.
 // Gives back the end of those; 'begin' when the products have no literals.
 Cube* TakeOutLiteral(Cube* begin, Cube* end, Cube& literal)
 {
-    std::array<std::array<size_t, 2>, kMaxCoverInputs> counts = {};
-    for (const Cube* cube = begin; cube != end; ++cube)
+    std::array<std::array<uint16_t, 2>, kMaxCoverInputs> counts = {}; // at most kMaxProducts
+    uint32_t allUsed = 0;
+    for (const Cube* cube = begin; cube != end; ++cube) {
+        allUsed |= cube->used;
         for (uint32_t used = cube->used; used != 0; used &= used - 1) {
             const auto input = static_cast<unsigned int>(__builtin_ctz(used));
             ++counts[input][cube->values >> input & 1u];
         }
+    }
     size_t most = 0;
-    for (unsigned int input = 0; input < kMaxCoverInputs; ++input) {
+    for (; allUsed != 0; allUsed &= allUsed - 1) {
+        const auto input = static_cast<unsigned int>(__builtin_ctz(allUsed));
         for (const uint32_t value : {0u, 1u}) {
             if (counts[input][value] > most) {
                 most = counts[input][value];
@@ -153,33 +212,45 @@ class Search {
         return false;
     }
 
-    // Two functions without a common input. The first input is always on the first side.
+    // Two functions without a common input.
     bool FindSplit(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
         if (support.size() > kMaxSplitInputs)
             return false;
+        return function.NumInputs() <= WordParts::kMaxInputs
+                   ? FindSplit(function, WordParts(function), support, formula)
+                   : FindSplit(function, Parts(function), support, formula);
+    }
+
+    // The first input is always on the first side.
+    template <class PartsOf>
+    bool FindSplit(const Rows& function, const PartsOf& parts,
+                   const std::vector<unsigned int>& support, Formula& formula)
+    {
         const uint32_t numSets = uint32_t(1) << (support.size() - 1);
         for (uint32_t set = 1; set < numSets; ++set) {
             Watch();
             InputSet sides[2] = {InputSet(1) << support[0], 0};
             for (size_t place = 1; place < support.size(); ++place)
                 sides[set >> (place - 1) & 1u] |= InputSet(1) << support[place];
-            if (Split(function, sides[0], sides[1], formula))
+            if (Split(function, parts, sides[0], sides[1], formula))
                 return true;
         }
         return false;
     }
 
-    bool Split(const Rows& function, InputSet first, InputSet second, Formula& formula)
+    template <class PartsOf>
+    bool Split(const Rows& function, const PartsOf& parts, InputSet first, InputSet second,
+               Formula& formula)
     {
-        const Rows product[2] = {Quantify(function, second, true), Quantify(function, first, true)};
+        const Rows product[2] = {parts.Some(second), parts.Some(first)};
         if ((product[0] & product[1]) == function)
             return JoinParts(Operator::And, product[0], product[1], formula);
-        const Rows sum[2] = {Quantify(function, second, false), Quantify(function, first, false)};
+        const Rows sum[2] = {parts.All(second), parts.All(first)};
         if ((sum[0] | sum[1]) == function)
             return JoinParts(Operator::Or, sum[0], sum[1], formula);
-        const Rows left = FixAll(function, second);
-        const Rows right = function.At(0) ? ~FixAll(function, first) : FixAll(function, first);
+        const Rows left = parts.Fixed(second);
+        const Rows right = function.At(0) ? ~parts.Fixed(first) : parts.Fixed(first);
         if ((left ^ right) == function)
             return JoinParts(Operator::Xor, left, right, formula);
         return false;

@@ -35,6 +35,7 @@ typedef std::array<size_t, 2> Sides;
 struct Settled {
     const Formula* formula = nullptr; // not a Not
     bool isFlipped = false;           // side 0 is that formula's inversion
+    uint32_t firstInput = UINT32_MAX; // the least it mentions
     Sides numInversions = {0, 0};
     std::vector<Settled> operands;
 };
@@ -62,10 +63,10 @@ size_t BetterSide(const Settled& settled)
 }
 
 // The side of an exclusive OR that needs no inversion of its own.
-size_t PlainSide(const Settled& settled)
+size_t PlainSide(const std::vector<Settled>& operands)
 {
     size_t numFlips = 0;
-    for (const Settled& operand : settled.operands)
+    for (const Settled& operand : operands)
         numFlips += BetterSide(operand);
     return numFlips % 2;
 }
@@ -80,57 +81,46 @@ Settled Settle(const Formula& formula)
     }
     Settled settled;
     settled.formula = &formula;
+    if (formula.operands.empty()) {
+        if (formula.op == Operator::Input) {
+            settled.firstInput = formula.input;
+            settled.numInversions[1] = 1;
+        }
+        return settled;
+    }
     settled.operands.reserve(formula.operands.size());
-    for (const Formula& operand : formula.operands)
+    for (const Formula& operand : formula.operands) {
         settled.operands.push_back(Settle(operand));
+        settled.firstInput = std::min(settled.firstInput, settled.operands.back().firstInput);
+    }
     if (formula.op == Operator::Xor) {
         size_t least = 0;
         for (const Settled& operand : settled.operands)
             least += operand.numInversions[BetterSide(operand)];
-        const size_t plainSide = PlainSide(settled);
+        const size_t plainSide = PlainSide(settled.operands);
         settled.numInversions[plainSide] = least;
         settled.numInversions[1 - plainSide] = least + 1;
-    } else if (settled.operands.empty()) {
-        settled.numInversions[1] = formula.op == Operator::Input ? 1 : 0;
-    } else {
-        const Sides sums = SumInversions(settled.operands);
-        for (const size_t side : {0, 1})
-            settled.numInversions[side] =
-                IsByInversion(sums, side) ? sums[1 - side] + 1 : sums[side];
+        return settled;
     }
+    const Sides sums = SumInversions(settled.operands);
+    for (const size_t side : {0, 1})
+        settled.numInversions[side] = IsByInversion(sums, side) ? sums[1 - side] + 1 : sums[side];
     return settled;
 }
 
-// The formula, or for side 1 its inversion, with the inversions where they were settled.
-Formula WriteSide(const Settled& settled, size_t side)
+// Operands in the order of their inputs.
+std::vector<const Settled*> Sorted(const std::vector<Settled>& operands)
 {
-    const size_t own = settled.isFlipped ? 1 - side : side; // of the formula that is pointed to
-    const Operator op = settled.formula->op;
-    if (settled.operands.empty())
-        return own == 0 ? *settled.formula : MakeNot(*settled.formula);
-    std::vector<Formula> operands;
-    operands.reserve(settled.operands.size());
-    if (op == Operator::Xor) {
-        for (const Settled& operand : settled.operands)
-            operands.push_back(WriteSide(operand, BetterSide(operand)));
-        Formula inner = Plain(op, std::move(operands));
-        return own == PlainSide(settled) ? inner : Around(Operator::Not, std::move(inner));
-    }
-    const Sides sums = SumInversions(settled.operands);
-    const bool isByInversion = IsByInversion(sums, own);
-    const size_t used = isByInversion ? 1 - own : own;
-    for (const Settled& operand : settled.operands)
-        operands.push_back(WriteSide(operand, used));
-    Formula inner = Plain(used == 0 ? op : Dual(op), std::move(operands));
-    return isByInversion ? Around(Operator::Not, std::move(inner)) : inner;
-}
-
-uint32_t FirstInput(const Formula& formula)
-{
-    uint32_t first = formula.op == Operator::Input ? formula.input : UINT32_MAX;
-    for (const Formula& operand : formula.operands)
-        first = std::min(first, FirstInput(operand));
-    return first;
+    std::vector<const Settled*> sorted;
+    sorted.reserve(operands.size());
+    for (const Settled& operand : operands)
+        sorted.push_back(&operand);
+    // As they were where that is the same: they stand in one array.
+    std::sort(sorted.begin(), sorted.end(), [](const Settled* left, const Settled* right) {
+        return left->firstInput != right->firstInput ? left->firstInput < right->firstInput
+                                                     : left < right;
+    });
+    return sorted;
 }
 
 Operator Negated(Operator op)
@@ -139,35 +129,33 @@ Operator Negated(Operator op)
                                : (op == Operator::Or ? Operator::Nor : Operator::Nxor);
 }
 
-uint32_t Append(const Formula& formula, Expression& expression)
+// Adds the formula, or for side 1 its inversion, with inversions where they were settled.
+uint32_t Append(const Settled& settled, size_t side, Expression& expression)
 {
-    if (formula.op == Operator::Input)
-        return AddInput(expression, formula.input);
-    if (formula.operands.empty())
-        return AddConstant(expression, formula.op == Operator::One);
-    Operator last = formula.op;
-    const Formula* inner = &formula;
-    if (formula.op == Operator::Not) {
-        inner = &formula.operands[0];
-        // Of two operands the operator itself is negated.
-        if (inner->operands.size() != 2)
-            return AddNot(expression, Append(*inner, expression));
-        last = Negated(inner->op);
+    const size_t own = settled.isFlipped ? 1 - side : side; // of the formula that is pointed to
+    const Formula& formula = *settled.formula;
+    if (formula.op == Operator::Input) {
+        const uint32_t node = AddInput(expression, formula.input);
+        return own == 0 ? node : AddNot(expression, node);
     }
-    std::vector<const Formula*> operands;
-    for (const Formula& operand : inner->operands)
-        operands.push_back(&operand);
-    std::stable_sort(operands.begin(), operands.end(),
-                     [](const Formula* left, const Formula* right) {
-                         return FirstInput(*left) < FirstInput(*right);
-                     });
-    uint32_t node = Append(*operands[0], expression);
-    for (size_t operand = 1; operand < operands.size(); ++operand) {
-        const uint32_t right = Append(*operands[operand], expression);
-        const bool isLast = operand + 1 == operands.size();
-        node = AddBinary(expression, isLast ? last : inner->op, node, right);
+    if (settled.operands.empty())
+        return AddConstant(expression, (formula.op == Operator::One) == (own == 0));
+    const bool isXor = formula.op == Operator::Xor;
+    const bool isInverted = isXor ? own != PlainSide(settled.operands)
+                                  : IsByInversion(SumInversions(settled.operands), own);
+    const size_t used = isInverted ? 1 - own : own; // of the operands, but for exclusive OR
+    const Operator op = isXor || used == 0 ? formula.op : Dual(formula.op);
+    const std::vector<const Settled*> operands = Sorted(settled.operands);
+    // Of two operands the operator itself is negated.
+    const bool isNegated = isInverted && operands.size() == 2;
+    uint32_t node = 0;
+    for (size_t place = 0; place < operands.size(); ++place) {
+        const Settled& operand = *operands[place];
+        const uint32_t right = Append(operand, isXor ? BetterSide(operand) : used, expression);
+        node =
+            place == 0 ? right : AddBinary(expression, isNegated ? Negated(op) : op, node, right);
     }
-    return node;
+    return isInverted && !isNegated ? AddNot(expression, node) : node;
 }
 
 } // namespace
@@ -224,7 +212,7 @@ Expression ToExpression(const Formula& formula, const std::vector<std::string>& 
 {
     Expression expression;
     expression.names = names;
-    Append(WriteSide(Settle(formula), 0), expression);
+    Append(Settle(formula), 0, expression);
     return expression;
 }
 

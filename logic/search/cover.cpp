@@ -1,5 +1,7 @@
 #include "cover.h"
 
+#include <algorithm>
+#include <array>
 #include <cassert>
 #include <utility>
 
@@ -21,10 +23,25 @@ struct LiteralCounter {
     size_t count = 0;
 };
 
+// What the search finds of the last inputs, by what is needed and allowed of their rows: most of
+// its steps would be there.
+constexpr unsigned int kNumLastInputs = 2;
+constexpr size_t kNumLastFunctions = 16;
+struct LastCover {
+    uint64_t covered = 0;
+    size_t numCubes = 0;
+    std::array<Cube, 2> cubes = {}; // of inputs 0 and 1, the last two
+};
+typedef std::array<std::array<LastCover, kNumLastFunctions>, kNumLastFunctions> LastCovers;
+
 template <class Sink>
 class CoverSearch {
   public:
-    CoverSearch(unsigned int numInputs, Sink& sink) : m_num_inputs(numInputs), m_sink(sink) {}
+    // 'lastCovers' may be null.
+    CoverSearch(unsigned int numInputs, const LastCovers* lastCovers, Sink& sink)
+        : m_num_inputs(numInputs), m_last_covers(lastCovers), m_sink(sink)
+    {
+    }
 
     // Takes the first input off, again and again: adds products over the inputs left that cover
     // 'needed' and nothing outside 'allowed', each with what 'prefix' says of the inputs before.
@@ -67,6 +84,8 @@ class CoverSearch {
             m_sink.Add(prefix);
             return allowed;
         }
+        if (numInputs == kNumLastInputs && m_last_covers != nullptr)
+            return AddLast((*m_last_covers)[needed][allowed], prefix);
         const uint32_t input = InputOf(numInputs);
         const unsigned int numRows = 1u << (numInputs - 1); // of a half
         const uint64_t half = RowMask(numInputs - 1);
@@ -90,16 +109,48 @@ class CoverSearch {
         return uint32_t(1) << (m_num_inputs - numInputs);
     }
 
+    uint64_t AddLast(const LastCover& cover, Cube prefix)
+    {
+        const unsigned int numBefore = m_num_inputs - kNumLastInputs;
+        for (size_t place = 0; place < cover.numCubes; ++place) {
+            const Cube cube = cover.cubes[place];
+            m_sink.Add(
+                {prefix.used | cube.used << numBefore, prefix.values | cube.values << numBefore});
+        }
+        return cover.covered;
+    }
+
     unsigned int m_num_inputs;
+    const LastCovers* m_last_covers;
     Sink& m_sink;
 };
+
+LastCovers MakeLastCovers()
+{
+    LastCovers covers;
+    for (size_t allowed = 0; allowed < kNumLastFunctions; ++allowed) {
+        for (size_t needed = 0; needed < kNumLastFunctions; ++needed) {
+            if ((needed & ~allowed) != 0)
+                continue;
+            CubeKeeper keeper;
+            LastCover& cover = covers[needed][allowed];
+            cover.covered = CoverSearch<CubeKeeper>(kNumLastInputs, nullptr, keeper)
+                                .FindInWord(needed, allowed, kNumLastInputs, {0, 0});
+            cover.numCubes = keeper.cubes.size();
+            assert(cover.numCubes <= cover.cubes.size());
+            std::copy(keeper.cubes.begin(), keeper.cubes.end(), cover.cubes.begin());
+        }
+    }
+    return covers;
+}
 
 template <class Sink>
 void Search(const Rows& function, Sink& sink)
 {
     assert(function.NumInputs() <= kMaxCoverInputs);
+    static const LastCovers lastCovers = MakeLastCovers();
     const Rows covered =
-        CoverSearch<Sink>(function.NumInputs(), sink).Find(function, function, {0, 0});
+        CoverSearch<Sink>(function.NumInputs(), &lastCovers, sink).Find(function, function, {0, 0});
     assert(covered == function);
     (void)covered;
 }

@@ -1,5 +1,6 @@
 // Arrays of look-up tables: every kernel, for every word, against the same written row by row.
 #include <algorithm>
+#include <bitset>
 #include <cstring>
 #include <map>
 #include <numeric>
@@ -316,6 +317,42 @@ TEST(Luts, DistinctOnesAreSortedAndCounted)
             ++distinct;
         }
     });
+}
+
+// Arrays of several parts, which threads share: each result stands in its own place.
+TEST(Luts, ManyAreDoneByThreadsAsByOne)
+{
+    constexpr unsigned int kNumInputs = 6;
+    constexpr uint8_t kOrder[kNumInputs] = {5, 0, 4, 1, 3, 2};
+    std::mt19937_64 random(4);
+    std::vector<uint64_t> words(300001);
+    std::generate(words.begin(), words.end(), random);
+    const LutArray luts = LutsOf(words, kNumInputs);
+    for (const unsigned int numThreads : {1u, 4u}) {
+        const LutWork work = {numThreads};
+        std::vector<uint64_t> permuted(words.size());
+        std::vector<uint8_t> counts(words.size());
+        std::vector<uint8_t> differences(words.size());
+        PermuteLuts(luts, kOrder, permuted.data(), work);
+        CountLutOnes(luts, counts.data(), work);
+        CompareLuts(luts, LutsOf(permuted, kNumInputs), differences.data(), work);
+        for (size_t place = 0; place < words.size(); ++place) {
+            const uint64_t word = words[place];
+            ASSERT_EQ(counts[place], std::bitset<64>(word).count());
+            ASSERT_EQ(std::bitset<64>(permuted[place]).count(), counts[place]);
+            ASSERT_EQ(differences[place] == kSameLut, word == permuted[place]);
+            const auto row = static_cast<unsigned int>(place % 64);
+            unsigned int source = 0;
+            for (unsigned int input = 0; input < kNumInputs; ++input)
+                source =
+                    WithInput(source, kOrder[input], InputAt(row, input, kNumInputs), kNumInputs);
+            ASSERT_EQ(permuted[place] >> row & 1u, word >> source & 1u);
+        }
+    }
+    const uint64_t first = 150000;
+    std::vector<uint64_t> narrow(words.size(), 1);
+    narrow[first] = narrow[299999] = uint64_t(1) << 40;
+    EXPECT_EQ(FirstUncleanLut(LutsOf(narrow, 5), LutWork{4}), first);
 }
 
 TEST(Parallel, EveryElementIsDoneOnce)

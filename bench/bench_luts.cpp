@@ -11,6 +11,7 @@
 #include "canonical.h"
 #include "lut_kernels.h"
 #include "lut_texts.h"
+#include "lut_word.h"
 #include "rows.h"
 #include "support/cases.h"
 

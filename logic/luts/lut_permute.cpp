@@ -1,8 +1,7 @@
 // Orders of inputs as exchanges of two bits of all row numbers, at most one less than there are
-// inputs; each is the delta swap of H. S. Warren, Hacker's Delight, 2nd edition, section 7-1.
+// inputs; each is one SwapLutBits.
 #include <algorithm>
 #include <array>
-#include <atomic>
 #include <cassert>
 #include <utility>
 
@@ -45,20 +44,6 @@ void ForEachSwap(const uint8_t* order, unsigned int numInputs, const Exchange& e
 }
 
 template <class Word>
-Word SwapBits(Word word, BitSwap bits, Word movers)
-{
-    const unsigned int distance = (1u << bits.high) - (1u << bits.low);
-    const Word change = static_cast<Word>((word ^ (word >> distance)) & movers);
-    return static_cast<Word>(word ^ change ^ (change << distance));
-}
-
-template <class Word>
-Word MoversOf(BitSwap bits)
-{
-    return static_cast<Word>(LutPattern<Word>(bits.low) & ~LutPattern<Word>(bits.high));
-}
-
-template <class Word>
 void PermutePart(const Word* tables, Word* results, size_t count, unsigned int numInputs,
                  const uint8_t* order)
 {
@@ -69,9 +54,8 @@ void PermutePart(const Word* tables, Word* results, size_t count, unsigned int n
         ForEachSwap(order, numInputs, [&](BitSwap bits) {
             if (bits.low == bits.high)
                 return;
-            const Word movers = MoversOf<Word>(bits);
             for (size_t place = begin; place < end; ++place)
-                results[place] = SwapBits(results[place], bits, movers);
+                results[place] = SwapLutBits(results[place], bits.low, bits.high);
         });
     }
 }
@@ -102,7 +86,7 @@ void PermuteLutsEach(const LutArray& luts, const uint8_t* orders, void* results,
             for (size_t place = begin; place < end; ++place) {
                 Word word = tables[place];
                 ForEachSwap(orders + place * numInputs, numInputs, [&word](BitSwap bits) {
-                    word = SwapBits(word, bits, MoversOf<Word>(bits));
+                    word = SwapLutBits(word, bits.low, bits.high);
                 });
                 words[place] = word;
             }
@@ -114,23 +98,19 @@ size_t FirstBadOrder(const uint8_t* orders, size_t count, unsigned int numInputs
                      const LutWork& work)
 {
     assert(numInputs <= kMaxLutInputs);
-    std::atomic<size_t> first{kNoLut};
-    RunInParts(count, kPartSize, work, [&](size_t begin, size_t end) {
-        for (size_t place = begin; place < end; ++place) {
-            unsigned int seen = 0;
-            for (unsigned int input = 0; input < numInputs; ++input) {
-                const uint8_t source = orders[place * numInputs + input];
-                seen |= source < numInputs ? 1u << source : 0u;
-            }
-            if (seen == AllLutInputs(numInputs))
-                continue;
-            size_t known = first;
-            while (place < known && !first.compare_exchange_weak(known, place))
-                ;
-            return;
+    const auto isOrder = [orders, numInputs](size_t place) {
+        unsigned int seen = 0;
+        for (unsigned int input = 0; input < numInputs; ++input) {
+            const uint8_t source = orders[place * numInputs + input];
+            seen |= source < numInputs ? 1u << source : 0u;
         }
+        return seen == AllLutInputs(numInputs);
+    };
+    return FindFirstInParts(count, kPartSize, work, [&](size_t begin, size_t end) {
+        while (begin < end && isOrder(begin))
+            ++begin;
+        return begin;
     });
-    return first;
 }
 
 } // namespace booleq

@@ -80,7 +80,7 @@ TEST(CanonicalOfFiveInputs, IsNoneThatTheUpperHalfRulesOut)
     std::mt19937 random(16);
     std::vector<uint64_t> tables;
     while (tables.size() < 5000000) {
-        const uint32_t table = random();
+        const auto table = static_cast<uint32_t>(random());
         if (!std::binary_search(uppers.begin(), uppers.end(), table >> 16))
             tables.push_back(table);
     }

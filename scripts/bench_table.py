@@ -278,7 +278,8 @@ def write_document(path, parts):
     pathlib.Path(path).write_text(before + figures + after)
 
 
-ALL = ["set", "read", "eval", "render", "column", "init_value", "truth_table", "road", "threads"]
+ALL = ["set", "read", "eval", "render", "column", "init_value", "truth_table", "road", "threads",
+       "luts"]
 
 
 def run_executables(build, names, options):

@@ -28,6 +28,7 @@ enum class Verdict {
 struct Decision {
     Verdict verdict = Verdict::Undecided; // only Equal and Different are answers
     std::string reason;                   // not empty: why it is undecided
+    bool isTimeOver = false;              // which is that a limit ended it
     std::vector<std::string> inputs;      // those of the left one, then what only the right one has
     std::vector<bool> assignment;         // where they differ, a value for each of the inputs
     bool isFirstRow = false;              // no row before that assignment differs

@@ -1,8 +1,5 @@
 #include "equality.h"
 
-#include <cassert>
-#include <cstdio>
-
 #include "column_decision.h"
 #include "function.h"
 #include "joined_inputs.h"
@@ -44,14 +41,12 @@ Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& rig
     return DecideEqual(ToExpression(left), ToExpression(right), limits);
 }
 
-std::string UndecidedText(const Decision& decision, const Limits& limits)
+Decision DecideValue(const Kq_BoolEquation& equation, bool value, const Limits& limits)
 {
-    assert(decision.verdict == Verdict::Undecided);
-    if (!decision.isTimeOver)
-        return "not decided: " + decision.reason;
-    char number[32];
-    std::snprintf(number, sizeof number, "%g", limits.seconds);
-    return "not decided in " + std::string(number) + (limits.seconds == 1 ? " second" : " seconds");
+    Function column;
+    if (IsInitValue(equation) && FunctionOf(equation, column))
+        return DecideColumns(column, {{}, ConstantRows(0, value)});
+    return DecideConstant(ToExpression(equation), value, limits);
 }
 
 } // namespace booleq

@@ -104,7 +104,8 @@ int RunConvert(const Request& request, Output& output)
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const std::string fault = request.Has("--short") ? Shorten(equation) : std::string();
+        const std::string fault =
+            request.Has("--short") ? Watched([&] { return Shorten(equation); }) : std::string();
         if (!fault.empty()) {
             Refuse(text, request, output, fault);
             return kRefused;
@@ -114,7 +115,7 @@ int RunConvert(const Request& request, Output& output)
             (!unit.empty() || target.wrapping == Wrapping::Always))
             ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
         const kq_logic::Conversion conversion =
-            kq_logic::Convert(equation, target.name, ownUnit, {seconds});
+            Watched([&] { return kq_logic::Convert(equation, target.name, ownUnit, {seconds}); });
         if (!conversion.fault.empty()) {
             Refuse(text, request, output, conversion.fault);
             return kRefused;

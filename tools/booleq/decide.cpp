@@ -17,7 +17,7 @@ namespace {
 constexpr double kMaxSeconds = 1e9;
 
 struct Shown {
-    Progress progress{"deciding, seconds", 0};
+    Progress progress{"working, seconds", 0};
     std::chrono::steady_clock::time_point start = std::chrono::steady_clock::now();
 };
 std::optional<Shown> shown;
@@ -25,7 +25,7 @@ std::optional<Shown> shown;
 void ShowSeconds()
 {
     const auto passed = std::chrono::steady_clock::now() - shown->start;
-    shown->progress.Show(
+    shown->progress.ShowNow(
         static_cast<uint64_t>(std::chrono::duration_cast<std::chrono::seconds>(passed).count()));
 }
 
@@ -68,14 +68,14 @@ double ParseSeconds(const Request& request, double seconds)
     return value;
 }
 
-DecidingProgress::DecidingProgress()
+WorkingProgress::WorkingProgress()
 {
     assert(!shown);
     shown.emplace();
     SetWatch(ShowSeconds);
 }
 
-DecidingProgress::~DecidingProgress()
+WorkingProgress::~WorkingProgress()
 {
     SetWatch(nullptr);
     shown.reset();

@@ -20,14 +20,22 @@ std::vector<Option> ClauseOptions();
 // What --seconds says; 'seconds' without it.  Fails: UsageError.
 double ParseSeconds(const Request& request, double seconds);
 
-// Says on a terminal for how long something is being decided, as long as it lives. One at a time.
-class DecidingProgress {
+// Says on a terminal for how long something is being decided or searched for, as long as it lives.
+// One at a time.
+class WorkingProgress {
   public:
-    DecidingProgress();
-    ~DecidingProgress();
-    DecidingProgress(const DecidingProgress&) = delete;
-    DecidingProgress& operator=(const DecidingProgress&) = delete;
+    WorkingProgress();
+    ~WorkingProgress();
+    WorkingProgress(const WorkingProgress&) = delete;
+    WorkingProgress& operator=(const WorkingProgress&) = delete;
 };
+// What 'work' gives back, with that meanwhile.
+template <class Work>
+auto Watched(const Work& work)
+{
+    const WorkingProgress progress;
+    return work();
+}
 
 // Fails: UsageError, when a file is asked for that cannot be: of many lines, or a proof from a
 // build without a solver. To be called first.

@@ -69,7 +69,7 @@ int RunEqual(const Request& request, Output& output)
         kq_logic::Decision decision;
         int status = kDone;
         {
-            const DecidingProgress progress;
+            const WorkingProgress progress;
             decision = kq_logic::DecideEqual(left, right, {seconds});
             if (WantsClauses(request))
                 status = WriteClauses(request, output,

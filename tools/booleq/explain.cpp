@@ -5,6 +5,7 @@
 #include "answer.h"
 #include "bit_orders.h"
 #include "commands.h"
+#include "decide.h"
 #include "options.h"
 #include "table_rows.h"
 #include "text.h"
@@ -80,12 +81,14 @@ int RunExplain(const Request& request, Output& output)
         kq_logic::Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
-        const kq_logic::Explanation explanation = kq_logic::Explain(function);
+        const kq_logic::Explanation explanation =
+            Watched([&] { return kq_logic::Explain(function); });
         if (!explanation.fault.empty()) {
             Refuse(text, request, output, explanation.fault);
             return kRefused;
         }
-        const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(function);
+        const kq_logic::ShortForm shortForm =
+            Watched([&] { return kq_logic::FindShortForm(function); });
         return Say(text, request, output,
                    {kDone, "done", LineMark::Block,
                     [&] { return ToJson(function, explanation, shortForm); },

@@ -131,7 +131,8 @@ int RunLint(const Request& request, Output& output)
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const LintReport report = Lint(text.text, equation, request.reading, limits);
+        const LintReport report =
+            Watched([&] { return Lint(text.text, equation, request.reading, limits); });
         const int status = report.IsClean() ? kDone : kFindings;
         const auto putText = [&] {
             if (status == kDone)

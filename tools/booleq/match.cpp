@@ -206,7 +206,8 @@ int RunMatch(const Request& request, Output& output)
         if (!SetNamed(text, request, isForSecond, output, first) ||
             RefuseTooMany(text, request, first, output))
             return kRefused;
-        const kq_logic::Matching matching = kq_logic::Match(first, second, scope, {seconds});
+        const kq_logic::Matching matching =
+            Watched([&] { return kq_logic::Match(first, second, scope, {seconds}); });
         assert(matching.fault.empty());
         const int found = matching.isFound ? kDone : kFindings;
         return Say(text, request, output,

@@ -63,7 +63,7 @@ int RunSat(const Request& request, Output& output)
         kq_logic::Decision decision;
         int status = kDone;
         {
-            const DecidingProgress progress;
+            const WorkingProgress progress;
             decision = kq_logic::DecideConstant(equation, asksAlways, {seconds});
             if (WantsClauses(request))
                 status = WriteClauses(request, output,

@@ -16,13 +16,8 @@ bool IsInitValue(const Kq_BoolEquation& equation)
 
 size_t NumInputsTogether(const Kq_BoolEquation& left, const Kq_BoolEquation& right)
 {
-    std::vector<std::string> inputs;
-    for (const auto& variable : left.GetVariables())
-        inputs.push_back(ToStd(variable.first));
-    std::vector<std::string> others;
-    for (const auto& variable : right.GetVariables())
-        others.push_back(ToStd(variable.first));
-    JoinInputs(others, inputs);
+    std::vector<std::string> inputs = InputNames(left);
+    JoinInputs(InputNames(right), inputs);
     return inputs.size();
 }
 

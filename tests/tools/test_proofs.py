@@ -12,10 +12,11 @@ NO, YES = 1, 0 # exit statuses of 'sat'
 
 
 def pigeons(holes):
-    """One pigeon more than holes, each in a hole and no two in one."""
+    """One pigeon more than holes, each in a hole and no two in one: never 1, and out of reach for
+    any solver from a dozen holes on."""
     seats = [" | ".join(f"p{pigeon}_{hole}" for hole in range(holes))
              for pigeon in range(holes + 1)]
-    pairs = [f"p{pigeon}_{hole} ~& p{other}_{hole}" for hole in range(holes)
+    pairs = [f"~p{pigeon}_{hole} | ~p{other}_{hole}" for hole in range(holes)
              for pigeon in range(holes + 1) for other in range(pigeon)]
     return " & ".join(f"({part})" for part in seats + pairs)
 

@@ -11,6 +11,8 @@ import sys
 import tempfile
 import time
 
+from test_proofs import pigeons
+
 LONG = ["table", "--format", "csv", "^".join(f"v{number}" for number in range(26))]
 TIMEOUT_SECONDS = 60
 
@@ -74,15 +76,6 @@ def check_silence(tool):
     done = subprocess.run([tool, *words], stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL,
                           stderr=subprocess.PIPE, timeout=TIMEOUT_SECONDS, check=True)
     assert done.stderr.count(b"\n") == 1 and b"\r" not in done.stderr, done.stderr
-
-
-def pigeons(holes):
-    """Never 1, and out of reach for any solver from a dozen holes on."""
-    seats = [" | ".join(f"p{pigeon}_{hole}" for hole in range(holes))
-             for pigeon in range(holes + 1)]
-    pairs = [f"~p{pigeon}_{hole} | ~p{other}_{hole}" for hole in range(holes)
-             for pigeon in range(holes + 1) for other in range(pigeon)]
-    return " & ".join(f"({part})" for part in seats + pairs)
 
 
 def searches(folder):

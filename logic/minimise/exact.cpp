@@ -46,9 +46,8 @@ class ExactSearch {
   private:
     void SetEssentialAside()
     {
-        const std::vector<uint8_t> isOpen(m_start.Size(), 0);
         for (size_t index = 0; index < m_start.Size(); ++index)
-            m_expander.Expand(m_start.At(index), nullptr, m_start, isOpen);
+            m_expander.Expand(m_start.At(index), nullptr, m_start, {});
         m_start.SortAndUnite();
         m_result.sum = m_start;
         std::vector<uint8_t> isEssential = FindEssential(m_space, m_start, m_problem.free, m_work);
@@ -258,11 +257,10 @@ class ExactSearch {
         const CoveringResult result = SolveCovering(problem, UINT64_MAX, m_work);
         m_bound = result.lowerBound;
         CubeList sum = m_essential;
-        const std::vector<uint8_t> isOpen(columns.Size(), 0);
         for (const uint32_t column : result.columns) {
             sum.Append(columns.At(column));
             uint64_t* cube = sum.At(sum.Size() - 1);
-            m_expander.Expand(cube, nullptr, columns, isOpen);
+            m_expander.Expand(cube, nullptr, columns, {});
         }
         const CoverCost cost = CostOf(m_space, sum);
         const CoverCost best = CostOf(m_space, m_result.sum);

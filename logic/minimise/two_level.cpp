@@ -47,7 +47,7 @@ class SmallSumSearch {
         UniteOutputs(m_space, m_cover.cubes);
         RemoveContained(m_cover.cubes, m_work);
         m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
-        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
+        ExpandCover(m_space, m_expander, m_cover, m_work);
         MakeIrredundant(m_space, m_cover, m_free, m_work);
         SetEssentialAside();
         m_best = m_cover;
@@ -109,7 +109,7 @@ class SmallSumSearch {
     void Turn(bool isBySize)
     {
         ReduceCover(m_space, m_cover, m_free, isBySize, m_work);
-        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
+        ExpandCover(m_space, m_expander, m_cover, m_work);
         m_pool.Append(m_cover.cubes);
         MakeIrredundant(m_space, m_cover, m_free, m_work);
     }

@@ -10,16 +10,6 @@
 
 namespace booleq {
 
-// Appends to 'target' the cofactors with respect to 'by' of the cubes that meet it: their inputs as
-// far as 'by' leaves them open, all others admitted, and the outputs that both have. 'left' is left
-// out (cubes.Size() for none).
-void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
-                   CubeList& target);
-
-// Appends the inputs of each cube that has the output to 'target', as the functions below want
-// them.
-void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
-
 // Whether the cubes cover all rows. 'cubes' is scratch space afterwards.
 bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);
 
@@ -48,10 +38,6 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
 // Fails: false; 'result' is empty then.  Requires: 'result' is neither of the lists.
 bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     size_t maxCubes, Work& work, CubeList& result);
-
-// Whether the two lists together cover 'cube', without cube 'left' of the first.
-bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
-               const CubeList& second, Work& work);
 
 } // namespace booleq
 

@@ -1,4 +1,5 @@
 // One row that a cover leaves out.
+#include "cofactors.h"
 #include "unate.h"
 #include "unate_walk.h"
 
@@ -95,7 +96,9 @@ bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeLi
 {
     CubeList meeting(space.NumWords());
     work.Spend(cubes.Size() * space.NumWords());
-    AppendMeeting(space, cubes, cube, cubes.Size(), meeting);
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (!IsDisjoint(space, cubes.At(index), cube))
+            AppendCofactor(space, cubes.At(index), cube, meeting);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         if (!GetBit(cube, space.OutputBit(output)))
             continue;

@@ -230,7 +230,7 @@ TEST(Minimise, ComplementAndTautologyAgreeWithRows)
             EXPECT_NE(numOn > 0, numOff > 0) << "row " << row;
         }
         const uint64_t all = space.All(0);
-        EXPECT_EQ(IsCovered(space, &all, cubes, cubes.Size(), CubeList(1), work), off.IsEmpty());
+        EXPECT_EQ(IsCovered(space, &all, cubes, CubeList(1), work), off.IsEmpty());
     }
 }
 

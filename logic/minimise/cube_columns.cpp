@@ -22,12 +22,6 @@ void Transpose(uint64_t* words)
     }
 }
 
-void AppendBits(uint64_t bits, size_t word, std::vector<uint32_t>& parts)
-{
-    for (; bits != 0; bits &= bits - 1)
-        parts.push_back(static_cast<uint32_t>(64 * word + LowestBit(bits)));
-}
-
 } // namespace
 
 CubeColumns::CubeColumns(const CubeSpace& space, const CubeList& cubes)
@@ -106,6 +100,34 @@ void CubeIndex::Find(const uint64_t* cube, size_t maxDistance, Work& work,
         }
         AppendBits(m_columns.Cubes(block) & ~two, block, found);
     }
+}
+
+void RemoveContained(const CubeSpace& space, CubeList& cubes, Work& work)
+{
+    const CubeColumns columns(space, cubes);
+    std::vector<uint8_t> isKept(cubes.Size(), 1);
+    std::vector<uint32_t> parts; // outputs first: few cubes have a given one
+    for (size_t index = 0; index < cubes.Size(); ++index) {
+        const uint64_t* cube = cubes.At(index);
+        parts.clear();
+        for (size_t word = space.NumWords(); word-- > 0;)
+            AppendBits(cube[word] & space.Outputs(word), word, parts);
+        for (size_t word = 0; word < space.NumWords(); ++word)
+            AppendBits(cube[word] & space.Inputs(word), word, parts);
+        work.Spend(columns.NumBlocks() * 4 + 1);
+        for (size_t block = 0; block < columns.NumBlocks() && isKept[index] != 0; ++block) {
+            uint64_t holders = columns.Cubes(block);
+            for (size_t place = 0; place < parts.size() && holders != 0; ++place)
+                holders &= columns.Block(block)[parts[place]];
+            for (; holders != 0; holders &= holders - 1) {
+                const size_t holder = block * kSide + LowestBit(holders);
+                const bool isEqual = IsSameCube(cubes.At(holder), cube, space.NumWords());
+                if (!isEqual || holder < index)
+                    isKept[index] = 0;
+            }
+        }
+    }
+    cubes.Keep(isKept);
 }
 
 } // namespace booleq

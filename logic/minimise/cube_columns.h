@@ -37,6 +37,13 @@ struct ColumnsToMeet {
 // Fails: false, for a cube of which an input has no value, so that it meets none.
 bool ListColumns(const CubeSpace& space, const uint64_t* cube, ColumnsToMeet& columns);
 
+// Appends the places of the bits of word 'word' of a cube, or of block 'word' of a list.
+inline void AppendBits(uint64_t bits, size_t word, std::vector<uint32_t>& places)
+{
+    for (; bits != 0; bits &= bits - 1)
+        places.push_back(static_cast<uint32_t>(64 * word + LowestBit(bits)));
+}
+
 inline uint64_t AnyColumn(const uint64_t* columns, const std::vector<uint32_t>& parts)
 {
     uint64_t any = 0;
@@ -73,6 +80,9 @@ class CubeIndex {
     CubeColumns m_columns;
     ColumnsToMeet m_to_meet;
 };
+
+// Cubes that lie in another one of the list go; of equal ones the first stays.
+void RemoveContained(const CubeSpace& space, CubeList& cubes, Work& work);
 
 } // namespace booleq
 

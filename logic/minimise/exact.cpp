@@ -21,7 +21,8 @@ class ExactSearch {
   public:
     ExactSearch(const TwoLevelProblem& problem, const CubeList& start, Goal goal, Work& work)
         : m_space(problem.space), m_problem(problem), m_goal(goal), m_work(work),
-          m_expander(problem, work), m_start(start), m_essential(m_space.NumWords()),
+          m_expander(problem, work), m_no_cubes(m_space.NumWords()),
+          m_none(m_space, m_no_cubes, false), m_start(start), m_essential(m_space.NumWords()),
           m_fixed(problem.free), m_rows(m_space.NumWords()), m_signatures(m_space.NumWords()),
           m_result(m_space)
     {
@@ -47,7 +48,7 @@ class ExactSearch {
     void SetEssentialAside()
     {
         for (size_t index = 0; index < m_start.Size(); ++index)
-            m_expander.Expand(m_start.At(index), nullptr, m_start, {});
+            m_expander.Expand(m_start.At(index), nullptr, m_none);
         m_start.SortAndUnite();
         m_result.sum = m_start;
         std::vector<uint8_t> isEssential = FindEssential(m_space, m_start, m_problem.free, m_work);
@@ -260,7 +261,7 @@ class ExactSearch {
         for (const uint32_t column : result.columns) {
             sum.Append(columns.At(column));
             uint64_t* cube = sum.At(sum.Size() - 1);
-            m_expander.Expand(cube, nullptr, columns, {});
+            m_expander.Expand(cube, nullptr, m_none);
         }
         const CoverCost cost = CostOf(m_space, sum);
         const CoverCost best = CostOf(m_space, m_result.sum);
@@ -301,6 +302,8 @@ class ExactSearch {
     Goal m_goal;
     Work& m_work;
     Expander m_expander;
+    const CubeList m_no_cubes;
+    const OpenCubes m_none;
     CubeList m_start; // primes; then those that are not essential
     CubeList m_essential;
     CubeList m_fixed; // free, and the essential primes

@@ -8,6 +8,13 @@
 
 namespace booleq {
 
+OpenCubes::OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen)
+    : m_cubes(cubes), m_columns(space, cubes), m_open(m_columns.NumBlocks())
+{
+    for (size_t block = 0; block < m_open.size() && areOpen; ++block)
+        m_open[block] = m_columns.Cubes(block);
+}
+
 Expander::Expander(const TwoLevelProblem& problem, Work& work)
     : m_problem(problem), m_space(problem.space), m_work(work), m_num_words(m_space.NumWords()),
       m_raised(m_num_words), m_free(m_num_words), m_scratch(m_num_words),
@@ -25,38 +32,55 @@ bool Expander::IsImplicant(const uint64_t* cube)
     return !m_obstacles.IsMet(cube);
 }
 
-void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const CubeList& others,
-                      const std::vector<uint32_t>& open)
+void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const OpenCubes& others)
 {
     for (size_t word = 0; word < m_num_words; ++word) {
         m_raised[word] = cube[word];
         m_free[word] = m_space.All(word) & ~cube[word] & (allowed ? allowed[word] : ~uint64_t(0));
     }
-    m_candidates = open;
     if (!m_problem.hasOff) {
-        ExpandByTautology(cube, others);
+        ListCandidates(others);
+        ExpandByTautology(cube, others.Cubes());
         return;
     }
     m_obstacles.Start(m_raised.data(), m_free.data());
     Settle();
+    ListCandidates(others);
     CoverOthers(others);
     while (!m_obstacles.IsNoneActive())
         RaiseLeastBlocked();
     for (size_t word = 0; word < m_num_words; ++word)
         cube[word] = m_raised[word] | m_free[word];
+    assert(IsImplicant(cube));
+}
+
+// The open cubes that lie in m_raised and m_free.
+void Expander::ListCandidates(const OpenCubes& others)
+{
+    const CubeColumns& columns = others.Columns();
+    std::vector<uint32_t> parts; // that keep a cube out
+    for (size_t word = 0; word < m_num_words; ++word)
+        AppendBits(m_space.All(word) & ~(m_raised[word] | m_free[word]), word, parts);
+    m_work.Spend(columns.NumBlocks() * (parts.size() + 1) / 2);
+    m_candidates.clear();
+    for (size_t block = 0; block < columns.NumBlocks(); ++block)
+        if (others.Open(block) != 0)
+            AppendBits(others.Open(block) & ~AnyColumn(columns.Block(block), parts), block,
+                       m_candidates);
+    m_feasible.assign(columns.NumBlocks(), 0);
 }
 
 // Takes in the others one by one, as long as there is one that could be; then heads for them.
-void Expander::CoverOthers(const CubeList& others)
+void Expander::CoverOthers(const OpenCubes& others)
 {
     for (;;) {
-        const size_t numFeasible = FilterCandidates(others);
+        const size_t numFeasible = FilterCandidates(others.Cubes());
         if (m_candidates.empty() || m_obstacles.IsNoneActive())
             return;
         if (numFeasible > 0)
             RaiseBest(others, numFeasible);
         else
-            RaiseMostFrequent(others);
+            RaiseMostFrequent(others.Cubes());
     }
 }
 
@@ -86,28 +110,40 @@ size_t Expander::FilterCandidates(const CubeList& others)
 }
 
 // How many candidates could still be taken in, as far as parts that are then lowered at once tell.
-size_t Expander::CountAfter(const CubeList& others, size_t numFeasible, const uint64_t* with)
+size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with)
 {
     for (size_t word = 0; word < m_num_words; ++word)
         m_scratch[word] = m_raised[word] | m_free[word];
     m_obstacles.ClearLowered(m_free.data(), with, m_scratch.data());
-    m_work.Spend(numFeasible);
+    std::vector<uint32_t> lost;
+    for (size_t word = 0; word < m_num_words; ++word)
+        AppendBits((m_raised[word] | m_free[word]) & ~m_scratch[word], word, lost);
+    if (lost.empty())
+        return numFeasible;
+    m_work.Spend(m_feasible_blocks.size() * lost.size() / 2);
     size_t count = 0;
-    for (size_t place = 0; place < numFeasible; ++place)
-        if (Contains(m_scratch.data(), others.At(m_candidates[place]), m_num_words))
-            ++count;
+    for (const uint32_t block : m_feasible_blocks)
+        count += CountBits(m_feasible[block] & ~AnyColumn(others.Columns().Block(block), lost));
     return count;
 }
 
 // Takes in the feasible candidate after which most others can be taken in; of equal ones the one
 // that raises fewest parts.
-void Expander::RaiseBest(const CubeList& others, size_t numFeasible)
+void Expander::RaiseBest(const OpenCubes& others, size_t numFeasible)
 {
+    std::fill(m_feasible.begin(), m_feasible.end(), 0);
+    m_feasible_blocks.clear();
+    for (size_t place = 0; place < numFeasible; ++place) {
+        const uint32_t candidate = m_candidates[place];
+        if (m_feasible[candidate / 64] == 0)
+            m_feasible_blocks.push_back(candidate / 64);
+        SetBit(m_feasible.data(), candidate);
+    }
     size_t best = 0;
     size_t bestCount = 0;
     size_t bestRaised = SIZE_MAX;
     for (size_t place = 0; place < numFeasible && numFeasible > 1; ++place) {
-        const uint64_t* cube = others.At(m_candidates[place]);
+        const uint64_t* cube = others.Cubes().At(m_candidates[place]);
         const size_t count = CountAfter(others, numFeasible, cube);
         size_t numRaised = 0;
         for (size_t word = 0; word < m_num_words; ++word)
@@ -118,7 +154,7 @@ void Expander::RaiseBest(const CubeList& others, size_t numFeasible)
             bestRaised = numRaised;
         }
     }
-    const uint64_t* cube = others.At(m_candidates[best]);
+    const uint64_t* cube = others.Cubes().At(m_candidates[best]);
     for (size_t word = 0; word < m_num_words; ++word) {
         m_raised[word] |= cube[word];
         m_free[word] &= ~cube[word];
@@ -214,28 +250,43 @@ void DropEqualPrimes(Cover& cover)
     KeepInCover(cover, isKept);
 }
 
+// Closes the open cubes that lie in 'prime', and clears their flags.
+void TakeIn(const CubeSpace& space, const uint64_t* prime, OpenCubes& others,
+            std::vector<uint8_t>& isKept, Work& work)
+{
+    std::vector<uint32_t> parts; // that keep a cube out
+    for (size_t word = 0; word < space.NumWords(); ++word)
+        AppendBits(space.All(word) & ~prime[word], word, parts);
+    const CubeColumns& columns = others.Columns();
+    work.Spend(columns.NumBlocks() * (parts.size() + 1) / 2);
+    std::vector<uint32_t> taken;
+    for (size_t block = 0; block < columns.NumBlocks(); ++block)
+        if (others.Open(block) != 0)
+            AppendBits(others.Open(block) & ~AnyColumn(columns.Block(block), parts), block, taken);
+    for (const uint32_t index : taken) {
+        assert(Contains(prime, others.Cubes().At(index), space.NumWords()));
+        others.Close(index);
+        isKept[index] = 0;
+    }
+}
+
 } // namespace
 
 void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work& work)
 {
     CubeList& cubes = cover.cubes;
     std::vector<uint8_t> isKept(cubes.Size(), 1);
-    std::vector<uint32_t> open; // what is yet to be expanded
-    for (const uint32_t index : OrderByWeight(space, cubes))
-        if (cover.isPrime[index] == 0)
-            open.push_back(index);
-    std::reverse(open.begin(), open.end());
-    while (!open.empty()) {
-        const uint32_t index = open.back();
-        open.pop_back();
-        expander.Expand(cubes.At(index), nullptr, cubes, open);
+    OpenCubes others(space, cubes, true); // what is yet to be expanded
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (cover.isPrime[index] != 0)
+            others.Close(index);
+    for (const uint32_t index : OrderByWeight(space, cubes)) {
+        if (!others.IsOpen(index))
+            continue;
+        others.Close(index);
+        expander.Expand(cubes.At(index), nullptr, others);
         cover.isPrime[index] = 1;
-        work.Spend(open.size());
-        const auto isTakenIn = [&](uint32_t other) {
-            isKept[other] = Contains(cubes.At(index), cubes.At(other), space.NumWords()) ? 0 : 1;
-            return isKept[other] == 0;
-        };
-        open.erase(std::remove_if(open.begin(), open.end(), isTakenIn), open.end());
+        TakeIn(space, cubes.At(index), others, isKept, work);
     }
     KeepInCover(cover, isKept);
     DropEqualPrimes(cover);

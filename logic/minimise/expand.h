@@ -11,6 +11,26 @@
 
 namespace booleq {
 
+// Cubes of a list that a growing one may take in. The list must outlive this; the cubes that are
+// open do not change.
+class OpenCubes {
+  public:
+    // All of the list are open, or none.
+    OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen);
+
+    const CubeList& Cubes() const { return m_cubes; }
+    const CubeColumns& Columns() const { return m_columns; }
+    // Bit k says whether cube 64 * block + k is open.
+    uint64_t Open(size_t block) const { return m_open[block]; }
+    void Close(size_t index) { ClearBit(m_open.data(), index); }
+    bool IsOpen(size_t index) const { return GetBit(m_open.data(), index); }
+
+  private:
+    const CubeList& m_cubes;
+    CubeColumns m_columns;
+    std::vector<uint64_t> m_open;
+};
+
 // Grows one cube at a time against the off-set of a problem, which must stay as it is as long as
 // this lives. Where the problem has no off-set, a cube may grow as far as 'on' and 'free' cover it,
 // which is one question of tautology for each part.
@@ -21,10 +41,9 @@ class Expander {
     // Whether the cube meets no row that is off.
     bool IsImplicant(const uint64_t* cube);
     // 'cube' becomes a prime that has only parts that 'allowed' has, or that it had; null allows
-    // all. It is steered to take in those of 'others' that are in 'open'.
+    // all. It is steered to take in those of 'others' that are open.
     // Requires: an implicant.
-    void Expand(uint64_t* cube, const uint64_t* allowed, const CubeList& others,
-                const std::vector<uint32_t>& open);
+    void Expand(uint64_t* cube, const uint64_t* allowed, const OpenCubes& others);
 
   private:
     // While a cube grows, m_raised has the parts that it has and m_free those that are not decided;
@@ -33,10 +52,11 @@ class Expander {
     void TakeInNearest(uint64_t* cube, const CubeList& others);
 
     void Settle();
-    void CoverOthers(const CubeList& others);
+    void CoverOthers(const OpenCubes& others);
+    void ListCandidates(const OpenCubes& others);
     size_t FilterCandidates(const CubeList& others);
-    void RaiseBest(const CubeList& others, size_t numFeasible);
-    size_t CountAfter(const CubeList& others, size_t numFeasible, const uint64_t* with);
+    void RaiseBest(const OpenCubes& others, size_t numFeasible);
+    size_t CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with);
     void RaiseMostFrequent(const CubeList& others);
     void RaiseLeastBlocked();
     void Raise(size_t bit);
@@ -53,7 +73,9 @@ class Expander {
     CubeIndex m_on_index;
     CubeIndex m_free_index;
     Cofactors m_known; // on and free; asked where there is no off-set
-    std::vector<uint32_t> m_candidates; // feasible ones first
+    std::vector<uint32_t> m_candidates;      // feasible ones first
+    std::vector<uint64_t> m_feasible;        // of each block of the others
+    std::vector<uint32_t> m_feasible_blocks; // that have any
     std::vector<uint32_t> m_counts;
 };
 

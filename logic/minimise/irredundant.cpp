@@ -14,7 +14,7 @@ namespace booleq {
 
 namespace {
 
-constexpr uint64_t kIrredundantUnits = 1u << 22; // to choose cubes in; each row has a cube anyway
+constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; each row has a cube anyway
 constexpr uint32_t kFixed = UINT32_MAX;          // label of cubes that stay
 
 // Appends a row for each place that only labelled cubes cover.

@@ -14,12 +14,6 @@ constexpr uint32_t Other(uint32_t part)
     return part ^ 1u;
 }
 
-void AppendBits(uint64_t bits, size_t word, std::vector<uint32_t>& parts)
-{
-    for (; bits != 0; bits &= bits - 1)
-        parts.push_back(static_cast<uint32_t>(64 * word + LowestBit(bits)));
-}
-
 // The pairs of a word of which just one part is there.
 uint64_t Literals(const CubeSpace& space, const uint64_t* cube, size_t word)
 {

@@ -115,8 +115,7 @@ size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, con
         if (IsSameCube(reduced.At(reduced.Size() - 1), cover.cubes.At(index), numWords))
             reduced.Resize(reduced.Size() - 1); // a prime that nothing shrinks takes in no other
     }
-    std::vector<uint32_t> all(reduced.Size());
-    std::iota(all.begin(), all.end(), 0u);
+    const OpenCubes others(space, reduced, true);
     std::vector<uint64_t> cube(numWords);
     CubeList added(numWords);
     for (size_t left = 0; left < reduced.Size(); ++left) {
@@ -125,7 +124,7 @@ size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, con
                 cube[word] = reduced.At(left)[word] | reduced.At(right)[word];
             if (!expander.IsImplicant(cube.data()))
                 continue;
-            expander.Expand(cube.data(), nullptr, reduced, all);
+            expander.Expand(cube.data(), nullptr, others);
             added.Append(cube.data());
         }
     }
@@ -159,11 +158,13 @@ void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const 
         }
         cubeIndex.Update(index);
     }
+    const CubeList noCubes(space.NumWords());
+    const OpenCubes none(space, noCubes, false);
     std::vector<uint64_t> allowed(space.NumWords());
     for (size_t index = 0; index < cubes.Size(); ++index) {
         for (size_t word = 0; word < space.NumWords(); ++word)
             allowed[word] = space.Inputs(word);
-        expander.Expand(cubes.At(index), allowed.data(), cubes, {});
+        expander.Expand(cubes.At(index), allowed.data(), none);
         cover.isPrime[index] = 0;
     }
 }

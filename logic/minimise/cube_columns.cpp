@@ -25,7 +25,7 @@ void Transpose(uint64_t* words)
 } // namespace
 
 CubeColumns::CubeColumns(const CubeSpace& space, const CubeList& cubes)
-    : m_num_parts(2 * space.NumInputs() + space.NumOutputs()),
+    : m_num_input_parts(2 * space.NumInputs()), m_num_parts(m_num_input_parts + space.NumOutputs()),
       m_num_blocks((cubes.Size() + kSide - 1) / kSide), m_columns(m_num_blocks * m_num_parts),
       m_cubes(m_num_blocks, ~uint64_t(0))
 {

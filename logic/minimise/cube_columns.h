@@ -13,6 +13,8 @@ class CubeColumns {
   public:
     CubeColumns(const CubeSpace& space, const CubeList& cubes);
 
+    size_t NumInputParts() const { return m_num_input_parts; }
+    size_t NumParts() const { return m_num_parts; }
     size_t NumBlocks() const { return m_num_blocks; }
     // A word for each part, in the order of a cube's bits; bit k of it is cube 64 * block + k.
     const uint64_t* Block(size_t block) const { return m_columns.data() + block * m_num_parts; }
@@ -22,6 +24,7 @@ class CubeColumns {
     void Set(size_t index, const uint64_t* cube);
 
   private:
+    size_t m_num_input_parts;
     size_t m_num_parts;
     size_t m_num_blocks;
     std::vector<uint64_t> m_columns;
@@ -30,7 +33,8 @@ class CubeColumns {
 
 // The columns of one cube that matter to those which it meets.
 struct ColumnsToMeet {
-    std::vector<uint32_t> inputs;  // one for each input that the cube fixes: a cube without it misses
+    std::vector<uint32_t>
+        inputs; // one for each input that the cube fixes: a cube without it misses
     std::vector<uint32_t> outputs; // and so does one without any of these
 };
 
@@ -69,6 +73,7 @@ class CubeIndex {
     CubeIndex(const CubeSpace& space, const CubeList& cubes);
 
     const CubeList& Cubes() const { return m_cubes; }
+    const CubeColumns& Columns() const { return m_columns; }
     void Update(size_t index) { m_columns.Set(index, m_cubes.At(index)); }
     // In ascending order the places of cubes that have a row of an output in common with 'cube', or
     // with 'maxDistance' 1 those that are at most one part away. Replaces 'found'.

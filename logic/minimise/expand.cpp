@@ -18,8 +18,8 @@ OpenCubes::OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen
 Expander::Expander(const TwoLevelProblem& problem, Work& work)
     : m_problem(problem), m_space(problem.space), m_work(work), m_num_words(m_space.NumWords()),
       m_raised(m_num_words), m_free(m_num_words), m_scratch(m_num_words),
-      m_obstacles(m_space, problem.off, work),
-      m_none(m_num_words), m_on_index(m_space, problem.hasOff ? m_none : problem.on),
+      m_obstacles(m_space, problem.off, work), m_none(m_num_words),
+      m_on_index(m_space, problem.hasOff ? m_none : problem.on),
       m_free_index(m_space, problem.hasOff ? m_none : problem.free),
       m_known(m_space, m_on_index, m_free_index, work)
 {

@@ -72,7 +72,7 @@ class Expander {
     const CubeList m_none;
     CubeIndex m_on_index;
     CubeIndex m_free_index;
-    Cofactors m_known; // on and free; asked where there is no off-set
+    Cofactors m_known;                       // on and free; asked where there is no off-set
     std::vector<uint32_t> m_candidates;      // feasible ones first
     std::vector<uint64_t> m_feasible;        // of each block of the others
     std::vector<uint32_t> m_feasible_blocks; // that have any

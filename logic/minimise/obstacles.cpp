@@ -192,7 +192,8 @@ void Obstacles::RaiseUnblocked(uint64_t* raised, uint64_t* free)
     m_work.Spend(m_live.size());
     for (const uint32_t block : m_live) {
         const uint64_t* columns = m_off.Block(block);
-        const auto dropBlocked = [&](Parts& parts, uint64_t cubes, uint32_t flip, uint64_t inverted) {
+        const auto dropBlocked = [&](Parts& parts, uint64_t cubes, uint32_t flip,
+                                     uint64_t inverted) {
             for (size_t place = parts.size(); place-- > 0;) {
                 if ((cubes & (columns[parts[place] ^ flip] ^ inverted)) == 0)
                     continue;

@@ -12,11 +12,11 @@ namespace booleq {
 
 namespace {
 
-// Without --exact an exact search is tried with a few times the work that the heuristic took, and a
+// Without --exact an exact search is tried with as much work as the heuristic took, and a
 // little; where that was much it would need far more, so there is a limit.
-constexpr uint64_t kTrialShare = 3;
-constexpr uint64_t kTrialUnits = 4u << 20;
-constexpr uint64_t kMaxTrialUnits = 10u << 20;
+constexpr uint64_t kTrialShare = 1;
+constexpr uint64_t kTrialUnits = 1u << 20;
+constexpr uint64_t kMaxTrialUnits = 3u << 20;
 
 void SetSeconds(double seconds, Work& work)
 {

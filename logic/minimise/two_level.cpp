@@ -25,7 +25,7 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
-constexpr uint64_t kMaxSpentForMore = 12u << 20; // where the loop took longer, more of it would too
+constexpr uint64_t kMaxSpentForMore = 20u << 20; // where the loop took longer, more of it would too
 constexpr size_t kMaxSplit = 50000;              // cubes of one output each, to start from
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
@@ -83,8 +83,8 @@ class SmallSumSearch {
         m_cover.isPrime.assign(m_cover.cubes.Size(), 1);
     }
 
-    // A cube that several outputs share is a choice that the search might not make: it starts from a
-    // cube for each output, unless these are too many.
+    // A cube that several outputs share is a choice that the search might not make: it starts from
+    // a cube for each output, unless these are too many.
     CubeList SplitOutputs(const CubeList& on) const
     {
         CubeList united = on;

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include "blocking.h"
+#include "cofactors.h"
 #include "covering.h"
 #include "cube_table.h"
 #include "logic_support.h"

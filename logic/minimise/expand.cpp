@@ -8,6 +8,13 @@
 
 namespace booleq {
 
+namespace {
+
+// Candidates at a time, times blocks of off cubes, each of which is asked of them.
+constexpr size_t kMaxAskedBlocks = size_t(1) << 18;
+
+} // namespace
+
 OpenCubes::OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen)
     : m_cubes(cubes), m_columns(space, cubes), m_open(m_columns.NumBlocks())
 {
@@ -102,11 +109,32 @@ size_t Expander::FilterCandidates(const CubeList& others)
             m_candidates[numKept++] = candidate;
     }
     m_candidates.resize(numKept);
+    const size_t numAsked =
+        std::min(numKept, kMaxAskedBlocks / (m_problem.off.Size() / 64 + 1) + 16);
+    if (numKept > numAsked) { // the nearest are asked now, others when the cube has grown
+        const auto isNearer = [&](uint32_t left, uint32_t right) {
+            const size_t leftCount = CountRaised(others.At(left));
+            const size_t rightCount = CountRaised(others.At(right));
+            return leftCount != rightCount ? leftCount < rightCount : left < right;
+        };
+        std::nth_element(m_candidates.begin(),
+                         m_candidates.begin() + static_cast<std::ptrdiff_t>(numAsked),
+                         m_candidates.end(), isNearer);
+    }
     size_t numFeasible = 0;
-    for (size_t place = 0; place < numKept; ++place)
+    for (size_t place = 0; place < numAsked; ++place)
         if (m_obstacles.IsFeasible(m_free.data(), others.At(m_candidates[place])))
             std::swap(m_candidates[place], m_candidates[numFeasible++]);
     return numFeasible;
+}
+
+// How many parts 'cube' would raise.
+size_t Expander::CountRaised(const uint64_t* cube) const
+{
+    size_t count = 0;
+    for (size_t word = 0; word < m_num_words; ++word)
+        count += CountBits(cube[word] & ~m_raised[word]);
+    return count;
 }
 
 // How many candidates could still be taken in, as far as parts that are then lowered at once tell.
@@ -145,9 +173,7 @@ void Expander::RaiseBest(const OpenCubes& others, size_t numFeasible)
     for (size_t place = 0; place < numFeasible && numFeasible > 1; ++place) {
         const uint64_t* cube = others.Cubes().At(m_candidates[place]);
         const size_t count = CountAfter(others, numFeasible, cube);
-        size_t numRaised = 0;
-        for (size_t word = 0; word < m_num_words; ++word)
-            numRaised += CountBits(cube[word] & ~m_raised[word]);
+        const size_t numRaised = CountRaised(cube);
         if (count > bestCount || (count == bestCount && numRaised < bestRaised)) {
             best = place;
             bestCount = count;

@@ -55,6 +55,7 @@ class Expander {
     void CoverOthers(const OpenCubes& others);
     void ListCandidates(const OpenCubes& others);
     size_t FilterCandidates(const CubeList& others);
+    size_t CountRaised(const uint64_t* cube) const;
     void RaiseBest(const OpenCubes& others, size_t numFeasible);
     size_t CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with);
     void RaiseMostFrequent(const CubeList& others);

@@ -25,8 +25,9 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
-constexpr uint64_t kMaxSpentForMore = 20u << 20; // where the loop took longer, more of it would too
-constexpr size_t kMaxSplit = 50000;              // cubes of one output each, to start from
+constexpr uint64_t kMaxSpentForMore = 14u << 20; // where the loop took longer, more of it would too
+constexpr size_t kMaxToCompare = 20000;
+constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start from
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
 
@@ -109,7 +110,8 @@ class SmallSumSearch {
     void StartFrom(CubeList cubes)
     {
         m_cover.cubes = std::move(cubes);
-        RemoveContained(m_space, m_cover.cubes, m_work);
+        if (m_cover.cubes.Size() <= kMaxToCompare) // expansion takes contained cubes in as well
+            RemoveContained(m_space, m_cover.cubes, m_work);
         m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
         ExpandCover(m_space, m_expander, m_cover, m_work);
         m_pool.Append(m_cover.cubes);

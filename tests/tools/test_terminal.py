@@ -53,6 +53,29 @@ def check_terminal(tool):
     os.close(terminal)
 
 
+def check_search(tool):
+    """A search that would take for ever says that it lives, and ends when it is told to."""
+    numbers = random.Random(1)
+    rows = [f"{row:011b} " + "".join(numbers.choice("01-") for _ in range(8)) for row in range(2048)]
+    with tempfile.NamedTemporaryFile("w", suffix=".pla") as file:
+        file.write(".i 11\n.o 8\n" + "\n".join(rows) + "\n.e\n")
+        file.flush()
+        terminal, side = pty.openpty()
+        with subprocess.Popen([tool, "minimize", "--exact", file.name], stdin=subprocess.DEVNULL,
+                              stdout=subprocess.DEVNULL, stderr=side,
+                              preexec_fn=heed_interrupts) as process:
+            os.close(side)
+            seen = read_until(terminal, b"booleq: minimising, steps: ")
+            assert b"booleq: minimising, steps: " in seen, seen
+            start = time.monotonic()
+            process.send_signal(signal.SIGINT)
+            assert process.wait(TIMEOUT_SECONDS) == -signal.SIGINT
+            seconds = time.monotonic() - start
+        assert b"interrupted" in read_until(terminal, b"interrupted")
+        os.close(terminal)
+    print(f"a search ends {seconds:.3f} s after an interrupt")
+
+
 def check_wiped(tool):
     """What was shown is gone at the end."""
     terminal, side = pty.openpty()
@@ -141,6 +164,7 @@ def main():
     options = parser.parse_args()
     tool = os.path.abspath(options.tool)
     check_terminal(tool)
+    check_search(tool)
     check_wiped(tool)
     check_silence(tool)
     print(f"progress, interrupt, silence: as they should be; a search ended after "

@@ -37,7 +37,7 @@ struct Decision {
 };
 
 // Inputs are the same when their names are; there may be any number. Nothing is guessed: Equal is
-// proved, and for a difference both were evaluated. Up to 30 inputs it is the first row.
+// proved, and for a difference both were evaluated. It is the first row up to kMaxFunctionInputs.
 // Fails: Undecided, without an equation, where a limit ends it, and, in a library built without a
 // solver, where only that could tell.  Cost: exponential at worst.
 KQ_EXPORT Decision DecideEqual(const Kq_BoolEquation& left, const Kq_BoolEquation& right,

@@ -34,13 +34,12 @@ BatchResult RefuseText(const char* what, const std::string& text, const Reading&
     return Fail(BatchOutcome::kTextRefused, std::move(message));
 }
 
-std::string AssignmentText(const Function& function, uint64_t row)
+std::string RowText(const Function& function, uint64_t row)
 {
-    std::string text;
+    std::vector<bool> values;
     for (size_t index = 0; index < function.NumInputs(); ++index)
-        text += (index == 0 ? "" : " ") + Visible(function.Inputs()[index]) +
-                (function.InputAt(row, index) ? "=1" : "=0");
-    return text;
+        values.push_back(function.InputAt(row, index));
+    return ValuesByName(function.Inputs(), values);
 }
 
 std::string InitFor(const Function& function)
@@ -115,7 +114,7 @@ BatchResult CompareInit(const BatchRow& row, const Function& function)
         return {};
     std::string message = "the equation is " + std::string(function.At(different) ? "1" : "0") +
                           " at row " + std::to_string(different) + " (" +
-                          AssignmentText(function, different) + "), the init value " +
+                          RowText(function, different) + "), the init value " +
                           (given.At(different) ? "1" : "0");
     if (function.NumInputs() <= kMaxWrittenInputs)
         message += "; the equation's is " + InitFor(function);

@@ -15,6 +15,8 @@ namespace kq_logic {
 
 namespace {
 
+static_assert(kMaxFunctionInputs == booleq::kMaxFirstRowInputs);
+
 Decision FromRoom(booleq::Decision decided)
 {
     Decision decision;

@@ -4,12 +4,14 @@
 
 #include <algorithm>
 #include <memory>
+#include <optional>
 #include <thread>
 #include <utility>
 
 #include "answer.h"
 #include "commands.h"
 #include "lines.h"
+#include "messages.h"
 #include "progress.h"
 #include "table_format.h"
 #include "text.h"
@@ -89,6 +91,9 @@ struct Answered {
 
 Answered AnswerLine(const Line& line, const Request& request, TableFormat& format)
 {
+    std::optional<NoMessages> silence; // of the thread that answers
+    if (!request.debug)
+        silence.emplace();
     BatchRow row;
     BatchResult result = format.ReadRow(line.text, row);
     if (result.outcome == BatchOutcome::kOk)

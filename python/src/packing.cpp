@@ -104,9 +104,9 @@ void Narrow(const ValueColumn& column, size_t first, size_t numRows, uint8_t* by
 
 #ifdef __SSE2__
 
-// Eight bytes of each of 16 rows, a row every 'stride' bytes, turned: piece[8 * k] is the 16 bits of
-// column k.
-void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, uint16_t* pieces, size_t pieceStride,
+// Eight bytes of each of 16 rows, a row every 'stride' bytes, turned: pieces[k] is the 16 bits of
+// column k; at least numColumns of them are written.
+void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uint16_t* pieces,
                __m128i& all)
 {
     __m128i in[16];
@@ -123,7 +123,7 @@ void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, uint16_t* pieces, siz
         four[row] = _mm_unpacklo_epi8(two[row], two[row + 4]);
         four[row + 4] = _mm_unpackhi_epi8(two[row], two[row + 4]);
     }
-    for (unsigned int half = 0; half < 2; ++half) {
+    for (unsigned int half = 0; half < (numColumns <= 4 ? 1 : 2); ++half) {
         const __m128i* const from = four + 4 * half;
         const __m128i eight[4] = {
             _mm_unpacklo_epi8(from[0], from[2]), _mm_unpackhi_epi8(from[0], from[2]),
@@ -132,7 +132,7 @@ void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, uint16_t* pieces, siz
             _mm_unpacklo_epi8(eight[0], eight[2]), _mm_unpackhi_epi8(eight[0], eight[2]),
             _mm_unpacklo_epi8(eight[1], eight[3]), _mm_unpackhi_epi8(eight[1], eight[3])};
         for (unsigned int column = 0; column < 4; ++column)
-            pieces[(4 * half + column) * pieceStride] = static_cast<uint16_t>(
+            pieces[4 * half + column] = static_cast<uint16_t>(
                 _mm_movemask_epi8(_mm_slli_epi16(columns[column], 7)));
     }
 }
@@ -155,8 +155,9 @@ class RowTurner {
             const size_t numColumns = std::min<size_t>(8, m_rows.numColumns - column);
             const uint8_t* source = from + column;
             std::ptrdiff_t stride = m_rows.rowStride;
-            uint8_t copy[16 * 8] = {};
+            uint8_t copy[16 * 8];
             if (numRows < 16 || source + 15 * stride + 8 > m_end) {
+                std::memset(copy, 0, sizeof copy);
                 for (size_t row = 0; row < numRows; ++row)
                     std::memcpy(copy + 8 * row,
                                 source + static_cast<std::ptrdiff_t>(row) * stride, numColumns);
@@ -165,7 +166,7 @@ class RowTurner {
             }
             uint16_t pieces[8];
             __m128i all = _mm_setzero_si128();
-            TurnBytes(source, stride, pieces, 1, all);
+            TurnBytes(source, stride, numColumns, pieces, all);
             uint64_t seen = 0;
             _mm_storel_epi64(reinterpret_cast<__m128i*>(&seen), all);
             const uint64_t mask = ~uint64_t(0) >> (64 - 8 * numColumns); // x86 is little-endian

@@ -21,7 +21,11 @@ size_t ReadCharacter(const std::string& text, size_t position, uint32_t& charact
 {
     constexpr uint32_t kLowest[] = {0, 0, 0x80, 0x800, 0x10000}; // that takes so many bytes
     const auto first = static_cast<unsigned char>(text[position]);
-    const size_t length = first < 0xc2 ? 0 : first < 0xe0 ? 2 : first < 0xf0 ? 3 : first < 0xf5 ? 4 : 0;
+    const size_t length = first < 0xc2   ? 0
+                          : first < 0xe0 ? 2
+                          : first < 0xf0 ? 3
+                          : first < 0xf5 ? 4
+                                         : 0;
     if (length == 0 || position + length > text.size())
         return 0;
     character = first & (0x7fu >> length);
@@ -96,10 +100,10 @@ std::string Excerpt(const std::string& text)
     if (text.size() <= kExcerptBytes)
         return Visible(text);
     size_t length = kExcerptBytes; // and no part of a character
-    while (length > kExcerptBytes - 3 && (static_cast<unsigned char>(text[length]) & 0xc0u) == 0x80u)
+    while (length > kExcerptBytes - 3 &&
+           (static_cast<unsigned char>(text[length]) & 0xc0u) == 0x80u)
         --length;
-    return Visible(text.substr(0, length)) + "... (" + std::to_string(text.size()) +
-           " bytes)";
+    return Visible(text.substr(0, length)) + "... (" + std::to_string(text.size()) + " bytes)";
 }
 
 std::string Count(uint64_t number, const std::string& noun)

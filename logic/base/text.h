@@ -14,9 +14,8 @@ std::string ToStd(const Port::StringBase<char>& text);
 
 // True when every byte is printable ASCII, so that Visible changes nothing.
 bool IsPrintable(const std::string& text);
-// From now on Visible leaves characters of UTF-8, of more than one byte, for which the test is true;
-// at first, and for null, it leaves none.
-// Threads: before others start.
+// From now on Visible leaves characters of UTF-8, of more than one byte, for which the test is
+// true; at first, and for null, it leaves none. Threads: before others start.
 typedef bool (*CharacterTest)(uint32_t character);
 void ShowUtf8(CharacterTest test);
 // How many columns of a terminal a visible text takes.

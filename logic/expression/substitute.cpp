@@ -198,7 +198,8 @@ std::vector<std::string> NamesInText(const Expression& expression)
 {
     std::vector<std::string> names;
     std::vector<bool> isListed(expression.names.size());
-    for (const Expression::Node& node : expression.nodes) { // post-order keeps the order of operands
+    for (const Expression::Node& node :
+         expression.nodes) { // post-order keeps the order of operands
         if (node.op != Operator::Input || isListed[node.left])
             continue;
         isListed[node.left] = true;

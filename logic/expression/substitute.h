@@ -18,7 +18,7 @@ constexpr size_t kMaxExpressionNodes = size_t(1) << 30;
 // What stands in place of an input: an expression, or another number for the input.
 struct Substitute {
     const Expression* expression = nullptr; // null: the input stays, with the number in places[0]
-    std::vector<uint32_t> places; // where the expression's inputs are among the new names
+    std::vector<uint32_t> places;           // where the expression's inputs are among the new names
 };
 
 // 'expression' with its input k replaced by substitutes[k], over 'names'.

@@ -56,10 +56,8 @@ Made FromFunction(const booleq::Function& function)
 
 Made FromNodes(const booleq::Expression& expression)
 {
-    std::string text =
-        WriteOwn(expression, booleq::OwnSyntax::AsTyped, booleq::Parentheses::Clear);
-    return Read(std::move(text), expression.names,
-                NamesInText(expression) != expression.names);
+    std::string text = WriteOwn(expression, booleq::OwnSyntax::AsTyped, booleq::Parentheses::Clear);
+    return Read(std::move(text), expression.names, NamesInText(expression) != expression.names);
 }
 
 py::object Give(const Made& made)
@@ -164,9 +162,9 @@ size_t RequireInput(const std::vector<std::string>& inputs, const py::handle& na
     for (size_t input = 0; input < inputs.size(); ++input)
         if (inputs[input] == bytes)
             return input;
-    throw py::type_error("there is no input " + Shown(name) +
-                         (inputs.empty() ? "; there are none"
-                                         : "; the inputs are " + booleq::Join(inputs, ", ")));
+    throw py::type_error(
+        "there is no input " + Shown(name) +
+        (inputs.empty() ? "; there are none" : "; the inputs are " + booleq::Join(inputs, ", ")));
 }
 
 // 'items' are pairs of a name and what stands for it: an equation, a text, 0 or 1.

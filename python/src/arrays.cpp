@@ -75,9 +75,9 @@ struct Assignments {
             return PackRows(rows, first, numRowsOfBlock, block, kBlockWords);
         bool isFine = true;
         for (size_t input = 0; input < columns.size(); ++input)
-            isFine = PackColumn(columns[input], first, numRowsOfBlock,
-                                block + kBlockWords * input) &&
-                     isFine;
+            isFine =
+                PackColumn(columns[input], first, numRowsOfBlock, block + kBlockWords * input) &&
+                isFine;
         return isFine;
     }
 };
@@ -149,19 +149,20 @@ size_t EvaluateAll(const Content& content, const Assignments& assignments, uint8
 {
     const Evaluator evaluator(content, assignments.numRows);
     std::atomic<size_t> fault{kNoRow};
-    booleq::RunInParts(assignments.numRows, kPartRows, booleq::LutWork(), [&](size_t begin, size_t end) {
-        std::vector<uint64_t> block(evaluator.BlockSize());
-        for (size_t row = begin; row < end; row += kBlockRows) {
-            const size_t numRows = std::min(kBlockRows, end - row);
-            if (!assignments.Pack(row, numRows, block.data())) {
-                size_t known = fault;
-                while (row < known && !fault.compare_exchange_weak(known, row)) {
-                }
-                return;
-            }
-            evaluator.Run(block, numRows, results + row);
-        }
-    });
+    booleq::RunInParts(assignments.numRows, kPartRows, booleq::LutWork(),
+                       [&](size_t begin, size_t end) {
+                           std::vector<uint64_t> block(evaluator.BlockSize());
+                           for (size_t row = begin; row < end; row += kBlockRows) {
+                               const size_t numRows = std::min(kBlockRows, end - row);
+                               if (!assignments.Pack(row, numRows, block.data())) {
+                                   size_t known = fault;
+                                   while (row < known && !fault.compare_exchange_weak(known, row)) {
+                                   }
+                                   return;
+                               }
+                               evaluator.Run(block, numRows, results + row);
+                           }
+                       });
     return fault;
 }
 
@@ -178,10 +179,10 @@ py::object Evaluate(const Equation& equation, const Assignments& assignments)
         return results;
     for (size_t row = fault; row < assignments.numRows; ++row)
         for (size_t input = 0; input < equation.NumInputs(); ++input) {
-            const ValueColumn column =
-                assignments.isRows ? ValueColumn{assignments.rows.data + input,
-                                                 assignments.rows.rowStride, ItemKind::Byte}
-                                   : assignments.columns[input];
+            const ValueColumn column = assignments.isRows
+                                           ? ValueColumn{assignments.rows.data + input,
+                                                         assignments.rows.rowStride, ItemKind::Byte}
+                                           : assignments.columns[input];
             if (IsFault(column, row))
                 return py::make_tuple(row, input);
         }
@@ -261,9 +262,10 @@ py::object Column(const py::object& self)
     py::object column = NewArray(py::make_tuple(numRows));
     uint8_t* const bytes = DataOf(column);
     FreelyIf(numRows > 65536, [&] {
-        booleq::RunInParts(numRows, size_t(1) << 20, booleq::LutWork(), [&](size_t begin, size_t end) {
-            UnpackBits(rows.Words() + begin / 64, end - begin, bytes + begin);
-        });
+        booleq::RunInParts(numRows, size_t(1) << 20, booleq::LutWork(),
+                           [&](size_t begin, size_t end) {
+                               UnpackBits(rows.Words() + begin / 64, end - begin, bytes + begin);
+                           });
     });
     return column;
 }

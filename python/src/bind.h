@@ -9,14 +9,14 @@
 
 namespace booleq_python {
 
-void BindTexts(py::module_& module);       // renderings, init values, other notations
-void BindMany(py::module_& module);        // equations by the thousand
-void BindAlgebra(py::module_& module);     // equations made of equations
-void BindQuestions(py::module_& module);   // what is decided, counted and matched
-void BindArrays(py::module_& module);      // many rows at once
-void BindLuts(py::module_& module);        // arrays of look-up tables
-void BindMinimize(py::module_& module);    // smallest sums
-void BindReports(py::module_& module);     // trees, maps, explanations, lint
+void BindTexts(py::module_& module);     // renderings, init values, other notations
+void BindMany(py::module_& module);      // equations by the thousand
+void BindAlgebra(py::module_& module);   // equations made of equations
+void BindQuestions(py::module_& module); // what is decided, counted and matched
+void BindArrays(py::module_& module);    // many rows at once
+void BindLuts(py::module_& module);      // arrays of look-up tables
+void BindMinimize(py::module_& module);  // smallest sums
+void BindReports(py::module_& module);   // trees, maps, explanations, lint
 
 } // namespace booleq_python
 

@@ -19,12 +19,11 @@ namespace booleq_python {
 namespace {
 
 struct CoreObject {
-    PyObject_HEAD
-    PyObject* weakReferences;
+    PyObject_HEAD PyObject* weakReferences;
     Equation value;
 };
 
-PyTypeObject* coreType = nullptr;     // owned, for ever
+PyTypeObject* coreType = nullptr;      // owned, for ever
 PyTypeObject* equationClass = nullptr; // owned, for ever; what new objects are
 
 // Runs 'work' as a function of C does: an exception becomes the interpreter's.
@@ -56,8 +55,8 @@ PyObject* New(PyTypeObject* type, PyObject* arguments, PyObject* named)
     PyObject* text = nullptr;
     PyObject* inputs = Py_None;
     PyObject* lsbFirst = Py_False;
-    if (!PyArg_ParseTupleAndKeywords(arguments, named, "O|OO:Equation",
-                                     const_cast<char**>(kNames), &text, &inputs, &lsbFirst))
+    if (!PyArg_ParseTupleAndKeywords(arguments, named, "O|OO:Equation", const_cast<char**>(kNames),
+                                     &text, &inputs, &lsbFirst))
         return nullptr;
     if (type != equationClass) {
         PyErr_SetString(PyExc_TypeError, "booleq.Equation is what is made, and nothing derived");
@@ -96,9 +95,9 @@ std::string Listed(const std::vector<std::string>& names)
 [[noreturn]] void RaiseUnknown(const Equation& equation, const py::handle& name)
 {
     const std::vector<std::string> inputs = equation.InputBytes();
-    throw py::type_error("there is no input " + Shown(name) +
-                         (inputs.empty() ? "; there are none"
-                                         : "; the inputs are " + Listed(inputs)));
+    throw py::type_error(
+        "there is no input " + Shown(name) +
+        (inputs.empty() ? "; there are none" : "; the inputs are " + Listed(inputs)));
 }
 
 // Values of inputs by name, as they are collected.

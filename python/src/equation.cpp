@@ -19,8 +19,8 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kLargeText = 2000;       // characters that take some ten microseconds
-constexpr size_t kEndlessText = 1000000; // those that take so long that somebody may not wait
+constexpr size_t kLargeText = 2000;     // characters that take some ten microseconds
+constexpr size_t kEndlessText = 200000; // those that take so long that somebody may not wait
 
 size_t Mix(size_t hash, size_t value)
 {
@@ -95,8 +95,7 @@ SharedContent Read(const std::string& bytes, const booleq::Reading& reading)
 {
     const booleq::NoMessages silence;
     const auto content = std::make_shared<Content>();
-    if (bytes.find('\0') != std::string::npos ||
-        !SetFromText(content->equation, bytes, reading))
+    if (bytes.find('\0') != std::string::npos || !SetFromText(content->equation, bytes, reading))
         return nullptr;
     return content;
 }
@@ -147,6 +146,11 @@ std::vector<std::string> Equation::InputBytes() const
 bool Equation::IsLargeText() const
 {
     return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kLargeText;
+}
+
+bool Equation::IsEndlessText() const
+{
+    return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kEndlessText;
 }
 
 unsigned int Equation::Evaluate(const std::vector<unsigned int>& values) const
@@ -237,7 +241,8 @@ py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool
     return Wrap({content, text, givenInputs, lsbFirst});
 }
 
-py::object MakeEquation(const py::object& text, const py::object& inputs, const py::object& lsbFirst)
+py::object MakeEquation(const py::object& text, const py::object& inputs,
+                        const py::object& lsbFirst)
 {
     const py::str plain = RequireStr(text, "text");
     const py::object given = inputs.is_none() ? inputs : RequireInputs(inputs);

@@ -56,6 +56,8 @@ class Equation {
     // Whether answers take longer than a switch of threads.
     bool IsLarge() const { return IsLargeText() || NumInputs() > 10; }
     bool IsLargeText() const;
+    // Whether the text is so long that reading or writing it takes longer than somebody waits.
+    bool IsEndlessText() const;
 
     // 0 or 1 for values of the inputs in their order, each 0 or 1.
     unsigned int Evaluate(const std::vector<unsigned int>& values) const;
@@ -84,7 +86,8 @@ py::tuple RequireInputs(const py::object& inputs);
 // Reads a text.  Fails: booleq.ParseError.
 py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool lsbFirst);
 // Takes arguments of any type.  Fails: TypeError, ValueError.
-py::object MakeEquation(const py::object& text, const py::object& inputs, const py::object& lsbFirst);
+py::object MakeEquation(const py::object& text, const py::object& inputs,
+                        const py::object& lsbFirst);
 // A new object of booleq.Equation.
 py::object Wrap(Equation equation);
 

@@ -18,6 +18,7 @@ constexpr std::chrono::milliseconds kBetweenChecks(10);
 
 thread_local PyThreadState* released = nullptr; // of a thread that has given up the lock
 thread_local Clock::time_point lastCheck;
+thread_local const std::atomic<bool>* abandoned = nullptr; // of a thread that runs beside
 
 std::atomic<unsigned long> mainThread{0};
 
@@ -69,6 +70,8 @@ void CheckSignals()
     if (now - lastCheck < kBetweenChecks)
         return;
     lastCheck = now;
+    if (abandoned && *abandoned)
+        throw Interrupted();
     if (PyThread_get_thread_ident() != mainThread)
         return; // only the main thread runs handlers
     if (released) {
@@ -89,19 +92,20 @@ void PrepareInterrupts()
     const py::object main = py::module_::import("threading").attr("main_thread")();
     mainThread = main.attr("ident").cast<unsigned long>();
     py::module_::import("atexit").attr("register")(py::cpp_function(&WaitForHelpers));
-    py::module_::import("os").attr("register_at_fork")(
-        py::arg("after_in_child") = py::cpp_function(&ForgetThreads));
+    py::module_::import("os").attr("register_at_fork")(py::arg("after_in_child") =
+                                                           py::cpp_function(&ForgetThreads));
     booleq::SetWatch(CheckSignals);
 }
 
-void StartBeside(std::function<void()> work)
+void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work)
 {
     Helpers& helpers = GetHelpers();
     {
         const std::lock_guard<std::mutex> guard(helpers.mutex);
         ++helpers.number;
     }
-    std::thread([work = std::move(work)]() mutable {
+    std::thread([isAbandoned, work = std::move(work)]() mutable {
+        abandoned = isAbandoned.get();
         work();
         work = nullptr; // what it holds goes before anybody thinks that it has ended
         Helpers& own = GetHelpers();

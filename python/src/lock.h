@@ -4,6 +4,7 @@
 #ifndef BOOLEQ_PYTHON_LOCK_H
 #define BOOLEQ_PYTHON_LOCK_H
 
+#include <atomic>
 #include <chrono>
 #include <functional>
 #include <future>
@@ -16,8 +17,8 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Work that takes no longer than this in nanoseconds, roughly, keeps the lock: giving it up may cost
-// a switch to another thread.
+// Work that takes no longer than this in nanoseconds, roughly, keeps the lock: giving it up may
+// cost a switch to another thread.
 constexpr double kShortWork = 20e3;
 
 // Gives up the lock while it lives.  Requires: this thread has it, and no other Unlocked.
@@ -30,8 +31,7 @@ class Unlocked {
 };
 
 // A handler raised; the exception waits in the thread's state.
-struct Interrupted {
-};
+struct Interrupted {};
 
 // Runs the handlers of signals that came, at most every few milliseconds: the watcher of logic/.
 // Does nothing on threads that Python does not know.
@@ -62,11 +62,13 @@ auto FreelyIf(bool isLong, const Work& work) -> decltype(work())
     return work();
 }
 
-// Starts a thread that the interpreter waits for when it ends.
-void StartBeside(std::function<void()> work);
+// Starts a thread that the interpreter waits for when it ends. Once 'isAbandoned' is set, what asks
+// the watcher on that thread ends by Interrupted.
+typedef std::shared_ptr<std::atomic<bool>> AbandonFlag;
+void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work);
 
-// Calls work that cannot be ended on a thread of its own. When a handler raises, nobody waits for
-// its result any more.
+// Calls work, parts of which cannot be ended, on a thread of its own. When a handler raises, nobody
+// waits for its result any more.
 // Requires: it has copies of, or shares, all that it uses.
 template <class Work>
 auto Beside(const Work& work) -> decltype(work())
@@ -74,12 +76,25 @@ auto Beside(const Work& work) -> decltype(work())
     typedef decltype(work()) Result;
     const auto task = std::make_shared<std::packaged_task<Result()>>(work);
     std::future<Result> result = task->get_future();
+    const auto isAbandoned = std::make_shared<std::atomic<bool>>(false);
     return Freely([&] {
-        StartBeside([task] { (*task)(); });
-        while (result.wait_for(std::chrono::milliseconds(20)) != std::future_status::ready)
-            CheckSignals();
+        StartBeside(isAbandoned, [task] { (*task)(); });
+        try {
+            while (result.wait_for(std::chrono::milliseconds(20)) != std::future_status::ready)
+                CheckSignals();
+        } catch (const Interrupted&) {
+            *isAbandoned = true;
+            throw;
+        }
         return result.get();
     });
+}
+
+// The one or the other, by how long the work's texts are.
+template <class Work>
+auto BesideIf(bool isEndless, const Work& work) -> decltype(work())
+{
+    return isEndless ? Beside(work) : Freely(work);
 }
 
 } // namespace booleq_python

@@ -225,12 +225,13 @@ py::tuple Describe(const py::buffer& tables, unsigned int numInputs, const py::o
     });
     py::list texts;
     for (const booleq::LutText& text : described.texts)
-        texts.append(py::make_tuple(
-            text.kind.empty() ? py::none() : py::object(Decode(text.kind)),
-            text.kind.empty() ? py::none() : py::object(Decode(text.name)),
-            text.shortForm.empty() ? py::none() : py::object(Decode(text.shortForm)),
-            text.numLiterals, text.isMinimal));
-    return py::make_tuple(ArrayOf(described.distinct.words), ArrayOf(described.distinct.firstPlaces),
+        texts.append(
+            py::make_tuple(text.kind.empty() ? py::none() : py::object(Decode(text.kind)),
+                           text.kind.empty() ? py::none() : py::object(Decode(text.name)),
+                           text.shortForm.empty() ? py::none() : py::object(Decode(text.shortForm)),
+                           text.numLiterals, text.isMinimal));
+    return py::make_tuple(ArrayOf(described.distinct.words),
+                          ArrayOf(described.distinct.firstPlaces),
                           ArrayOf(described.distinct.counts), ArrayOf(places), texts);
 }
 
@@ -277,8 +278,8 @@ void ReadText(const std::string& text, unsigned int numInputs, size_t place, uin
 void ReadNumber(const py::handle& value, unsigned int numInputs, size_t place, uint64_t* words)
 {
     if (!PyIndex_Check(value.ptr()))
-        throw py::type_error("values[" + std::to_string(place) + "] must be an int or a text, not " +
-                             TypeName(value));
+        throw py::type_error("values[" + std::to_string(place) +
+                             "] must be an int or a text, not " + TypeName(value));
     const auto number = py::reinterpret_steal<py::object>(PyNumber_Index(value.ptr()));
     if (!number)
         throw py::error_already_set();

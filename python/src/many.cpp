@@ -41,10 +41,7 @@ class Texts {
             Add(At(place), place);
     }
 
-    size_t Size() const
-    {
-        return static_cast<size_t>(PySequence_Fast_GET_SIZE(m_objects.ptr()));
-    }
+    size_t Size() const { return static_cast<size_t>(PySequence_Fast_GET_SIZE(m_objects.ptr())); }
     py::handle At(size_t place) const
     {
         return PySequence_Fast_GET_ITEM(m_objects.ptr(), static_cast<Py_ssize_t>(place));
@@ -101,8 +98,8 @@ bool Set(Kq_BoolEquation& equation, const char* text, const Terms& terms)
     if (!terms.reading.hasInputs)
         return equation.SetEquation(text);
     const std::string own = booleq::LibraryText(text, terms.reading);
-    return equation.SetEquationWithExplicitTerms(terms.names, own.c_str(),
-                                                 terms.reading.lsbFirst, false);
+    return equation.SetEquationWithExplicitTerms(terms.names, own.c_str(), terms.reading.lsbFirst,
+                                                 false);
 }
 
 // Calls set(place, equation) for each; gives back the first place where it was false, or 'size'.
@@ -138,8 +135,7 @@ py::list Give(std::vector<SharedContent>& contents, const Texts* texts, const py
         py::object text;
         if (texts)
             text = py::reinterpret_borrow<py::object>(texts->At(place));
-        equations[place] =
-            Wrap({std::move(contents[place]), std::move(text), given, lsbFirst});
+        equations[place] = Wrap({std::move(contents[place]), std::move(text), given, lsbFirst});
     }
     return equations;
 }

@@ -36,8 +36,8 @@ booleq::Sum Minimised(const booleq::Pla& table, const booleq::SumOptions& option
     return sum;
 }
 
-py::object MinimizeEquation(const py::object& self, const py::object& dontCare, const py::object& isExact,
-                            double seconds)
+py::object MinimizeEquation(const py::object& self, const py::object& dontCare,
+                            const py::object& isExact, double seconds)
 {
     const SharedContent content = Own(self).Shared();
     SharedContent free;

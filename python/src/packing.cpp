@@ -30,14 +30,13 @@ uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
     uint64_t word = 0;
     __m128i all = _mm_setzero_si128();
     for (unsigned int part = 0; part < 4; ++part) {
-        const __m128i values =
-            _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + 16 * part));
+        const __m128i values = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + 16 * part));
         all = _mm_or_si128(all, values);
         const auto bits = static_cast<uint32_t>(_mm_movemask_epi8(_mm_slli_epi16(values, 7)));
         word |= static_cast<uint64_t>(bits) << (16 * part);
     }
-    const __m128i above = _mm_cmpeq_epi8(_mm_andnot_si128(_mm_set1_epi8(1), all),
-                                         _mm_setzero_si128());
+    const __m128i above =
+        _mm_cmpeq_epi8(_mm_andnot_si128(_mm_set1_epi8(1), all), _mm_setzero_si128());
     seen = static_cast<uint8_t>(seen | (_mm_movemask_epi8(above) == 0xffff ? 0 : 2));
     return word;
 }
@@ -132,8 +131,8 @@ void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, ui
             _mm_unpacklo_epi8(eight[0], eight[2]), _mm_unpackhi_epi8(eight[0], eight[2]),
             _mm_unpacklo_epi8(eight[1], eight[3]), _mm_unpackhi_epi8(eight[1], eight[3])};
         for (unsigned int column = 0; column < 4; ++column)
-            pieces[4 * half + column] = static_cast<uint16_t>(
-                _mm_movemask_epi8(_mm_slli_epi16(columns[column], 7)));
+            pieces[4 * half + column] =
+                static_cast<uint16_t>(_mm_movemask_epi8(_mm_slli_epi16(columns[column], 7)));
     }
 }
 
@@ -159,8 +158,8 @@ class RowTurner {
             if (numRows < 16 || source + 15 * stride + 8 > m_end) {
                 std::memset(copy, 0, sizeof copy);
                 for (size_t row = 0; row < numRows; ++row)
-                    std::memcpy(copy + 8 * row,
-                                source + static_cast<std::ptrdiff_t>(row) * stride, numColumns);
+                    std::memcpy(copy + 8 * row, source + static_cast<std::ptrdiff_t>(row) * stride,
+                                numColumns);
                 source = copy;
                 stride = 8;
             }

@@ -53,7 +53,8 @@ py::object FindDifference(const py::object& self, const py::object& other, doubl
         throw py::type_error("other must be an Equation, a text, 0 or 1, not " + TypeName(other));
     const SharedContent left = Own(self).Shared();
     const SharedContent right = Own(converted).Shared();
-    return Differing(Freely([&] {
+    const bool isEndless = Own(self).IsEndlessText() || Own(converted).IsEndlessText();
+    return Differing(BesideIf(isEndless, [left, right, seconds] {
         return kq_logic::DecideEqual(left->equation, right->equation, LimitsOf(seconds));
     }));
 }
@@ -62,7 +63,7 @@ py::object FindDifference(const py::object& self, const py::object& other, doubl
 py::object FindOther(const py::object& self, bool value, double seconds)
 {
     const SharedContent content = Own(self).Shared();
-    return Differing(Freely([&] {
+    return Differing(BesideIf(Own(self).IsEndlessText(), [content, value, seconds] {
         return kq_logic::DecideConstant(content->equation, value, LimitsOf(seconds));
     }));
 }
@@ -94,9 +95,8 @@ std::vector<std::string> SupportOf(const Content& content)
     for (size_t input = 0; input < expression.names.size(); ++input) {
         if (isNamed.count(expression.names[input]) == 0)
             continue;
-        const booleq::Decision decision =
-            DecideEqual(Fixed(expression, input, false), Fixed(expression, input, true),
-                        booleq::Limits());
+        const booleq::Decision decision = DecideEqual(
+            Fixed(expression, input, false), Fixed(expression, input, true), booleq::Limits());
         if (decision.verdict == booleq::Verdict::Undecided)
             throw std::runtime_error("not decided: " + decision.reason);
         if (decision.IsDifferent())
@@ -137,8 +137,8 @@ py::tuple CountOnes(const py::object& self)
         for (size_t input = 0; input < substitutes.size(); ++input)
             substitutes[input].places = {places[input]};
         named.resize(named.size() - numIdle);
-        numOnes = booleq::NumOnes(
-            ToFunction(Substituted(expression, substitutes, named)).GetRows());
+        numOnes =
+            booleq::NumOnes(ToFunction(Substituted(expression, substitutes, named)).GetRows());
     });
     if (!fault.empty())
         throw py::value_error(fault);

@@ -169,7 +169,9 @@ py::object LintEquation(const py::object& self, double seconds)
     const std::string text = Encode(py::reinterpret_borrow<py::str>(equation.Text()));
     const booleq::Reading reading = equation.GetReading();
     const booleq::LintReport report =
-        Freely([&] { return booleq::Lint(text, content->equation, reading, {seconds}); });
+        BesideIf(equation.IsEndlessText(), [text, content, reading, seconds] {
+            return booleq::Lint(text, content->equation, reading, {seconds});
+        });
     py::list readers;
     for (const booleq::ForeignReading& read : report.readings)
         readers.append(ReadingOf(report, read));

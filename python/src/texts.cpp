@@ -56,15 +56,16 @@ py::str Render(const py::object& self, const py::object& syntax, const py::objec
                           "'; there are primary, alt1, alt2, alt3, expression");
 }
 
-// The text, unless the equation is another one once its blanks are what the library makes them: then
-// one with the parentheses that it needs.
+// The text, unless the equation is another one once its blanks are what the library makes them:
+// then one with the parentheses that it needs.
 std::string ReadableText(const Content& content, const std::string& text,
                          const booleq::Reading& reading)
 {
     const std::string typed = booleq::ToStd(content.equation.GetEquation(true));
     Kq_BoolEquation again;
     if (booleq::SetFromText(again, typed, reading) && again == content.equation)
-        return text.size() > 2 && text[0] == '0' ? "(" + text + ")" : text; // or it is an init value
+        return text.size() > 2 && text[0] == '0' ? "(" + text + ")"
+                                                 : text; // or it is an init value
     return WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::AsTyped,
                     booleq::Parentheses::Clear);
 }
@@ -240,7 +241,7 @@ py::object ConvertEquation(const py::object& self, const py::object& to, const p
     const std::string target = Encode(RequireStr(to, "to"));
     const std::string name = Encode(RequireStr(unit, "name"));
     const Kq_BoolEquation converted = isShort ? Shortened(equation) : content->equation;
-    const auto conversion = Freely([&] {
+    const auto conversion = BesideIf(equation.IsEndlessText(), [converted, target, name, seconds] {
         kq_logic::Limits limits;
         limits.seconds = seconds;
         return kq_logic::Convert(converted, target, name, limits);

@@ -71,14 +71,15 @@ def bench_luts(repeats: int) -> None:
     few = LutArray(generator.choice(luts.words[:1000], NUM_LUTS), 6)
     orders = np.argsort(generator.random((NUM_LUTS, 6)), axis=1).astype(np.uint8)
     names = list("abcdef")
-    for what, work in [
+    works: List[Any] = [
             ("`permute`, one order", lambda: luts.permute([3, 1, 5, 0, 2, 4])),
             ("`permute`, an order each", lambda: luts.permute(orders)),
             ("`support`", luts.support), ("`count_ones`", luts.count_ones),
             ("`unique`, all different", luts.unique),
             ("`canonical`, random tables", luts.canonical),
             ("`explain`, 1,000 distinct functions", lambda: few.explain(names)),
-            ("`equations`", lambda: luts.equations(names))]:
+            ("`equations`", lambda: luts.equations(names))]
+    for what, work in works:
         print(f"| {what} | {shown(seconds(work, repeats))} |")
 
 

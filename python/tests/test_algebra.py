@@ -207,8 +207,9 @@ def test_sympy_and_back(equation: Equation) -> None:
 
 def test_other_operators_of_sympy() -> None:
     a, b, c = sympy.symbols("a b c")
-    for expression in (sympy.Implies(a, b), sympy.Equivalent(a, b, c), sympy.ITE(a, b, c),
-                       sympy.Nand(a, b), sympy.Nor(a, b, c), sympy.true, sympy.Xor(a, b, c)):
+    expressions: Any = (sympy.Implies(a, b), sympy.Equivalent(a, b, c), sympy.ITE(a, b, c),
+                       sympy.Nand(a, b), sympy.Nor(a, b, c), sympy.true, sympy.Xor(a, b, c))
+    for expression in expressions:
         equation = Equation.from_sympy(expression)
         for row in rows_of(["a", "b", "c"]):
             there = expression.subs({sympy.Symbol(name): bool(bit) for name, bit in row.items()})

@@ -197,7 +197,7 @@ def test_match(equation: Equation, data: st.DataObject) -> None:
 @examples(60)
 @given(equations(max_inputs=4))
 def test_sympy_and_back(equation: Equation) -> None:
-    expression = equation.to_sympy()
+    expression: Any = equation.to_sympy()
     again = Equation.from_sympy(expression)
     assert again.equivalent(equation)
     for row in rows_of(list(equation.inputs)):

@@ -1,0 +1,382 @@
+#include "cause.h"
+
+#include <algorithm>
+#include <cassert>
+#include <functional>
+
+#include "function.h"
+#include "match.h"
+#include "text.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr unsigned int kDigitRows = 4; // of a hexadecimal digit
+
+// What may happen to an init value, and what undoes it.
+struct Fault {
+    CauseCode code;
+    std::string detail;
+    std::function<Rows(const Rows&)> apply;
+    std::function<Rows(const Rows&)> undo; // empty where something is lost
+    int input = -1; // of the pins, that it is about
+};
+
+// A fault that changes where rows stand: row k comes from row source(k); kNoRow gives a 0.
+Rows MoveRows(const Rows& rows, const std::function<uint64_t(uint64_t)>& source)
+{
+    Rows moved(rows.NumInputs());
+    for (uint64_t row = 0; row < rows.NumRows(); ++row) {
+        const uint64_t from = source(row);
+        if (from != Rows::kNoRow && rows.At(from))
+            moved.Set(row, true);
+    }
+    return moved;
+}
+
+Rows ShiftUp(const Rows& rows, uint64_t distance)
+{
+    return MoveRows(rows,
+                    [=](uint64_t row) { return row < distance ? Rows::kNoRow : row - distance; });
+}
+
+Rows ShiftDown(const Rows& rows, uint64_t distance)
+{
+    const uint64_t numRows = rows.NumRows();
+    return MoveRows(rows, [=](uint64_t row) {
+        return row + distance < numRows ? row + distance : Rows::kNoRow;
+    });
+}
+
+Rows RotateUp(const Rows& rows, uint64_t distance)
+{
+    const uint64_t numRows = rows.NumRows();
+    return MoveRows(rows, [=](uint64_t row) { return (row + numRows - distance) % numRows; });
+}
+
+Rows DropFirst(const Rows& rows, uint64_t numKept)
+{
+    return MoveRows(rows, [=](uint64_t row) { return row < numKept ? row : Rows::kNoRow; });
+}
+
+// Groups of so many rows, the last group first.
+Rows ReverseGroups(const Rows& rows, uint64_t group)
+{
+    const uint64_t numGroups = rows.NumRows() / group;
+    return MoveRows(
+        rows, [=](uint64_t row) { return (numGroups - 1 - row / group) * group + row % group; });
+}
+
+Rows ReverseInputs(const Rows& rows)
+{
+    std::vector<unsigned int> order(rows.NumInputs());
+    for (unsigned int input = 0; input < order.size(); ++input)
+        order[input] = static_cast<unsigned int>(order.size()) - 1 - input;
+    return PermuteInputs(rows, order);
+}
+
+void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun, std::vector<Fault>& faults)
+{
+    const uint64_t numDigits = numRows / digit;
+    for (uint64_t count = 1; count < numDigits; ++count) {
+        const uint64_t distance = count * digit;
+        const std::string by = Count(count, noun);
+        faults.push_back({CauseCode::DigitsShifted, by + " to the left, zeros put in",
+                          [=](const Rows& rows) { return ShiftUp(rows, distance); }, nullptr});
+        faults.push_back({CauseCode::DigitsShifted, by + " to the right, zeros put in",
+                          [=](const Rows& rows) { return ShiftDown(rows, distance); }, nullptr});
+        // Half way round is the exchange of halves.
+        if (2 * distance != numRows)
+            faults.push_back(
+                {CauseCode::DigitsRotated, by + " to the left",
+                 [=](const Rows& rows) { return RotateUp(rows, distance); },
+                 [=](const Rows& rows) { return RotateUp(rows, numRows - distance); }});
+        faults.push_back({CauseCode::DigitsLost, "the first " + by + (count == 1 ? " is" : " are") +
+                                                     " lost, zeros in place of " +
+                                                     (count == 1 ? "it" : "them"),
+                          [=](const Rows& rows) { return DropFirst(rows, numRows - distance); },
+                          nullptr});
+    }
+    if (numDigits > 1) {
+        const auto reverse = [=](const Rows& rows) { return ReverseGroups(rows, digit); };
+        faults.push_back({CauseCode::DigitsReversed,
+                          std::string(noun) + "s, the last one first", reverse, reverse});
+    }
+}
+
+// Those that happen to the init value alone.
+std::vector<Fault> InitFaults(unsigned int numInputs)
+{
+    const uint64_t numRows = uint64_t(1) << numInputs;
+    const auto invert = [](const Rows& rows) { return ~rows; };
+    std::vector<Fault> faults = {{CauseCode::OutputInverted, "", invert, invert}};
+    if (numInputs > 2)
+        faults.push_back({CauseCode::BitOrder,
+                          "the first pin counts most in the one, least in the other", ReverseInputs,
+                          ReverseInputs});
+    for (unsigned int input = 0; input < numInputs; ++input) {
+        const auto turn = [=](const Rows& rows) { return InvertInput(rows, input); };
+        faults.push_back({input == 0 ? CauseCode::HalvesExchanged : CauseCode::InputInverted, "",
+                          turn, turn, static_cast<int>(input)});
+    }
+    constexpr uint64_t kMaxDigits = 64;
+    if (numRows >= 2 * kDigitRows && numRows / kDigitRows <= kMaxDigits)
+        AddDigitFaults(numRows, kDigitRows, "hexadecimal digit", faults);
+    if (numRows >= 4 * kDigitRows) {
+        const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, 2 * kDigitRows); };
+        faults.push_back({CauseCode::DigitsReversed, "bytes, the last one first", reverse, reverse});
+    }
+    if (numRows <= kMaxDigits)
+        AddDigitFaults(numRows, 1, "binary digit", faults);
+    return faults;
+}
+
+class CauseFinder {
+  public:
+    CauseFinder(const PinFunction& left, const PinFunction& right)
+        : m_left(left), m_right(right), m_left_function(Normalise(left)),
+          m_right_function(Normalise(right))
+    {
+        assert(m_left_function != m_right_function);
+        m_has_expected = RightRows(m_left_function, m_right, m_expected);
+    }
+
+    std::vector<Cause> Run()
+    {
+        FindInitFaults();
+        FindSwappedPins();
+        FindChangedDigit();
+        FindOtherNet();
+        FindStuckInput();
+        std::stable_sort(m_causes.begin(), m_causes.end(),
+                         [](const Cause& left, const Cause& right) {
+                             return left.code < right.code;
+                         });
+        return std::move(m_causes);
+    }
+
+  private:
+    // One of a kind is enough: a shift by a hexadecimal digit is one by four binary ones.
+    bool IsKnown(CauseCode code) const
+    {
+        return std::any_of(m_causes.begin(), m_causes.end(),
+                           [code](const Cause& cause) { return cause.code == code; });
+    }
+
+    // Done to the left table's init value it gives the right one's function.
+    bool LeadsToRight(const Fault& fault) const
+    {
+        return Normalise({fault.apply(m_left.rows), m_left.nets}) == m_right_function;
+    }
+
+    // Undone of the right table's init value, or done to the one that it should have.
+    bool LeadsFromRight(const Fault& fault) const
+    {
+        if (fault.undo && Normalise({fault.undo(m_right.rows), m_right.nets}) == m_left_function)
+            return true;
+        return m_has_expected && fault.apply(m_expected) == m_right.rows;
+    }
+
+    void AddInitFault(const Fault& fault, const PinFunction& pins)
+    {
+        Cause cause = {fault.code, {}, fault.detail};
+        if (fault.input >= 0)
+            cause.nets.push_back(pins.nets[static_cast<size_t>(fault.input)]);
+        m_causes.push_back(std::move(cause));
+    }
+
+    // By the right table's pins first: it is the one that is looked at.
+    void FindInitFaults()
+    {
+        for (const Fault& fault : InitFaults(m_right.rows.NumInputs()))
+            if (!IsKnown(fault.code) && LeadsFromRight(fault))
+                AddInitFault(fault, m_right);
+        for (const Fault& fault : InitFaults(m_left.rows.NumInputs()))
+            if (!IsKnown(fault.code) && LeadsToRight(fault))
+                AddInitFault(fault, m_left);
+    }
+
+    void FindSwappedPins()
+    {
+        const std::vector<NetId>& nets = m_left_function.nets;
+        if (nets != m_right_function.nets)
+            return;
+        const auto count = static_cast<unsigned int>(nets.size());
+        for (unsigned int first = 0; first < count; ++first)
+            for (unsigned int second = first + 1; second < count; ++second)
+                if (SwapInputs(m_left_function.rows, first, second) == m_right_function.rows) {
+                    AddSwap({nets[first], nets[second]}, {nets[second], nets[first]});
+                    return;
+                }
+        FindPermutedPins();
+    }
+
+    void FindPermutedPins()
+    {
+        const std::vector<NetId>& nets = m_left_function.nets;
+        if (nets.size() < 3 || nets.size() > kMaxMatchInputs)
+            return;
+        std::vector<std::string> names; // any: places are what counts
+        for (size_t place = 0; place < nets.size(); ++place)
+            names.push_back("n" + std::to_string(place));
+        constexpr double kSeconds = 1; // of one table; hard ones stay without this cause
+        const Function left(names, m_left_function.rows);
+        const Matching matching =
+            Match(left, Function(names, m_right_function.rows), false, kSeconds);
+        if (!matching.isFound)
+            return;
+        std::vector<NetId> taken;
+        std::vector<NetId> takenFor;
+        for (size_t place = 0; place < nets.size(); ++place) {
+            const NetId source = nets[matching.sources[place]];
+            if (source == nets[place])
+                continue;
+            taken.push_back(source);
+            takenFor.push_back(nets[place]);
+        }
+        AddSwap(taken, takenFor);
+    }
+
+    void AddSwap(std::vector<NetId> nets, const std::vector<NetId>& takenFor)
+    {
+        nets.insert(nets.end(), takenFor.begin(), takenFor.end());
+        const bool isSameInit = m_left.rows == m_right.rows && m_left.nets != m_right.nets;
+        m_causes.push_back({CauseCode::PinsSwapped, std::move(nets),
+                            isSameInit ? "the init value is the same, the order of pins is not"
+                                       : ""});
+    }
+
+    void FindChangedDigit()
+    {
+        if (!m_has_expected)
+            return;
+        const Rows changed = m_expected ^ m_right.rows;
+        const uint64_t numRows = changed.NumRows();
+        const uint64_t first = FirstDifference(changed, ConstantRows(changed.NumInputs(), false));
+        if (first == Rows::kNoRow)
+            return;
+        const uint64_t digit = first / kDigitRows;
+        const uint64_t inDigit = numRows <= kDigitRows ? numRows : kDigitRows;
+        uint64_t numChanged = 0;
+        for (uint64_t place = 0; place < inDigit; ++place)
+            numChanged += changed.At(digit * kDigitRows + place) ? 1 : 0;
+        if (numChanged != NumOnes(changed))
+            return;
+        const bool isBinary = numChanged == 1;
+        m_causes.push_back({CauseCode::DigitChanged, {},
+                            isBinary ? "binary digit " + std::to_string(first) + ", from the right"
+                                     : "hexadecimal digit " + std::to_string(digit) +
+                                           ", from the right"});
+    }
+
+    void FindOtherNet()
+    {
+        std::vector<NetId> gone;
+        std::vector<NetId> come;
+        std::set_difference(m_left_function.nets.begin(), m_left_function.nets.end(),
+                            m_right_function.nets.begin(), m_right_function.nets.end(),
+                            std::back_inserter(gone));
+        std::set_difference(m_right_function.nets.begin(), m_right_function.nets.end(),
+                            m_left_function.nets.begin(), m_left_function.nets.end(),
+                            std::back_inserter(come));
+        if (gone.size() != 1 || come.size() > 1)
+            return;
+        const std::vector<NetId>& candidates = come.empty() ? m_right_function.nets : come;
+        for (const NetId net : candidates) {
+            if (Replace(m_left_function, gone.front(), net) != m_right_function)
+                continue;
+            m_causes.push_back({CauseCode::OtherNet, {gone.front(), net}, ""});
+            return;
+        }
+    }
+
+    void FindStuckInput()
+    {
+        for (const NetId net : m_left_function.nets)
+            for (const bool value : {false, true})
+                if (Fix(m_left_function, net, value) == m_right_function) {
+                    m_causes.push_back({CauseCode::InputStuck, {net}, value ? "1" : "0"});
+                    return;
+                }
+    }
+
+    const PinFunction& m_left;
+    const PinFunction& m_right;
+    NetFunction m_left_function;
+    NetFunction m_right_function;
+    Rows m_expected; // the right one's init value, had it the left one's function
+    bool m_has_expected = false;
+    std::vector<Cause> m_causes;
+};
+
+} // namespace
+
+const char* CauseWord(CauseCode code)
+{
+    switch (code) {
+    case CauseCode::OutputInverted:
+        return "output-inverted";
+    case CauseCode::PinsSwapped:
+        return "pins-swapped";
+    case CauseCode::BitOrder:
+        return "bit-order";
+    case CauseCode::HalvesExchanged:
+        return "halves-exchanged";
+    case CauseCode::InputInverted:
+        return "input-inverted";
+    case CauseCode::DigitsShifted:
+        return "digits-shifted";
+    case CauseCode::DigitsRotated:
+        return "digits-rotated";
+    case CauseCode::DigitsLost:
+        return "digits-lost";
+    case CauseCode::DigitsReversed:
+        return "digits-reversed";
+    case CauseCode::DigitChanged:
+        return "digit-changed";
+    case CauseCode::OtherNet:
+        return "other-net";
+    case CauseCode::InputStuck:
+        return "input-stuck";
+    case CauseCode::OutputMoved:
+        return "output-moved";
+    }
+    return "";
+}
+
+std::vector<Cause> FindCauses(const PinFunction& left, const PinFunction& right)
+{
+    return CauseFinder(left, right).Run();
+}
+
+bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows)
+{
+    // Over all pins, then each net of the function by the first pin that has it.
+    const auto numPins = static_cast<unsigned int>(right.nets.size());
+    std::vector<unsigned int> pinOf;
+    for (const NetId net : left.nets) {
+        const auto found = std::find(right.nets.begin(), right.nets.end(), net);
+        if (found == right.nets.end())
+            return false;
+        pinOf.push_back(static_cast<unsigned int>(found - right.nets.begin()));
+    }
+    Rows result = left.rows;
+    std::vector<unsigned int> order = pinOf; // widened inputs come in front
+    std::vector<unsigned int> others;
+    for (unsigned int pin = 0; pin < numPins; ++pin)
+        if (std::find(pinOf.begin(), pinOf.end(), pin) == pinOf.end())
+            others.push_back(pin);
+    for (size_t count = 0; count < others.size(); ++count)
+        result = Widen(result);
+    order.insert(order.begin(), others.begin(), others.end());
+    // Input k of the result is the one of 'result' that stands for pin k.
+    std::vector<unsigned int> places(numPins);
+    for (unsigned int place = 0; place < numPins; ++place)
+        places[order[place]] = place;
+    rows = PermuteInputs(std::move(result), places);
+    assert(Normalise({rows, right.nets}).rows == left.rows);
+    return true;
+}
+
+} // namespace booleq

@@ -79,17 +79,20 @@ uint64_t HashOf(const NetFunction& function)
 
 class Inspector {
   public:
-    Inspector(const Design& design, const std::function<void(const TableFinding&)>& take)
+    Inspector(const Design& design, const FindingTaker& take)
         : m_design(design), m_take(take), m_functions(design)
     {
     }
 
     uint64_t Run()
     {
-        for (const ReadFinding& finding : m_design.findings)
+        for (const ReadFinding& finding : m_design.findings) {
+            if (m_is_over)
+                break;
             Take(static_cast<size_t>(finding.code), finding.line, finding.path,
                  finding.text.empty() ? CodeSentence(finding.code) : finding.text);
-        for (uint32_t table = 0; table < m_design.tables.size(); ++table) {
+        }
+        for (uint32_t table = 0; table < m_design.tables.size() && !m_is_over; ++table) {
             if (table % kWatchedTables == 0)
                 Watch();
             Look(table);
@@ -101,8 +104,10 @@ class Inspector {
     void Take(size_t rule, uint32_t line, const std::string& path, const std::string& text)
     {
         assert(rule < FindingRules().size());
+        if (m_is_over)
+            return;
         ++m_num_findings;
-        m_take({rule, line, path, text});
+        m_is_over = !m_take({rule, line, path, text});
     }
 
     void TakeOf(uint32_t table, TableRule rule, const std::string& text)
@@ -142,11 +147,12 @@ class Inspector {
     }
 
     const Design& m_design;
-    const std::function<void(const TableFinding&)>& m_take;
+    const FindingTaker& m_take;
     TableFunctions m_functions;
     TableFunctions::Found m_found;
     std::unordered_map<uint64_t, uint32_t> m_firsts; // tables, by hash of their function
     uint64_t m_num_findings = 0;
+    bool m_is_over = false;
 };
 
 } // namespace
@@ -157,7 +163,7 @@ const std::vector<FindingRule>& FindingRules()
     return rules;
 }
 
-uint64_t FindFindings(const Design& design, const std::function<void(const TableFinding&)>& take)
+uint64_t FindFindings(const Design& design, const FindingTaker& take)
 {
     return Inspector(design, take).Run();
 }

@@ -30,10 +30,12 @@ struct TableFinding {
     std::string text; // a sentence without a full stop
 };
 
+// Takes a finding; false ends the search.
+typedef std::function<bool(const TableFinding&)> FindingTaker;
+
 // Calls 'take' for each finding: the reader's, then the others in the order of tables.
-// Gives back how many there were.
-uint64_t FindFindings(const Design& design,
-                      const std::function<void(const TableFinding&)>& take);
+// Gives back how many it was called for.
+uint64_t FindFindings(const Design& design, const FindingTaker& take);
 
 } // namespace booleq
 

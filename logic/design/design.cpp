@@ -26,6 +26,7 @@ constexpr CodeText kCodeTexts[] = {
     {"pin-strange", "the cell's type has no such pin; the cell is not read"},
     {"pin-twice", "a pin is connected twice; the first one counts"},
     {"too-wide", "the table has more than 16 inputs; the cell is not read"},
+    {"mode-unread", "in this mode the cell is more than logic; it is not read"},
     {"cover-mixed", "rows of 0 and of 1 stand in one table; it is not read"},
     {"driver-twice", "the net has a second driver"},
     {"module-unused", "the module is not below the top; it is not read"},

@@ -101,6 +101,7 @@ enum class FindingCode {
     PinStrange,     // a pin that the cell type does not have; the cell is not read
     PinTwice,       // a pin connected twice; the first one counts
     TooWide,        // more than kMaxTableInputs inputs; the cell is not read
+    ModeUnread,     // a parameter makes the cell more than logic; it is not read
     CoverMixed,     // rows of 0 and of 1 in one table; the cell is not read
     DriverTwice,    // a net with a second driver
     ModuleUnused,   // a module with tables that is not below the top; not read
@@ -112,9 +113,9 @@ enum class FindingCode {
 // What a reader has to say about a file that it could read.
 struct ReadFinding {
     FindingCode code;
-    uint32_t line = 0; // 0: the path tells where
+    uint32_t line = 0; // 0: the name tells where
     uint32_t table = kNoTable;
-    std::string path; // of the cell or net
+    ScopedName name;  // of the cell, net or module
     std::string text; // what is wrong, where the code alone does not say it
 
     static constexpr uint32_t kNoTable = UINT32_MAX;

@@ -6,6 +6,7 @@
 #define BOOLEQ_DESIGN_READ_DESIGN_H
 
 #include <string>
+#include <string_view>
 
 #include "cell_types.h"
 #include "design.h"
@@ -20,6 +21,8 @@ struct ReadOptions {
     void (*progress)(void* context, uint64_t numBytesDone, uint64_t numBytes) = nullptr;
     void* progressContext = nullptr;
     double yosysSeconds = 600; // after which yosys is ended
+    // Tables, nets and instances with the hierarchy laid out; a small file can ask for any number.
+    uint64_t maxItems = uint64_t(1) << 26;
 };
 
 // 'file' may be "-", which is standard input.
@@ -27,7 +30,7 @@ bool ReadDesign(const std::string& file, const ReadOptions& options, Design& des
                 std::string& fault);
 
 // A text that is in memory; 'name' stands for the file in messages. Verilog goes to yosys, too.
-bool ReadDesignText(std::string text, const std::string& name, const ReadOptions& options,
+bool ReadDesignText(std::string_view text, const std::string& name, const ReadOptions& options,
                     Design& design, std::string& fault);
 
 } // namespace booleq

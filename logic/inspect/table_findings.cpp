@@ -38,6 +38,7 @@ Severity SeverityOf(FindingCode code)
     case FindingCode::PinOpen:
     case FindingCode::PinUnknown:
     case FindingCode::TooWide:
+    case FindingCode::ModeUnread:
     case FindingCode::ModuleUnused:
     case FindingCode::NumFindingCodes:
         break;
@@ -89,7 +90,7 @@ class Inspector {
         for (const ReadFinding& finding : m_design.findings) {
             if (m_is_over)
                 break;
-            Take(static_cast<size_t>(finding.code), finding.line, finding.path,
+            Take(static_cast<size_t>(finding.code), finding.line, Path(m_design, finding.name),
                  finding.text.empty() ? CodeSentence(finding.code) : finding.text);
         }
         for (uint32_t table = 0; table < m_design.tables.size() && !m_is_over; ++table) {

@@ -56,8 +56,10 @@ Format Recognise(std::string_view text)
 
 void ReadSource(const SourceText& source, const ReadOptions& options, Design& design)
 {
-    static constexpr FormatRow kFormats[] = {
-        {"Yosys JSON", ReadYosysJson}, {"BLIF", nullptr}, {"EDIF", nullptr}, {"Verilog", nullptr}};
+    static constexpr FormatRow kFormats[] = {{"Yosys JSON", ReadYosysJson},
+                                             {"BLIF", ReadBlifNetlist},
+                                             {"EDIF", nullptr},
+                                             {"Verilog", nullptr}};
     const Format format = Recognise(source.Text());
     const FormatRow& row = kFormats[static_cast<size_t>(format)];
     design.format = row.name;

@@ -226,7 +226,13 @@ class BlifNetlistReader {
         if (m_words.size() != 3)
             Refuse(".conn has two nets");
         const LocalNet from = NetOf(m_words[1]);
-        const LocalNet to = NetOf(m_words[2]);
+        Connect(from, NetOf(m_words[2]));
+    }
+
+    // Deliberate: a buffer without a name is how BLIF says that two signals are one, and a netlist
+    // in another format has no cell there.
+    void Connect(LocalNet from, LocalNet to)
+    {
         if (from != kNetUnknown && to != kNetUnknown)
             m_module->joins.emplace_back(from, to);
     }
@@ -245,7 +251,8 @@ class BlifNetlistReader {
         m_output_name = m_words.back();
         m_rows_are = Rows01::None;
         m_num_pins = static_cast<unsigned int>(std::min<size_t>(m_inputs.size(), UINT32_MAX));
-        m_is_named = false;
+        m_is_named = m_is_wire = false;
+        m_num_rows = 0;
         if (m_num_pins <= kMaxTableInputs)
             m_words_of_rows.assign(NumWords(m_num_pins), 0);
     }
@@ -262,6 +269,8 @@ class BlifNetlistReader {
             Refuse("the value of a row is 0 or 1, not " + Quoted(value));
         if (pattern.find_first_not_of("01-") != std::string_view::npos)
             Refuse("a row has 0, 1 and -, not " + Quoted(pattern));
+        ++m_num_rows;
+        m_is_wire = pattern == "1" && value == "1";
         const Rows01 kind = value == "1" ? Rows01::Ones : Rows01::Zeros;
         m_rows_are = m_rows_are == Rows01::None || m_rows_are == kind ? kind : Rows01::Mixed;
         if (m_num_pins <= kMaxTableInputs)
@@ -290,6 +299,10 @@ class BlifNetlistReader {
     {
         if (m_num_pins == 0 && m_rows_are != Rows01::Mixed) {
             FlushConstant();
+            return;
+        }
+        if (m_num_pins == 1 && m_num_rows == 1 && m_is_wire && !m_is_named) {
+            Connect(m_inputs[0], NetOf(m_output_name));
             return;
         }
         const LocalNet output = NetOf(m_output_name);
@@ -427,7 +440,9 @@ class BlifNetlistReader {
     std::vector<uint64_t> m_words_of_rows;
     unsigned int m_num_pins = 0;
     Rows01 m_rows_are = Rows01::None;
+    uint64_t m_num_rows = 0;
     bool m_is_named = false;
+    bool m_is_wire = false; // its row says that the output is the input
 };
 
 } // namespace

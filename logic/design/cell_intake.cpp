@@ -104,6 +104,11 @@ uint32_t CellIntake::DesignTypeOf(KnownType& known, size_t variant)
     if (designType != kNoType)
         return designType;
     const CellType& type = m_cell_types.All()[(*known.variants)[variant]];
+    // A constant has one type in the design, whatever its pin.
+    for (size_t other = 0; type.kind == CellKind::Constant && other < known.designTypes.size();
+         ++other)
+        if (known.designTypes[other] != kNoType)
+            return designType = known.designTypes[other];
     const CellRole role = type.kind == CellKind::Table      ? CellRole::Table
                           : type.kind == CellKind::Constant ? CellRole::Constant
                                                             : CellRole::Unread;

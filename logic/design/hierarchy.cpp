@@ -39,6 +39,7 @@ class Layout {
         ReportUnused();
         m_modules.clear();
         m_joiner.Apply(m_design);
+        NameByOutputs();
         CheckDrivers();
         CheckNames();
         if (!m_options.hasKeys)
@@ -292,6 +293,14 @@ class Layout {
             finding.name = {0, content.name};
             m_design.findings.push_back(std::move(finding));
         }
+    }
+
+    // Of tables without a name, that which their net shows now.
+    void NameByOutputs()
+    {
+        for (DesignTable& table : m_design.tables)
+            if (table.isNamedByOutput && table.output >= kNumFixedNets)
+                table.name = m_design.nets[table.output];
     }
 
     void AddPorts(const Frame& frame)

@@ -104,6 +104,11 @@ uint32_t CellIntake::DesignTypeOf(KnownType& known, size_t variant)
     if (designType != kNoType)
         return designType;
     const CellType& type = m_cell_types.All()[(*known.variants)[variant]];
+    // A constant has one type in the design, whatever its pin.
+    for (size_t other = 0; type.kind == CellKind::Constant && other < known.designTypes.size();
+         ++other)
+        if (known.designTypes[other] != kNoType)
+            return designType = known.designTypes[other];
     const CellRole role = type.kind == CellKind::Table      ? CellRole::Table
                           : type.kind == CellKind::Constant ? CellRole::Constant
                                                             : CellRole::Unread;
@@ -272,18 +277,22 @@ void CellIntake::EndVectorTable(const CellType& type, uint32_t designType)
     Count(designType);
 }
 
-bool CellIntake::IsConditionMet(const CellStep& step) const
+bool CellIntake::IsMet(const CellCondition& condition) const
 {
-    if (step.conditionName.empty())
-        return true;
-    const CellValue* value = FindValue(step.conditionName);
+    const CellValue* value = FindValue(condition.parameter);
     if (value == nullptr)
-        return step.isConditionInitial;
-    if (!value->isNumber && value->text == step.conditionValue)
+        return condition.isInitial;
+    if (!value->isNumber && value->text == condition.value)
         return true;
     InitDigits wanted;
-    return ReadInitDigits(step.conditionValue, BareDigits::Decimal, 64, wanted) &&
+    return ReadInitDigits(condition.value, BareDigits::Decimal, 64, wanted) &&
            IsNumber(*value, wanted.words[0]);
+}
+
+bool CellIntake::AreConditionsMet(const CellStep& step) const
+{
+    return std::all_of(step.conditions.begin(), step.conditions.end(),
+                       [this](const CellCondition& condition) { return IsMet(condition); });
 }
 
 // The value of a parameter, as many bits as the table has rows.  Fails: false, with a finding.
@@ -331,7 +340,7 @@ bool CellIntake::AddOutputs(uint32_t cellType, uint32_t designType)
     const ComposedTable* first = nullptr;
     bool isAny = false;
     for (const ComposedTable& output : m_outputs[cellType]) {
-        if (!IsConditionMet(output.Step()))
+        if (!AreConditionsMet(output.Step()))
             continue;
         if (first == nullptr)
             first = &output;
@@ -386,7 +395,8 @@ void CellIntake::PushTable(uint32_t designType, size_t outputPin, LocalNet outpu
     if (m_module->inputs.size() > UINT32_MAX - kMaxTableInputs)
         throw ReadFault{"more than 2^32 inputs of tables"};
     DesignTable table;
-    table.name.name = m_name;
+    table.isNamedByOutput = m_name == 0;
+    table.name.name = m_name != 0 ? m_name : m_module->netNames[output];
     table.type = designType;
     table.init = init;
     table.firstInput = static_cast<uint32_t>(m_module->inputs.size());
@@ -400,8 +410,7 @@ void CellIntake::PushTable(uint32_t designType, size_t outputPin, LocalNet outpu
     PlaceFindings(static_cast<uint32_t>(m_module->tables.size() - 1));
 }
 
-void CellIntake::EndWithRows(const Rows& rows, const std::vector<LocalNet>& inputs, LocalNet output,
-                             bool isNamedByOutput)
+void CellIntake::EndWithRows(const Rows& rows, const std::vector<LocalNet>& inputs, LocalNet output)
 {
     assert(rows.NumInputs() == inputs.size());
     KnownType& known = Known(m_type);
@@ -410,7 +419,6 @@ void CellIntake::EndWithRows(const Rows& rows, const std::vector<LocalNet>& inpu
     m_inputs = inputs;
     PushTable(known.designTypes[0], 0, output,
               m_inits.Add(rows.NumInputs(), rows.Words(), nullptr));
-    m_module->tables.back().isNamedByOutput = isNamedByOutput;
     Count(known.designTypes[0]);
 }
 
@@ -423,8 +431,15 @@ void CellIntake::EndUnread(FindingCode code, const std::string& text)
     EndUnreadOf(known.designTypes[0]);
 }
 
+// A cell without a name gets one by its line; a table, that of its output.
+NameId CellIntake::NameOrLine()
+{
+    return m_name != 0 ? m_name : m_design.names.Add("$line" + std::to_string(m_line));
+}
+
 void CellIntake::EndUnreadOf(uint32_t designType)
 {
+    m_name = NameOrLine();
     m_module->unread.push_back({{0, m_name}, designType});
     PlaceFindings(ReadFinding::kNoTable);
     Count(designType);
@@ -433,7 +448,7 @@ void CellIntake::EndUnreadOf(uint32_t designType)
 void CellIntake::EndPending()
 {
     PendingCell cell;
-    cell.name = m_name;
+    cell.name = NameOrLine();
     cell.type = m_design.names.Add(m_type);
     cell.firstPin = static_cast<uint32_t>(m_module->pins.size());
     cell.numPins = static_cast<uint32_t>(m_pins.size());

@@ -32,6 +32,7 @@ class CellIntake {
     // Cells are of this module from now on.
     void EnterModule(ModuleContent& module) { m_module = &module; }
 
+    // 0 is no name.
     void Begin(NameId name, uint32_t line);
     void SetType(std::string_view type) { m_type = type; }
     void SetName(NameId name) { m_name = name; }
@@ -43,8 +44,7 @@ class CellIntake {
 
     // The cell, between Begin and End, is a table whose rows the format itself says.
     // The inputs are from the least significant, as in an init value.
-    void EndWithRows(const Rows& rows, const std::vector<LocalNet>& inputs, LocalNet output,
-                     bool isNamedByOutput);
+    void EndWithRows(const Rows& rows, const std::vector<LocalNet>& inputs, LocalNet output);
     // It cannot be read, for that reason.
     void EndUnread(FindingCode code, const std::string& text);
 
@@ -79,8 +79,10 @@ class CellIntake {
     bool AddOutputs(uint32_t cellType, uint32_t designType);
     void EndVectorTable(const CellType& type, uint32_t designType);
     void EndPending();
+    NameId NameOrLine();
     void EndUnreadOf(uint32_t designType);
-    bool IsConditionMet(const CellStep& step) const;
+    bool IsMet(const CellCondition& condition) const;
+    bool AreConditionsMet(const CellStep& step) const;
     bool ReadParameter(const CellParameter& parameter, uint32_t numBits, InitDigits& digits);
     bool AddOutput(const CellType& type, const ComposedTable& output, uint32_t designType);
     void RemoveTables(size_t first);

@@ -168,7 +168,7 @@ class TypeReader {
         m_type->parameters.push_back(parameter);
     }
 
-    // table PIN = INIT[31:0] PIN... [when PARAMETER=VALUE [initial]]
+    // table PIN = INIT[31:0] PIN... [when PARAMETER=VALUE [initial]...]
     void ReadTable()
     {
         AddName(m_type->outputPins, m_words[1]);
@@ -187,7 +187,7 @@ class TypeReader {
         const auto when = std::find(m_words.begin(), m_words.end(), "when");
         const auto numWords = static_cast<size_t>(when - m_words.begin());
         if (when != m_words.end())
-            ReadCondition(numWords, step);
+            ReadConditions(numWords + 1, step);
         for (size_t word = 4; word < numWords; ++word)
             step.inputs.push_back(FindSource(m_words[word]));
         if (m_type->vectorPin.empty())
@@ -197,15 +197,22 @@ class TypeReader {
         m_type->steps.push_back(std::move(step));
     }
 
-    void ReadCondition(size_t when, CellStep& step) const
+    // PARAMETER=VALUE [initial], once or more.
+    void ReadConditions(size_t word, CellStep& step) const
     {
-        const size_t sign = when + 1 < m_words.size() ? m_words[when + 1].find('=') : 0;
-        const bool hasInitial = when + 2 < m_words.size() && m_words[when + 2] == "initial";
-        if (sign == 0 || sign == std::string::npos || m_words.size() != when + (hasInitial ? 3 : 2))
-            Refuse("expected PARAMETER=VALUE after 'when', and 'initial' at most");
-        step.conditionName = m_words[when + 1].substr(0, sign);
-        step.conditionValue = m_words[when + 1].substr(sign + 1);
-        step.isConditionInitial = hasInitial;
+        for (; word < m_words.size(); ++word) {
+            const size_t sign = m_words[word].find('=');
+            if (m_words[word] == "initial" && !step.conditions.empty()) {
+                step.conditions.back().isInitial = true;
+                continue;
+            }
+            if (sign == 0 || sign == std::string::npos)
+                Refuse("expected PARAMETER=VALUE after 'when' instead of " + Quoted(m_words[word]));
+            step.conditions.push_back(
+                {m_words[word].substr(0, sign), m_words[word].substr(sign + 1), false});
+        }
+        if (step.conditions.empty())
+            Refuse("expected PARAMETER=VALUE after 'when'");
     }
 
     uint32_t FindSource(const std::string& name) const

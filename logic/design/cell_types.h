@@ -24,6 +24,13 @@ struct CellParameter {
     uint64_t initial = 0; // its value where a cell does not say it
 };
 
+// A parameter must have a value.
+struct CellCondition {
+    std::string parameter;
+    std::string value;
+    bool isInitial = false; // it has it where a cell does not say it
+};
+
 // A table within a cell: the whole cell, a half, or one of a tree of tables.
 struct CellStep {
     static constexpr uint32_t kLiteral = UINT32_MAX;
@@ -35,9 +42,7 @@ struct CellStep {
     uint64_t literal = 0;
     uint32_t firstBit = 0; // of the parameter: bits firstBit to firstBit + 2^inputs - 1
     bool isOutput = true;
-    std::string conditionName; // not empty: an output only where this parameter has this value
-    std::string conditionValue;
-    bool isConditionInitial = false; // it has it where a cell does not say it
+    std::vector<CellCondition> conditions; // all of them must hold, or this is not an output
 };
 
 struct CellType {

@@ -28,6 +28,7 @@ constexpr CodeText kCodeTexts[] = {
     {"too-wide", "the table has more than 16 inputs; the cell is not read"},
     {"mode-unread", "in this mode the cell is more than logic; it is not read"},
     {"cover-mixed", "rows of 0 and of 1 stand in one table; it is not read"},
+    {"name-twice", "another cell has the same name"},
     {"driver-twice", "the net has a second driver"},
     {"module-unused", "the module is not below the top; it is not read"},
     {"port-strange", "the module of the instance has no such port"},

@@ -83,6 +83,15 @@ struct DesignType {
     std::string note; // why it is not read
 };
 
+enum class PortDirection { Input, Output, Both };
+
+// One bit of a port of the design.
+struct DesignPort {
+    NameId name = 0; // "a[3]" of a port of several bits
+    NetId net = kNetOpen;
+    PortDirection direction = PortDirection::Input;
+};
+
 // A cell that may hold a table and is not read, because of its type or of its parameters.
 struct UnreadCell {
     ScopedName name;
@@ -103,6 +112,7 @@ enum class FindingCode {
     TooWide,        // more than kMaxTableInputs inputs; the cell is not read
     ModeUnread,     // a parameter makes the cell more than logic; it is not read
     CoverMixed,     // rows of 0 and of 1 in one table; the cell is not read
+    NameTwice,      // two cells of one name
     DriverTwice,    // a net with a second driver
     ModuleUnused,   // a module with tables that is not below the top; not read
     PortStrange,    // an instance connects a port that its module does not have
@@ -145,7 +155,8 @@ struct Design {
         nets; // the name to show: of the highest scope, a public one where there is
     // Other names of nets, by net; constants have some, too.
     std::vector<std::pair<NetId, ScopedName>> aliases;
-    std::vector<NameId> keys; // value of ReadOptions::keyAttribute, 0 without
+    std::vector<DesignPort> ports; // in the order of the file
+    std::vector<NameId> keys;      // value of ReadOptions::keyAttribute, 0 without
     std::vector<UnreadCell> unread;
     std::vector<ReadFinding> findings;
     uint64_t numCells = 0; // of all types but modules

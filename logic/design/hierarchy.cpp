@@ -33,12 +33,15 @@ class Layout {
         m_design.top = m_modules[top].name;
         m_design.nets.resize(kNumFixedNets);
         Enter(top, 0, nullptr, nullptr);
+        AddPorts(m_path.back());
         while (!m_path.empty())
             Step();
         ReportUnused();
         m_modules.clear();
         m_joiner.Apply(m_design);
+        NameByOutputs();
         CheckDrivers();
+        CheckNames();
         if (!m_options.hasKeys)
             m_design.keys.clear();
     }
@@ -178,8 +181,8 @@ class Layout {
         const ModuleContent& outer = m_modules[parent.module];
         const ModuleContent& inner = m_modules[frame.module];
         std::unordered_map<NameId, const BitRange*> ports;
-        for (const BitRange& port : inner.ports)
-            ports.emplace(port.name, &port);
+        for (const ModulePort& port : inner.ports)
+            ports.emplace(port.bits.name, &port.bits);
         for (uint32_t index = 0; index < cell.numPins; ++index) {
             const BitRange& pin = outer.pins[cell.firstPin + index];
             const auto found = ports.find(pin.name);
@@ -292,6 +295,69 @@ class Layout {
         }
     }
 
+    // Of tables without a name, that which their net shows now.
+    void NameByOutputs()
+    {
+        for (DesignTable& table : m_design.tables)
+            if (table.isNamedByOutput && table.output >= kNumFixedNets)
+                table.name = m_design.nets[table.output];
+    }
+
+    void AddPorts(const Frame& frame)
+    {
+        const ModuleContent& content = m_modules[frame.module];
+        for (const ModulePort& port : content.ports) {
+            const std::string name(m_design.names.Text(port.bits.name));
+            for (uint32_t bit = 0; bit < port.bits.count; ++bit) {
+                DesignPort made;
+                made.name = port.bits.count == 1
+                                ? port.bits.name
+                                : m_design.names.Add(name + "[" + std::to_string(bit) + "]");
+                made.net = frame.nets[content.bits[port.bits.first + bit]];
+                made.direction = port.direction;
+                m_design.ports.push_back(made);
+            }
+        }
+    }
+
+    void ReportTable(FindingCode code, uint32_t index, const std::string& text)
+    {
+        const DesignTable& table = m_design.tables[index];
+        ReadFinding finding;
+        finding.code = code;
+        finding.line = table.line;
+        finding.table = index;
+        finding.name = table.name;
+        finding.text = text;
+        m_design.findings.push_back(std::move(finding));
+    }
+
+    // Tables of one scope follow one another.
+    void CheckNames()
+    {
+        std::vector<uint32_t> lastWith(m_design.names.Size(), kNone);
+        for (uint32_t index = 0; index < m_design.tables.size(); ++index) {
+            const DesignTable& table = m_design.tables[index];
+            if (table.isNamedByOutput)
+                continue;
+            uint32_t& last = lastWith[table.name.name];
+            const bool isTwice = last != kNone &&
+                                 m_design.tables[last].name.scope == table.name.scope &&
+                                 !IsSameCell(last, index);
+            if (isTwice)
+                ReportTable(FindingCode::NameTwice, index, "");
+            last = index;
+        }
+    }
+
+    // The outputs of one cell follow one another, and an output stands once.
+    bool IsSameCell(uint32_t first, uint32_t second) const
+    {
+        return second == first + 1 &&
+               m_design.tables[first].outputPin < m_design.tables[second].outputPin &&
+               m_design.tables[first].type == m_design.tables[second].type;
+    }
+
     void CheckDrivers()
     {
         std::vector<bool> isDriven(m_design.nets.size(), false);
@@ -299,15 +365,8 @@ class Layout {
             const DesignTable& table = m_design.tables[index];
             if (table.output < kNumFixedNets)
                 continue;
-            if (isDriven[table.output]) {
-                ReadFinding finding;
-                finding.code = FindingCode::DriverTwice;
-                finding.line = table.line;
-                finding.table = index;
-                finding.name = table.name;
-                finding.text = NetName(m_design, table.output);
-                m_design.findings.push_back(std::move(finding));
-            }
+            if (isDriven[table.output])
+                ReportTable(FindingCode::DriverTwice, index, NetName(m_design, table.output));
             isDriven[table.output] = true;
         }
     }

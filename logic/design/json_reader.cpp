@@ -233,20 +233,29 @@ class JsonReader {
         }
     }
 
+    static PortDirection DirectionOf(std::string_view word)
+    {
+        return word == "input"    ? PortDirection::Input
+               : word == "output" ? PortDirection::Output
+                                  : PortDirection::Both;
+    }
+
     void ReadPorts(json::value ports)
     {
         for (auto field : ports.get_object()) {
-            BitRange port;
-            port.name = AddOnce(field.unescaped_key());
+            ModulePort port;
+            port.bits.name = AddOnce(field.unescaped_key());
             bool hasBits = false;
             for (auto part : field.value().get_object()) {
                 m_place.part = part.unescaped_key();
+                if (m_place.part == "direction")
+                    port.direction = DirectionOf(part.value().get_string());
                 if (m_place.part != "bits" || hasBits)
                     continue;
                 hasBits = true;
                 ReadBits(part.value());
-                port.first = static_cast<uint32_t>(m_module->bits.size());
-                port.count = static_cast<uint32_t>(m_bits.size());
+                port.bits.first = static_cast<uint32_t>(m_module->bits.size());
+                port.bits.count = static_cast<uint32_t>(m_bits.size());
                 m_module->bits.insert(m_module->bits.end(), m_bits.begin(), m_bits.end());
             }
             m_place.part = std::string_view();

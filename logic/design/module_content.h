@@ -20,6 +20,11 @@ struct BitRange {
     uint32_t count = 0;
 };
 
+struct ModulePort {
+    BitRange bits;
+    PortDirection direction = PortDirection::Both;
+};
+
 // A cell whose type may be a module; which one, is known when all of them are read.
 struct PendingCell {
     NameId name = 0;
@@ -45,7 +50,7 @@ struct ModuleContent {
     std::vector<bool> isHidden =
         std::vector<bool>(kNumFixedNets, false); // its name is a tool's own
     std::vector<NetAlias> aliases;
-    std::vector<BitRange> ports;
+    std::vector<ModulePort> ports;
     std::vector<BitRange> pins; // of pending cells
     std::vector<LocalNet> bits; // of ports and pins
     std::vector<PendingCell> pending;

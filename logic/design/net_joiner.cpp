@@ -72,6 +72,8 @@ void NetJoiner::Apply(Design& design)
         input = numbers[input];
     for (auto& alias : design.aliases)
         alias.first = numbers[alias.first];
+    for (DesignPort& port : design.ports)
+        port.net = numbers[port.net];
 }
 
 } // namespace booleq

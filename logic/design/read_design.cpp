@@ -6,6 +6,7 @@
 #include "read_fault.h"
 #include "readers.h"
 #include "watch.h"
+#include "yosys_process.h"
 
 namespace booleq {
 
@@ -54,20 +55,23 @@ Format Recognise(std::string_view text)
     throw ReadFault{kUnknown};
 }
 
-void ReadSource(const SourceText& source, const ReadOptions& options, Design& design)
+void ReadSource(SourceText& source, const ReadOptions& options, Design& design)
 {
-    static constexpr FormatRow kFormats[] = {
-        {"Yosys JSON", ReadYosysJson}, {"BLIF", nullptr}, {"EDIF", nullptr}, {"Verilog", nullptr}};
+    static constexpr FormatRow kFormats[] = {{"Yosys JSON", ReadYosysJson},
+                                             {"BLIF", ReadBlifNetlist},
+                                             {"EDIF", ReadEdif},
+                                             {"Verilog", ReadYosysJson}};
     const Format format = Recognise(source.Text());
     const FormatRow& row = kFormats[static_cast<size_t>(format)];
     design.format = row.name;
     design.numBytes = source.Text().size();
-    if (row.read == nullptr)
-        throw ReadFault{std::string(row.name) + " is not read yet"};
+    SourceText json;
+    if (format == Format::Verilog)
+        ConvertVerilog(source, options.yosysSeconds, json);
     std::vector<ModuleContent> modules;
     const CellTypes& cellTypes =
         options.cellTypes != nullptr ? *options.cellTypes : CellTypes::Known();
-    row.read({source, options, cellTypes, design, modules});
+    row.read({format == Format::Verilog ? json : source, options, cellTypes, design, modules});
     LayoutOptions layout;
     layout.top = options.top;
     layout.isFirstTop = format == Format::Blif;

@@ -70,6 +70,13 @@ SourceText::~SourceText()
     std::free(m_bytes);
 }
 
+void SourceText::Release()
+{
+    std::free(m_bytes);
+    m_bytes = nullptr;
+    m_size = m_capacity = 0;
+}
+
 // Large blocks move without being copied, and pages that nobody has written take no memory.
 void SourceText::Reserve(size_t numBytes)
 {

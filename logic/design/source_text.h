@@ -29,6 +29,9 @@ class SourceText {
     // A text that is compressed, too, is uncompressed.
     void Copy(std::string_view text);
 
+    // Empty again, without its memory.
+    void Release();
+
     std::string_view Text() const { return std::string_view(m_bytes, m_size); }
     // Including the padding.
     size_t Capacity() const { return m_size + kPadding; }

@@ -5,7 +5,7 @@ usage: read_bitstream.py BITSTREAM.asc NETLIST.json
 
 Takes the text form of a bitstream (iceunpack), and of fpga-icestorm its description of the chip,
 which says what each bit is and which wires a routed net consists of. Gives one cell for each logic
-cell that holds a table or a flip-flop, with its place as the attribute PLACE. Names are gone: nets
+cell that holds a table or a flip-flop, with its place as the attribute NEXTPNR_BEL, as the placed netlist has it. Names are gone: nets
 are numbered.
 """
 import json
@@ -60,7 +60,7 @@ def cell_at(chip, nets, column, row, index):
         connections["O"] = [nets[wire("out")]]
     return {"hide_name": 0, "type": "SB_LUT4",
             "parameters": {"LUT_INIT": "".join(reversed(table))},
-            "attributes": {"PLACE": f"X{column}/Y{row}/lc{index}"},
+            "attributes": {"NEXTPNR_BEL": f"X{column}/Y{row}/lc{index}"},
             "port_directions": {**dict.fromkeys(INPUTS, "input"), "O": "output"},
             "connections": connections}
 

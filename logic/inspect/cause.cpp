@@ -263,11 +263,10 @@ class CauseFinder {
             numChanged += changed.At(digit * kDigitRows + place) ? 1 : 0;
         if (numChanged != NumOnes(changed))
             return;
-        const bool isBinary = numChanged == 1;
         m_causes.push_back({CauseCode::DigitChanged, {},
-                            isBinary ? "binary digit " + std::to_string(first) + ", from the right"
-                                     : "hexadecimal digit " + std::to_string(digit) +
-                                           ", from the right"});
+                            numChanged == 1 ? "bit " + std::to_string(first)
+                                            : "hexadecimal digit " + std::to_string(digit) +
+                                                  ", the last one being 0"});
     }
 
     void FindOtherNet()

@@ -60,18 +60,24 @@ Comparison::Comparison(Design& left, Design& right, const CompareOptions& option
 void Comparison::Match(const CompareOptions& options)
 {
     m_are_names_gone = options.names == NetNames::Gone;
+    NetPairs doubtful;
     if (!m_are_names_gone) {
-        m_unused_renames = JoinByNames(m_left, m_right, m_match, options.renames, m_nets);
+        NameJoins joins = JoinByNames(m_left, m_right, m_match, options.renames, m_nets);
+        m_unused_renames = std::move(joins.unused);
+        doubtful = std::move(joins.doubtful);
         m_pairing = PairTables(m_left, m_right, m_match, m_nets, PairWays::All);
         m_are_names_gone = options.names == NetNames::Auto && SaysNothingByName(m_pairing);
     }
     if (m_are_names_gone) {
         m_nets = NetMap(m_left, m_right);
+        doubtful.clear();
         m_pairing = PairTables(m_left, m_right, m_match, m_nets, PairWays::Key);
     }
-    FollowWires(m_left, m_pairing.onlyLeft);
-    FollowWires(m_right, m_pairing.onlyRight);
-    const auto joined = JoinByStructure(m_left, m_right, m_pairing, m_nets);
+    if (options.followsWires) {
+        FollowWires(m_left, m_pairing.onlyLeft);
+        FollowWires(m_right, m_pairing.onlyRight);
+    }
+    const NetPairs joined = JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
     if (m_are_names_gone)
         return;
     for (const auto& pair : joined) {
@@ -174,7 +180,7 @@ Difference Comparison::Describe(const TablePair& pair) const
     difference.rightFunction = Normalise(right);
     Rows expected;
     if (RightRows(difference.leftFunction, right, expected))
-        difference.rightInit = HexOf(expected);
+        difference.expectedInit = HexOf(expected);
     if (difference.leftFunction == difference.rightFunction) {
         difference.isSameFunction = true;
         difference.causes.push_back(

@@ -24,6 +24,9 @@ enum class NetNames {
 struct CompareOptions {
     Renames renames;
     NetNames names = NetNames::Auto;
+    // Who reads a net that only passes another one, by a table that the other design lacks, reads
+    // that one. Wrong where the cell of such a table has a flip-flop, too.
+    bool followsWires = false;
     void (*progress)(void* context, uint64_t numDone, uint64_t numTables) = nullptr;
     void* progressContext = nullptr;
 };
@@ -44,11 +47,10 @@ struct Difference {
     NetFunction leftFunction; // in common numbers
     NetFunction rightFunction;
     std::vector<Cause> causes;
-    std::string rightInit; // hexadecimal, for the right table's pins; empty where it lacks a net
+    std::string expectedInit; // hexadecimal, for the right table's pins; empty where it lacks a net
 };
 
-// Designs stay as they are but for one thing: who reads a net that only passes another one, by a table
-// that the other design lacks, reads that one afterwards.
+// Designs stay as they are, but for what CompareOptions::followsWires changes in their inputs.
 // Invariant: each pair is the same, the same but for renamed nets, or one of 'different'.
 class Comparison {
   public:

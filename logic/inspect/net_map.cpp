@@ -18,6 +18,17 @@ ScopedIndex IndexNets(const Design& design)
     return index;
 }
 
+// Whether a table drives or reads a net.
+std::vector<bool> NetsOfTables(const Design& design)
+{
+    std::vector<bool> isUsed(design.nets.size(), false);
+    for (const DesignTable& table : design.tables)
+        isUsed[table.output] = true;
+    for (const NetId net : design.inputs)
+        isUsed[net] = true;
+    return isUsed;
+}
+
 // The nets with the wanted paths; the others stay kNotThere.
 void FindPaths(const Design& design, std::unordered_map<std::string, NetId>& wanted)
 {
@@ -82,24 +93,31 @@ void NetMap::Join(NetId left, NetId right)
     ++m_num_known;
 }
 
-Renames JoinByNames(const Design& left, const Design& right, const NameMatch& match,
-                    const Renames& renames, NetMap& nets)
+NameJoins JoinByNames(const Design& left, const Design& right, const NameMatch& match,
+                      const Renames& renames, NetMap& nets)
 {
-    Renames unused = JoinRenamed(left, right, renames, nets);
+    NameJoins joins;
+    joins.unused = JoinRenamed(left, right, renames, nets);
     const ScopedIndex index = IndexNets(right);
+    const std::vector<bool> isUsedLeft = NetsOfTables(left);
+    const std::vector<bool> isUsedRight = NetsOfTables(right);
     const auto join = [&](NetId net, const ScopedName& name) {
         if (nets.IsKnownLeft(net))
             return;
         const NetId found = match.Find(name, index);
-        if (found != kNotThere && !nets.IsKnownRight(found))
+        if (found == kNotThere || nets.IsKnownRight(found))
+            return;
+        if (isUsedLeft[net] && isUsedRight[found])
             nets.Join(net, found);
+        else if (isUsedLeft[net] || isUsedRight[found])
+            joins.doubtful.emplace_back(net, found);
     };
     for (NetId net = kNumFixedNets; net < left.nets.size(); ++net)
         join(net, left.nets[net]);
     for (const auto& alias : left.aliases)
         if (alias.first >= kNumFixedNets)
             join(alias.first, alias.second);
-    return unused;
+    return joins;
 }
 
 std::string NumberName(const Design& left, const Design& right, const NetMap& nets, NetId number)

@@ -49,10 +49,17 @@ class NetMap {
     size_t m_num_known = 0;
 };
 
-// Joins nets with a name in common, or with names that 'renames' takes for one another. What it
-// could not use of 'renames' comes back.
-Renames JoinByNames(const Design& left, const Design& right, const NameMatch& match,
-                    const Renames& renames, NetMap& nets);
+// What names say about which nets are the same.
+struct NameJoins {
+    Renames unused; // what could not be used of the renames
+    // Nets with a name in common of which one is of no table: the name may have moved.
+    std::vector<std::pair<NetId, NetId>> doubtful;
+};
+
+// Joins nets that 'renames' takes for one another, then those with a name in common, if tables of
+// both designs have them.
+NameJoins JoinByNames(const Design& left, const Design& right, const NameMatch& match,
+                      const Renames& renames, NetMap& nets);
 
 // The name to show for a common number.
 std::string NumberName(const Design& left, const Design& right, const NetMap& nets, NetId number);

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cassert>
 #include <unordered_map>
+#include <unordered_set>
 
 #include "watch.h"
 
@@ -15,17 +16,29 @@ constexpr unsigned int kMaxRounds = 64;
 // What pairs of tables say about which nets are the same.
 class Votes {
   public:
-    void Add(NetId left, NetId right) { ++m_counts[uint64_t(left) << 32 | right]; }
-    bool IsEmpty() const { return m_counts.empty(); }
+    // A net that has a name in common with another one needs two votes for anything else.
+    explicit Votes(const NetPairs& doubtful)
+    {
+        for (const auto& pair : doubtful) {
+            m_doubtful_lefts.insert(pair.first);
+            m_doubtful_rights.insert(pair.second);
+        }
+    }
 
-    // Joins each net with the one that most are for, where that is so seen from both sides.
-    void Join(NetMap& nets, std::vector<std::pair<NetId, NetId>>& joined) const
+    void Add(NetId left, NetId right) { ++m_counts[uint64_t(left) << 32 | right]; }
+
+    // Joins each net with the one that most are for, where that is so seen from both sides. The
+    // votes are gone afterwards.
+    void Join(NetMap& nets, NetPairs& joined)
     {
         std::unordered_map<NetId, Favourite> lefts;
         std::unordered_map<NetId, Favourite> rights;
         for (const auto& count : m_counts) {
             const auto left = static_cast<NetId>(count.first >> 32);
             const auto right = static_cast<NetId>(count.first);
+            if (count.second < 2 && (m_doubtful_lefts.count(left) != 0 ||
+                                     m_doubtful_rights.count(right) != 0))
+                continue;
             lefts[left].Hear(right, count.second);
             rights[right].Hear(left, count.second);
         }
@@ -40,6 +53,7 @@ class Votes {
         std::sort(joined.begin() + static_cast<std::ptrdiff_t>(numBefore), joined.end());
         for (size_t place = numBefore; place < joined.size(); ++place)
             nets.Join(joined[place].first, joined[place].second);
+        m_counts.clear();
     }
 
   private:
@@ -61,6 +75,8 @@ class Votes {
     };
 
     std::unordered_map<uint64_t, uint32_t> m_counts;
+    std::unordered_set<NetId> m_doubtful_lefts;
+    std::unordered_set<NetId> m_doubtful_rights;
 };
 
 std::vector<NetId> UnknownOf(const NetFunction& function, const NetMap& nets, bool isLeft)
@@ -167,19 +183,18 @@ Assignments FindAssignments(const NetFunction& left, const NetFunction& right, c
     return found;
 }
 
-std::vector<std::pair<NetId, NetId>> JoinByStructure(const Design& left, const Design& right,
-                                                     const Pairing& pairing, NetMap& nets)
+NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing& pairing,
+                         const NetPairs& doubtful, NetMap& nets)
 {
-    std::vector<std::pair<NetId, NetId>> joined;
-    Votes outputs;
-    VoteForOutputs(left, right, pairing, nets, outputs);
-    outputs.Join(nets, joined);
+    NetPairs joined;
+    Votes votes(doubtful);
+    VoteForOutputs(left, right, pairing, nets, votes);
+    votes.Join(nets, joined);
 
     std::vector<const TablePair*> waiting;
     for (const TablePair& pair : pairing.pairs)
         waiting.push_back(&pair);
     for (unsigned int round = 0; round < kMaxRounds && !waiting.empty(); ++round) {
-        Votes votes;
         std::vector<const TablePair*> rest;
         for (const TablePair* const pair : waiting) {
             Watch();
@@ -193,6 +208,9 @@ std::vector<std::pair<NetId, NetId>> JoinByStructure(const Design& left, const D
             break;
         waiting = std::move(rest);
     }
+    for (const auto& pair : doubtful)
+        if (!nets.IsKnownLeft(pair.first) && !nets.IsKnownRight(pair.second))
+            nets.Join(pair.first, pair.second);
     return joined;
 }
 

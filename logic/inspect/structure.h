@@ -29,11 +29,14 @@ struct Assignments {
 };
 Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets);
 
+// Left and right nets that are the same.
 // Joins the outputs of pairs, then, again and again, the inputs that can be nothing else, by the
 // vote of all pairs. A net that two tables want to join with different ones stays unknown unless
-// more want one of them.
-std::vector<std::pair<NetId, NetId>> JoinByStructure(const Design& left, const Design& right,
-                                                     const Pairing& pairing, NetMap& nets);
+// more want one of them; of 'doubtful' nets, which a name speaks for, two tables at least must want
+// it. Those that are then still unknown are joined as their name says, and are not in the result.
+typedef std::vector<std::pair<NetId, NetId>> NetPairs;
+NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing& pairing,
+                         const NetPairs& doubtful, NetMap& nets);
 
 // Tables of 'tables' that only pass a net, or are constant: whoever reads their output reads the
 // net itself from now on.

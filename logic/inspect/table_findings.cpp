@@ -31,6 +31,7 @@ Severity SeverityOf(FindingCode code)
     case FindingCode::PinTwice:
     case FindingCode::CoverMixed:
     case FindingCode::DriverTwice:
+    case FindingCode::NameTwice:
     case FindingCode::PortStrange:
     case FindingCode::PortWidth:
         return Severity::Error;

@@ -226,9 +226,9 @@ class DiffAnswer {
         for (const Cause& cause : difference.causes)
             PutField(m_output, &cause == &difference.causes.front() ? "  cause" : "  or",
                      Visible(CauseText(cause)));
-        if (!difference.rightInit.empty() && !difference.isSameFunction)
-            PutField(m_output, "  right init", difference.rightInit + ", for these pins: " +
-                                                   Visible(PinsText(pair)));
+        if (!difference.expectedInit.empty() && !difference.isSameFunction)
+            PutField(m_output, "  should be", difference.expectedInit + ", right's pins being " +
+                                                  Visible(PinsText(pair)));
     }
 
     // The right table's pins, the most significant one first.
@@ -317,8 +317,8 @@ class DiffAnswer {
             difference.isSameFunction ? Json(nullptr) : Json(difference.right ? 1 : 0);
         json["left_equation"] = EquationOf(difference.leftFunction);
         json["right_equation"] = EquationOf(difference.rightFunction);
-        json["right_init"] =
-            difference.rightInit.empty() ? Json(nullptr) : Json(difference.rightInit);
+        json["should_be"] =
+            difference.expectedInit.empty() ? Json(nullptr) : Json(difference.expectedInit);
         json["causes"] = Json::array();
         for (const Cause& cause : difference.causes)
             json["causes"].push_back({{"code", CauseWord(cause.code)}, {"message", CauseText(cause)}});
@@ -384,6 +384,7 @@ int RunDiff(const Request& request, Output& output)
 {
     CompareOptions options;
     options.names = ParseNames(request);
+    options.followsWires = request.Has("--allow-wires");
     if (request.Has("--rows"))
         ParseRows(request.Get("--rows")); // wrong usage shows before any work
     if (request.Has("--rename"))
@@ -415,7 +416,7 @@ Command NetlistDiffCommand()
                                       "(auto: as the pairs show)"},
         {"--open", "0|1", "What an input reads that nothing is connected to"},
         {"--allow-wires", nullptr, "Tables that only pass a net or a constant may be in one "
-                                   "netlist only"},
+                                   "netlist only; nets are followed through them"},
         {"--rows", "N|all", "Differences to describe (20; with --json all)"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);

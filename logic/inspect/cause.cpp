@@ -86,12 +86,13 @@ void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun, std::vec
                           [=](const Rows& rows) { return ShiftUp(rows, distance); }, nullptr});
         faults.push_back({CauseCode::DigitsShifted, by + " to the right, zeros put in",
                           [=](const Rows& rows) { return ShiftDown(rows, distance); }, nullptr});
-        // Half way round is the exchange of halves.
-        if (2 * distance != numRows)
-            faults.push_back(
-                {CauseCode::DigitsRotated, by + " to the left",
-                 [=](const Rows& rows) { return RotateUp(rows, distance); },
-                 [=](const Rows& rows) { return RotateUp(rows, numRows - distance); }});
+        // Half way round is the exchange of halves; less than that is the shorter way.
+        if (2 * distance < numRows) {
+            const auto left = [=](const Rows& rows) { return RotateUp(rows, distance); };
+            const auto right = [=](const Rows& rows) { return RotateUp(rows, numRows - distance); };
+            faults.push_back({CauseCode::DigitsRotated, by + " to the left", left, right});
+            faults.push_back({CauseCode::DigitsRotated, by + " to the right", right, left});
+        }
         faults.push_back({CauseCode::DigitsLost, "the first " + by + (count == 1 ? " is" : " are") +
                                                      " lost, zeros in place of " +
                                                      (count == 1 ? "it" : "them"),
@@ -123,7 +124,7 @@ std::vector<Fault> InitFaults(unsigned int numInputs)
     constexpr uint64_t kMaxDigits = 64;
     if (numRows >= 2 * kDigitRows && numRows / kDigitRows <= kMaxDigits)
         AddDigitFaults(numRows, kDigitRows, "hexadecimal digit", faults);
-    if (numRows >= 4 * kDigitRows) {
+    if (numRows >= 8 * kDigitRows) { // two bytes are two halves
         const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, 2 * kDigitRows); };
         faults.push_back({CauseCode::DigitsReversed, "bytes, the last one first", reverse, reverse});
     }
@@ -149,6 +150,7 @@ class CauseFinder {
         FindChangedDigit();
         FindOtherNet();
         FindStuckInput();
+        DropWeaker();
         std::stable_sort(m_causes.begin(), m_causes.end(),
                          [](const Cause& left, const Cause& right) {
                              return left.code < right.code;
@@ -176,6 +178,19 @@ class CauseFinder {
         if (fault.undo && Normalise({fault.undo(m_right.rows), m_right.nets}) == m_left_function)
             return true;
         return m_has_expected && fault.apply(m_expected) == m_right.rows;
+    }
+
+    // What says no more than another cause: a half is told apart by an input; digits that are shifted
+    // out and are 0 are as good as rotated.
+    void DropWeaker()
+    {
+        const bool hasShift = IsKnown(CauseCode::DigitsShifted);
+        const bool hasHalves = IsKnown(CauseCode::HalvesExchanged);
+        const auto isWeaker = [=](const Cause& cause) {
+            return (cause.code == CauseCode::DigitsRotated && hasShift) ||
+                   (cause.code == CauseCode::InputInverted && hasHalves);
+        };
+        m_causes.erase(std::remove_if(m_causes.begin(), m_causes.end(), isWeaker), m_causes.end());
     }
 
     void AddInitFault(const Fault& fault, const PinFunction& pins)

@@ -178,7 +178,7 @@ class DiffAnswer {
         case CauseCode::BitOrder:
             return "the init value is in the other bit order" + detail;
         case CauseCode::HalvesExchanged:
-            return "the halves of the init value are exchanged, which are told apart by " + first;
+            return "the halves of the init value are exchanged, as if " + first + " were inverted";
         case CauseCode::InputInverted:
             return "the input " + first + " is taken inverted";
         case CauseCode::DigitsShifted:

@@ -133,6 +133,44 @@ std::vector<Fault> InitFaults(unsigned int numInputs)
     return faults;
 }
 
+// The rows that some assignment of the nets leads to: constants have their value, pins of one net
+// the same one.
+Rows ReachableRows(const std::vector<NetId>& nets)
+{
+    const auto numPins = static_cast<unsigned int>(nets.size());
+    Rows reachable = ConstantRows(numPins, true);
+    for (unsigned int pin = 0; pin < numPins; ++pin) {
+        const Rows value = InputRows(numPins, pin);
+        if (nets[pin] == kNetZero)
+            reachable = AndNot(std::move(reachable), value);
+        else if (nets[pin] == kNetOne)
+            reachable = std::move(reachable) & value;
+        else
+            for (unsigned int other = 0; other < pin; ++other)
+                if (nets[other] == nets[pin])
+                    reachable = AndNot(std::move(reachable), value ^ InputRows(numPins, other));
+    }
+    return reachable;
+}
+
+// Which digit all changed rows are in; empty where they are in several, or there are none.
+std::string ChangedDigit(const Rows& changed)
+{
+    const uint64_t first = FirstDifference(changed, ConstantRows(changed.NumInputs(), false));
+    if (first == Rows::kNoRow)
+        return std::string();
+    const uint64_t digit = first / kDigitRows;
+    const uint64_t end = std::min<uint64_t>(changed.NumRows(), (digit + 1) * kDigitRows);
+    uint64_t numChanged = 0;
+    for (uint64_t row = first; row < end; ++row)
+        numChanged += changed.At(row) ? 1 : 0;
+    if (numChanged != NumOnes(changed))
+        return std::string();
+    return numChanged == 1
+               ? "bit " + std::to_string(first)
+               : "hexadecimal digit " + std::to_string(digit) + ", the last one being 0";
+}
+
 class CauseFinder {
   public:
     CauseFinder(const PinFunction& left, const PinFunction& right)
@@ -141,6 +179,7 @@ class CauseFinder {
     {
         assert(m_left_function != m_right_function);
         m_has_expected = RightRows(m_left_function, m_right, m_expected);
+        m_reachable = ReachableRows(m_right.nets);
     }
 
     std::vector<Cause> Run()
@@ -177,7 +216,7 @@ class CauseFinder {
     {
         if (fault.undo && Normalise({fault.undo(m_right.rows), m_right.nets}) == m_left_function)
             return true;
-        return m_has_expected && fault.apply(m_expected) == m_right.rows;
+        return m_has_expected && IsZero((fault.apply(m_expected) ^ m_right.rows) & m_reachable);
     }
 
     // What says no more than another cause: a half is told apart by an input; digits that are shifted
@@ -212,19 +251,22 @@ class CauseFinder {
                 AddInitFault(fault, m_left);
     }
 
+    // Two pins, constant ones and idle ones among them, then any order of those that matter.
     void FindSwappedPins()
     {
-        const std::vector<NetId>& nets = m_left_function.nets;
-        if (nets != m_right_function.nets)
-            return;
-        const auto count = static_cast<unsigned int>(nets.size());
-        for (unsigned int first = 0; first < count; ++first)
-            for (unsigned int second = first + 1; second < count; ++second)
-                if (SwapInputs(m_left_function.rows, first, second) == m_right_function.rows) {
-                    AddSwap({nets[first], nets[second]}, {nets[second], nets[first]});
-                    return;
-                }
-        FindPermutedPins();
+        const size_t numPins = m_right.nets.size();
+        for (size_t first = 0; first < numPins; ++first)
+            for (size_t second = first + 1; second < numPins; ++second) {
+                PinFunction pins = m_right;
+                std::swap(pins.nets[first], pins.nets[second]);
+                if (Normalise(std::move(pins)) != m_left_function)
+                    continue;
+                AddSwap({m_right.nets[second], m_right.nets[first]},
+                        {m_right.nets[first], m_right.nets[second]});
+                return;
+            }
+        if (m_left_function.nets == m_right_function.nets)
+            FindPermutedPins();
     }
 
     void FindPermutedPins()
@@ -262,26 +304,17 @@ class CauseFinder {
                                        : ""});
     }
 
+    // Over the right table's pins; else over the left one's, where the right one has idle pins.
     void FindChangedDigit()
     {
-        if (!m_has_expected)
-            return;
-        const Rows changed = m_expected ^ m_right.rows;
-        const uint64_t numRows = changed.NumRows();
-        const uint64_t first = FirstDifference(changed, ConstantRows(changed.NumInputs(), false));
-        if (first == Rows::kNoRow)
-            return;
-        const uint64_t digit = first / kDigitRows;
-        const uint64_t inDigit = numRows <= kDigitRows ? numRows : kDigitRows;
-        uint64_t numChanged = 0;
-        for (uint64_t place = 0; place < inDigit; ++place)
-            numChanged += changed.At(digit * kDigitRows + place) ? 1 : 0;
-        if (numChanged != NumOnes(changed))
-            return;
-        m_causes.push_back({CauseCode::DigitChanged, {},
-                            numChanged == 1 ? "bit " + std::to_string(first)
-                                            : "hexadecimal digit " + std::to_string(digit) +
-                                                  ", the last one being 0"});
+        Rows other;
+        std::string detail;
+        if (m_has_expected)
+            detail = ChangedDigit((m_expected ^ m_right.rows) & m_reachable);
+        if (detail.empty() && RightRows(m_right_function, m_left, other))
+            detail = ChangedDigit((other ^ m_left.rows) & ReachableRows(m_left.nets));
+        if (!detail.empty())
+            m_causes.push_back({CauseCode::DigitChanged, {}, detail});
     }
 
     void FindOtherNet()
@@ -294,15 +327,24 @@ class CauseFinder {
         std::set_difference(m_right_function.nets.begin(), m_right_function.nets.end(),
                             m_left_function.nets.begin(), m_left_function.nets.end(),
                             std::back_inserter(come));
+        // One of several pins of a net moved, or one that was constant; else the only one.
+        if (gone.empty() && come.size() == 1) {
+            std::vector<NetId> places = m_left_function.nets;
+            places.insert(places.end(), {kNetZero, kNetOne});
+            for (const NetId net : places)
+                if (Replace(m_right_function, come.front(), net) == m_left_function) {
+                    m_causes.push_back({CauseCode::OtherNet, {net, come.front()}, ""});
+                    return;
+                }
+        }
         if (gone.size() != 1 || come.size() > 1)
             return;
         const std::vector<NetId>& candidates = come.empty() ? m_right_function.nets : come;
-        for (const NetId net : candidates) {
-            if (Replace(m_left_function, gone.front(), net) != m_right_function)
-                continue;
-            m_causes.push_back({CauseCode::OtherNet, {gone.front(), net}, ""});
-            return;
-        }
+        for (const NetId net : candidates)
+            if (Replace(m_left_function, gone.front(), net) == m_right_function) {
+                m_causes.push_back({CauseCode::OtherNet, {gone.front(), net}, ""});
+                return;
+            }
     }
 
     void FindStuckInput()
@@ -313,6 +355,26 @@ class CauseFinder {
                     m_causes.push_back({CauseCode::InputStuck, {net}, value ? "1" : "0"});
                     return;
                 }
+        FindStuckPin();
+    }
+
+    // One of several pins of a net.
+    void FindStuckPin()
+    {
+        for (size_t pin = 0; pin < m_right.nets.size(); ++pin) {
+            const NetId constant = m_right.nets[pin];
+            if (constant != kNetZero && constant != kNetOne)
+                continue;
+            for (const NetId net : m_left_function.nets) {
+                PinFunction pins = m_right;
+                pins.nets[pin] = net;
+                if (Normalise(std::move(pins)) != m_left_function)
+                    continue;
+                m_causes.push_back(
+                    {CauseCode::InputStuck, {net}, constant == kNetOne ? "1" : "0"});
+                return;
+            }
+        }
     }
 
     const PinFunction& m_left;
@@ -320,6 +382,7 @@ class CauseFinder {
     NetFunction m_left_function;
     NetFunction m_right_function;
     Rows m_expected; // the right one's init value, had it the left one's function
+    Rows m_reachable; // of the right table, see ReachableRows
     bool m_has_expected = false;
     std::vector<Cause> m_causes;
 };

@@ -143,7 +143,7 @@ void AddIdlePin(CircuitTable& table, int net, Random& random)
 void AddFixedPin(CircuitTable& table, bool isAnything, Random& random)
 {
     const size_t place = Pick(random, table.pins.size() + 1);
-    const size_t kind = Pick(random, 3);
+    const size_t kind = Pick(random, isAnything ? 3 : 2);
     const int net = kind == 0   ? kZeroPin
                     : kind == 1 ? kOnePin
                                 : table.pins[Pick(random, table.pins.size())];

@@ -129,7 +129,8 @@ void PutFault(CircuitTable& table, Fault fault, const Circuit& circuit, Random& 
         return;
     }
     case Fault::InputStuck:
-        pins[pin] = Pick(random, 2) == 0 ? kZeroPin : kOnePin;
+        if (pins[pin] >= 0)
+            pins[pin] = Pick(random, 2) == 0 ? kZeroPin : kOnePin;
         return;
     default:
         ChangeRows(table, fault, random);
@@ -143,7 +144,8 @@ void Disguise(CircuitTable& table, const Circuit& circuit, bool isAnything, Rand
     ShufflePins(table, random);
     if (table.pins.size() < 6 && Pick(random, 3) == 0) {
         const auto net = static_cast<int>(Pick(random, circuit.nets.size()));
-        if (net != table.output)
+        if (net != table.output &&
+            std::find(table.pins.begin(), table.pins.end(), net) == table.pins.end())
             AddIdlePin(table, net, random);
     }
     if (table.pins.size() < 7 && Pick(random, 3) == 0)
@@ -165,7 +167,9 @@ bool IsOfOneTable(Fault fault)
 
 size_t MinPins(Fault fault)
 {
-    if (fault == Fault::BitOrder || fault == Fault::DigitsRotated)
+    if (fault == Fault::DigitsRotated)
+        return 4; // of two digits, either way round is the exchange of halves
+    if (fault == Fault::BitOrder)
         return 3;
     return fault == Fault::InputInverted || fault == Fault::PinsSwapped ? 2 : 1;
 }
@@ -233,7 +237,10 @@ std::string Judge::LookAtDifference(const PairOfCircuits& pair, const Comparison
         ++counts[CauseWord(code)];
         return std::string();
     }
-    return std::string("the cause ") + CauseWord(code) + " is not named";
+    std::string named;
+    for (const Cause& cause : difference.causes)
+        named += std::string(" ") + CauseWord(cause.code);
+    return std::string("the cause ") + CauseWord(code) + " is not named, but" + named;
 }
 
 std::string Judge::Look(const PairOfCircuits& pair, const Comparison& comparison)

@@ -188,7 +188,7 @@ class CauseFinder {
         FindSwappedPins();
         FindChangedDigit();
         FindOtherNet();
-        FindStuckInput();
+        FindOtherPin();
         DropWeaker();
         std::stable_sort(m_causes.begin(), m_causes.end(),
                          [](const Cause& left, const Cause& right) {
@@ -272,7 +272,7 @@ class CauseFinder {
     void FindPermutedPins()
     {
         const std::vector<NetId>& nets = m_left_function.nets;
-        if (nets.size() < 3 || nets.size() > kMaxMatchInputs)
+        if (nets.size() < 2 || nets.size() > kMaxMatchInputs)
             return;
         std::vector<std::string> names; // any: places are what counts
         for (size_t place = 0; place < nets.size(); ++place)
@@ -317,64 +317,47 @@ class CauseFinder {
             m_causes.push_back({CauseCode::DigitChanged, {}, detail});
     }
 
+    // A net that another one, or a constant, stands for in the whole function.
     void FindOtherNet()
     {
         std::vector<NetId> gone;
-        std::vector<NetId> come;
         std::set_difference(m_left_function.nets.begin(), m_left_function.nets.end(),
                             m_right_function.nets.begin(), m_right_function.nets.end(),
                             std::back_inserter(gone));
-        std::set_difference(m_right_function.nets.begin(), m_right_function.nets.end(),
-                            m_left_function.nets.begin(), m_left_function.nets.end(),
-                            std::back_inserter(come));
-        // One of several pins of a net moved, or one that was constant; else the only one.
-        if (gone.empty() && come.size() == 1) {
-            std::vector<NetId> places = m_left_function.nets;
-            places.insert(places.end(), {kNetZero, kNetOne});
-            for (const NetId net : places)
-                if (Replace(m_right_function, come.front(), net) == m_left_function) {
-                    m_causes.push_back({CauseCode::OtherNet, {net, come.front()}, ""});
-                    return;
-                }
-        }
-        if (gone.size() != 1 || come.size() > 1)
+        if (gone.size() != 1)
             return;
-        const std::vector<NetId>& candidates = come.empty() ? m_right_function.nets : come;
+        std::vector<NetId> candidates = m_right_function.nets;
+        candidates.insert(candidates.end(), {kNetZero, kNetOne});
         for (const NetId net : candidates)
-            if (Replace(m_left_function, gone.front(), net) == m_right_function) {
-                m_causes.push_back({CauseCode::OtherNet, {gone.front(), net}, ""});
-                return;
-            }
+            if (Replace(m_left_function, gone.front(), net) == m_right_function)
+                AddOtherNet(gone.front(), net);
     }
 
-    void FindStuckInput()
+    // One pin of the right table, where a net has several, or the pin is constant or idle.
+    void FindOtherPin()
     {
-        for (const NetId net : m_left_function.nets)
-            for (const bool value : {false, true})
-                if (Fix(m_left_function, net, value) == m_right_function) {
-                    m_causes.push_back({CauseCode::InputStuck, {net}, value ? "1" : "0"});
-                    return;
-                }
-        FindStuckPin();
-    }
-
-    // One of several pins of a net.
-    void FindStuckPin()
-    {
-        for (size_t pin = 0; pin < m_right.nets.size(); ++pin) {
-            const NetId constant = m_right.nets[pin];
-            if (constant != kNetZero && constant != kNetOne)
-                continue;
-            for (const NetId net : m_left_function.nets) {
+        std::vector<NetId> candidates = m_left.nets;
+        candidates.insert(candidates.end(), m_right.nets.begin(), m_right.nets.end());
+        candidates.insert(candidates.end(), {kNetZero, kNetOne});
+        for (size_t pin = 0; pin < m_right.nets.size(); ++pin)
+            for (const NetId net : candidates) {
                 PinFunction pins = m_right;
                 pins.nets[pin] = net;
-                if (Normalise(std::move(pins)) != m_left_function)
-                    continue;
-                m_causes.push_back(
-                    {CauseCode::InputStuck, {net}, constant == kNetOne ? "1" : "0"});
-                return;
+                if (Normalise(std::move(pins)) == m_left_function)
+                    AddOtherNet(net, m_right.nets[pin]);
             }
-        }
+    }
+
+    void AddOtherNet(NetId before, NetId after)
+    {
+        const bool isStuck = after == kNetZero || after == kNetOne;
+        const CauseCode code = isStuck ? CauseCode::InputStuck : CauseCode::OtherNet;
+        if (IsKnown(code))
+            return;
+        if (isStuck)
+            m_causes.push_back({code, {before}, after == kNetOne ? "1" : "0"});
+        else
+            m_causes.push_back({code, {before, after}, ""});
     }
 
     const PinFunction& m_left;

@@ -4,14 +4,12 @@
 #include <cassert>
 
 #include "function.h"
+#include "parallel.h"
 #include "structure.h"
-#include "watch.h"
 
 namespace booleq {
 
 namespace {
-
-constexpr uint64_t kWatchedTables = 1024;
 
 // More pairs by key than by names: then names say nothing.
 bool SaysNothingByName(const Pairing& pairing)
@@ -124,31 +122,21 @@ Comparison::Verdict Comparison::Compare(const TablePair& pair) const
 
 void Comparison::CompareAll(const CompareOptions& options)
 {
-    std::vector<uint64_t> counts(m_left.nets.size(), 0); // of renamed nets: pairs that have it
-    for (size_t place = 0; place < m_pairing.pairs.size(); ++place) {
-        const TablePair& pair = m_pairing.pairs[place];
-        if (place % kWatchedTables == 0) {
-            Watch();
-            if (options.progress)
-                options.progress(options.progressContext, place, m_pairing.pairs.size());
-        }
-        switch (Compare(pair)) {
-        case Verdict::SameByOrder:
-            ++m_num_by_order;
-            ++m_num_same;
-            break;
-        case Verdict::Same:
-            ++m_num_same;
-            break;
-        case Verdict::Renamed:
-            ++m_num_renamed;
-            CountRenamed(pair, counts);
-            break;
-        case Verdict::Different:
-            m_different.push_back(pair);
-            break;
-        }
+    constexpr size_t kBlock = 65536; // pairs from one look at the progress to the next
+    constexpr size_t kPart = 512;    // of a thread, a millisecond or less
+    std::vector<Verdict> verdicts(m_pairing.pairs.size());
+    for (size_t first = 0; first < verdicts.size(); first += kBlock) {
+        if (options.progress)
+            options.progress(options.progressContext, first, verdicts.size());
+        const size_t count = std::min(kBlock, verdicts.size() - first);
+        RunInParts(count, kPart, LutWork(), [&](size_t begin, size_t end) {
+            for (size_t place = first + begin; place < first + end; ++place)
+                verdicts[place] = Compare(m_pairing.pairs[place]);
+        });
     }
+    std::vector<uint64_t> counts(m_left.nets.size(), 0); // of renamed nets: pairs that have it
+    for (size_t place = 0; place < verdicts.size(); ++place)
+        Count(m_pairing.pairs[place], verdicts[place], counts);
     assert(m_num_same + m_num_renamed + m_different.size() == m_pairing.pairs.size());
     for (RenamedNet& net : m_renamed)
         net.numTables = counts[net.left];
@@ -156,6 +144,26 @@ void Comparison::CompareAll(const CompareOptions& options)
     m_renamed.erase(std::remove_if(m_renamed.begin(), m_renamed.end(),
                                    [](const RenamedNet& net) { return net.numTables == 0; }),
                     m_renamed.end());
+}
+
+void Comparison::Count(const TablePair& pair, Verdict verdict, std::vector<uint64_t>& counts)
+{
+    switch (verdict) {
+    case Verdict::SameByOrder:
+        ++m_num_by_order;
+        ++m_num_same;
+        break;
+    case Verdict::Same:
+        ++m_num_same;
+        break;
+    case Verdict::Renamed:
+        ++m_num_renamed;
+        CountRenamed(pair, counts);
+        break;
+    case Verdict::Different:
+        m_different.push_back(pair);
+        break;
+    }
 }
 
 void Comparison::CountRenamed(const TablePair& pair, std::vector<uint64_t>& counts) const

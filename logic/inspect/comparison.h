@@ -5,6 +5,7 @@
 #ifndef BOOLEQ_INSPECT_COMPARISON_H
 #define BOOLEQ_INSPECT_COMPARISON_H
 
+#include <cstdint>
 #include <string>
 #include <utility>
 #include <vector>
@@ -72,13 +73,14 @@ class Comparison {
     std::string NameOf(NetId number) const;
 
   private:
-    enum class Verdict { Same, SameByOrder, Renamed, Different };
+    enum class Verdict : uint8_t { Same, SameByOrder, Renamed, Different };
 
     void Match(const CompareOptions& options);
     void CompareAll(const CompareOptions& options);
     Verdict Compare(const TablePair& pair) const;
     Verdict CompareOutputs(const TablePair& pair) const;
     bool HasRenamed(const TablePair& pair) const;
+    void Count(const TablePair& pair, Verdict verdict, std::vector<uint64_t>& counts);
     void CountRenamed(const TablePair& pair, std::vector<uint64_t>& counts) const;
 
     Design& m_left;

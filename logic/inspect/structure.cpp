@@ -112,6 +112,13 @@ void VoteForOutputs(const Design& left, const Design& right, const Pairing& pair
     }
 }
 
+bool HasUnknownInput(const Design& left, const DesignTable& table, const NetMap& nets)
+{
+    const NetId* const inputs = left.Inputs(table);
+    return std::any_of(inputs, inputs + left.NumInputs(table),
+                       [&nets](NetId net) { return !nets.IsKnownLeft(net); });
+}
+
 // True while the pair may tell more in another round.
 bool VoteForInputs(const NetFunction& left, const NetFunction& right, const NetMap& nets,
                    Votes& votes)
@@ -193,7 +200,8 @@ NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing&
 
     std::vector<const TablePair*> waiting;
     for (const TablePair& pair : pairing.pairs)
-        waiting.push_back(&pair);
+        if (HasUnknownInput(left, left.tables[pair.left], nets))
+            waiting.push_back(&pair);
     for (unsigned int round = 0; round < kMaxRounds && !waiting.empty(); ++round) {
         std::vector<const TablePair*> rest;
         for (const TablePair* const pair : waiting) {

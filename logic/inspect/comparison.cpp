@@ -75,13 +75,18 @@ void Comparison::Match(const CompareOptions& options)
         FollowWires(m_left, m_pairing.onlyLeft);
         FollowWires(m_right, m_pairing.onlyRight);
     }
-    const NetPairs joined = JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
-    if (m_are_names_gone)
-        return;
-    for (const auto& pair : joined) {
-        m_is_renamed[pair.first] = true;
-        m_renamed.push_back({pair.first, pair.second, 0});
+    // A net that is found may be the output of more tables that belong together.
+    for (bool isMore = true; isMore;) {
+        const NetPairs joined =
+            JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
+        for (const auto& pair : joined) {
+            m_is_renamed[pair.first] = !m_are_names_gone;
+            if (!m_are_names_gone)
+                m_renamed.push_back({pair.first, pair.second, 0});
+        }
+        isMore = !joined.empty() && PairRest(m_left, m_right, m_nets, m_pairing) > 0;
     }
+    JoinDoubtful(doubtful, m_nets);
 }
 
 bool Comparison::HasRenamed(const TablePair& pair) const

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cassert>
 #include <string_view>
+#include <unordered_map>
+#include <unordered_set>
 
 namespace booleq {
 
@@ -172,6 +174,32 @@ Pairing PairTables(const Design& left, const Design& right, const NameMatch& mat
                    const NetMap& nets, PairWays ways)
 {
     return Pairer(left, right, match, nets).Run(ways);
+}
+
+size_t PairRest(const Design& left, const Design& right, const NetMap& nets, Pairing& pairing)
+{
+    std::unordered_map<NetId, uint32_t> drivers;
+    for (const uint32_t table : pairing.onlyRight)
+        if (right.tables[table].output >= kNumFixedNets)
+            drivers.emplace(right.tables[table].output, table);
+    std::vector<uint32_t> rest;
+    std::unordered_set<uint32_t> taken;
+    for (const uint32_t table : pairing.onlyLeft) {
+        const NetId output = left.tables[table].output;
+        const auto driver = output >= kNumFixedNets && nets.IsKnownLeft(output)
+                                ? drivers.find(nets.RightOfLeft(output))
+                                : drivers.end();
+        if (driver == drivers.end() || !taken.insert(driver->second).second)
+            rest.push_back(table);
+        else
+            pairing.pairs.push_back({table, driver->second, PairedBy::Net});
+    }
+    pairing.onlyLeft = std::move(rest);
+    pairing.onlyRight.erase(
+        std::remove_if(pairing.onlyRight.begin(), pairing.onlyRight.end(),
+                       [&taken](uint32_t table) { return taken.count(table) != 0; }),
+        pairing.onlyRight.end());
+    return taken.size();
 }
 
 } // namespace booleq

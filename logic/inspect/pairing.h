@@ -35,6 +35,9 @@ enum class PairWays { All, Key };
 Pairing PairTables(const Design& left, const Design& right, const NameMatch& match,
                    const NetMap& nets, PairWays ways);
 
+// Pairs what is left by output nets that have become known since; gives back how many pairs came.
+size_t PairRest(const Design& left, const Design& right, const NetMap& nets, Pairing& pairing);
+
 } // namespace booleq
 
 #endif

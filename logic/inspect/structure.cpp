@@ -216,10 +216,14 @@ NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing&
             break;
         waiting = std::move(rest);
     }
+    return joined;
+}
+
+void JoinDoubtful(const NetPairs& doubtful, NetMap& nets)
+{
     for (const auto& pair : doubtful)
         if (!nets.IsKnownLeft(pair.first) && !nets.IsKnownRight(pair.second))
             nets.Join(pair.first, pair.second);
-    return joined;
 }
 
 void FollowWires(Design& design, const std::vector<uint32_t>& tables)

@@ -33,10 +33,12 @@ Assignments FindAssignments(const NetFunction& left, const NetFunction& right, c
 // Joins the outputs of pairs, then, again and again, the inputs that can be nothing else, by the
 // vote of all pairs. A net that two tables want to join with different ones stays unknown unless
 // more want one of them; of 'doubtful' nets, which a name speaks for, two tables at least must want
-// it. Those that are then still unknown are joined as their name says, and are not in the result.
+// it.
 typedef std::vector<std::pair<NetId, NetId>> NetPairs;
 NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing& pairing,
                          const NetPairs& doubtful, NetMap& nets);
+// Joins those of which nothing else is known as their names say.
+void JoinDoubtful(const NetPairs& doubtful, NetMap& nets);
 
 // Tables of 'tables' that only pass a net, or are constant: whoever reads their output reads the
 // net itself from now on.

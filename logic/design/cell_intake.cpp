@@ -21,12 +21,15 @@ bool IsNumber(const CellValue& value, uint64_t number)
 {
     if (value.isNumber)
         return value.number == number;
+    uint64_t bits = 0;
+    if (ReadPlainBits(value.text, bits) && bits == number)
+        return true;
     InitDigits digits;
     const auto isRead = [&](BareDigits bare) {
         return ReadInitDigits(value.text, bare, 64, digits) && !digits.hasUnknown &&
                !digits.isLong && digits.words[0] == number;
     };
-    return isRead(BareDigits::Binary) || isRead(BareDigits::Decimal);
+    return isRead(BareDigits::Decimal);
 }
 
 const uint64_t* UnknownOf(const InitDigits& digits)
@@ -199,11 +202,32 @@ void CellIntake::End()
         }
         return;
     }
-    const CellType& first = m_cell_types.All()[known.variants->front()];
+    RefusePins(known);
+}
+
+// No variant of the type has all the pins. The one that has most of them tells which are strange.
+void CellIntake::RefusePins(KnownType& known)
+{
+    size_t best = 0;
+    size_t fewest = SIZE_MAX;
+    const auto isStrange = [](const CellType& type, const Pin& pin) {
+        return !IsAnyOf(type.inputPins, pin.name) && !IsAnyOf(type.outputPins, pin.name) &&
+               !IsAnyOf(type.otherPins, pin.name);
+    };
+    for (size_t variant = 0; variant < known.variants->size(); ++variant) {
+        const CellType& type = m_cell_types.All()[(*known.variants)[variant]];
+        const auto numStrange = static_cast<size_t>(std::count_if(
+            m_pins.begin(), m_pins.end(), [&](const Pin& pin) { return isStrange(type, pin); }));
+        if (numStrange < fewest) {
+            fewest = numStrange;
+            best = variant;
+        }
+    }
+    const CellType& type = m_cell_types.All()[(*known.variants)[best]];
     for (const Pin& pin : m_pins)
-        if (!IsAnyOf(first.inputPins, pin.name) && !IsAnyOf(first.outputPins, pin.name))
+        if (isStrange(type, pin))
             AddFinding(FindingCode::PinStrange, std::string(pin.name));
-    EndUnreadOf(DesignTypeOf(known, 0));
+    EndUnreadOf(DesignTypeOf(known, best));
 }
 
 LocalNet CellIntake::InputNet(const std::string& pin, size_t hint, bool isOpenZero)
@@ -397,6 +421,8 @@ void CellIntake::PushTable(uint32_t designType, size_t outputPin, LocalNet outpu
     DesignTable table;
     table.isNamedByOutput = m_name == 0;
     table.name.name = m_name != 0 ? m_name : m_module->netNames[output];
+    if (table.name.name == 0)
+        table.name.name = NameOrLine();
     table.type = designType;
     table.init = init;
     table.firstInput = static_cast<uint32_t>(m_module->inputs.size());

@@ -78,6 +78,7 @@ class CellIntake {
     void EndTable(uint32_t cellType, uint32_t designType);
     bool AddOutputs(uint32_t cellType, uint32_t designType);
     void EndVectorTable(const CellType& type, uint32_t designType);
+    void RefusePins(KnownType& known);
     void EndPending();
     NameId NameOrLine();
     void EndUnreadOf(uint32_t designType);

@@ -412,12 +412,12 @@ class EdifReader {
             }
         }
         if (instance.cell == kNone)
-            Refuse("instance " + Quoted(name.text) + " does not say its cell");
+            ThrowAtLine(instance.line, "instance " + Quoted(name.text) + " does not say its cell");
         instance.numProperties =
             static_cast<uint32_t>(m_properties.size()) - instance.firstProperty;
         Known& known = KnownOf(name.ident);
         if (known.instanceEpoch == m_epoch)
-            Refuse("there are two instances " + Quoted(name.ident));
+            ThrowAtLine(instance.line, "there are two instances " + Quoted(name.ident));
         known.instanceEpoch = m_epoch;
         known.instance = static_cast<uint32_t>(m_instances.size());
         m_instances.push_back(instance);

@@ -89,9 +89,10 @@ FoldedRows FoldTable(const Design& design, const DesignTable& table)
     const NetId* inputs = design.Inputs(table);
     FoldedRows folded;
     folded.rows = TableRows(design, design.inits[table.init]);
-    std::vector<unsigned int> kept; // inputs of the rows, ascending
-    for (unsigned int input = 0; input < numInputs; ++input) {
-        const NetId net = inputs[numInputs - 1 - input];
+    std::vector<unsigned int> kept; // inputs of the rows, descending: from the first pin on
+    for (unsigned int pin = 0; pin < numInputs; ++pin) {
+        const unsigned int input = numInputs - 1 - pin;
+        const NetId net = inputs[pin];
         if (net <= kNetOne) {
             folded.rows = Cofactor(folded.rows, input, net == kNetOne);
             continue;
@@ -107,6 +108,8 @@ FoldedRows FoldTable(const Design& design, const DesignTable& table)
         kept.push_back(input);
         folded.nets.push_back(net);
     }
+    std::reverse(kept.begin(), kept.end());
+    std::reverse(folded.nets.begin(), folded.nets.end());
     folded.rows = Restrict(folded.rows, kept);
     assert(folded.rows.NumInputs() == folded.nets.size());
     return folded;

@@ -201,6 +201,10 @@ bool Split(std::string_view text, BareDigits bare, uint32_t numBits, Literal& li
             return true;
         }
     }
+    // A prefix without digits, unless it is two digits.
+    if (text.size() == 2 && numBits != 2 && text[0] == '0' && !IsDecimal(text[1]) &&
+        bare != BareDigits::Hex)
+        return false;
     literal.digits = text;
     switch (FormOf(text, bare, numBits)) {
     case BareDigits::Binary:
@@ -230,10 +234,39 @@ std::string_view Trimmed(std::string_view text)
 
 } // namespace
 
+bool ReadPlainBits(std::string_view text, uint64_t& value)
+{
+    if (text.empty() || text.size() > 64)
+        return false;
+    value = 0;
+    size_t place = 0;
+    for (; place + 8 <= text.size(); place += 8) {
+        uint64_t digits = 0; // one in each byte, the first in the lowest
+        for (unsigned int digit = 0; digit < 8; ++digit)
+            digits |= uint64_t(static_cast<unsigned char>(text[place + digit])) << (8 * digit);
+        digits ^= 0x3030303030303030;
+        if ((digits & 0xfefefefefefefefe) != 0)
+            return false;
+        // Digit k of the byte goes to bit 63 - k: no two of the products meet.
+        value = value << 8 | (digits * 0x8040201008040201) >> 56;
+    }
+    for (; place < text.size(); ++place) {
+        if (text[place] != '0' && text[place] != '1')
+            return false;
+        value = value << 1 | static_cast<uint64_t>(text[place] - '0');
+    }
+    return true;
+}
+
 bool ReadInitDigits(std::string_view text, BareDigits bare, uint32_t numBits, InitDigits& digits)
 {
     assert(numBits != 0);
     Clear(numBits, digits);
+    uint64_t bits = 0;
+    if (bare == BareDigits::Binary && text.size() == numBits && ReadPlainBits(text, bits)) {
+        digits.words[0] = bits;
+        return true;
+    }
     Literal literal;
     if (!Split(Trimmed(text), bare, numBits, literal))
         return false;

@@ -24,6 +24,9 @@ struct InitDigits {
 // and as many as bits are wanted, Hex where there are a quarter of that, and not read otherwise.
 // Requires: numBits > 0.  Keeps the blocks of 'digits'.
 bool ReadInitDigits(std::string_view text, BareDigits bare, uint32_t numBits, InitDigits& digits);
+// A text of 0 and 1 alone, at most 64 of them, as a number: eight digits at a time.
+// Fails: false for any other text.
+bool ReadPlainBits(std::string_view text, uint64_t& value);
 void ReadInitNumber(uint64_t number, uint32_t numBits, InitDigits& digits);
 
 } // namespace booleq

@@ -56,9 +56,10 @@ class JsonReader {
         try {
             m_document = m_parser.iterate(
                 simdjson::padded_string_view(text.data(), text.size(), m_job.source.Capacity()));
+            m_has_document = true;
             bool hasModules = false;
             for (auto field : m_document.get_object()) {
-                const std::string_view key = field.unescaped_key();
+                const std::string_view key = KeyOf(field);
                 if (key != "modules")
                     continue;
                 if (hasModules)
@@ -90,7 +91,7 @@ class JsonReader {
     {
         const char* location = nullptr;
         const std::string_view text = m_job.source.Text();
-        if (m_document.current_location().get(location) != simdjson::SUCCESS ||
+        if (!m_has_document || m_document.current_location().get(location) != simdjson::SUCCESS ||
             location < text.data() || location > text.data() + text.size())
             return 0;
         return static_cast<size_t>(location - text.data());
@@ -111,12 +112,54 @@ class JsonReader {
         throw ReadFault{where + what};
     }
 
+    // The text of a string that has no escapes as it stands in the file, so that it need not be
+    // copied. Empty data: it has some. The first quotation mark ends it then.
+    static std::string_view Plain(json::raw_json_string raw)
+    {
+        const char* start = raw.raw();
+        const char* end = start;
+        while (*end != '"' && *end != '\\')
+            ++end;
+        return *end == '"' ? std::string_view(start, static_cast<size_t>(end - start))
+                           : std::string_view();
+    }
+
+    static std::string_view KeyOf(simdjson::simdjson_result<json::field>& field)
+    {
+        const std::string_view plain = Plain(field.key());
+        return plain.data() != nullptr ? plain : std::string_view(field.unescaped_key());
+    }
+
+    static std::string_view StringOf(json::value value)
+    {
+        const std::string_view plain = Plain(value.get_raw_json_string());
+        return plain.data() != nullptr ? plain : std::string_view(value.get_string());
+    }
+
+    // Fails: false for what is not a string.
+    static bool GetString(json::value value, std::string_view& text)
+    {
+        if (value.type() != json::json_type::string)
+            return false;
+        text = StringOf(value);
+        return true;
+    }
+
     // Says of each name whether it stood in this section before.
     void EnterSection(const char* section)
     {
         m_place.section = section;
         m_place.item = m_place.part = std::string_view();
         ++m_section;
+    }
+
+    // Yosys writes a backslash before a name of the design that looks like one of its own.
+    static std::string_view WithoutMark(std::string_view name)
+    {
+        const bool isMarked =
+            name.size() > 1 && name[0] == '\\' &&
+            (name[1] == '$' || name[1] == '\\' || (name[1] >= '0' && name[1] <= '9'));
+        return isMarked ? name.substr(1) : name;
     }
 
     NameId AddOnce(std::string_view name)
@@ -128,7 +171,8 @@ class JsonReader {
         if (m_section_of[id] == m_section)
             Refuse("the name stands twice");
         m_section_of[id] = m_section;
-        return id;
+        const std::string_view own = WithoutMark(name);
+        return own.size() == name.size() ? id : m_job.design.names.Add(own);
     }
 
     void ReadModules(json::value modules)
@@ -136,7 +180,7 @@ class JsonReader {
         std::unordered_map<NameId, bool> names;
         for (auto field : modules.get_object()) {
             m_place = Place();
-            m_place.module = field.unescaped_key();
+            m_place.module = KeyOf(field);
             m_job.modules.emplace_back();
             m_module = &m_job.modules.back();
             m_module->name = m_job.design.names.Add(m_place.module);
@@ -161,7 +205,7 @@ class JsonReader {
             isThere = true;
         };
         for (auto field : module.get_object()) {
-            const std::string_view key = field.unescaped_key();
+            const std::string_view key = KeyOf(field);
             if (key == "attributes") {
                 ReadModuleAttributes(field.value());
             } else if (key == "ports") {
@@ -182,14 +226,14 @@ class JsonReader {
     static bool IsSet(json::value value)
     {
         if (value.type() == json::json_type::string)
-            return std::string_view(value.get_string()).find('1') != std::string_view::npos;
+            return StringOf(value).find('1') != std::string_view::npos;
         return value.type() == json::json_type::number && double(value.get_double()) != 0;
     }
 
     void ReadModuleAttributes(json::value attributes)
     {
         for (auto field : attributes.get_object()) {
-            const std::string_view key = field.unescaped_key();
+            const std::string_view key = KeyOf(field);
             if (key == "top")
                 m_module->isTop = IsSet(field.value());
             else if (key == "blackbox" || key == "whitebox")
@@ -229,7 +273,7 @@ class JsonReader {
             if (bit.get_uint64().get(number) == simdjson::SUCCESS)
                 m_bits.push_back(NetOf(number));
             else
-                m_bits.push_back(ConstantOf(bit.get_string()));
+                m_bits.push_back(ConstantOf(StringOf(bit)));
         }
     }
 
@@ -244,12 +288,12 @@ class JsonReader {
     {
         for (auto field : ports.get_object()) {
             ModulePort port;
-            port.bits.name = AddOnce(field.unescaped_key());
+            port.bits.name = AddOnce(KeyOf(field));
             bool hasBits = false;
             for (auto part : field.value().get_object()) {
-                m_place.part = part.unescaped_key();
+                m_place.part = KeyOf(part);
                 if (m_place.part == "direction")
-                    port.direction = DirectionOf(part.value().get_string());
+                    port.direction = DirectionOf(StringOf(part.value()));
                 if (m_place.part != "bits" || hasBits)
                     continue;
                 hasBits = true;
@@ -266,12 +310,12 @@ class JsonReader {
     void ReadCells(json::value cells)
     {
         for (auto field : cells.get_object()) {
-            const std::string_view name = field.unescaped_key();
+            const std::string_view name = KeyOf(field);
             if (m_pace.IsDue())
                 m_pace.Report(Location());
             m_intake.Begin(AddOnce(name), 0);
             for (auto part : field.value().get_object()) {
-                m_place.part = part.unescaped_key();
+                m_place.part = KeyOf(part);
                 ReadCellPart(part.value());
             }
             m_place.part = std::string_view();
@@ -283,7 +327,7 @@ class JsonReader {
     {
         const std::string_view key = m_place.part;
         if (key == "type")
-            m_intake.SetType(part.get_string());
+            m_intake.SetType(StringOf(part));
         else if (key == "parameters")
             ReadParameters(part);
         else if (key == "attributes" && !m_job.options.keyAttribute.empty())
@@ -302,10 +346,10 @@ class JsonReader {
     void ReadParameters(json::value parameters)
     {
         for (auto field : parameters.get_object()) {
-            const std::string_view name = field.unescaped_key();
+            const std::string_view name = KeyOf(field);
             json::value own = field.value();
             CellValue value;
-            if (own.get_string().get(value.text) == simdjson::SUCCESS) {
+            if (GetString(own, value.text)) {
                 m_intake.AddParameter(name, value);
                 continue;
             }
@@ -319,11 +363,11 @@ class JsonReader {
     void ReadKey(json::value attributes)
     {
         for (auto field : attributes.get_object()) {
-            if (std::string_view(field.unescaped_key()) != m_job.options.keyAttribute)
+            if (KeyOf(field) != m_job.options.keyAttribute)
                 continue;
             json::value own = field.value();
             std::string_view text;
-            if (own.get_string().get(text) != simdjson::SUCCESS)
+            if (!GetString(own, text))
                 text = Token(own);
             m_intake.SetKey(m_job.design.names.Add(text));
         }
@@ -332,7 +376,7 @@ class JsonReader {
     void ReadConnections(json::value connections)
     {
         for (auto field : connections.get_object()) {
-            m_place.part = field.unescaped_key();
+            m_place.part = KeyOf(field);
             ReadBits(field.value());
             m_intake.AddPin(m_place.part, m_bits.data(), m_bits.size());
         }
@@ -341,7 +385,7 @@ class JsonReader {
     void ReadNets(json::value nets)
     {
         for (auto field : nets.get_object()) {
-            const std::string_view name = field.unescaped_key();
+            const std::string_view name = KeyOf(field);
             if (m_pace.IsDue())
                 m_pace.Report(Location());
             const NameId id = AddOnce(name);
@@ -350,7 +394,7 @@ class JsonReader {
             int64_t offset = 0;
             m_bits.clear();
             for (auto part : field.value().get_object()) {
-                m_place.part = part.unescaped_key();
+                m_place.part = KeyOf(part);
                 if (m_place.part == "bits")
                     ReadBits(part.value());
                 else if (m_place.part == "hide_name")
@@ -367,7 +411,7 @@ class JsonReader {
             }
             for (size_t bit = 0; bit < m_bits.size(); ++bit) {
                 const size_t step = isDownwards ? m_bits.size() - 1 - bit : bit;
-                m_text.assign(name);
+                m_text.assign(WithoutMark(name));
                 m_text += '[';
                 m_text += std::to_string(static_cast<uint64_t>(offset) + step);
                 m_text += ']';
@@ -404,6 +448,7 @@ class JsonReader {
     Pace m_pace;
     json::parser m_parser;
     json::document m_document;
+    bool m_has_document = false; // else it must not be asked for its location
     Place m_place;
     CellIntake m_intake;
     BitNumbers m_bit_numbers;

@@ -43,11 +43,10 @@ NameArena::NameArena() : m_ends(1, 0), m_slots(kFirstSlots, 0), m_hashes(1, 0) {
 size_t NameArena::SlotOf(std::string_view name, uint64_t hash) const
 {
     const size_t mask = m_slots.size() - 1;
-    const auto check = static_cast<uint32_t>(hash >> 32);
     size_t slot = static_cast<size_t>(hash) & mask;
     while (m_slots[slot] != 0) {
         const NameId other = m_slots[slot];
-        if (m_hashes[other] == check && Text(other) == name)
+        if (m_hashes[other] == hash && Text(other) == name)
             return slot;
         slot = (slot + 1) & mask;
     }
@@ -70,7 +69,7 @@ NameId NameArena::Add(std::string_view name)
     }
     const auto id = static_cast<NameId>(m_ends.size());
     m_bytes.insert(m_bytes.end(), name.begin(), name.end());
-    m_hashes.push_back(static_cast<uint32_t>(hash >> 32));
+    m_hashes.push_back(hash);
     m_ends.push_back(m_bytes.size());
     m_slots[slot] = id;
     assert(m_slots[slot] != 0);
@@ -86,13 +85,18 @@ NameId NameArena::Find(std::string_view name) const
     return id == 0 ? kNoName : id;
 }
 
-// The high half of a hash is kept, the low half chooses the slot, so names are hashed again.
 void NameArena::Grow()
 {
-    std::vector<uint32_t> slots(m_slots.size() * 2, 0);
+    Rehash(m_slots.size() * 2);
+}
+
+void NameArena::Rehash(size_t numSlots)
+{
+    assert((numSlots & (numSlots - 1)) == 0);
+    std::vector<uint32_t> slots(numSlots, 0);
     const size_t mask = slots.size() - 1;
     for (NameId name = 1; name < m_ends.size(); ++name) {
-        size_t slot = static_cast<size_t>(Hash(Text(name))) & mask;
+        size_t slot = static_cast<size_t>(m_hashes[name]) & mask;
         while (slots[slot] != 0)
             slot = (slot + 1) & mask;
         slots[slot] = name;
@@ -100,10 +104,25 @@ void NameArena::Grow()
     m_slots = std::move(slots);
 }
 
+// In a file of a large design a name stands about every 350 bytes. Memory that is reserved and not
+// written is not taken.
+void NameArena::Reserve(uint64_t numBytes)
+{
+    const auto numNames = static_cast<size_t>(numBytes / 350);
+    m_bytes.reserve(static_cast<size_t>(numBytes / 6));
+    m_ends.reserve(numNames);
+    m_hashes.reserve(numNames);
+    size_t numSlots = m_slots.size();
+    while (numSlots * 3 < numNames * 4)
+        numSlots *= 2;
+    if (numSlots != m_slots.size())
+        Rehash(numSlots);
+}
+
 size_t NameArena::NumBytes() const
 {
     return m_bytes.capacity() + m_ends.capacity() * sizeof(uint64_t) +
-           (m_slots.capacity() + m_hashes.capacity()) * sizeof(uint32_t);
+           m_slots.capacity() * sizeof(uint32_t) + m_hashes.capacity() * sizeof(uint64_t);
 }
 
 } // namespace booleq

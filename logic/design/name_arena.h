@@ -22,6 +22,9 @@ class NameArena {
 
     NameArena();
 
+    // Makes room for what a text of so many bytes may have; without it, the arena grows by itself.
+    void Reserve(uint64_t numBytes);
+
     // The number of a name, a new one where it is not there.
     NameId Add(std::string_view name);
     // kNoName where it is not there.
@@ -38,11 +41,12 @@ class NameArena {
   private:
     size_t SlotOf(std::string_view name, uint64_t hash) const;
     void Grow();
+    void Rehash(size_t numSlots);
 
     std::vector<char> m_bytes;
     std::vector<uint64_t> m_ends;
     std::vector<uint32_t> m_slots;
-    std::vector<uint32_t> m_hashes; // of each name, so that growing reads no bytes
+    std::vector<uint64_t> m_hashes; // of each name, so that growing reads no bytes
 };
 
 } // namespace booleq

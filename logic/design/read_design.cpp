@@ -65,6 +65,7 @@ void ReadSource(SourceText& source, const ReadOptions& options, Design& design)
     const FormatRow& row = kFormats[static_cast<size_t>(format)];
     design.format = row.name;
     design.numBytes = source.Text().size();
+    design.names.Reserve(design.numBytes);
     SourceText json;
     if (format == Format::Verilog)
         ConvertVerilog(source, options.yosysSeconds, json);

@@ -2,6 +2,7 @@
 #include <algorithm>
 #include <map>
 
+#include "cause_text.h"
 #include "commands.h"
 #include "comparison.h"
 #include "equation_text.h"
@@ -151,57 +152,6 @@ class DiffAnswer {
                                    : SpellNet(m_right, nets.RightOf(number), m_target);
     }
 
-    std::string NamesOf(const std::vector<NetId>& nets, size_t begin, size_t end) const
-    {
-        std::vector<std::string> names;
-        for (size_t place = begin; place < end; ++place)
-            names.push_back(m_comparison.NameOf(nets[place]));
-        return Join(names, ", ");
-    }
-
-    std::string CauseText(const Cause& cause) const
-    {
-        const std::vector<NetId>& nets = cause.nets;
-        const std::string first = nets.empty() ? "" : m_comparison.NameOf(nets.front());
-        const std::string detail = cause.detail.empty() ? "" : ": " + cause.detail;
-        switch (cause.code) {
-        case CauseCode::OutputInverted:
-            return "the output is inverted";
-        case CauseCode::PinsSwapped: {
-            const size_t half = nets.size() / 2;
-            return "pins swapped without the init value: " +
-                   (nets.size() == 4
-                        ? first + " and " + m_comparison.NameOf(nets[1])
-                        : NamesOf(nets, 0, half) + " became " + NamesOf(nets, half, nets.size())) +
-                   (cause.detail.empty() ? "" : "; " + cause.detail);
-        }
-        case CauseCode::BitOrder:
-            return "the init value is in the other bit order" + detail;
-        case CauseCode::HalvesExchanged:
-            return "the halves of the init value are exchanged, as if " + first + " were inverted";
-        case CauseCode::InputInverted:
-            return "the input " + first + " is taken inverted";
-        case CauseCode::DigitsShifted:
-            return "the digits of the init value are shifted" + detail;
-        case CauseCode::DigitsRotated:
-            return "the digits of the init value are rotated" + detail;
-        case CauseCode::DigitsLost:
-            return "the init value is shortened" + detail;
-        case CauseCode::DigitsReversed:
-            return "the digits of the init value are reversed" + detail;
-        case CauseCode::DigitChanged:
-            return "one digit of the init value is another one" + detail;
-        case CauseCode::OtherNet:
-            return "an input comes from " + m_comparison.NameOf(nets[1]) + " in place of " + first;
-        case CauseCode::InputStuck:
-            return "the input " + first + " is taken as " + cause.detail;
-        case CauseCode::OutputMoved:
-            return "the same function drives " + m_comparison.NameOf(nets[1]) + " in place of " +
-                   first;
-        }
-        return std::string();
-    }
-
     void PutDifference(const TablePair& pair)
     {
         const Difference difference = m_comparison.Describe(pair);
@@ -225,7 +175,7 @@ class DiffAnswer {
             PutField(m_output, "  cause", "none that is known");
         for (const Cause& cause : difference.causes)
             PutField(m_output, &cause == &difference.causes.front() ? "  cause" : "  or",
-                     Visible(CauseText(cause)));
+                     Visible(CauseText(m_comparison, cause)));
         if (!difference.expectedInit.empty() && !difference.isSameFunction)
             PutField(m_output, "  should be", difference.expectedInit + ", right's pins being " +
                                                   Visible(PinsText(pair)));
@@ -321,7 +271,7 @@ class DiffAnswer {
             difference.expectedInit.empty() ? Json(nullptr) : Json(difference.expectedInit);
         json["causes"] = Json::array();
         for (const Cause& cause : difference.causes)
-            json["causes"].push_back({{"code", CauseWord(cause.code)}, {"message", CauseText(cause)}});
+            json["causes"].push_back({{"code", CauseWord(cause.code)}, {"message", CauseText(m_comparison, cause)}});
         return json;
     }
 

@@ -12,8 +12,8 @@
 //     std::cout << comparison.isSame << '\n'; // 0
 //     std::cout << comparison.differences[0].path << '\n'; // y
 //
-// A netlist may have a million tables, so it is held packed: At() makes one plain value at a time, and
-// a comparison has only what is not the same, not a verdict for each table.
+// A netlist may have a million tables, so it is held packed: At() makes one plain value at a time,
+// and a comparison has only what is not the same, not a verdict for each table.
 #ifndef KQ_LOGIC_NETLIST_H
 #define KQ_LOGIC_NETLIST_H
 
@@ -70,7 +70,8 @@ class KQ_EXPORT Netlist {
 };
 
 struct CompareOptions {
-    std::vector<std::pair<std::string, std::string>> renames; // a left net, and the right one's name
+    std::vector<std::pair<std::string, std::string>>
+        renames;              // a left net, and the right one's name
     bool allowsWires = false; // tables that only pass a net or a constant may be on one side only
 };
 
@@ -79,7 +80,7 @@ struct TableDifference {
     std::string path; // in the left netlist
     std::string rightPath;
     std::vector<std::pair<std::string, bool>> assignment; // of nets, for which they differ first
-    bool left = false;                                     // values there
+    bool left = false;                                    // values there
     bool right = false;
     std::vector<std::pair<std::string, std::string>> causes; // a stable word, and a sentence
     std::string shouldBe; // the right one's init value; empty where it lacks a net

@@ -34,14 +34,6 @@ bool OptionsOf(const NetlistOptions& options, booleq::CellTypes& cellTypes,
     return true;
 }
 
-std::string HexOf(const booleq::Rows& rows)
-{
-    std::vector<std::string> names; // digits need none, only their number
-    for (unsigned int input = 0; input < rows.NumInputs(); ++input)
-        names.push_back(std::to_string(input));
-    return booleq::Function(std::move(names), rows).Hex();
-}
-
 TableDifference ToPublic(const booleq::Comparison& comparison, const booleq::Design& left,
                          const booleq::Design& right, const booleq::TablePair& pair)
 {
@@ -120,7 +112,7 @@ NetlistTable Netlist::At(size_t table) const
     plain.output = NetName(design, own.output);
     for (unsigned int pin = design.NumInputs(own); pin-- > 0;)
         plain.inputs.push_back(NetName(design, design.Inputs(own)[pin]));
-    plain.init = HexOf(TableRows(design, design.inits[own.init]));
+    plain.init = booleq::HexOf(TableRows(design, design.inits[own.init]));
     return plain;
 }
 
@@ -137,10 +129,10 @@ NetlistComparison Compare(const Netlist& left, const Netlist& right, const Compa
     result.isSame = comparison.Different().empty() && comparison.NumRenamed() == 0;
     for (const booleq::TablePair& pair : comparison.Different())
         result.differences.push_back(ToPublic(comparison, leftDesign, rightDesign, pair));
-    result.missing = LonePaths(leftDesign, comparison.Pairs().onlyLeft, options.allowsWires,
-                               result.isSame);
-    result.added = LonePaths(rightDesign, comparison.Pairs().onlyRight, options.allowsWires,
-                             result.isSame);
+    result.missing =
+        LonePaths(leftDesign, comparison.Pairs().onlyLeft, options.allowsWires, result.isSame);
+    result.added =
+        LonePaths(rightDesign, comparison.Pairs().onlyRight, options.allowsWires, result.isSame);
     for (const booleq::RenamedNet& net : comparison.RenamedNets())
         result.renamed.emplace_back(NetName(leftDesign, net.left), NetName(rightDesign, net.right));
     return result;

@@ -2,136 +2,14 @@
 
 #include <algorithm>
 #include <cassert>
-#include <functional>
 
 #include "function.h"
+#include "init_fault.h"
 #include "match.h"
-#include "text.h"
 
 namespace booleq {
 
 namespace {
-
-constexpr unsigned int kDigitRows = 4; // of a hexadecimal digit
-
-// What may happen to an init value, and what undoes it.
-struct Fault {
-    CauseCode code;
-    std::string detail;
-    std::function<Rows(const Rows&)> apply;
-    std::function<Rows(const Rows&)> undo; // empty where something is lost
-    int input = -1; // of the pins, that it is about
-};
-
-// A fault that changes where rows stand: row k comes from row source(k); kNoRow gives a 0.
-Rows MoveRows(const Rows& rows, const std::function<uint64_t(uint64_t)>& source)
-{
-    Rows moved(rows.NumInputs());
-    for (uint64_t row = 0; row < rows.NumRows(); ++row) {
-        const uint64_t from = source(row);
-        if (from != Rows::kNoRow && rows.At(from))
-            moved.Set(row, true);
-    }
-    return moved;
-}
-
-Rows ShiftUp(const Rows& rows, uint64_t distance)
-{
-    return MoveRows(rows,
-                    [=](uint64_t row) { return row < distance ? Rows::kNoRow : row - distance; });
-}
-
-Rows ShiftDown(const Rows& rows, uint64_t distance)
-{
-    const uint64_t numRows = rows.NumRows();
-    return MoveRows(rows, [=](uint64_t row) {
-        return row + distance < numRows ? row + distance : Rows::kNoRow;
-    });
-}
-
-Rows RotateUp(const Rows& rows, uint64_t distance)
-{
-    const uint64_t numRows = rows.NumRows();
-    return MoveRows(rows, [=](uint64_t row) { return (row + numRows - distance) % numRows; });
-}
-
-Rows DropFirst(const Rows& rows, uint64_t numKept)
-{
-    return MoveRows(rows, [=](uint64_t row) { return row < numKept ? row : Rows::kNoRow; });
-}
-
-// Groups of so many rows, the last group first.
-Rows ReverseGroups(const Rows& rows, uint64_t group)
-{
-    const uint64_t numGroups = rows.NumRows() / group;
-    return MoveRows(
-        rows, [=](uint64_t row) { return (numGroups - 1 - row / group) * group + row % group; });
-}
-
-Rows ReverseInputs(const Rows& rows)
-{
-    std::vector<unsigned int> order(rows.NumInputs());
-    for (unsigned int input = 0; input < order.size(); ++input)
-        order[input] = static_cast<unsigned int>(order.size()) - 1 - input;
-    return PermuteInputs(rows, order);
-}
-
-void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun, std::vector<Fault>& faults)
-{
-    const uint64_t numDigits = numRows / digit;
-    for (uint64_t count = 1; count < numDigits; ++count) {
-        const uint64_t distance = count * digit;
-        const std::string by = Count(count, noun);
-        faults.push_back({CauseCode::DigitsShifted, by + " to the left, zeros put in",
-                          [=](const Rows& rows) { return ShiftUp(rows, distance); }, nullptr});
-        faults.push_back({CauseCode::DigitsShifted, by + " to the right, zeros put in",
-                          [=](const Rows& rows) { return ShiftDown(rows, distance); }, nullptr});
-        // Half way round is the exchange of halves; less than that is the shorter way.
-        if (2 * distance < numRows) {
-            const auto left = [=](const Rows& rows) { return RotateUp(rows, distance); };
-            const auto right = [=](const Rows& rows) { return RotateUp(rows, numRows - distance); };
-            faults.push_back({CauseCode::DigitsRotated, by + " to the left", left, right});
-            faults.push_back({CauseCode::DigitsRotated, by + " to the right", right, left});
-        }
-        faults.push_back({CauseCode::DigitsLost, "the first " + by + (count == 1 ? " is" : " are") +
-                                                     " lost, zeros in place of " +
-                                                     (count == 1 ? "it" : "them"),
-                          [=](const Rows& rows) { return DropFirst(rows, numRows - distance); },
-                          nullptr});
-    }
-    if (numDigits > 1) {
-        const auto reverse = [=](const Rows& rows) { return ReverseGroups(rows, digit); };
-        faults.push_back({CauseCode::DigitsReversed,
-                          std::string(noun) + "s, the last one first", reverse, reverse});
-    }
-}
-
-// Those that happen to the init value alone.
-std::vector<Fault> InitFaults(unsigned int numInputs)
-{
-    const uint64_t numRows = uint64_t(1) << numInputs;
-    const auto invert = [](const Rows& rows) { return ~rows; };
-    std::vector<Fault> faults = {{CauseCode::OutputInverted, "", invert, invert}};
-    if (numInputs > 2)
-        faults.push_back({CauseCode::BitOrder,
-                          "the first pin counts most in the one, least in the other", ReverseInputs,
-                          ReverseInputs});
-    for (unsigned int input = 0; input < numInputs; ++input) {
-        const auto turn = [=](const Rows& rows) { return InvertInput(rows, input); };
-        faults.push_back({input == 0 ? CauseCode::HalvesExchanged : CauseCode::InputInverted, "",
-                          turn, turn, static_cast<int>(input)});
-    }
-    constexpr uint64_t kMaxDigits = 64;
-    if (numRows >= 2 * kDigitRows && numRows / kDigitRows <= kMaxDigits)
-        AddDigitFaults(numRows, kDigitRows, "hexadecimal digit", faults);
-    if (numRows >= 8 * kDigitRows) { // two bytes are two halves
-        const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, 2 * kDigitRows); };
-        faults.push_back({CauseCode::DigitsReversed, "bytes, the last one first", reverse, reverse});
-    }
-    if (numRows <= kMaxDigits)
-        AddDigitFaults(numRows, 1, "binary digit", faults);
-    return faults;
-}
 
 // The rows that some assignment of the nets leads to: constants have their value, pins of one net
 // the same one.
@@ -190,10 +68,9 @@ class CauseFinder {
         FindOtherNet();
         FindOtherPin();
         DropWeaker();
-        std::stable_sort(m_causes.begin(), m_causes.end(),
-                         [](const Cause& left, const Cause& right) {
-                             return left.code < right.code;
-                         });
+        std::stable_sort(
+            m_causes.begin(), m_causes.end(),
+            [](const Cause& left, const Cause& right) { return left.code < right.code; });
         return std::move(m_causes);
     }
 
@@ -206,21 +83,21 @@ class CauseFinder {
     }
 
     // Done to the left table's init value it gives the right one's function.
-    bool LeadsToRight(const Fault& fault) const
+    bool LeadsToRight(const InitFault& fault) const
     {
         return Normalise({fault.apply(m_left.rows), m_left.nets}) == m_right_function;
     }
 
     // Undone of the right table's init value, or done to the one that it should have.
-    bool LeadsFromRight(const Fault& fault) const
+    bool LeadsFromRight(const InitFault& fault) const
     {
         if (fault.undo && Normalise({fault.undo(m_right.rows), m_right.nets}) == m_left_function)
             return true;
         return m_has_expected && IsZero((fault.apply(m_expected) ^ m_right.rows) & m_reachable);
     }
 
-    // What says no more than another cause: a half is told apart by an input; digits that are shifted
-    // out and are 0 are as good as rotated.
+    // What says no more than another cause: a half is told apart by an input; digits that are
+    // shifted out and are 0 are as good as rotated.
     void DropWeaker()
     {
         const bool hasShift = IsKnown(CauseCode::DigitsShifted);
@@ -232,7 +109,7 @@ class CauseFinder {
         m_causes.erase(std::remove_if(m_causes.begin(), m_causes.end(), isWeaker), m_causes.end());
     }
 
-    void AddInitFault(const Fault& fault, const PinFunction& pins)
+    void AddInitFault(const InitFault& fault, const PinFunction& pins)
     {
         Cause cause = {fault.code, {}, fault.detail};
         if (fault.input >= 0)
@@ -243,10 +120,10 @@ class CauseFinder {
     // By the right table's pins first: it is the one that is looked at.
     void FindInitFaults()
     {
-        for (const Fault& fault : InitFaults(m_right.rows.NumInputs()))
+        for (const InitFault& fault : InitFaults(m_right.rows.NumInputs()))
             if (!IsKnown(fault.code) && LeadsFromRight(fault))
                 AddInitFault(fault, m_right);
-        for (const Fault& fault : InitFaults(m_left.rows.NumInputs()))
+        for (const InitFault& fault : InitFaults(m_left.rows.NumInputs()))
             if (!IsKnown(fault.code) && LeadsToRight(fault))
                 AddInitFault(fault, m_left);
     }
@@ -299,9 +176,9 @@ class CauseFinder {
     {
         nets.insert(nets.end(), takenFor.begin(), takenFor.end());
         const bool isSameInit = m_left.rows == m_right.rows && m_left.nets != m_right.nets;
-        m_causes.push_back({CauseCode::PinsSwapped, std::move(nets),
-                            isSameInit ? "the init value is the same, the order of pins is not"
-                                       : ""});
+        m_causes.push_back(
+            {CauseCode::PinsSwapped, std::move(nets),
+             isSameInit ? "the init value is the same, the order of pins is not" : ""});
     }
 
     // Over the right table's pins; else over the left one's, where the right one has idle pins.
@@ -364,7 +241,7 @@ class CauseFinder {
     const PinFunction& m_right;
     NetFunction m_left_function;
     NetFunction m_right_function;
-    Rows m_expected; // the right one's init value, had it the left one's function
+    Rows m_expected;  // the right one's init value, had it the left one's function
     Rows m_reachable; // of the right table, see ReachableRows
     bool m_has_expected = false;
     std::vector<Cause> m_causes;

@@ -1,7 +1,7 @@
-// Why two tables that should be one differ, where a fault that tools make explains it: what was done
-// to the one so that it became the other.
-// In: the pins of both tables in common net numbers. Out: every fault that explains the difference
-// whole, each applied and compared before it is named.  Cost: some thousand operations on rows.
+// Why two tables that should be one differ, where a fault that tools make explains it: what was
+// done to the one so that it became the other. In: the pins of both tables in common net numbers.
+// Out: every fault that explains the difference whole, each applied and compared before it is
+// named.  Cost: some thousand operations on rows.
 #ifndef BOOLEQ_INSPECT_CAUSE_H
 #define BOOLEQ_INSPECT_CAUSE_H
 
@@ -20,12 +20,12 @@ enum class CauseCode {
     InputInverted,   // another pin is
     DigitsShifted,
     DigitsRotated,
-    DigitsLost,      // the first ones are 0
+    DigitsLost, // the first ones are 0
     DigitsReversed,
-    DigitChanged,    // one
-    OtherNet,        // one input comes from another net
-    InputStuck,      // one input is taken as a constant
-    OutputMoved      // the function is the same, and drives another net
+    DigitChanged, // one
+    OtherNet,     // one input comes from another net
+    InputStuck,   // one input is taken as a constant
+    OutputMoved   // the function is the same, and drives another net
 };
 
 struct Cause {

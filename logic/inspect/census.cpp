@@ -56,9 +56,9 @@ void NumberClasses(Census& census)
             ++census.numWide;
             continue;
         }
-        const uint64_t form = FindCanonical(function.rows.Words()[0], numInputs,
-                                            CanonicalScope::OrderAndInversions)
-                                  .form;
+        const uint64_t form =
+            FindCanonical(function.rows.Words()[0], numInputs, CanonicalScope::OrderAndInversions)
+                .form;
         const auto added = numbers[numInputs].emplace(form, census.numClasses);
         function.classNumber = added.first->second;
         census.numClasses += added.second ? 1 : 0;
@@ -69,8 +69,8 @@ void CountTypes(const Design& design, Census& census)
 {
     for (const DesignType& type : design.types)
         if (type.numCells > 0)
-            census.types.push_back({std::string(design.names.Text(type.name)), type.role,
-                                    type.numCells, type.note});
+            census.types.push_back(
+                {std::string(design.names.Text(type.name)), type.role, type.numCells, type.note});
     std::sort(census.types.begin(), census.types.end(),
               [](const TypeCount& left, const TypeCount& right) {
                   return left.numCells != right.numCells ? left.numCells > right.numCells

@@ -37,14 +37,6 @@ std::vector<NetId> NetOrder(const PinFunction& left, const PinFunction& right,
     return order;
 }
 
-std::string HexOf(const Rows& rows)
-{
-    std::vector<std::string> names; // digits need none, only their number
-    for (unsigned int input = 0; input < rows.NumInputs(); ++input)
-        names.push_back(std::to_string(input));
-    return Function(std::move(names), rows).Hex();
-}
-
 } // namespace
 
 Comparison::Comparison(Design& left, Design& right, const CompareOptions& options)
@@ -77,8 +69,7 @@ void Comparison::Match(const CompareOptions& options)
     }
     // A net that is found may be the output of more tables that belong together.
     for (bool isMore = true; isMore;) {
-        const NetPairs joined =
-            JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
+        const NetPairs joined = JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
         for (const auto& pair : joined) {
             m_is_renamed[pair.first] = !m_are_names_gone;
             if (!m_are_names_gone)
@@ -196,11 +187,10 @@ Difference Comparison::Describe(const TablePair& pair) const
         difference.expectedInit = HexOf(expected);
     if (difference.leftFunction == difference.rightFunction) {
         difference.isSameFunction = true;
-        difference.causes.push_back(
-            {CauseCode::OutputMoved,
-             {m_left.tables[pair.left].output,
-              m_nets.NumberOfRight(m_right.tables[pair.right].output)},
-             ""});
+        difference.causes.push_back({CauseCode::OutputMoved,
+                                     {m_left.tables[pair.left].output,
+                                      m_nets.NumberOfRight(m_right.tables[pair.right].output)},
+                                     ""});
         return difference;
     }
     const std::vector<NetId> order =

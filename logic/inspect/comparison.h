@@ -17,9 +17,9 @@
 namespace booleq {
 
 enum class NetNames {
-    Auto,  // by name, unless pairs by key show that the names are others
-    Kept,  // by name
-    Gone   // by structure alone
+    Auto, // by name, unless pairs by key show that the names are others
+    Kept, // by name
+    Gone  // by structure alone
 };
 
 struct CompareOptions {
@@ -42,8 +42,8 @@ struct RenamedNet {
 // One pair that differs, for people and programs.
 struct Difference {
     std::vector<std::pair<std::string, bool>> assignment; // nets in the order of the left pins
-    bool isSameFunction = false;                           // then there is no assignment
-    bool left = false;                                     // values there
+    bool isSameFunction = false;                          // then there is no assignment
+    bool left = false;                                    // values there
     bool right = false;
     NetFunction leftFunction; // in common numbers
     NetFunction rightFunction;

@@ -101,8 +101,8 @@ FunctionTexts MakeTexts(const Rows& rows, const Target& target)
         return texts;
     const Conversion conversion = Convert(form.expression, target, "", Limits());
     if (conversion.fault.empty() && conversion.isProved)
-        texts.equation = Split(conversion.text.substr(0, conversion.text.find('\n')),
-                               rows.NumInputs());
+        texts.equation =
+            Split(conversion.text.substr(0, conversion.text.find('\n')), rows.NumInputs());
     return texts;
 }
 

@@ -43,7 +43,7 @@ class NameMatch {
   private:
     const Design& m_from;
     const Design& m_to;
-    std::vector<NameId> m_names;   // by name of 'from'; kNotThere where 'to' lacks it
+    std::vector<NameId> m_names;    // by name of 'from'; kNotThere where 'to' lacks it
     std::vector<uint32_t> m_scopes; // the same for scopes
 };
 

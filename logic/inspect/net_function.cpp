@@ -4,6 +4,7 @@
 #include <cassert>
 
 #include "fold.h"
+#include "function.h"
 
 namespace booleq {
 
@@ -48,9 +49,8 @@ void SortNets(PinFunction& pins)
     for (size_t end = 1; end < pins.nets.size(); ++end)
         for (size_t place = end; place > 0 && pins.nets[place - 1] > pins.nets[place]; --place) {
             std::swap(pins.nets[place - 1], pins.nets[place]);
-            pins.rows =
-                SwapInputs(std::move(pins.rows), static_cast<unsigned int>(place - 1),
-                           static_cast<unsigned int>(place));
+            pins.rows = SwapInputs(std::move(pins.rows), static_cast<unsigned int>(place - 1),
+                                   static_cast<unsigned int>(place));
         }
 }
 
@@ -117,6 +117,14 @@ NetFunction Replace(const NetFunction& function, NetId net, NetId by)
     PinFunction pins = {function.rows, function.nets};
     std::replace(pins.nets.begin(), pins.nets.end(), net, by);
     return Normalise(std::move(pins));
+}
+
+std::string HexOf(const Rows& rows)
+{
+    std::vector<std::string> names; // digits need none, only their number
+    for (unsigned int input = 0; input < rows.NumInputs(); ++input)
+        names.push_back(std::to_string(input));
+    return Function(std::move(names), rows).Hex();
 }
 
 PinFunction PinsOf(const Design& design, const DesignTable& table)

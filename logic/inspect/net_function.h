@@ -4,6 +4,7 @@
 #ifndef BOOLEQ_INSPECT_NET_FUNCTION_H
 #define BOOLEQ_INSPECT_NET_FUNCTION_H
 
+#include <string>
 #include <vector>
 
 #include "design.h"
@@ -41,6 +42,9 @@ NetFunction Renumber(const NetFunction& function, const std::vector<NetId>& numb
 // With a net at a value, and with another net in place of it; a net without effect changes nothing.
 NetFunction Fix(const NetFunction& function, NetId net, bool value);
 NetFunction Replace(const NetFunction& function, NetId net, NetId by);
+
+// Hexadecimal digits of rows, the highest first, as Function::Hex writes them.
+std::string HexOf(const Rows& rows);
 
 // The pins of a table.
 PinFunction PinsOf(const Design& design, const DesignTable& table);

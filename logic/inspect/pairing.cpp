@@ -76,9 +76,9 @@ class Pairer {
             if (other == kNotThere)
                 continue;
             const ScopedName name = m_right.tables[other].name;
-            for (; other < m_right.tables.size() &&
-                   m_right.tables[other].name.scope == name.scope &&
-                   m_right.tables[other].name.name == name.name;
+            for (;
+                 other < m_right.tables.size() && m_right.tables[other].name.scope == name.scope &&
+                 m_right.tables[other].name.name == name.name;
                  ++other)
                 if (Pair(table, other, PairedBy::Path))
                     break;
@@ -95,8 +95,7 @@ class Pairer {
         }
         for (uint32_t table = 0; table < m_left.tables.size(); ++table) {
             const NetId net = m_left.tables[table].output;
-            if (m_partners[table] != kNotThere || net < kNumFixedNets ||
-                !m_nets.IsKnownLeft(net))
+            if (m_partners[table] != kNotThere || net < kNumFixedNets || !m_nets.IsKnownLeft(net))
                 continue;
             const uint32_t driver = drivers[m_nets.RightOfLeft(net)];
             if (driver == kNotThere || m_is_taken[driver])
@@ -122,8 +121,8 @@ class Pairer {
                 ++m_num_keys_twice;
         }
         for (uint32_t table = 0; table < m_left.tables.size(); ++table) {
-            const NameId key = m_left.keys[table] == 0 ? kNotThere
-                                                       : m_match.Find(m_left.keys[table]);
+            const NameId key =
+                m_left.keys[table] == 0 ? kNotThere : m_match.Find(m_left.keys[table]);
             if (m_partners[table] != kNotThere || key == kNotThere || firsts[key] == kNotThere)
                 continue;
             for (uint32_t other = firsts[key];

@@ -15,7 +15,7 @@ namespace booleq {
 enum class PairedBy : uint8_t { Path, Net, Key };
 
 struct TablePair {
-    uint32_t left;  // of Design::tables
+    uint32_t left; // of Design::tables
     uint32_t right;
     PairedBy by;
 };
@@ -30,8 +30,8 @@ struct Pairing {
 
 enum class PairWays { All, Key };
 
-// By path, else by output net, else by key; or by key alone. A path that a program made up ("$abc$12") is looked at
-// after the net: two runs give it to different cells.
+// By path, else by output net, else by key; or by key alone. A path that a program made up
+// ("$abc$12") is looked at after the net: two runs give it to different cells.
 Pairing PairTables(const Design& left, const Design& right, const NameMatch& match,
                    const NetMap& nets, PairWays ways);
 

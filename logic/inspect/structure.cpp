@@ -36,8 +36,8 @@ class Votes {
         for (const auto& count : m_counts) {
             const auto left = static_cast<NetId>(count.first >> 32);
             const auto right = static_cast<NetId>(count.first);
-            if (count.second < 2 && (m_doubtful_lefts.count(left) != 0 ||
-                                     m_doubtful_rights.count(right) != 0))
+            if (count.second < 2 &&
+                (m_doubtful_lefts.count(left) != 0 || m_doubtful_rights.count(right) != 0))
                 continue;
             lefts[left].Hear(right, count.second);
             rights[right].Hear(left, count.second);

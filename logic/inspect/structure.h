@@ -23,9 +23,9 @@ NetFunction RightFunction(const Design& right, uint32_t table, const NetMap& net
 struct Assignments {
     static constexpr unsigned int kMaxNets = 5; // more have too many orders
 
-    unsigned int number = 0; // 2 stands for more
+    unsigned int number = 0;                    // 2 stands for more
     std::vector<std::pair<NetId, NetId>> first; // common numbers, left and right
-    bool isTried = true; // false: too many nets
+    bool isTried = true;                        // false: too many nets
 };
 Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets);
 

@@ -33,9 +33,9 @@ uint32_t TableFunctions::Number(const Rows& rows)
 {
     const auto next = static_cast<uint32_t>(m_functions.size());
     const bool isWord = rows.NumInputs() <= kMaxWordInputs;
-    const uint32_t number = isWord
-                                ? m_words[rows.NumInputs()].emplace(rows.Words()[0], next).first->second
-                                : m_wide.emplace(rows, next).first->second;
+    const uint32_t number =
+        isWord ? m_words[rows.NumInputs()].emplace(rows.Words()[0], next).first->second
+               : m_wide.emplace(rows, next).first->second;
     if (number == next)
         m_functions.push_back(rows);
     assert(m_functions[number] == rows);

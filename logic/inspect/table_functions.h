@@ -20,9 +20,9 @@ constexpr unsigned int kMaxWordInputs = 6; // of a function that is one word
 class TableFunctions {
   public:
     struct Found {
-        uint32_t function = 0;    // of Functions()
-        std::vector<NetId> nets;  // of its inputs
-        std::vector<NetId> idle;  // nets that have no effect
+        uint32_t function = 0;   // of Functions()
+        std::vector<NetId> nets; // of its inputs
+        std::vector<NetId> idle; // nets that have no effect
     };
 
     explicit TableFunctions(const Design& design);

@@ -1,5 +1,5 @@
-// Small netlists made at random, as tables over numbered nets; what they say is computed row by row,
-// with nothing of the code under test. They are written as Yosys JSON or BLIF.
+// Small netlists made at random, as tables over numbered nets; what they say is computed row by
+// row, with nothing of the code under test. They are written as Yosys JSON or BLIF.
 #ifndef TESTS_NETLISTS_CIRCUIT_H
 #define TESTS_NETLISTS_CIRCUIT_H
 
@@ -41,8 +41,8 @@ bool IsSameFunction(const CircuitTable& left, const CircuitTable& right);
 // Changes that leave the function alone.
 void ShufflePins(CircuitTable& table, Random& random);
 void AddIdlePin(CircuitTable& table, int net, Random& random);
-// A pin that is a constant, or a net that the table has on another pin, with anything in the rows that
-// never count; or, where the rows shall be as if the pin were idle, a constant.
+// A pin that is a constant, or a net that the table has on another pin, with anything in the rows
+// that never count; or, where the rows shall be as if the pin were idle, a constant.
 void AddFixedPin(CircuitTable& table, bool isAnything, Random& random);
 
 std::string WriteJson(const Circuit& circuit, const char* key);

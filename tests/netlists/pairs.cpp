@@ -1,5 +1,5 @@
-// Pairs of netlists, equal or with one fault, compared: whether the verdict is right, and whether the
-// cause that is named is the fault that was put in.
+// Pairs of netlists, equal or with one fault, compared: whether the verdict is right, and whether
+// the cause that is named is the fault that was put in.
 //
 // usage: netlist_pairs [COUNT [SEED]]
 #include <algorithm>
@@ -67,7 +67,7 @@ struct PairOfCircuits {
     Circuit left;
     Circuit right;
     Fault fault = Fault::None;
-    size_t table = 0; // of both, that the fault is in
+    size_t table = 0;    // of both, that the fault is in
     std::string renamed; // of NetRenamed, the net
 };
 
@@ -197,7 +197,8 @@ PairOfCircuits MakePair(Random& random)
         pair.right.nets[static_cast<size_t>(faulty.output)] = "quite_another_name";
     }
     if (pair.fault == Fault::Missing)
-        pair.right.tables.erase(pair.right.tables.begin() + static_cast<std::ptrdiff_t>(pair.table));
+        pair.right.tables.erase(pair.right.tables.begin() +
+                                static_cast<std::ptrdiff_t>(pair.table));
     if (pair.fault == Fault::Added) {
         CircuitTable added = pair.right.tables[pair.table];
         added.name = "more";

@@ -26,10 +26,10 @@ const std::vector<Option>& CommonOptions(bool takesFiles)
 const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
-        ShowCommand(),    CheckCommand(), EvalCommand(),    TableCommand(),
-        InitCommand(),    EqualCommand(), SatCommand(),     ExplainCommand(),
-        PermuteCommand(), MatchCommand(), ConvertCommand(), LintCommand(),
-        TreeCommand(),    KmapCommand(),  BatchCommand(),   MinimizeCommand(),
+        ShowCommand(),         CheckCommand(),       EvalCommand(),         TableCommand(),
+        InitCommand(),         EqualCommand(),       SatCommand(),          ExplainCommand(),
+        PermuteCommand(),      MatchCommand(),       ConvertCommand(),      LintCommand(),
+        TreeCommand(),         KmapCommand(),        BatchCommand(),        MinimizeCommand(),
         NetlistStatsCommand(), NetlistListCommand(), NetlistCheckCommand(), NetlistDiffCommand(),
     };
     return commands;

@@ -10,7 +10,7 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMargin = 20;
-constexpr size_t kLine = 26;      // from one bar to the next
+constexpr size_t kLine = 26; // from one bar to the next
 constexpr size_t kBarHeight = 18;
 constexpr size_t kBarLength = 320; // of the longest
 constexpr size_t kNumberWidth = 110;
@@ -52,8 +52,8 @@ void PutHistograms(const std::vector<Histogram>& histograms, Output& output)
             const auto length = static_cast<size_t>(static_cast<double>(bar.number) * kBarLength /
                                                     static_cast<double>(most));
             output.Put(SvgNote(left - kCharacterWidth, y + kBarHeight - 4, "end", Label(bar)));
-            output.Put(SvgBox(left, y, std::max<size_t>(length, bar.number > 0 ? 1 : 0),
-                              kBarHeight, true, ""));
+            output.Put(SvgBox(left, y, std::max<size_t>(length, bar.number > 0 ? 1 : 0), kBarHeight,
+                              true, ""));
             output.Put(SvgText(left + length + kCharacterWidth, y + kBarHeight - 4, "start",
                                std::to_string(bar.number)));
             y += kLine;

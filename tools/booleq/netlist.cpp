@@ -58,8 +58,9 @@ void RefuseFile(const std::string& file, const Request& request, Output& output,
 
 std::vector<Option> NetlistOptions()
 {
-    return {{"--cells", "FILE", "More types of cells that are look-up tables, as docs/netlists.md "
-                                "says"},
+    return {{"--cells", "FILE",
+             "More types of cells that are look-up tables, as docs/netlists.md "
+             "says"},
             {"--top", "MODULE", "The module that is the design, where the file does not say so"}};
 }
 

@@ -72,8 +72,8 @@ class FindingsOut {
             around = AroundFindings(design);
             m_output.Put(around.first);
         }
-        const uint64_t numFindings = FindFindings(
-            design, [this](const TableFinding& finding) { return Take(finding); });
+        const uint64_t numFindings =
+            FindFindings(design, [this](const TableFinding& finding) { return Take(finding); });
         m_output.Put(around.second);
         if (m_sarif)
             m_sarif->Finish();
@@ -83,8 +83,7 @@ class FindingsOut {
   private:
     std::pair<std::string, std::string> AroundFindings(const Design& design) const
     {
-        const bool isClean =
-            FindFindings(design, [](const TableFinding&) { return false; }) == 0;
+        const bool isClean = FindFindings(design, [](const TableFinding&) { return false; }) == 0;
         return JsonAroundArray({m_file, 0}, m_request, isClean ? "done" : "findings",
                                {{"tables", design.tables.size()}, {"findings", Json::array()}});
     }
@@ -130,20 +129,21 @@ Command NetlistCheckCommand()
         {"--sarif", "FILE", "Write the findings to FILE too, as SARIF 2.1.0"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
-    return {"netlist check",
-            "FILE",
-            1,
-            1,
-            "Find what is odd about the look-up tables of a netlist",
-            "Init values whose digits are not as many as the rows, or are x; inputs without effect\n"
-            "or connection; tables that are constant, only pass or invert a net, or are the same\n"
-            "function of the same nets as another one. One finding a line: file, line where the\n"
-            "format has one, severity, code, path, sentence. Status 0: no findings, 1: findings.\n",
-            options,
-            {"booleq netlist check design.json",
-             "booleq netlist check design.blif --sarif findings.sarif"},
-            RunNetlistCheck,
-            true};
+    return {
+        "netlist check",
+        "FILE",
+        1,
+        1,
+        "Find what is odd about the look-up tables of a netlist",
+        "Init values whose digits are not as many as the rows, or are x; inputs without effect\n"
+        "or connection; tables that are constant, only pass or invert a net, or are the same\n"
+        "function of the same nets as another one. One finding a line: file, line where the\n"
+        "format has one, severity, code, path, sentence. Status 0: no findings, 1: findings.\n",
+        options,
+        {"booleq netlist check design.json",
+         "booleq netlist check design.blif --sarif findings.sarif"},
+        RunNetlistCheck,
+        true};
 }
 
 } // namespace booleq

@@ -1,4 +1,5 @@
-// The command 'netlist diff': whether every look-up table of a netlist is still the function it was.
+// The command 'netlist diff': whether every look-up table of a netlist is still the function it
+// was.
 #include <algorithm>
 #include <map>
 
@@ -159,8 +160,9 @@ class DiffAnswer {
         PutField(m_output, "different", Visible(TableName(m_left, pair.left)));
         PutField(m_output, "  net", Visible(NetName(m_left, output)));
         if (pair.by != PairedBy::Path)
-            PutField(m_output, "  right", Visible(TableName(m_right, pair.right)) +
-                                              ", matched by " + PairedWord(pair.by));
+            PutField(m_output, "  right",
+                     Visible(TableName(m_right, pair.right)) + ", matched by " +
+                         PairedWord(pair.by));
         if (!difference.isSameFunction) {
             std::string row;
             for (const auto& net : difference.assignment)
@@ -177,8 +179,8 @@ class DiffAnswer {
             PutField(m_output, &cause == &difference.causes.front() ? "  cause" : "  or",
                      Visible(CauseText(m_comparison, cause)));
         if (!difference.expectedInit.empty() && !difference.isSameFunction)
-            PutField(m_output, "  should be", difference.expectedInit + ", right's pins being " +
-                                                  Visible(PinsText(pair)));
+            PutField(m_output, "  should be",
+                     difference.expectedInit + ", right's pins being " + Visible(PinsText(pair)));
     }
 
     // The right table's pins, the most significant one first.
@@ -196,9 +198,8 @@ class DiffAnswer {
         if (!IsWire(design, table))
             return std::string();
         const NetFunction function = Normalise(PinsOf(design, design.tables[table]));
-        return function.nets.empty()
-                   ? (function.rows.At(0) ? "constant 1" : "constant 0")
-                   : "only passes " + NetName(design, function.nets.front());
+        return function.nets.empty() ? (function.rows.At(0) ? "constant 1" : "constant 0")
+                                     : "only passes " + NetName(design, function.nets.front());
     }
 
     void PutLone(const char* label, const Design& design, uint32_t table)
@@ -262,7 +263,8 @@ class DiffAnswer {
         json["assignment"] = difference.isSameFunction ? Json(nullptr) : Json::object();
         for (const auto& net : difference.assignment)
             PutMember(json["assignment"], net.first, net.second ? 1 : 0);
-        json["left_value"] = difference.isSameFunction ? Json(nullptr) : Json(difference.left ? 1 : 0);
+        json["left_value"] =
+            difference.isSameFunction ? Json(nullptr) : Json(difference.left ? 1 : 0);
         json["right_value"] =
             difference.isSameFunction ? Json(nullptr) : Json(difference.right ? 1 : 0);
         json["left_equation"] = EquationOf(difference.leftFunction);
@@ -271,7 +273,8 @@ class DiffAnswer {
             difference.expectedInit.empty() ? Json(nullptr) : Json(difference.expectedInit);
         json["causes"] = Json::array();
         for (const Cause& cause : difference.causes)
-            json["causes"].push_back({{"code", CauseWord(cause.code)}, {"message", CauseText(m_comparison, cause)}});
+            json["causes"].push_back(
+                {{"code", CauseWord(cause.code)}, {"message", CauseText(m_comparison, cause)}});
         return json;
     }
 
@@ -307,14 +310,14 @@ class DiffAnswer {
                                          {"right", NetName(m_right, net.right)},
                                          {"tables", net.numTables}});
         result["different"] = Json::array();
-        const auto around = JsonAroundArray({m_request.operands[0], 0}, m_request,
-                                            IsSame() ? "yes" : "no", result);
+        const auto around =
+            JsonAroundArray({m_request.operands[0], 0}, m_request, IsSame() ? "yes" : "no", result);
         m_output.Put(around.first);
         const std::vector<TablePair>& different = m_comparison.Different();
-        const size_t numDescribed = m_request.Has("--rows")
-                                        ? static_cast<size_t>(std::min<uint64_t>(
-                                              different.size(), m_max_described))
-                                        : different.size();
+        const size_t numDescribed =
+            m_request.Has("--rows")
+                ? static_cast<size_t>(std::min<uint64_t>(different.size(), m_max_described))
+                : different.size();
         for (size_t place = 0; place < numDescribed; ++place)
             m_output.Put((place > 0 ? "," : "") + JsonLine(DifferenceJson(different[place])));
         m_output.Put(around.second);
@@ -359,35 +362,39 @@ int RunDiff(const Request& request, Output& output)
 Command NetlistDiffCommand()
 {
     std::vector<Option> options = {
-        {"--key", "ATTRIBUTE", "Match tables by this attribute, a place such as a bel, where path "
-                               "and net do not"},
+        {"--key", "ATTRIBUTE",
+         "Match tables by this attribute, a place such as a bel, where path "
+         "and net do not"},
         {"--rename", "FILE", "Lines of two names: a net of LEFT, and what RIGHT calls it"},
-        {"--names", "auto|kept|gone", "Whether nets of one name are one; gone: --key alone counts "
-                                      "(auto: as the pairs show)"},
+        {"--names", "auto|kept|gone",
+         "Whether nets of one name are one; gone: --key alone counts "
+         "(auto: as the pairs show)"},
         {"--open", "0|1", "What an input reads that nothing is connected to"},
-        {"--allow-wires", nullptr, "Tables that only pass a net or a constant may be in one "
-                                   "netlist only; nets are followed through them"},
+        {"--allow-wires", nullptr,
+         "Tables that only pass a net or a constant may be in one "
+         "netlist only; nets are followed through them"},
         {"--rows", "N|all", "Differences to describe (20; with --json all)"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
-    return {"netlist diff",
-            "LEFT RIGHT",
-            2,
-            2,
-            "Compare two netlists table by table: is each still the function it was?",
-            "Tables are matched by path, else by output net, else by --key, and compared as\n"
-            "functions of nets, whatever the order of pins, width, cell type or format. Of one that\n"
-            "differs: the first row by net names, both equations, and every cause that explains the\n"
-            "whole difference, such as pins that were swapped without the init value, exchanged\n"
-            "halves or shifted digits, with the init value that would have been right. Where names\n"
-            "are gone on one side, nets are matched by the tables around them. Status 0: the same,\n"
-            "1: different.\n",
-            options,
-            {"booleq netlist diff before.json after.json",
-             "booleq netlist diff mapped.blif routed.json --rename nets.txt",
-             "booleq netlist diff placed.json bitstream.json --key NEXTPNR_BEL --open 0"},
-            RunDiff,
-            true};
+    return {
+        "netlist diff",
+        "LEFT RIGHT",
+        2,
+        2,
+        "Compare two netlists table by table: is each still the function it was?",
+        "Tables are matched by path, else by output net, else by --key, and compared as\n"
+        "functions of nets, whatever the order of pins, width, cell type or format. Of one that\n"
+        "differs: the first row by net names, both equations, and every cause that explains the\n"
+        "whole difference, such as pins that were swapped without the init value, exchanged\n"
+        "halves or shifted digits, with the init value that would have been right. Where names\n"
+        "are gone on one side, nets are matched by the tables around them. Status 0: the same,\n"
+        "1: different.\n",
+        options,
+        {"booleq netlist diff before.json after.json",
+         "booleq netlist diff mapped.blif routed.json --rename nets.txt",
+         "booleq netlist diff placed.json bitstream.json --key NEXTPNR_BEL --open 0"},
+        RunDiff,
+        true};
 }
 
 } // namespace booleq

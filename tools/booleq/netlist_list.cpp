@@ -5,6 +5,7 @@
 #include "commands.h"
 #include "equation_text.h"
 #include "fold.h"
+#include "net_function.h"
 #include "netlist.h"
 #include "parallel.h"
 #include "progress.h"
@@ -89,9 +90,8 @@ class Filter {
         if (!m_has_net || MatchesGlob(m_net, NetName(design, table.output)))
             return true;
         const NetId* const inputs = design.Inputs(table);
-        return std::any_of(inputs, inputs + design.NumInputs(table), [&](NetId net) {
-            return MatchesGlob(m_net, NetName(design, net));
-        });
+        return std::any_of(inputs, inputs + design.NumInputs(table),
+                           [&](NetId net) { return MatchesGlob(m_net, NetName(design, net)); });
     }
 
   private:
@@ -118,8 +118,7 @@ class Lister {
   public:
     Lister(const Design& design, const Request& request, Output& output)
         : m_design(design), m_format(ParseFormat(request)), m_target(ParseTarget(request)),
-          m_output(output), m_filter(request), m_functions(design),
-          m_inits(design.inits.size())
+          m_output(output), m_filter(request), m_functions(design), m_inits(design.inits.size())
     {
     }
 
@@ -154,8 +153,7 @@ class Lister {
         RunInParts(m_texts.size(), kPart, LutWork(), [&](size_t begin, size_t end) {
             for (size_t function = begin; function < end; ++function)
                 if (function < isAsked.size() && isAsked[function])
-                    m_texts[function] =
-                        MakeTexts(m_functions.Functions()[function], m_target);
+                    m_texts[function] = MakeTexts(m_functions.Functions()[function], m_target);
         });
     }
 
@@ -190,11 +188,10 @@ class Lister {
         std::pair<std::string, std::string>& known = m_inits[init];
         if (known.first.empty()) {
             const Rows rows = TableRows(m_design, m_design.inits[init]);
-            std::vector<std::string> names; // digits need none, only their number
-            for (unsigned int input = 0; input < rows.NumInputs(); ++input)
-                names.push_back(std::to_string(input));
-            const Function function(names, rows);
-            known = {function.Hex(), function.Reversed().Hex()};
+            std::vector<unsigned int> reversed(rows.NumInputs());
+            for (unsigned int input = 0; input < reversed.size(); ++input)
+                reversed[input] = rows.NumInputs() - 1 - input;
+            known = {HexOf(rows), HexOf(PermuteInputs(rows, reversed))};
         }
         listed.init = known.first;
         listed.lsbInit = known.second;
@@ -279,29 +276,32 @@ int RunList(const Request& request, Output& output)
 Command NetlistListCommand()
 {
     std::vector<Option> options = {
-        {"--cell", "GLOB", "Only tables whose path matches; * stands for any characters, ? for one"},
+        {"--cell", "GLOB",
+         "Only tables whose path matches; * stands for any characters, ? for one"},
         {"--net", "GLOB", "Only tables that drive or read a net whose name matches"},
-        {"--to", "TARGET", "Notation of the equations: primary, alt1, alt2, alt3, paren, verilog, "
-                           "vhdl, c, python or liberty (alt1)"},
+        {"--to", "TARGET",
+         "Notation of the equations: primary, alt1, alt2, alt3, paren, verilog, "
+         "vhdl, c, python or liberty (alt1)"},
         {"--format", "text|csv|jsonl", "How to print them (text); --json is jsonl"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
-    return {"netlist list",
-            "FILE",
-            1,
-            1,
-            "List the look-up tables of a netlist with their equations over nets",
-            "Of each table: path, type, output net, a short equation over its nets, the name of its\n"
-            "function, and its init value with the first pin listed most and least significant.\n"
-            "Equations leave out idle inputs and fold constant ones; each different function is\n"
-            "shortened once and proved equal. Where a notation cannot spell a net's name, the\n"
-            "equation has a changed one; pins and output are always the names of the file.\n",
-            options,
-            {"booleq netlist list design.json --cell 'u1.*'",
-             "booleq netlist list design.blif --net carry --to verilog",
-             "booleq netlist list --format csv design.json"},
-            RunList,
-            true};
+    return {
+        "netlist list",
+        "FILE",
+        1,
+        1,
+        "List the look-up tables of a netlist with their equations over nets",
+        "Of each table: path, type, output net, a short equation over its nets, the name of its\n"
+        "function, and its init value with the first pin listed most and least significant.\n"
+        "Equations leave out idle inputs and fold constant ones; each different function is\n"
+        "shortened once and proved equal. Where a notation cannot spell a net's name, the\n"
+        "equation has a changed one; pins and output are always the names of the file.\n",
+        options,
+        {"booleq netlist list design.json --cell 'u1.*'",
+         "booleq netlist list design.blif --net carry --to verilog",
+         "booleq netlist list --format csv design.json"},
+        RunList,
+        true};
 }
 
 } // namespace booleq

@@ -99,10 +99,11 @@ void PutFunctions(const Census& census, Output& output)
 
 void PutText(const std::string& file, const Design& design, const Census& census, Output& output)
 {
-    PutField(output, "file", Visible(file) + "; " + design.format +
-                                 (design.top == 0 ? std::string()
-                                                  : ", top " + Visible(std::string(
-                                                                   design.names.Text(design.top)))));
+    PutField(output, "file",
+             Visible(file) + "; " + design.format +
+                 (design.top == 0
+                      ? std::string()
+                      : ", top " + Visible(std::string(design.names.Text(design.top)))));
     PutField(output, "cells", std::to_string(census.numCells));
     PutField(output, "tables", std::to_string(census.numTables));
     PutField(output, "by pins", WidthsText(census.byWidth));
@@ -121,9 +122,9 @@ void PutText(const std::string& file, const Design& design, const Census& census
     if (census.findings.empty())
         PutField(output, "findings", "none of the reader");
     for (const auto& finding : census.findings)
-        PutField(output, "findings", std::to_string(finding.second) + " " +
-                                         CodeWord(finding.first) + ": " +
-                                         CodeSentence(finding.first));
+        PutField(output, "findings",
+                 std::to_string(finding.second) + " " + CodeWord(finding.first) + ": " +
+                     CodeSentence(finding.first));
     PutTypes(census, output);
     PutFunctions(census, output);
 }

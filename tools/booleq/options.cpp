@@ -209,7 +209,8 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
         AddOption(app, entry);
 
     // The parser takes its words from the back.
-    std::vector<std::string> words(arguments.rbegin(), arguments.rend() - static_cast<std::ptrdiff_t>(numNamed));
+    std::vector<std::string> words(arguments.rbegin(),
+                                   arguments.rend() - static_cast<std::ptrdiff_t>(numNamed));
     try {
         app.parse(std::move(words));
     } catch (const CLI::ParseError& error) {

@@ -64,7 +64,8 @@ Json Log(const std::vector<SarifRule>& rules)
 } // namespace
 
 SarifFile::SarifFile(const std::string& file, std::vector<SarifRule> rules)
-    : m_name(file), m_rules(std::move(rules)), m_stream(OpenToWrite(file)), m_output(m_stream, Visible(file))
+    : m_name(file), m_rules(std::move(rules)), m_stream(OpenToWrite(file)),
+      m_output(m_stream, Visible(file))
 {
     const std::string text = JsonLine(Log(m_rules)) + "\n";
     // The results are the last thing but for the ends of what they stand in.

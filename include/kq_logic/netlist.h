@@ -1,11 +1,11 @@
 // Look-up tables of netlists, read and compared: is each still the function it was?
 //
-//     const std::string cover = "11 1\n.end\n";
+//     const std::string head = ".model m\n.names a b y\n";
 //     kq_logic::Netlist before;
 //     kq_logic::Netlist after;
 //     std::string fault;
-//     if (!before.ReadText(".names a b y\n" + cover, fault) ||
-//         !after.ReadText(".names a b y\n0" + cover, fault))
+//     if (!before.ReadText(head + "11 1\n.end\n", fault) ||
+//         !after.ReadText(head + "01 1\n.end\n", fault))
 //         return 1;
 //     std::cout << before.NumTables() << ' ' << before.At(0).init << '\n'; // 1 0x8
 //     const kq_logic::NetlistComparison comparison = kq_logic::Compare(before, after);

@@ -3,7 +3,9 @@
 #include <algorithm>
 #include <cassert>
 
+#include "canonical.h"
 #include "function.h"
+#include "match.h"
 #include "parallel.h"
 #include "structure.h"
 
@@ -35,6 +37,20 @@ std::vector<NetId> NetOrder(const PinFunction& left, const PinFunction& right,
     add(right.nets, rightFunction.nets);
     add(left.nets, rightFunction.nets);
     return order;
+}
+
+// Of functions with too many unknown nets to try them all.
+bool IsSameInSomeOrder(const Rows& left, const Rows& right)
+{
+    const unsigned int numInputs = left.NumInputs();
+    if (numInputs <= kMaxCanonicalInputs)
+        return FindCanonical(left.Words()[0], numInputs, CanonicalScope::Order).form ==
+               FindCanonical(right.Words()[0], numInputs, CanonicalScope::Order).form;
+    std::vector<std::string> names; // any: places are what counts
+    for (unsigned int input = 0; input < numInputs; ++input)
+        names.push_back("n" + std::to_string(input));
+    constexpr double kSeconds = 1; // of one table; one that takes longer differs
+    return booleq::Match(Function(names, left), Function(names, right), false, kSeconds).isFound;
 }
 
 } // namespace
@@ -110,8 +126,10 @@ Comparison::Verdict Comparison::Compare(const TablePair& pair) const
         return Verdict::Different;
     if (left == right)
         return HasRenamed(pair) ? Verdict::Renamed : Verdict::Same;
-    const bool canBeSame = left.nets.size() == right.nets.size();
-    if (canBeSame && FindAssignments(left, right, m_nets).number > 0)
+    if (left.nets.size() != right.nets.size())
+        return Verdict::Different;
+    const Assignments found = FindAssignments(left, right, m_nets);
+    if (found.number > 0 || (!found.isTried && IsSameInSomeOrder(left.rows, right.rows)))
         return m_are_names_gone ? Verdict::SameByOrder : Verdict::Renamed;
     return Verdict::Different;
 }

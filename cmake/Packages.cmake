@@ -15,6 +15,14 @@ set(CPACK_STRIP_FILES ON)
 set(CPACK_PRE_BUILD_SCRIPTS "${CMAKE_CURRENT_LIST_DIR}/packages/stage.cmake")
 set(CPACK_POST_BUILD_SCRIPTS "${CMAKE_CURRENT_LIST_DIR}/packages/finish.cmake")
 
+# What the solver is linked into; its authors are named there.
+get_property(kq_has_solver GLOBAL PROPERTY KQ_HAS_SOLVER)
+if(kq_has_solver)
+  set(CPACK_KQ_SOLVER_FILES_logic "lib/*/libkq_logic.so.*")
+  set(CPACK_KQ_SOLVER_FILES_tool "bin/booleq")
+  set(CPACK_KQ_SOLVER_FILES_python "lib/python3/dist-packages/booleq/*.so")
+endif()
+
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_COMPONENTS_GROUPING IGNORE)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)

@@ -16,7 +16,7 @@ endfunction()
 
 # The licence as a copyright file that machines can read. Its first line is its name, then comes
 # the line of the copyright, then the terms. What others made is in COMPONENT.copyright, under the
-# same terms.
+# same terms, and so is the solver where it is linked into a component's files.
 function(kq_copyright variable component)
   file(READ "${CPACK_RESOURCE_FILE_LICENSE}" text)
   if(NOT text MATCHES "^MIT License\n\nCopyright (\\(c\\) )?([0-9][^\n]*)\n\n(.*[^\n])\n*$")
@@ -30,6 +30,12 @@ function(kq_copyright variable component)
   set(others "")
   if(EXISTS "${CMAKE_CURRENT_LIST_DIR}/${component}.copyright")
     file(READ "${CMAKE_CURRENT_LIST_DIR}/${component}.copyright" others)
+  endif()
+  set(files "${CPACK_KQ_SOLVER_FILES_${component}}")
+  if(files)
+    file(READ "${CMAKE_CURRENT_LIST_DIR}/solver.copyright" solver)
+    string(CONFIGURE "${solver}" solver @ONLY)
+    string(APPEND others "${solver}")
   endif()
   set(${variable} "Format: https://www.debian.org/doc/packaging-manuals/copyright-format/1.0/
 Upstream-Name: Kq_BoolEquation

@@ -24,6 +24,7 @@ struct Conversion {
     std::string output; // the name of its output
     std::vector<std::string> inputs; // of the equation
     std::vector<std::string> names;  // how each is spelled in the text
+    bool saysNames = false;          // comments in the text name the inputs that are spelled anew
     bool isProved = false;           // read again, the text says the same for all assignments
     std::string doubt;               // why that is not known; nothing was found against it
 };

@@ -28,6 +28,7 @@ enum class Verdict {
 struct Decision {
     Verdict verdict = Verdict::Undecided; // only Equal and Different are answers
     std::string reason;                   // not empty: why it is undecided
+    bool isTimeOver = false;              // which is that a limit ended it
     std::vector<std::string> inputs;      // those of the left one, then what only the right one has
     std::vector<bool> assignment;         // where they differ, a value for each of the inputs
     bool isFirstRow = false;              // no row before that assignment differs
@@ -36,7 +37,7 @@ struct Decision {
 };
 
 // Inputs are the same when their names are; there may be any number. Nothing is guessed: Equal is
-// proved, and for a difference both were evaluated. Up to 30 inputs it is the first row.
+// proved, and for a difference both were evaluated. It is the first row up to kMaxFunctionInputs.
 // Fails: Undecided, without an equation, where a limit ends it, and, in a library built without a
 // solver, where only that could tell.  Cost: exponential at worst.
 KQ_EXPORT Decision DecideEqual(const Kq_BoolEquation& left, const Kq_BoolEquation& right,

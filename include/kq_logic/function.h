@@ -51,6 +51,8 @@ class KQ_EXPORT Function {
     {
         return (row >> (NumInputs() - 1 - input) & 1u) != 0;
     }
+    // Whether the input changes any value.  Requires: input < NumInputs().
+    bool DependsOn(size_t input) const;
     // The packed rows, 64 to a word, zeros beyond the last one; as long as this function lives.
     const uint64_t* Words() const;
     size_t NumWords() const; // one at least

@@ -19,6 +19,14 @@ namespace {
 constexpr size_t kMaxWrittenInputs = 10;
 constexpr size_t kMaxShortInputs = 6; // a short form of more takes too long for a table
 
+typedef RowCompleter::Listed Listed;
+
+bool Set(Kq_BoolEquation& equation, const std::string& text, const Listed& listed)
+{
+    return listed.reading.hasInputs ? SetOverTerms(equation, text, listed.reading, listed.terms)
+                                    : SetFromText(equation, text, listed.reading);
+}
+
 BatchResult Fail(BatchOutcome outcome, std::string message)
 {
     return {outcome, std::move(message)};
@@ -34,13 +42,12 @@ BatchResult RefuseText(const char* what, const std::string& text, const Reading&
     return Fail(BatchOutcome::kTextRefused, std::move(message));
 }
 
-std::string AssignmentText(const Function& function, uint64_t row)
+std::string RowText(const Function& function, uint64_t row)
 {
-    std::string text;
+    std::vector<bool> values;
     for (size_t index = 0; index < function.NumInputs(); ++index)
-        text += (index == 0 ? "" : " ") + Visible(function.Inputs()[index]) +
-                (function.InputAt(row, index) ? "=1" : "=0");
-    return text;
+        values.push_back(function.InputAt(row, index));
+    return ValuesByName(function.Inputs(), values);
 }
 
 std::string InitFor(const Function& function)
@@ -48,36 +55,40 @@ std::string InitFor(const Function& function)
     return function.NumInputs() == 1 ? function.Binary() : function.Hex();
 }
 
-// Sets equation and function from the row's equation over its inputs.
-BatchResult ReadEquation(const BatchRow& row, const Reading& reading, Function& function)
+// The first variable that is not listed; null when all are. Those that are come first.
+const Port::StringBase<char>* Unlisted(const Kq_BoolEquation& equation, const Reading& reading)
 {
-    Kq_BoolEquation equation;
-    if (row.equation.find('\0') != std::string::npos ||
-        !SetFromText(equation, row.equation, reading))
-        return RefuseText("the equation is", row.equation, reading);
-    if (reading.hasInputs && equation.GetNumVariables() > reading.inputs.size()) {
-        const auto& name = equation.GetVariables()[reading.inputs.size()].first;
-        return Fail(BatchOutcome::kDiffers,
-                    "the equation has " + Excerpt(ToStd(name)) + ", which is not among the inputs");
-    }
-    if (!FunctionOf(equation, function))
+    const size_t numListed = reading.inputs.size();
+    return equation.GetNumVariables() > numListed ? &equation.GetVariables()[numListed].first
+                                                  : nullptr;
+}
+
+// Sets equation and rows from the row's equation over its inputs.
+BatchResult ReadEquation(const BatchRow& row, const Listed& listed, Kq_BoolEquation& equation,
+                         Rows& rows)
+{
+    if (row.equation.find('\0') != std::string::npos || !Set(equation, row.equation, listed))
+        return RefuseText("the equation is", row.equation, listed.reading);
+    if (listed.reading.hasInputs)
+        if (const auto* const name = Unlisted(equation, listed.reading))
+            return Fail(BatchOutcome::kDiffers, "the equation has " + Excerpt(ToStd(*name)) +
+                                                    ", which is not among the inputs");
+    if (!RowsOf(equation, rows))
         return Fail(BatchOutcome::kTextRefused, NoFunctionReason(equation.GetNumVariables()));
     return {};
 }
 
-// Sets equation and function from the row's init value over the inputs of 'reading'.
-BatchResult ReadInit(const BatchRow& row, const Reading& reading, Kq_BoolEquation& equation)
+// Sets the equation from the row's init value over the inputs listed.
+BatchResult ReadInit(const BatchRow& row, const Listed& listed, Kq_BoolEquation& equation)
 {
     if (row.init.find('\0') != std::string::npos ||
-        WidthOfInit(LibraryText(row.init, reading)).numRows == 0 ||
-        !SetFromText(equation, row.init, reading))
-        return RefuseText("the init value is", row.init, reading);
+        WidthOfInit(LibraryText(row.init, listed.reading)).numRows == 0 ||
+        !Set(equation, row.init, listed))
+        return RefuseText("the init value is", row.init, listed.reading);
     // Read over a name like 'a'+b, an init value has the inputs that its expression has.
-    if (equation.GetNumVariables() > reading.inputs.size()) {
-        const auto& name = equation.GetVariables()[reading.inputs.size()].first;
-        return Fail(BatchOutcome::kDiffers, "the init value has " + Excerpt(ToStd(name)) +
+    if (const auto* const name = Unlisted(equation, listed.reading))
+        return Fail(BatchOutcome::kDiffers, "the init value has " + Excerpt(ToStd(*name)) +
                                                 ", which is not among the inputs");
-    }
     return {};
 }
 
@@ -96,28 +107,26 @@ bool BeginsLikeInit(const std::string& text)
     return WidthOfInit(text).numRows > 0 || IsSizedLiteral(text);
 }
 
-// Compares the row's init value with the equation's function.
-BatchResult CompareInit(const BatchRow& row, const Function& function)
+// Compares the row's init value with the rows of its equation, over the same inputs.
+BatchResult CompareInit(const BatchRow& row, const Listed& listed, const Rows& rows)
 {
     if (!BeginsLikeInit(row.init))
         return RefuseNoInit(row.init);
-    Reading reading;
-    reading.hasInputs = true;
-    reading.inputs = function.Inputs();
     Kq_BoolEquation equation;
-    BatchResult result = ReadInit(row, reading, equation);
-    Function given;
-    if (result.outcome != BatchOutcome::kOk || !FunctionOf(equation, given))
+    BatchResult result = ReadInit(row, listed, equation);
+    Rows given;
+    if (result.outcome != BatchOutcome::kOk || !RowsOf(equation, given))
         return result;
-    assert(given.Inputs() == function.Inputs());
-    const uint64_t different = function.FirstDifference(given);
-    if (different == Function::kNoRow)
+    assert(given.NumInputs() == rows.NumInputs());
+    const uint64_t different = FirstDifference(rows, given);
+    if (different == Rows::kNoRow)
         return {};
-    std::string message = "the equation is " + std::string(function.At(different) ? "1" : "0") +
+    const Function function(listed.reading.inputs, rows);
+    std::string message = "the equation is " + std::string(rows.At(different) ? "1" : "0") +
                           " at row " + std::to_string(different) + " (" +
-                          AssignmentText(function, different) + "), the init value " +
+                          RowText(function, different) + "), the init value " +
                           (given.At(different) ? "1" : "0");
-    if (function.NumInputs() <= kMaxWrittenInputs)
+    if (rows.NumInputs() <= kMaxWrittenInputs)
         message += "; the equation's is " + InitFor(function);
     return Fail(BatchOutcome::kDiffers, std::move(message));
 }
@@ -134,15 +143,15 @@ std::string ShortText(const Kq_BoolEquation& equation)
 }
 
 // The equation of a row that has an init value and inputs only.
-BatchResult WriteEquation(BatchRow& row, const Reading& reading)
+BatchResult WriteEquation(BatchRow& row, const Listed& listed)
 {
     if (!BeginsLikeInit(row.init))
         return RefuseNoInit(row.init);
-    if (reading.inputs.size() > kMaxWrittenInputs)
+    if (listed.reading.inputs.size() > kMaxWrittenInputs)
         return Fail(BatchOutcome::kIncomplete, "no equation is written over more than " +
                                                    std::to_string(kMaxWrittenInputs) + " inputs");
     Kq_BoolEquation equation;
-    BatchResult result = ReadInit(row, reading, equation);
+    BatchResult result = ReadInit(row, listed, equation);
     if (result.outcome != BatchOutcome::kOk)
         return result;
     row.equation = ShortText(equation);
@@ -180,14 +189,16 @@ const char* OutcomeName(BatchOutcome outcome)
     return "";
 }
 
-BatchResult CompleteRow(BatchRow& row)
+BatchResult RowCompleter::Complete(BatchRow& row)
 {
-    Reading reading;
-    reading.hasInputs = !row.inputs.empty();
-    reading.inputs = row.inputs;
-    BatchResult result = CheckNames(row.inputs);
-    if (result.outcome != BatchOutcome::kOk)
-        return result;
+    if (row.inputs != m_listed.reading.inputs) {
+        m_listed.reading.inputs = row.inputs;
+        m_listed.reading.hasInputs = !row.inputs.empty();
+        m_listed.terms = TermsOf(m_listed.reading);
+        m_fault = CheckNames(row.inputs);
+    }
+    if (m_fault.outcome != BatchOutcome::kOk)
+        return m_fault;
     if (IsBlank(row.equation)) {
         if (IsBlank(row.init))
             return Fail(BatchOutcome::kIncomplete,
@@ -195,27 +206,37 @@ BatchResult CompleteRow(BatchRow& row)
         if (row.inputs.empty())
             return Fail(BatchOutcome::kIncomplete,
                         "an init value without an equation needs its inputs");
-        return WriteEquation(row, reading);
+        return WriteEquation(row, m_listed);
     }
-    Function function;
-    result = ReadEquation(row, reading, function);
+    Kq_BoolEquation equation;
+    Rows rows;
+    BatchResult result = ReadEquation(row, m_listed, equation, rows);
     if (result.outcome != BatchOutcome::kOk)
         return result;
-    if (function.NumInputs() == 0)
+    if (rows.NumInputs() == 0)
         return Fail(BatchOutcome::kIncomplete,
                     "the equation has no inputs, so no init value: it is "
                     "always " +
-                        std::string(function.At(0) ? "1" : "0"));
+                        std::string(rows.At(0) ? "1" : "0"));
     const bool hasInit = !IsBlank(row.init);
-    if (hasInit)
-        result = CompareInit(row, function);
+    if (hasInit && m_listed.reading.hasInputs) {
+        result = CompareInit(row, m_listed, rows);
+    } else if (hasInit) {
+        Listed own;
+        own.reading.hasInputs = true;
+        own.reading.inputs = InputNames(equation);
+        own.terms = TermsOf(own.reading);
+        result = CompareInit(row, own, rows);
+    }
     if (result.outcome != BatchOutcome::kOk)
         return result;
     if (!hasInit || row.inputs.empty())
         result.outcome = BatchOutcome::kFilled;
+    if (row.inputs.empty())
+        row.inputs = InputNames(equation);
+    assert(row.inputs.size() == rows.NumInputs());
     if (!hasInit)
-        row.init = InitFor(function);
-    row.inputs = function.Inputs();
+        row.init = InitFor({row.inputs, std::move(rows)});
     return result;
 }
 

@@ -6,6 +6,10 @@
 #include <string>
 #include <vector>
 
+#include <port/Port_StringBase.h>
+
+#include "listed_inputs.h"
+
 namespace booleq {
 
 enum class BatchOutcome {
@@ -31,14 +35,29 @@ struct BatchResult {
     std::string message; // for kDiffers, kIncomplete and kTextRefused; one sentence
 };
 
-// Fills and compares. Where the outcome is neither kOk nor kFilled, the row is as it was.
-// An equation without init value gets the hexadecimal one, the binary one over one input, because
-// that reads back; without inputs it has none. Missing inputs are those of the equation in order
-// of first occurrence. A missing equation is a short one up to six inputs; above it is the one the
-// library reads the init value as.
-// Threads: any, each with rows of its own.
-// Cost: that of the column, up to 30 inputs.
-BatchResult CompleteRow(BatchRow& row);
+// Completes rows one after the other. It remembers the inputs of the last one, as those of the next
+// are often the same.
+// Threads: any, each with rows and a completer of its own.
+class RowCompleter {
+  public:
+    // Fills and compares. Where the outcome is neither kOk nor kFilled, the row is as it was.
+    // An equation without init value gets the hexadecimal one, the binary one over one input,
+    // because that reads back; without inputs it has none. Missing inputs are those of the equation
+    // in order of first occurrence. A missing equation is a short one up to six inputs; above it is
+    // the one the library reads the init value as.
+    // Cost: that of the column, up to 30 inputs.
+    BatchResult Complete(BatchRow& row);
+
+    // Inputs as the library takes them.
+    struct Listed {
+        Reading reading;
+        std::vector<Port::StringBase<char>> terms;
+    };
+
+  private:
+    Listed m_listed;
+    BatchResult m_fault; // of these inputs; kOk for none
+};
 
 } // namespace booleq
 

@@ -1,8 +1,5 @@
 #include "equality.h"
 
-#include <cassert>
-#include <cstdio>
-
 #include "column_decision.h"
 #include "function.h"
 #include "joined_inputs.h"
@@ -19,13 +16,8 @@ bool IsInitValue(const Kq_BoolEquation& equation)
 
 size_t NumInputsTogether(const Kq_BoolEquation& left, const Kq_BoolEquation& right)
 {
-    std::vector<std::string> inputs;
-    for (const auto& variable : left.GetVariables())
-        inputs.push_back(ToStd(variable.first));
-    std::vector<std::string> others;
-    for (const auto& variable : right.GetVariables())
-        others.push_back(ToStd(variable.first));
-    JoinInputs(others, inputs);
+    std::vector<std::string> inputs = InputNames(left);
+    JoinInputs(InputNames(right), inputs);
     return inputs.size();
 }
 
@@ -44,14 +36,12 @@ Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& rig
     return DecideEqual(ToExpression(left), ToExpression(right), limits);
 }
 
-std::string UndecidedText(const Decision& decision, const Limits& limits)
+Decision DecideValue(const Kq_BoolEquation& equation, bool value, const Limits& limits)
 {
-    assert(decision.verdict == Verdict::Undecided);
-    if (!decision.isTimeOver)
-        return "not decided: " + decision.reason;
-    char number[32];
-    std::snprintf(number, sizeof number, "%g", limits.seconds);
-    return "not decided in " + std::string(number) + (limits.seconds == 1 ? " second" : " seconds");
+    Function column;
+    if (IsInitValue(equation) && FunctionOf(equation, column))
+        return DecideColumns(column, {{}, ConstantRows(0, value)});
+    return DecideConstant(ToExpression(equation), value, limits);
 }
 
 } // namespace booleq

@@ -1,9 +1,7 @@
-// Whether two equations are one function: by columns where one is an init value, otherwise by what
-// they say.
+// Whether two equations are one function, and whether one ever has a value: by columns where one is
+// an init value, otherwise by what they say.
 #ifndef BOOLEQ_ANSWERS_EQUALITY_H
 #define BOOLEQ_ANSWERS_EQUALITY_H
-
-#include <string>
 
 #include <Kq_BoolEquation.h>
 
@@ -16,9 +14,9 @@ namespace booleq {
 Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
                          const Limits& limits);
 
-// "not decided in 10 seconds", or "not decided: " and the reason.
-// Requires: the decision is undecided, under these limits.
-std::string UndecidedText(const Decision& decision, const Limits& limits);
+// Whether the equation always has the value: Different is an assignment where it has the other.
+// Requires, Fails: as above.
+Decision DecideValue(const Kq_BoolEquation& equation, bool value, const Limits& limits);
 
 } // namespace booleq
 

@@ -7,13 +7,15 @@
 #include <utility>
 
 #include "convert.h"
-#include "decision.h"
+#include "equality.h"
 #include "expression.h"
 #include "text.h"
 
 namespace kq_logic {
 
 namespace {
+
+static_assert(kMaxFunctionInputs == booleq::kMaxFirstRowInputs);
 
 Decision FromRoom(booleq::Decision decided)
 {
@@ -29,6 +31,7 @@ Decision FromRoom(booleq::Decision decided)
         break;
     }
     decision.reason = std::move(decided.reason);
+    decision.isTimeOver = decided.isTimeOver;
     decision.inputs = std::move(decided.inputs);
     decision.assignment = std::move(decided.assignment);
     decision.isFirstRow = decided.isFirstRow;
@@ -54,16 +57,14 @@ Decision DecideEqual(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
 {
     if (!left || !right)
         return NoEquation();
-    return FromRoom(booleq::DecideEqual(booleq::ToExpression(left), booleq::ToExpression(right),
-                                        {limits.seconds}));
+    return FromRoom(booleq::DecideEquations(left, right, {limits.seconds}));
 }
 
 Decision DecideConstant(const Kq_BoolEquation& equation, bool value, const Limits& limits)
 {
     if (!equation)
         return NoEquation();
-    return FromRoom(
-        booleq::DecideConstant(booleq::ToExpression(equation), value, {limits.seconds}));
+    return FromRoom(booleq::DecideValue(equation, value, {limits.seconds}));
 }
 
 std::vector<std::string> ConversionTargets()
@@ -93,6 +94,7 @@ Conversion Convert(const Kq_BoolEquation& equation, const std::string& target,
     conversion.output = std::move(written.output);
     conversion.inputs = expression.names;
     conversion.names = std::move(written.names);
+    conversion.saysNames = written.saysNames;
     conversion.isProved = written.isProved;
     conversion.doubt = std::move(written.doubt);
     return conversion;

@@ -42,6 +42,11 @@ bool Function::At(size_t row) const
     return m_imp->function.At(row);
 }
 
+bool Function::DependsOn(size_t input) const
+{
+    return booleq::DependsOn(m_imp->function.GetRows(), static_cast<unsigned int>(input));
+}
+
 const uint64_t* Function::Words() const
 {
     return m_imp->function.GetRows().Words();

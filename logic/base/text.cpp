@@ -1,6 +1,7 @@
 #include "text.h"
 
 #include <algorithm>
+#include <cassert>
 #include <cwchar>
 #include <cwctype>
 
@@ -100,6 +101,15 @@ std::string Join(const std::vector<std::string>& words, const char* between)
         isFirst = false;
     }
     return text;
+}
+
+std::string ValuesByName(const std::vector<std::string>& names, const std::vector<bool>& values)
+{
+    assert(names.size() == values.size());
+    std::string text;
+    for (size_t index = 0; index < names.size(); ++index)
+        text += (index == 0 ? "" : " ") + Visible(names[index]) + (values[index] ? "=1" : "=0");
+    return text.empty() ? "no inputs" : text;
 }
 
 bool IsBlank(const std::string& text)

@@ -28,6 +28,8 @@ std::string Excerpt(const std::string& text);
 std::string Count(uint64_t number, const std::string& noun);
 // The words with 'between' between them.
 std::string Join(const std::vector<std::string>& words, const char* between);
+// "A=1 B=0", names visible; "no inputs" without any.  Requires: as many values as names.
+std::string ValuesByName(const std::vector<std::string>& names, const std::vector<bool>& values);
 // True for a text of blanks, tabs and line feeds only; the empty text is one.
 bool IsBlank(const std::string& text);
 

@@ -89,15 +89,20 @@ bool RowsOf(const Kq_BoolEquation& equation, Rows& rows)
     return true;
 }
 
+std::vector<std::string> InputNames(const Kq_BoolEquation& equation)
+{
+    std::vector<std::string> names;
+    for (const auto& variable : equation.GetVariables())
+        names.push_back(ToStd(variable.first));
+    return names;
+}
+
 bool FunctionOf(const Kq_BoolEquation& equation, Function& function)
 {
     Rows rows;
     if (!RowsOf(equation, rows))
         return false;
-    std::vector<std::string> inputs;
-    for (const auto& variable : equation.GetVariables())
-        inputs.push_back(ToStd(variable.first));
-    function = Function(std::move(inputs), std::move(rows));
+    function = Function(InputNames(equation), std::move(rows));
     return true;
 }
 

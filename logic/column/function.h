@@ -64,6 +64,8 @@ class Function {
     Rows m_rows;
 };
 
+// The names of an equation's variables in their order.
+std::vector<std::string> InputNames(const Kq_BoolEquation& equation);
 // The rows of a set equation, its first variable being input 0.
 // Fails: false without an equation or with more than kMaxFunctionInputs variables.
 bool RowsOf(const Kq_BoolEquation& equation, Rows& rows);

@@ -31,7 +31,7 @@ std::string NameComments(const Expression& expression, const Target& target,
                          const Conversion& conversion)
 {
     std::string text;
-    for (const auto& change : ChangedNames(expression, conversion)) {
+    for (const auto& change : ChangedNames(expression.names, conversion.names)) {
         std::string line = Visible(change.first) + " is " + change.second;
         // A mark inside a name must not end the comment.
         for (size_t mark = line.find("*/"); mark != std::string::npos; mark = line.find("*/"))
@@ -98,13 +98,14 @@ Conversion Convert(const Expression& expression, const Target& target, const std
     return conversion;
 }
 
-std::vector<std::pair<std::string, std::string>> ChangedNames(const Expression& expression,
-                                                              const Conversion& conversion)
+std::vector<std::pair<std::string, std::string>>
+ChangedNames(const std::vector<std::string>& inputs, const std::vector<std::string>& names)
 {
+    assert(names.empty() || names.size() == inputs.size());
     std::vector<std::pair<std::string, std::string>> changes;
-    for (size_t input = 0; input < conversion.names.size(); ++input)
-        if (expression.names[input] != conversion.names[input])
-            changes.emplace_back(expression.names[input], conversion.names[input]);
+    for (size_t input = 0; input < names.size(); ++input)
+        if (inputs[input] != names[input])
+            changes.emplace_back(inputs[input], names[input]);
     return changes;
 }
 

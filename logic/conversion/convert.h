@@ -31,9 +31,10 @@ struct Conversion {
 Conversion Convert(const Expression& expression, const Target& target, const std::string& unit,
                    const Limits& limits);
 
-// The inputs whose name in the target is another one, each with that.
-std::vector<std::pair<std::string, std::string>> ChangedNames(const Expression& expression,
-                                                              const Conversion& conversion);
+// The inputs whose name in the target is another one, each with that. 'names' are those of a
+// conversion; none where there is no text.
+std::vector<std::pair<std::string, std::string>>
+ChangedNames(const std::vector<std::string>& inputs, const std::vector<std::string>& names);
 
 } // namespace booleq
 

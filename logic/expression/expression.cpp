@@ -115,8 +115,7 @@ uint32_t AddBinary(Expression& expression, Operator op, uint32_t left, uint32_t 
 Expression ToExpression(const Kq_BoolEquation& equation)
 {
     Expression expression;
-    for (const auto& variable : equation.GetVariables())
-        expression.names.push_back(ToStd(variable.first));
+    expression.names = InputNames(equation);
     struct Visit {
         const LibraryNode* node;
         bool hasOperands; // they were appended

@@ -1,5 +1,6 @@
 #include "listed_inputs.h"
 
+#include <cassert>
 #include <set>
 
 #include "init_literal.h"
@@ -27,12 +28,25 @@ bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Readi
 {
     if (!reading.hasInputs)
         return equation.SetEquation(text.c_str());
+    return equation.SetEquationWithExplicitTerms(TermsOf(reading), text.c_str(), reading.lsbFirst,
+                                                 reading.reverse);
+}
+
+std::vector<Port::StringBase<char>> TermsOf(const Reading& reading)
+{
     std::vector<Port::StringBase<char>> terms;
     terms.reserve(reading.inputs.size());
     for (const std::string& input : reading.inputs)
         terms.push_back(Port::StringBase<char>(input.c_str()));
-    return equation.SetEquationWithExplicitTerms(terms, text.c_str(), reading.lsbFirst,
-                                                 reading.reverse);
+    return terms;
+}
+
+bool SetOverTerms(Kq_BoolEquation& equation, const std::string& text, const Reading& reading,
+                  const std::vector<Port::StringBase<char>>& terms)
+{
+    assert(reading.hasInputs && terms.size() == reading.inputs.size());
+    return equation.SetEquationWithExplicitTerms(terms, LibraryText(text, reading).c_str(),
+                                                 reading.lsbFirst, reading.reverse);
 }
 
 bool IsInitValue(const Kq_BoolEquation& equation)

@@ -24,6 +24,12 @@ bool SetFromText(Kq_BoolEquation& equation, const std::string& text, const Readi
 // The same without those: what the library itself reads.
 bool SetVerbatim(Kq_BoolEquation& equation, const std::string& text, const Reading& reading);
 
+// The inputs of 'reading' as the library takes them, for whoever sets many equations over the same.
+std::vector<Port::StringBase<char>> TermsOf(const Reading& reading);
+// SetFromText for such.  Requires: the terms are those of the reading, which has inputs.
+bool SetOverTerms(Kq_BoolEquation& equation, const std::string& text, const Reading& reading,
+                  const std::vector<Port::StringBase<char>>& terms);
+
 // What the library is given for a text over these inputs; the text where it is refused.
 std::string LibraryText(const std::string& text, const Reading& reading);
 

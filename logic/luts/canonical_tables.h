@@ -15,7 +15,7 @@ constexpr unsigned int kMaxBlockInputs = 4;
 // A transformation of the inputs of a block, for all blocks of a word at once, without branches.
 struct BlockTransformation {
     LutTransformation meaning; // over the block's inputs
-    // Exchanges of inputs, see SwapLutBits; one that is not needed moves nothing.
+    // Exchanges of inputs, see SwapLutBits (lut_word.h); one that is not needed moves nothing.
     uint64_t movers[kMaxBlockInputs - 1];
     uint64_t inverted[kMaxBlockInputs]; // all ones where this bit of the row number is inverted
     uint8_t distances[kMaxBlockInputs - 1];

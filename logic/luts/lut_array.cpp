@@ -1,7 +1,6 @@
 #include "lut_array.h"
 
 #include <algorithm>
-#include <atomic>
 #include <cassert>
 
 #include "lut_word.h"
@@ -31,21 +30,16 @@ bool HasLutShape(unsigned int numInputs, unsigned int tableBytes)
 
 size_t FirstUncleanLut(const LutArray& luts, const LutWork& work)
 {
-    std::atomic<size_t> first{kNoLut};
+    size_t first = kNoLut;
     WithLutWord(luts, [&](auto zero) {
         typedef decltype(zero) Word;
         const auto* const tables = static_cast<const Word*>(luts.tables);
         const Word outside = static_cast<Word>(~LutMask<Word>(luts.numInputs));
-        RunInParts(luts.count, kPartSize, work, [&](size_t begin, size_t end) {
-            const Word* const found = std::find_if(tables + begin, tables + end, [&](Word table) {
-                return (table & outside) != Word();
-            });
-            if (found == tables + end)
-                return;
-            const auto place = static_cast<size_t>(found - tables);
-            size_t known = first;
-            while (place < known && !first.compare_exchange_weak(known, place))
-                ;
+        first = FindFirstInParts(luts.count, kPartSize, work, [&](size_t begin, size_t end) {
+            const Word* const found =
+                std::find_if(tables + begin, tables + end,
+                             [outside](Word table) { return (table & outside) != Word(); });
+            return static_cast<size_t>(found - tables);
         });
     });
     return first;

@@ -151,13 +151,9 @@ void InvertLutInputs(const LutArray& luts, uint8_t inputs, void* results, const 
     assert((inputs & ~AllLutInputs(luts.numInputs)) == 0);
     const unsigned int numInputs = luts.numInputs;
     MapLuts(luts, results, work, [numInputs, inputs](auto word) {
-        typedef decltype(word) Word;
         for (unsigned int input = 0; input < numInputs; ++input) {
-            if ((inputs >> input & 1u) == 0)
-                continue;
-            const unsigned int bit = numInputs - 1 - input;
-            const Word upper = LutPattern<Word>(bit);
-            word = static_cast<Word>((word & upper) >> (1u << bit) | (word << (1u << bit) & upper));
+            if ((inputs >> input & 1u) != 0)
+                word = InvertLutBit(word, numInputs - 1 - input);
         }
         return word;
     });

@@ -6,6 +6,7 @@
 #include <cassert>
 #include <utility>
 
+#include "lut_word.h"
 #include "rows.h"
 
 namespace booleq {
@@ -38,22 +39,6 @@ uint64_t Reorder(uint64_t table, const uint8_t* order, unsigned int numInputs)
 }
 
 } // namespace
-
-uint64_t SwapLutBits(uint64_t table, unsigned int low, unsigned int high)
-{
-    assert(low < high && high < 6);
-    const unsigned int distance = (1u << high) - (1u << low);
-    const uint64_t movers = BitPattern(low) & ~BitPattern(high);
-    const uint64_t change = (table ^ table >> distance) & movers;
-    return table ^ change ^ change << distance;
-}
-
-uint64_t InvertLutBit(uint64_t table, unsigned int bit)
-{
-    assert(bit < 6);
-    const uint64_t upper = BitPattern(bit);
-    return (table & upper) >> (1u << bit) | (table << (1u << bit) & upper);
-}
 
 uint64_t Transform(const LutTransformation& transformation, uint64_t table, unsigned int numInputs)
 {

@@ -28,12 +28,6 @@ uint64_t TransformBack(const LutTransformation& transformation, uint64_t result,
 // One after the other: what 'second' makes of what 'first' makes.
 LutTransformation Compose(const LutTransformation& first, const LutTransformation& second);
 
-// Two inputs of the table trade places; 'low' and 'high' are bits of the row number.
-// Requires: low < high < 6.
-uint64_t SwapLutBits(uint64_t table, unsigned int low, unsigned int high);
-// An input of the table is taken inverted; 'bit' is its bit of the row number.  Requires: bit < 6.
-uint64_t InvertLutBit(uint64_t table, unsigned int bit);
-
 } // namespace booleq
 
 #endif

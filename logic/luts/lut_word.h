@@ -44,18 +44,18 @@ constexpr bool operator<(TwoWords left, TwoWords right)
 {
     return left.upper != right.upper ? left.upper < right.upper : left.lower < right.lower;
 }
-// Requires, in both: 0 < distance < 128.
+// Requires, in both: distance < 128.
 constexpr TwoWords operator>>(TwoWords word, unsigned int distance)
 {
     if (distance >= 64)
         return {word.upper >> (distance - 64), 0};
-    return {word.lower >> distance | word.upper << (64 - distance), word.upper >> distance};
+    return {word.lower >> distance | word.upper << 1 << (63 - distance), word.upper >> distance};
 }
 constexpr TwoWords operator<<(TwoWords word, unsigned int distance)
 {
     if (distance >= 64)
         return {0, word.lower << (distance - 64)};
-    return {word.lower << distance, word.upper << distance | word.lower >> (64 - distance)};
+    return {word.lower << distance, word.upper << distance | word.lower >> 1 >> (63 - distance)};
 }
 
 // How a table of words of 64 bits is the same table as a Word, and back.
@@ -89,6 +89,26 @@ template <class Word>
 constexpr Word LutMask(unsigned int numInputs)
 {
     return LutWord<Word>::Of(RowMask(numInputs), numInputs > 6 ? ~uint64_t(0) : 0);
+}
+
+// Two inputs of a table trade places; 'low' and 'high' are bits of the row number. This is the
+// delta swap of H. S. Warren, Hacker's Delight, 2nd edition, section 7-1. Requires: low <= high; if
+// they are the same, nothing moves.
+template <class Word>
+constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
+{
+    const unsigned int distance = (1u << high) - (1u << low);
+    const auto movers = static_cast<Word>(LutPattern<Word>(low) & ~LutPattern<Word>(high));
+    const auto change = static_cast<Word>((word ^ (word >> distance)) & movers);
+    return static_cast<Word>(word ^ change ^ (change << distance));
+}
+
+// An input of a table is taken inverted; 'bit' is its bit of the row number.
+template <class Word>
+constexpr Word InvertLutBit(Word word, unsigned int bit)
+{
+    const Word upper = LutPattern<Word>(bit);
+    return static_cast<Word>((word & upper) >> (1u << bit) | (word << (1u << bit) & upper));
 }
 
 // Calls visit(Word()) with the type of an array's tables.

@@ -87,4 +87,17 @@ void RunInParts(size_t count, size_t partSize, const LutWork& work, const PartRu
     parts.ThrowFailure();
 }
 
+size_t FindFirstInParts(size_t count, size_t partSize, const LutWork& work, const PartFinder& find)
+{
+    std::atomic<size_t> first{kNoLut};
+    RunInParts(count, partSize, work, [&](size_t begin, size_t end) {
+        const size_t place = find(begin, end);
+        assert(begin <= place && place <= end);
+        size_t known = first;
+        while (place < end && place < known && !first.compare_exchange_weak(known, place))
+            ;
+    });
+    return first;
+}
+
 } // namespace booleq

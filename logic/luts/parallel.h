@@ -17,6 +17,11 @@ namespace booleq {
 typedef std::function<void(size_t begin, size_t end)> PartRunner;
 void RunInParts(size_t count, size_t partSize, const LutWork& work, const PartRunner& run);
 
+// The least place from 0 to count that 'find' finds in a part, kNoLut when it finds none: 'find'
+// gives the first place of its part, the part's end for none.
+typedef std::function<size_t(size_t begin, size_t end)> PartFinder;
+size_t FindFirstInParts(size_t count, size_t partSize, const LutWork& work, const PartFinder& find);
+
 } // namespace booleq
 
 #endif

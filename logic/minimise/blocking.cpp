@@ -33,30 +33,91 @@ void KeepMinimal(CubeList& sets, Work& work)
     sets = minimal;
 }
 
+// The parts that alone keep 'cube' from cubes of a block. Requires: it meets none of them.
+void AddSingles(const CubeColumns& cubes, size_t block, const ColumnsToMeet& toMeet,
+                uint64_t* singles)
+{
+    const uint64_t* const columns = cubes.Block(block);
+    const uint64_t noOutput = ~AnyColumn(columns, toMeet.outputs);
+    uint64_t one = noOutput;
+    uint64_t two = 0;
+    for (const uint32_t part : toMeet.inputs) {
+        two |= one & ~columns[part];
+        one |= ~columns[part];
+    }
+    assert((cubes.Cubes(block) & ~one) == 0);
+    const uint64_t near = cubes.Cubes(block) & ~two;
+    if (near == 0)
+        return;
+    for (const uint32_t part : toMeet.inputs)
+        if ((near & ~columns[part]) != 0)
+            SetBit(singles, part ^ 1u); // the other part of the pair
+    for (size_t part = cubes.NumInputParts(); part < cubes.NumParts(); ++part)
+        if ((near & noOutput & columns[part]) != 0)
+            SetBit(singles, part);
+}
+
+// The sets of one off cube, one for each of its outputs when no output is common, without those
+// that have a part of 'singles'.
+void AppendSets(const CubeSpace& space, const uint64_t* off, const uint64_t* cube,
+                const std::vector<uint64_t>& singles, CubeList& sets)
+{
+    const size_t numWords = space.NumWords();
+    std::vector<uint64_t> set(numWords);
+    uint64_t isKnown = 0;
+    for (size_t word = 0; word < numWords; ++word) {
+        set[word] = off[word] & InputConflicts(space, off, cube, word) * 3;
+        isKnown |= set[word] & singles[word];
+    }
+    if (isKnown != 0)
+        return;
+    if (HasCommonOutput(space, off, cube)) {
+        sets.Append(set.data());
+        return;
+    }
+    for (size_t word = space.FirstOutputWord(); word < numWords; ++word) {
+        uint64_t rest = off[word] & space.Outputs(word) & ~singles[word];
+        for (; rest != 0; rest &= rest - 1) {
+            sets.Append(set.data());
+            SetBit(sets.At(sets.Size() - 1), 64 * word + LowestBit(rest));
+        }
+    }
+}
+
 } // namespace
 
-CubeList FindBlockingSets(const CubeSpace& space, const CubeList& off, const uint64_t* cube,
+CubeList FindBlockingSets(const CubeSpace& space, const CubeIndex& off, const uint64_t* cube,
                           Work& work)
 {
     const size_t numWords = space.NumWords();
+    const CubeColumns& columns = off.Columns();
     CubeList sets(numWords);
-    std::vector<uint64_t> set(numWords);
-    work.Spend(off.Size() * numWords);
-    for (size_t index = 0; index < off.Size(); ++index) {
-        for (size_t word = 0; word < numWords; ++word)
-            set[word] = off.At(index)[word] & InputConflicts(space, off.At(index), cube, word) * 3;
-        if (HasCommonOutput(space, off.At(index), cube)) {
-            sets.Append(set.data());
-            continue;
-        }
-        for (size_t word = space.FirstOutputWord(); word < numWords; ++word) {
-            for (uint64_t rest = off.At(index)[word] & space.Outputs(word); rest != 0;
-                 rest &= rest - 1) {
-                sets.Append(set.data());
-                SetBit(sets.At(sets.Size() - 1), 64 * word + LowestBit(rest));
-            }
+    ColumnsToMeet toMeet;
+    if (!ListColumns(space, cube, toMeet))
+        return sets;
+    work.Spend(columns.NumBlocks() * (toMeet.inputs.size() + toMeet.outputs.size() + 1));
+    // Sets of one part, from off cubes that are one part away; with one of these in a set that set
+    // says nothing new.
+    std::vector<uint64_t> singles(numWords);
+    for (size_t block = 0; block < columns.NumBlocks(); ++block)
+        AddSingles(columns, block, toMeet, singles.data());
+    for (size_t word = 0; word < numWords; ++word) {
+        for (uint64_t rest = singles[word]; rest != 0; rest &= rest - 1) {
+            sets.Resize(sets.Size() + 1);
+            SetBit(sets.At(sets.Size() - 1), 64 * word + LowestBit(rest));
         }
     }
+    std::vector<uint32_t> others;
+    for (size_t block = 0; block < columns.NumBlocks(); ++block) {
+        uint64_t open = columns.Cubes(block);
+        for (size_t place = 0; place < toMeet.inputs.size() && open != 0; ++place)
+            if (GetBit(singles.data(), toMeet.inputs[place] ^ 1u))
+                open &= columns.Block(block)[toMeet.inputs[place]];
+        AppendBits(open, block, others);
+    }
+    for (const uint32_t index : others)
+        AppendSets(space, off.Cubes().At(index), cube, singles, sets);
+    work.Spend(others.size() * numWords);
     KeepMinimal(sets, work);
     return sets;
 }

@@ -6,14 +6,14 @@
 #ifndef BOOLEQ_MINIMISE_BLOCKING_H
 #define BOOLEQ_MINIMISE_BLOCKING_H
 
-#include "cube.h"
+#include "cube_columns.h"
 #include "work.h"
 
 namespace booleq {
 
 // One set of parts for each way in which 'cube', which meets no off cube, would meet one if all of
 // the set were raised; no set holds another one.
-CubeList FindBlockingSets(const CubeSpace& space, const CubeList& off, const uint64_t* cube,
+CubeList FindBlockingSets(const CubeSpace& space, const CubeIndex& off, const uint64_t* cube,
                           Work& work);
 
 // The parts that all primes that hold the cube have: those in no blocking set.

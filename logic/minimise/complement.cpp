@@ -2,6 +2,7 @@
 // six inputs are covered as a word of rows.
 #include <algorithm>
 
+#include "cofactors.h"
 #include "small_cover.h"
 #include "unate.h"
 #include "unate_walk.h"

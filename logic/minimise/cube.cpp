@@ -100,33 +100,4 @@ size_t CountOutputs(const CubeSpace& space, const uint64_t* cube)
     return numOutputs;
 }
 
-void RemoveContained(CubeList& cubes, Work& work)
-{
-    const size_t numCubes = cubes.Size();
-    const size_t numWords = cubes.NumWords();
-    std::vector<uint32_t> sizes(numCubes);
-    for (size_t index = 0; index < numCubes; ++index)
-        for (size_t word = 0; word < numWords; ++word)
-            sizes[index] += static_cast<uint32_t>(CountBits(cubes.At(index)[word]));
-    std::vector<uint32_t> order(numCubes);
-    std::iota(order.begin(), order.end(), 0u);
-    std::stable_sort(order.begin(), order.end(),
-                     [&](uint32_t left, uint32_t right) { return sizes[left] > sizes[right]; });
-
-    std::vector<uint8_t> isKept(numCubes, 0);
-    std::vector<uint32_t> kept;
-    for (const uint32_t index : order) {
-        const uint64_t* cube = cubes.At(index);
-        const auto holds = [&](uint32_t other) {
-            return Contains(cubes.At(other), cube, numWords);
-        };
-        work.Spend(kept.size() + 1);
-        if (std::none_of(kept.begin(), kept.end(), holds)) {
-            kept.push_back(index);
-            isKept[index] = 1;
-        }
-    }
-    cubes.Keep(isKept);
-}
-
 } // namespace booleq

@@ -165,10 +165,6 @@ size_t CountCubeLiterals(const CubeSpace& space, const uint64_t* cube);
 size_t CountLiterals(const CubeSpace& space, const CubeList& cubes);
 size_t CountOutputs(const CubeSpace& space, const uint64_t* cube);
 
-// Cubes that lie in another one of the list go; of equal ones the first stays.
-// Cost: O(cubes^2) word operations, less where sizes differ.
-void RemoveContained(CubeList& cubes, Work& work);
-
 } // namespace booleq
 
 #endif

@@ -5,6 +5,7 @@
 #include <unordered_map>
 
 #include "cover.h"
+#include "cube_columns.h"
 #include "listed_inputs.h"
 #include "text.h"
 #include "unate.h"
@@ -38,7 +39,7 @@ class CubesOfExpression {
     CubesOfExpression(const CubeSpace& space, const Expression& expression, const Places& places,
                       Work& work)
         : m_space(space), m_expression(expression), m_places(places), m_work(work),
-          m_full(space.NumInputWords(), ~uint64_t(0))
+          m_full(space.NumInputWords(), ~uint64_t(0)), m_input_space(space.NumInputs(), 0)
     {
     }
 
@@ -109,14 +110,14 @@ class CubesOfExpression {
                 product.Append(cube.data());
             }
         }
-        RemoveContained(product, m_work);
+        RemoveContained(m_input_space, product, m_work);
         return product;
     }
 
     CubeList Union(CubeList left, const CubeList& right)
     {
         left.Append(right);
-        RemoveContained(left, m_work);
+        RemoveContained(m_input_space, left, m_work);
         return left;
     }
 
@@ -138,6 +139,7 @@ class CubesOfExpression {
     const Places& m_places;
     Work& m_work;
     std::vector<uint64_t> m_full;
+    const CubeSpace m_input_space; // of cubes without outputs
     std::vector<CubeList> m_stack;
 };
 

@@ -21,7 +21,8 @@ class ExactSearch {
   public:
     ExactSearch(const TwoLevelProblem& problem, const CubeList& start, Goal goal, Work& work)
         : m_space(problem.space), m_problem(problem), m_goal(goal), m_work(work),
-          m_expander(problem, work), m_start(start), m_essential(m_space.NumWords()),
+          m_expander(problem, work), m_off(m_space, problem.off), m_no_cubes(m_space.NumWords()),
+          m_none(m_space, m_no_cubes, false), m_start(start), m_essential(m_space.NumWords()),
           m_fixed(problem.free), m_rows(m_space.NumWords()), m_signatures(m_space.NumWords()),
           m_result(m_space)
     {
@@ -46,9 +47,8 @@ class ExactSearch {
   private:
     void SetEssentialAside()
     {
-        const std::vector<uint8_t> isOpen(m_start.Size(), 0);
         for (size_t index = 0; index < m_start.Size(); ++index)
-            m_expander.Expand(m_start.At(index), nullptr, m_start, isOpen);
+            m_expander.Expand(m_start.At(index), nullptr, m_none);
         m_start.SortAndUnite();
         m_result.sum = m_start;
         std::vector<uint8_t> isEssential = FindEssential(m_space, m_start, m_problem.free, m_work);
@@ -76,7 +76,8 @@ class ExactSearch {
         CubeList known = m_fixed;
         m_point.resize(m_space.NumWords());
         for (size_t index = 0; index < m_start.Size(); ++index) {
-            while (FindUncoveredRow(m_space, m_start.At(index), known, m_work, m_point.data())) {
+            UncoveredRows search(m_space, m_start.At(index), known, m_work);
+            while (search.Next(m_point.data())) {
                 Row row = RowAt(m_point.data());
                 while (m_rows.Size() > kHardFactor * m_start.Size() && MoveToHarder(row)) {
                 }
@@ -84,6 +85,7 @@ class ExactSearch {
                 m_signatures.Append(row.signature.data());
                 m_blocking.push_back(row.blocking);
                 known.Append(row.signature.data());
+                search.Cover(row.signature.data());
             }
         }
         DropImpliedRows();
@@ -99,7 +101,7 @@ class ExactSearch {
     {
         Row row = {std::vector<uint64_t>(point, point + m_space.NumWords()),
                    std::vector<uint64_t>(m_space.NumWords()),
-                   FindBlockingSets(m_space, m_problem.off, point, m_work)};
+                   FindBlockingSets(m_space, m_off, point, m_work)};
         FindSignature(m_space, row.blocking, row.signature.data());
         assert(Contains(row.signature.data(), point, m_space.NumWords()));
         return row;
@@ -258,11 +260,10 @@ class ExactSearch {
         const CoveringResult result = SolveCovering(problem, UINT64_MAX, m_work);
         m_bound = result.lowerBound;
         CubeList sum = m_essential;
-        const std::vector<uint8_t> isOpen(columns.Size(), 0);
         for (const uint32_t column : result.columns) {
             sum.Append(columns.At(column));
             uint64_t* cube = sum.At(sum.Size() - 1);
-            m_expander.Expand(cube, nullptr, columns, isOpen);
+            m_expander.Expand(cube, nullptr, m_none);
         }
         const CoverCost cost = CostOf(m_space, sum);
         const CoverCost best = CostOf(m_space, m_result.sum);
@@ -303,6 +304,9 @@ class ExactSearch {
     Goal m_goal;
     Work& m_work;
     Expander m_expander;
+    const CubeIndex m_off;
+    const CubeList m_no_cubes;
+    const OpenCubes m_none;
     CubeList m_start; // primes; then those that are not essential
     CubeList m_essential;
     CubeList m_fixed; // free, and the essential primes

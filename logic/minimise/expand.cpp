@@ -8,167 +8,86 @@
 
 namespace booleq {
 
-Expander::Expander(const TwoLevelProblem& problem, Work& work)
-    : m_problem(problem), m_space(problem.space), m_off(problem.off), m_work(work),
-      m_num_words(m_space.NumWords()), m_raised(m_num_words), m_free(m_num_words),
-      m_blocked(m_num_words), m_scratch(m_num_words), m_order(m_off.Size())
+namespace {
+
+// Candidates at a time, times blocks of off cubes, each of which is asked of them.
+constexpr size_t kMaxAskedBlocks = size_t(1) << 18;
+
+} // namespace
+
+OpenCubes::OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen)
+    : m_cubes(cubes), m_columns(space, cubes), m_open(m_columns.NumBlocks())
 {
-    std::iota(m_order.begin(), m_order.end(), 0u);
+    for (size_t block = 0; block < m_open.size() && areOpen; ++block)
+        m_open[block] = m_columns.Cubes(block);
+}
+
+Expander::Expander(const TwoLevelProblem& problem, Work& work)
+    : m_problem(problem), m_space(problem.space), m_work(work), m_num_words(m_space.NumWords()),
+      m_raised(m_num_words), m_free(m_num_words), m_scratch(m_num_words),
+      m_obstacles(m_space, problem.off, work), m_none(m_num_words),
+      m_on_index(m_space, problem.hasOff ? m_none : problem.on),
+      m_free_index(m_space, problem.hasOff ? m_none : problem.free),
+      m_known(m_space, m_on_index, m_free_index, work)
+{
 }
 
 bool Expander::IsImplicant(const uint64_t* cube)
 {
     if (!m_problem.hasOff)
-        return IsCovered(m_space, cube, m_problem.on, m_problem.on.Size(), m_problem.free, m_work);
-    for (size_t place = 0; place < m_order.size(); ++place) {
-        if (IsDisjoint(m_space, cube, m_off.At(m_order[place])))
-            continue;
-        std::swap(m_order[place], m_order[place / 2]); // those that object come to the front
-        m_work.Spend(place + 1);
-        return false;
-    }
-    m_work.Spend(m_off.Size());
-    return true;
+        return m_known.Cover(cube, SIZE_MAX);
+    return !m_obstacles.IsMet(cube);
 }
 
-void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const CubeList& others,
-                      const std::vector<uint8_t>& isOpen)
+void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const OpenCubes& others)
 {
     for (size_t word = 0; word < m_num_words; ++word) {
         m_raised[word] = cube[word];
         m_free[word] = m_space.All(word) & ~cube[word] & (allowed ? allowed[word] : ~uint64_t(0));
     }
-    m_active.resize(m_off.Size());
-    std::iota(m_active.begin(), m_active.end(), 0u);
-    m_candidates.clear();
-    for (size_t index = 0; index < others.Size(); ++index)
-        if (isOpen[index] != 0)
-            m_candidates.push_back(static_cast<uint32_t>(index));
     if (!m_problem.hasOff) {
-        ExpandByTautology(cube, others);
+        ListCandidates(others);
+        ExpandByTautology(cube, others.Cubes());
         return;
     }
+    m_obstacles.Start(m_raised.data(), m_free.data());
     Settle();
+    ListCandidates(others);
     CoverOthers(others);
-    while (!m_active.empty())
+    while (!m_obstacles.IsNoneActive())
         RaiseLeastBlocked();
     for (size_t word = 0; word < m_num_words; ++word)
         cube[word] = m_raised[word] | m_free[word];
+    assert(IsImplicant(cube));
 }
 
-// Decides what is decided: parts that would meet an off cube at once are lowered, parts that no
-// active cube asks for are raised.
-void Expander::Settle()
+// The open cubes that lie in m_raised and m_free.
+void Expander::ListCandidates(const OpenCubes& others)
 {
-    while (LowerAndDrop()) {
-    }
-    for (size_t word = 0; word < m_num_words; ++word) {
-        m_raised[word] |= m_free[word] & ~m_blocked[word];
-        m_free[word] &= m_blocked[word];
-    }
-}
-
-// One pass over the active cubes. True when a part was lowered, so that more cubes may be inactive.
-bool Expander::LowerAndDrop()
-{
-    m_work.Spend(m_active.size() * m_num_words + 1);
-    switch (m_num_words) {
-    case 1:
-        return LowerAndDropIn<1>();
-    case 2:
-        return LowerAndDropIn<2>();
-    default:
-        return LowerAndDropIn<0>();
-    }
-}
-
-// 'kNumWords' is the number of words if the compiler is to know it, else 0.
-template <size_t kNumWords>
-bool Expander::LowerAndDropIn()
-{
-    const size_t numWords = kNumWords > 0 ? kNumWords : m_num_words;
-    const uint64_t* const raised = m_raised.data();
-    uint64_t* const free = m_free.data();
-    uint64_t* const missing = m_scratch.data();
-    uint64_t* const blocked = m_blocked.data();
-    uint64_t lows[kNumWords > 0 ? kNumWords : 1] = {};
-    uint64_t outs[kNumWords > 0 ? kNumWords : 1] = {};
-    for (size_t word = 0; word < kNumWords; ++word) {
-        lows[word] = m_space.InputLow(word);
-        outs[word] = m_space.Outputs(word);
-    }
-    bool isLowered = false;
-    std::fill(m_blocked.begin(), m_blocked.end(), 0);
-    size_t numActive = 0;
-    for (const uint32_t index : m_active) {
-        const uint64_t* const off = m_off.At(index);
-        size_t distance = 0; // exact up to 1
-        uint64_t unreachable = 0;
-        uint64_t commonOutputs = 0;
-        uint64_t reachableOutputs = 0;
-        for (size_t word = 0; word < numWords; ++word) {
-            const uint64_t low = kNumWords > 0 ? lows[word] : m_space.InputLow(word);
-            const uint64_t out = kNumWords > 0 ? outs[word] : m_space.Outputs(word);
-            const uint64_t common = raised[word] & off[word];
-            const uint64_t conflicts = low & ~(common | common >> 1);
-            missing[word] = off[word] & conflicts * 3;
-            // Of each pair in conflict one part of the off cube must still be free.
-            const uint64_t open = missing[word] & free[word];
-            unreachable |= conflicts & ~(open | open >> 1);
-            distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
-            commonOutputs |= common & out;
-            reachableOutputs |= off[word] & free[word] & out;
-        }
-        if (unreachable != 0 || (commonOutputs | reachableOutputs) == 0)
-            continue;
-        if (commonOutputs == 0) {
-            ++distance;
-            for (size_t word = 0; word < numWords; ++word)
-                missing[word] |= off[word] & m_space.Outputs(word);
-        }
-        assert(distance > 0); // invariant 1
-        if (distance == 1) {
-            for (size_t word = 0; word < numWords; ++word)
-                free[word] &= ~missing[word];
-            isLowered = true; // and the cube cannot be met any more
-            continue;
-        }
-        for (size_t word = 0; word < numWords; ++word)
-            blocked[word] |= missing[word];
-        m_active[numActive++] = index;
-    }
-    m_active.resize(numActive);
-    return isLowered;
-}
-
-// Whether the supercube of m_raised and 'with' meets no off cube.
-// Requires: 'with' has no parts outside m_raised and m_free.
-bool Expander::IsFeasible(const uint64_t* with)
-{
+    const CubeColumns& columns = others.Columns();
+    std::vector<uint32_t> parts; // that keep a cube out
     for (size_t word = 0; word < m_num_words; ++word)
-        m_scratch[word] = m_raised[word] | with[word];
-    for (size_t place = 0; place < m_active.size(); ++place) {
-        if (!IsDisjoint(m_space, m_scratch.data(), m_off.At(m_active[place]))) {
-            m_work.Spend(place + 1);
-            std::swap(m_active[place], m_active[place / 2]); // those that object come to the front
-            return false;
-        }
-    }
-    m_work.Spend(m_active.size());
-    return true;
+        AppendBits(m_space.All(word) & ~(m_raised[word] | m_free[word]), word, parts);
+    m_work.Spend(columns.NumBlocks() * (parts.size() + 1) / 2);
+    m_candidates.clear();
+    for (size_t block = 0; block < columns.NumBlocks(); ++block)
+        if (others.Open(block) != 0)
+            AppendBits(others.Open(block) & ~AnyColumn(columns.Block(block), parts), block,
+                       m_candidates);
+    m_feasible.assign(columns.NumBlocks(), 0);
 }
 
 // Takes in the others one by one, as long as there is one that could be; then heads for them.
-void Expander::CoverOthers(const CubeList& others)
+void Expander::CoverOthers(const OpenCubes& others)
 {
     for (;;) {
-        const size_t numFeasible = FilterCandidates(others);
-        if (m_candidates.empty() || m_active.empty())
+        const size_t numFeasible = FilterCandidates(others.Cubes());
+        if (m_candidates.empty() || m_obstacles.IsNoneActive())
             return;
         if (numFeasible > 0)
             RaiseBest(others, numFeasible);
         else
-            RaiseMostFrequent(others);
+            RaiseMostFrequent(others.Cubes());
     }
 }
 
@@ -190,79 +109,88 @@ size_t Expander::FilterCandidates(const CubeList& others)
             m_candidates[numKept++] = candidate;
     }
     m_candidates.resize(numKept);
+    const size_t numAsked =
+        std::min(numKept, kMaxAskedBlocks / (m_problem.off.Size() / 64 + 1) + 16);
+    if (numKept > numAsked) { // the nearest are asked now, others when the cube has grown
+        const auto isNearer = [&](uint32_t left, uint32_t right) {
+            const size_t leftCount = CountRaised(others.At(left));
+            const size_t rightCount = CountRaised(others.At(right));
+            return leftCount != rightCount ? leftCount < rightCount : left < right;
+        };
+        std::nth_element(m_candidates.begin(),
+                         m_candidates.begin() + static_cast<std::ptrdiff_t>(numAsked),
+                         m_candidates.end(), isNearer);
+    }
     size_t numFeasible = 0;
-    for (size_t place = 0; place < numKept; ++place)
-        if (IsFeasible(others.At(m_candidates[place])))
+    for (size_t place = 0; place < numAsked; ++place)
+        if (m_obstacles.IsFeasible(m_free.data(), others.At(m_candidates[place])))
             std::swap(m_candidates[place], m_candidates[numFeasible++]);
     return numFeasible;
 }
 
-namespace {
-
-bool IsAtDistanceOne(const CubeSpace& space, const uint64_t* left, const uint64_t* right)
+// How many parts 'cube' would raise.
+size_t Expander::CountRaised(const uint64_t* cube) const
 {
-    size_t distance = HasCommonOutput(space, left, right) ? 0 : 1;
-    for (size_t word = 0; word < space.NumInputWords() && distance <= 1; ++word) {
-        const uint64_t conflicts = InputConflicts(space, left, right, word);
-        distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
-    }
-    return distance == 1;
+    size_t count = 0;
+    for (size_t word = 0; word < m_num_words; ++word)
+        count += CountBits(cube[word] & ~m_raised[word]);
+    return count;
 }
 
-} // namespace
-
 // How many candidates could still be taken in, as far as parts that are then lowered at once tell.
-size_t Expander::CountAfter(const CubeList& others, size_t numFeasible, const uint64_t* with)
+size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with)
 {
-    std::vector<uint64_t> reach(m_num_words);
-    std::vector<uint64_t> raised(m_num_words);
-    for (size_t word = 0; word < m_num_words; ++word) {
-        raised[word] = m_raised[word] | with[word];
-        reach[word] = m_raised[word] | m_free[word];
-    }
-    m_work.Spend(m_active.size() + numFeasible);
-    for (const uint32_t place : m_active) {
-        const uint64_t* off = m_off.At(place);
-        if (!IsAtDistanceOne(m_space, raised.data(), off))
-            continue;
-        for (size_t word = 0; word < m_num_words; ++word)
-            reach[word] &= ~(off[word] & InputConflicts(m_space, raised.data(), off, word) * 3);
-        if (!HasCommonOutput(m_space, raised.data(), off))
-            for (size_t word = m_space.FirstOutputWord(); word < m_num_words; ++word)
-                reach[word] &= ~(off[word] & m_space.Outputs(word));
-    }
+    for (size_t word = 0; word < m_num_words; ++word)
+        m_scratch[word] = m_raised[word] | m_free[word];
+    m_obstacles.ClearLowered(m_free.data(), with, m_scratch.data());
+    std::vector<uint32_t> lost;
+    for (size_t word = 0; word < m_num_words; ++word)
+        AppendBits((m_raised[word] | m_free[word]) & ~m_scratch[word], word, lost);
+    if (lost.empty())
+        return numFeasible;
+    m_work.Spend(m_feasible_blocks.size() * lost.size() / 2);
     size_t count = 0;
-    for (size_t place = 0; place < numFeasible; ++place)
-        if (Contains(reach.data(), others.At(m_candidates[place]), m_num_words))
-            ++count;
+    for (const uint32_t block : m_feasible_blocks)
+        count += CountBits(m_feasible[block] & ~AnyColumn(others.Columns().Block(block), lost));
     return count;
 }
 
 // Takes in the feasible candidate after which most others can be taken in; of equal ones the one
 // that raises fewest parts.
-void Expander::RaiseBest(const CubeList& others, size_t numFeasible)
+void Expander::RaiseBest(const OpenCubes& others, size_t numFeasible)
 {
+    std::fill(m_feasible.begin(), m_feasible.end(), 0);
+    m_feasible_blocks.clear();
+    for (size_t place = 0; place < numFeasible; ++place) {
+        const uint32_t candidate = m_candidates[place];
+        if (m_feasible[candidate / 64] == 0)
+            m_feasible_blocks.push_back(candidate / 64);
+        SetBit(m_feasible.data(), candidate);
+    }
     size_t best = 0;
     size_t bestCount = 0;
     size_t bestRaised = SIZE_MAX;
     for (size_t place = 0; place < numFeasible && numFeasible > 1; ++place) {
-        const uint64_t* cube = others.At(m_candidates[place]);
+        const uint64_t* cube = others.Cubes().At(m_candidates[place]);
         const size_t count = CountAfter(others, numFeasible, cube);
-        size_t numRaised = 0;
-        for (size_t word = 0; word < m_num_words; ++word)
-            numRaised += CountBits(cube[word] & ~m_raised[word]);
+        const size_t numRaised = CountRaised(cube);
         if (count > bestCount || (count == bestCount && numRaised < bestRaised)) {
             best = place;
             bestCount = count;
             bestRaised = numRaised;
         }
     }
-    const uint64_t* cube = others.At(m_candidates[best]);
+    const uint64_t* cube = others.Cubes().At(m_candidates[best]);
     for (size_t word = 0; word < m_num_words; ++word) {
         m_raised[word] |= cube[word];
         m_free[word] &= ~cube[word];
     }
     Settle();
+}
+
+void Expander::Settle()
+{
+    m_obstacles.Settle(m_raised.data(), m_free.data());
 }
 
 void Expander::Raise(size_t bit)
@@ -290,21 +218,12 @@ void Expander::RaiseMostFrequent(const CubeList& others)
 // Raises the free part that fewest active cubes ask for.
 void Expander::RaiseLeastBlocked()
 {
-    m_work.Spend(m_active.size() * m_num_words);
-    m_counts.assign(64 * m_num_words, 0);
-    for (const uint32_t index : m_active) {
-        const uint64_t* off = m_off.At(index);
-        for (size_t word = 0; word < m_num_words; ++word) {
-            uint64_t rest = off[word] & m_free[word];
-            for (; rest != 0; rest &= rest - 1)
-                ++m_counts[64 * word + LowestBit(rest)];
-        }
-    }
+    m_obstacles.CountFree(m_free.data(), m_counts);
     size_t best = SIZE_MAX;
     for (size_t bit = 0; bit < m_counts.size(); ++bit)
         if (GetBit(m_free.data(), bit) && (best == SIZE_MAX || m_counts[bit] < m_counts[best]))
             best = bit;
-    assert(best != SIZE_MAX); // invariant 3: an active cube needs free parts
+    assert(best != SIZE_MAX); // an active cube needs free parts
     Raise(best);
 }
 
@@ -327,35 +246,76 @@ std::vector<uint32_t> OrderByWeight(const CubeSpace& space, const CubeList& cube
     return order;
 }
 
-void ExpandCover(const CubeSpace& space, Expander& expander, const uint64_t* allowed, Cover& cover,
-                 Work& work)
+void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept)
 {
-    CubeList& cubes = cover.cubes;
-    std::vector<uint8_t> isKept(cubes.Size(), 1);
-    std::vector<uint8_t> isOpen(cubes.Size());
-    for (size_t index = 0; index < cubes.Size(); ++index)
-        isOpen[index] = cover.isPrime[index] != 0 ? 0 : 1;
-    for (const uint32_t index : OrderByWeight(space, cubes)) {
-        if (isKept[index] == 0 || cover.isPrime[index] != 0)
-            continue;
-        isOpen[index] = 0;
-        expander.Expand(cubes.At(index), allowed, cubes, isOpen);
-        cover.isPrime[index] = allowed ? 0 : 1;
-        work.Spend(cubes.Size());
-        for (size_t other = 0; other < cubes.Size(); ++other) {
-            if (other != index && isKept[other] != 0 &&
-                Contains(cubes.At(index), cubes.At(other), space.NumWords())) {
-                isKept[other] = 0;
-                isOpen[other] = 0;
-            }
-        }
-    }
-    cubes.Keep(isKept);
+    cover.cubes.Keep(isKept);
     size_t numKept = 0;
     for (size_t index = 0; index < isKept.size(); ++index)
         if (isKept[index] != 0)
             cover.isPrime[numKept++] = cover.isPrime[index];
     cover.isPrime.resize(numKept);
+}
+
+namespace {
+
+// Primes lie in one another only when they are equal.
+void DropEqualPrimes(Cover& cover)
+{
+    const CubeList& cubes = cover.cubes;
+    const size_t numWords = cubes.NumWords();
+    std::vector<uint32_t> order(cubes.Size());
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
+        return std::lexicographical_compare(cubes.At(left), cubes.At(left) + numWords,
+                                            cubes.At(right), cubes.At(right) + numWords);
+    });
+    std::vector<uint8_t> isKept(cubes.Size(), 1);
+    for (size_t place = 1; place < order.size(); ++place)
+        if (IsSameCube(cubes.At(order[place - 1]), cubes.At(order[place]), numWords))
+            isKept[order[place - 1]] = 0;
+    KeepInCover(cover, isKept);
+}
+
+// Closes the open cubes that lie in 'prime', and clears their flags.
+void TakeIn(const CubeSpace& space, const uint64_t* prime, OpenCubes& others,
+            std::vector<uint8_t>& isKept, Work& work)
+{
+    std::vector<uint32_t> parts; // that keep a cube out
+    for (size_t word = 0; word < space.NumWords(); ++word)
+        AppendBits(space.All(word) & ~prime[word], word, parts);
+    const CubeColumns& columns = others.Columns();
+    work.Spend(columns.NumBlocks() * (parts.size() + 1) / 2);
+    std::vector<uint32_t> taken;
+    for (size_t block = 0; block < columns.NumBlocks(); ++block)
+        if (others.Open(block) != 0)
+            AppendBits(others.Open(block) & ~AnyColumn(columns.Block(block), parts), block, taken);
+    for (const uint32_t index : taken) {
+        assert(Contains(prime, others.Cubes().At(index), space.NumWords()));
+        others.Close(index);
+        isKept[index] = 0;
+    }
+}
+
+} // namespace
+
+void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work& work)
+{
+    CubeList& cubes = cover.cubes;
+    std::vector<uint8_t> isKept(cubes.Size(), 1);
+    OpenCubes others(space, cubes, true); // what is yet to be expanded
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (cover.isPrime[index] != 0)
+            others.Close(index);
+    for (const uint32_t index : OrderByWeight(space, cubes)) {
+        if (!others.IsOpen(index))
+            continue;
+        others.Close(index);
+        expander.Expand(cubes.At(index), nullptr, others);
+        cover.isPrime[index] = 1;
+        TakeIn(space, cubes.At(index), others, isKept, work);
+    }
+    KeepInCover(cover, isKept);
+    DropEqualPrimes(cover);
 }
 
 } // namespace booleq

@@ -5,9 +5,31 @@
 #ifndef BOOLEQ_MINIMISE_EXPAND_H
 #define BOOLEQ_MINIMISE_EXPAND_H
 
+#include "cofactors.h"
+#include "obstacles.h"
 #include "two_level.h"
 
 namespace booleq {
+
+// Cubes of a list that a growing one may take in. The list must outlive this; the cubes that are
+// open do not change.
+class OpenCubes {
+  public:
+    // All of the list are open, or none.
+    OpenCubes(const CubeSpace& space, const CubeList& cubes, bool areOpen);
+
+    const CubeList& Cubes() const { return m_cubes; }
+    const CubeColumns& Columns() const { return m_columns; }
+    // Bit k says whether cube 64 * block + k is open.
+    uint64_t Open(size_t block) const { return m_open[block]; }
+    void Close(size_t index) { ClearBit(m_open.data(), index); }
+    bool IsOpen(size_t index) const { return GetBit(m_open.data(), index); }
+
+  private:
+    const CubeList& m_cubes;
+    CubeColumns m_columns;
+    std::vector<uint64_t> m_open;
+};
 
 // Grows one cube at a time against the off-set of a problem, which must stay as it is as long as
 // this lives. Where the problem has no off-set, a cube may grow as far as 'on' and 'free' cover it,
@@ -19,45 +41,42 @@ class Expander {
     // Whether the cube meets no row that is off.
     bool IsImplicant(const uint64_t* cube);
     // 'cube' becomes a prime that has only parts that 'allowed' has, or that it had; null allows
-    // all. It is steered to take in cubes of 'others' whose flag in 'isOpen' is set.
+    // all. It is steered to take in those of 'others' that are open.
     // Requires: an implicant.
-    void Expand(uint64_t* cube, const uint64_t* allowed, const CubeList& others,
-                const std::vector<uint8_t>& isOpen);
+    void Expand(uint64_t* cube, const uint64_t* allowed, const OpenCubes& others);
 
   private:
-    // Invariants while a cube grows:
-    // 1. m_raised meets no off cube; m_free has parts that are not decided, none of m_raised's.
-    // 2. m_active has the off cubes that m_raised and m_free together meet.
-    // 3. m_blocked has the free parts that an active cube needs to come nearer; when Settle is done
-    //    these are all the free parts.
+    // While a cube grows, m_raised has the parts that it has and m_free those that are not decided;
+    // invariants are those of Obstacles.
     void ExpandByTautology(uint64_t* cube, const CubeList& others);
     void TakeInNearest(uint64_t* cube, const CubeList& others);
 
     void Settle();
-    bool LowerAndDrop();
-    template <size_t kNumWords>
-    bool LowerAndDropIn();
-    bool IsFeasible(const uint64_t* with);
-    void CoverOthers(const CubeList& others);
+    void CoverOthers(const OpenCubes& others);
+    void ListCandidates(const OpenCubes& others);
     size_t FilterCandidates(const CubeList& others);
-    void RaiseBest(const CubeList& others, size_t numFeasible);
-    size_t CountAfter(const CubeList& others, size_t numFeasible, const uint64_t* with);
+    size_t CountRaised(const uint64_t* cube) const;
+    void RaiseBest(const OpenCubes& others, size_t numFeasible);
+    size_t CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with);
     void RaiseMostFrequent(const CubeList& others);
     void RaiseLeastBlocked();
     void Raise(size_t bit);
 
     const TwoLevelProblem& m_problem;
     const CubeSpace& m_space;
-    const CubeList& m_off;
     Work& m_work;
     size_t m_num_words;
     std::vector<uint64_t> m_raised;
     std::vector<uint64_t> m_free;
-    std::vector<uint64_t> m_blocked;
     std::vector<uint64_t> m_scratch;
-    std::vector<uint32_t> m_order; // of the off cubes, for IsImplicant
-    std::vector<uint32_t> m_active;
-    std::vector<uint32_t> m_candidates; // feasible ones first
+    Obstacles m_obstacles;
+    const CubeList m_none;
+    CubeIndex m_on_index;
+    CubeIndex m_free_index;
+    Cofactors m_known;                       // on and free; asked where there is no off-set
+    std::vector<uint32_t> m_candidates;      // feasible ones first
+    std::vector<uint64_t> m_feasible;        // of each block of the others
+    std::vector<uint32_t> m_feasible_blocks; // that have any
     std::vector<uint32_t> m_counts;
 };
 
@@ -68,9 +87,11 @@ struct Cover {
     std::vector<uint8_t> isPrime;
 };
 
-// All cubes become primes; those that others then contain go. 'allowed' as above.
-void ExpandCover(const CubeSpace& space, Expander& expander, const uint64_t* allowed, Cover& cover,
-                 Work& work);
+// Cubes whose flag is 0 go.
+void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept);
+
+// All cubes become primes; those that others then contain go.
+void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work& work);
 
 // The order that puts cubes first which have little in common with the others.
 std::vector<uint32_t> OrderByWeight(const CubeSpace& space, const CubeList& cubes);

@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <numeric>
 
+#include "cofactors.h"
 #include "covering.h"
 #include "reduce.h"
 #include "unate.h"
@@ -13,7 +14,7 @@ namespace booleq {
 
 namespace {
 
-constexpr uint64_t kIrredundantUnits = 1u << 22; // to choose cubes in; each row has a cube anyway
+constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; each row has a cube anyway
 constexpr uint32_t kFixed = UINT32_MAX;          // label of cubes that stay
 
 // Appends a row for each place that only labelled cubes cover.
@@ -115,29 +116,25 @@ class ChoiceSearch {
     std::vector<std::vector<uint32_t>>& m_rows;
 };
 
-// AppendMeeting with the label of each cube; without labels all are fixed.
-void AppendLabelled(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, bool isFixed,
-                    CubeList& meeting, std::vector<uint32_t>& labels)
-{
-    for (size_t index = 0; index < cubes.Size(); ++index)
-        if (!IsDisjoint(space, cubes.At(index), by))
-            labels.push_back(isFixed ? kFixed : static_cast<uint32_t>(index));
-    AppendMeeting(space, cubes, by, cubes.Size(), meeting);
-    assert(meeting.Size() == labels.size());
-}
-
 // The rows of the covering problem whose columns are the cubes of 'choices'; 'fixed' stay.
 std::vector<std::vector<uint32_t>> FindChoices(const CubeSpace& space, const CubeList& choices,
                                                const CubeList& fixed, Work& work)
 {
     std::vector<std::vector<uint32_t>> rows;
+    CubeIndex choiceIndex(space, choices);
+    CubeIndex fixedIndex(space, fixed);
+    std::vector<uint32_t> meetingLabels;
+    std::vector<uint32_t> found;
     for (size_t index = 0; index < choices.Size(); ++index) {
         const size_t numBefore = rows.size();
         CubeList meeting(space.NumWords());
-        std::vector<uint32_t> meetingLabels;
-        work.Spend((choices.Size() + fixed.Size()) * space.NumWords());
-        AppendLabelled(space, choices, choices.At(index), false, meeting, meetingLabels);
-        AppendLabelled(space, fixed, choices.At(index), true, meeting, meetingLabels);
+        choiceIndex.Find(choices.At(index), 0, work, meetingLabels);
+        for (const uint32_t choice : meetingLabels)
+            AppendCofactor(space, choices.At(choice), choices.At(index), meeting);
+        fixedIndex.Find(choices.At(index), 0, work, found);
+        for (const uint32_t place : found)
+            AppendCofactor(space, fixed.At(place), choices.At(index), meeting);
+        meetingLabels.resize(meeting.Size(), kFixed);
         for (size_t output = 0; output < space.NumOutputs(); ++output) {
             if (!GetBit(choices.At(index), space.OutputBit(output)))
                 continue;
@@ -165,8 +162,11 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
     CubeList& cubes = cover.cubes;
     std::vector<uint8_t> isKept(cubes.Size(), 0);
     CubeList fixed = free; // and the cubes that have a place of their own
+    CubeIndex cubeIndex(space, cubes);
+    CubeIndex freeIndex(space, free);
+    Cofactors ofOthers(space, cubeIndex, freeIndex, work);
     for (size_t index = 0; index < cubes.Size(); ++index) {
-        if (!IsCovered(space, cubes.At(index), cubes, index, free, work)) {
+        if (!ofOthers.Cover(cubes.At(index), index)) {
             isKept[index] = 1;
             fixed.Append(cubes.At(index));
         }
@@ -174,9 +174,11 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
     CubeList choices(space.NumWords());
     std::vector<uint32_t> places;
     const CubeList none(space.NumWords());
+    CubeIndex fixedIndex(space, fixed);
+    CubeIndex noIndex(space, none);
+    Cofactors ofFixed(space, fixedIndex, noIndex, work);
     for (size_t index = 0; index < cubes.Size(); ++index) {
-        if (isKept[index] == 0 &&
-            !IsCovered(space, cubes.At(index), fixed, fixed.Size(), none, work)) {
+        if (isKept[index] == 0 && !ofFixed.Cover(cubes.At(index), SIZE_MAX)) {
             choices.Append(cubes.At(index));
             places.push_back(static_cast<uint32_t>(index));
         }
@@ -190,36 +192,31 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
         for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns)
             isKept[places[choice]] = 1;
     }
-    cubes.Keep(isKept);
-    size_t numKept = 0;
-    for (size_t index = 0; index < isKept.size(); ++index)
-        if (isKept[index] != 0)
-            cover.isPrime[numKept++] = cover.isPrime[index];
-    cover.isPrime.resize(numKept);
+    KeepInCover(cover, isKept);
 }
 
 namespace {
 
 // The cubes whose part outside 'prime' has a consensus with it: as cofactors with respect to
-// 'prime', with the outputs for which it is one.
-void AppendConsensus(const CubeSpace& space, const CubeList& cubes, size_t left,
-                     const uint64_t* prime, CubeList& target)
+// 'prime', with the outputs for which it is one. 'near' has the cubes at most one part away.
+void AppendConsensus(const CubeSpace& space, const CubeList& cubes,
+                     const std::vector<uint32_t>& near, size_t left, const uint64_t* prime,
+                     CubeList& target)
 {
-    for (size_t index = 0; index < cubes.Size(); ++index) {
+    for (const uint32_t index : near) {
+        if (index == left)
+            continue;
         const uint64_t* cube = cubes.At(index);
-        size_t distance = 0;
+        uint64_t conflicts = 0;
         uint64_t outside = 0;
-        for (size_t word = 0; word < space.NumInputWords() && distance <= 1; ++word) {
-            const uint64_t conflicts = InputConflicts(space, cube, prime, word);
-            distance += (conflicts != 0 ? 1u : 0u) + ((conflicts & (conflicts - 1)) != 0 ? 1u : 0u);
+        for (size_t word = 0; word < space.NumInputWords(); ++word) {
+            conflicts |= InputConflicts(space, cube, prime, word);
             outside |= cube[word] & ~prime[word] & space.Inputs(word);
         }
-        if (index == left || distance > 1)
-            continue;
         uint64_t outputsOutside = 0;
         for (size_t word = space.FirstOutputWord(); word < space.NumWords(); ++word)
             outputsOutside |= cube[word] & ~prime[word] & space.Outputs(word);
-        const bool isForAll = distance == 0 && outputsOutside != 0;
+        const bool isForAll = conflicts == 0 && outputsOutside != 0;
         if (!isForAll && (outside == 0 || !HasCommonOutput(space, cube, prime)))
             continue;
         target.Resize(target.Size() + 1);
@@ -237,13 +234,19 @@ std::vector<uint8_t> FindEssential(const CubeSpace& space, const CubeList& cubes
                                    const CubeList& free, Work& work)
 {
     std::vector<uint8_t> isEssential(cubes.Size(), 0);
+    CubeIndex cubeIndex(space, cubes);
+    CubeIndex freeIndex(space, free);
+    std::vector<uint32_t> found;
     for (size_t index = 0; index < cubes.Size(); ++index) {
         const uint64_t* prime = cubes.At(index);
         CubeList consensus(space.NumWords());
-        work.Spend(2 * (cubes.Size() + free.Size()) * space.NumWords());
-        AppendMeeting(space, free, prime, free.Size(), consensus);
-        AppendConsensus(space, cubes, index, prime, consensus);
-        AppendConsensus(space, free, free.Size(), prime, consensus);
+        freeIndex.Find(prime, 0, work, found);
+        for (const uint32_t place : found)
+            AppendCofactor(space, free.At(place), prime, consensus);
+        cubeIndex.Find(prime, 1, work, found);
+        AppendConsensus(space, cubes, found, index, prime, consensus);
+        freeIndex.Find(prime, 1, work, found);
+        AppendConsensus(space, free, found, SIZE_MAX, prime, consensus);
         for (size_t output = 0; output < space.NumOutputs() && isEssential[index] == 0; ++output) {
             if (!GetBit(prime, space.OutputBit(output)))
                 continue;

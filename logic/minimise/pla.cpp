@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <numeric>
 
+#include "cube_columns.h"
 #include "unate.h"
 
 namespace booleq {
@@ -149,7 +150,7 @@ void AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
             problem.free.Append(common.data());
         }
     }
-    RemoveContained(problem.free, work);
+    RemoveContained(problem.space, problem.free, work);
 }
 
 } // namespace

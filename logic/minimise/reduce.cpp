@@ -4,11 +4,16 @@
 #include <algorithm>
 #include <numeric>
 
+#include "cofactors.h"
 #include "unate.h"
 
 namespace booleq {
 
-void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, const CubeList& free,
+namespace {
+
+// The smallest cube that has what neither the other cubes nor the free ones cover of cube 'index',
+// which the two lists of 'cofactors' hold. All words 0 when nothing is left.
+void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, Cofactors& cofactors,
                 Work& work, uint64_t* reduced)
 {
     const uint64_t* cube = cubes.At(index);
@@ -21,18 +26,13 @@ void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, con
     }
     std::fill(reduced, reduced + space.NumWords(), 0);
     bool isEmpty = true;
-    CubeList meeting(space.NumWords());
-    work.Spend((cubes.Size() + free.Size()) * space.NumWords());
-    AppendMeeting(space, cubes, cube, index, meeting);
-    AppendMeeting(space, free, cube, free.Size(), meeting);
-    CubeList cofactor(numInputWords);
+    cofactors.Take(cube, index);
+    CubeList scratch(numInputWords);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         if (!GetBit(cube, space.OutputBit(output)))
             continue;
-        cofactor.Resize(0);
-        work.Spend(meeting.Size());
-        AppendOfOutput(space, meeting, output, cofactor);
-        CubeList scratch = cofactor;
+        CubeList& cofactor = cofactors.OfOutput(output);
+        scratch = cofactor;
         if (IsTautology(space, scratch, work))
             continue;
         isEmpty = false;
@@ -45,8 +45,6 @@ void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, con
         reduced[word] |= cube[word] & found[word] & space.Inputs(word);
     assert(Contains(cube, reduced, space.NumWords()));
 }
-
-namespace {
 
 size_t SizeOf(const CubeSpace& space, const uint64_t* cube)
 {
@@ -79,16 +77,6 @@ std::vector<uint32_t> OrderToReduce(const CubeSpace& space, const CubeList& cube
     return order;
 }
 
-void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept)
-{
-    cover.cubes.Keep(isKept);
-    size_t numKept = 0;
-    for (size_t index = 0; index < isKept.size(); ++index)
-        if (isKept[index] != 0)
-            cover.isPrime[numKept++] = cover.isPrime[index];
-    cover.isPrime.resize(numKept);
-}
-
 } // namespace
 
 void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,
@@ -97,11 +85,15 @@ void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, boo
     CubeList& cubes = cover.cubes;
     std::vector<uint64_t> reduced(space.NumWords());
     std::vector<uint8_t> isKept(cubes.Size(), 1);
+    CubeIndex cubeIndex(space, cubes);
+    CubeIndex freeIndex(space, free);
+    Cofactors cofactors(space, cubeIndex, freeIndex, work);
     for (const uint32_t index : OrderToReduce(space, cubes, isBySize)) {
-        ReduceCube(space, cubes, index, free, work, reduced.data());
+        ReduceCube(space, cubes, index, cofactors, work, reduced.data());
         if (IsSameCube(reduced.data(), cubes.At(index), space.NumWords()))
             continue;
         CopyCube(cubes.At(index), reduced.data(), space.NumWords());
+        cubeIndex.Update(index);
         cover.isPrime[index] = 0;
         if (!HasCommonOutput(space, reduced.data(), reduced.data()))
             isKept[index] = 0;
@@ -114,13 +106,16 @@ size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, con
 {
     const size_t numWords = space.NumWords();
     CubeList reduced(numWords);
+    CubeIndex cubeIndex(space, cover.cubes);
+    CubeIndex freeIndex(space, free);
+    Cofactors cofactors(space, cubeIndex, freeIndex, work);
     for (size_t index = 0; index < cover.cubes.Size(); ++index) {
         reduced.Resize(reduced.Size() + 1);
-        ReduceCube(space, cover.cubes, index, free, work, reduced.At(reduced.Size() - 1));
+        ReduceCube(space, cover.cubes, index, cofactors, work, reduced.At(reduced.Size() - 1));
         if (IsSameCube(reduced.At(reduced.Size() - 1), cover.cubes.At(index), numWords))
             reduced.Resize(reduced.Size() - 1); // a prime that nothing shrinks takes in no other
     }
-    const std::vector<uint8_t> isOpen(reduced.Size(), 1);
+    const OpenCubes others(space, reduced, true);
     std::vector<uint64_t> cube(numWords);
     CubeList added(numWords);
     for (size_t left = 0; left < reduced.Size(); ++left) {
@@ -129,7 +124,7 @@ size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, con
                 cube[word] = reduced.At(left)[word] | reduced.At(right)[word];
             if (!expander.IsImplicant(cube.data()))
                 continue;
-            expander.Expand(cube.data(), nullptr, reduced, isOpen);
+            expander.Expand(cube.data(), nullptr, others);
             added.Append(cube.data());
         }
     }
@@ -149,28 +144,27 @@ void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const 
     std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
         return CountCubeLiterals(space, cubes.At(left)) > CountCubeLiterals(space, cubes.At(right));
     });
+    CubeIndex cubeIndex(space, cubes);
+    CubeIndex freeIndex(space, free);
+    Cofactors cofactors(space, cubeIndex, freeIndex, work);
     for (const uint32_t index : order) {
-        CubeList meeting(space.NumWords());
-        work.Spend((cubes.Size() + free.Size()) * space.NumWords());
-        AppendMeeting(space, cubes, cubes.At(index), index, meeting);
-        AppendMeeting(space, free, cubes.At(index), free.Size(), meeting);
+        cofactors.Take(cubes.At(index), index);
         for (size_t output = 0; output < space.NumOutputs(); ++output) {
             const size_t bit = space.OutputBit(output);
             if (!GetBit(cubes.At(index), bit) || CountOutputs(space, cubes.At(index)) == 1)
                 continue;
-            CubeList cofactor(space.NumInputWords());
-            work.Spend(meeting.Size());
-            AppendOfOutput(space, meeting, output, cofactor);
-            if (IsTautology(space, cofactor, work))
+            if (IsTautology(space, cofactors.OfOutput(output), work))
                 ClearBit(cubes.At(index), bit);
         }
+        cubeIndex.Update(index);
     }
-    const std::vector<uint8_t> isOpen(cubes.Size(), 0);
+    const CubeList noCubes(space.NumWords());
+    const OpenCubes none(space, noCubes, false);
     std::vector<uint64_t> allowed(space.NumWords());
     for (size_t index = 0; index < cubes.Size(); ++index) {
         for (size_t word = 0; word < space.NumWords(); ++word)
             allowed[word] = space.Inputs(word);
-        expander.Expand(cubes.At(index), allowed.data(), cubes, isOpen);
+        expander.Expand(cubes.At(index), allowed.data(), none);
         cover.isPrime[index] = 0;
     }
 }

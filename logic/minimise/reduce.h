@@ -8,11 +8,6 @@
 
 namespace booleq {
 
-// The smallest cube that has what neither the other cubes of 'cubes' nor 'free' cover of cube
-// 'index'. All words 0 when nothing is left.
-void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, const CubeList& free,
-                Work& work, uint64_t* reduced);
-
 // Each cube in turn becomes as small as the others, as they are then, let it be. 'isBySize': the
 // largest first; otherwise the one that is largest and then those that are nearest to it.
 void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,

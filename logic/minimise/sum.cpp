@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <stdexcept>
 
+#include "cofactors.h"
 #include "reduce.h"
 #include "unate.h"
 
@@ -11,11 +12,11 @@ namespace booleq {
 
 namespace {
 
-// Without --exact an exact search is tried with a few times the work that the heuristic took, and a
+// Without --exact an exact search is tried with as much work as the heuristic took, and a
 // little; where that was much it would need far more, so there is a limit.
-constexpr uint64_t kTrialShare = 3;
-constexpr uint64_t kTrialUnits = 4u << 20;
-constexpr uint64_t kMaxTrialUnits = 10u << 20;
+constexpr uint64_t kTrialShare = 1;
+constexpr uint64_t kTrialUnits = 1u << 20;
+constexpr uint64_t kMaxTrialUnits = 3u << 20;
 
 void SetSeconds(double seconds, Work& work)
 {
@@ -24,21 +25,30 @@ void SetSeconds(double seconds, Work& work)
                                                   std::chrono::duration<double>(seconds)));
 }
 
+bool DoCoverAll(const CubeSpace& space, const CubeList& cubes, CubeIndex& first, CubeIndex& second,
+                Work& work)
+{
+    Cofactors cofactors(space, first, second, work);
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (!cofactors.Cover(cubes.At(index), SIZE_MAX))
+            return false;
+    return true;
+}
+
 bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
 {
     const CubeSpace& space = table.space;
-    for (size_t index = 0; index < table.on.Size(); ++index)
-        if (!IsCovered(space, table.on.At(index), sum, sum.Size(), table.free, work))
-            return false;
+    CubeIndex sumIndex(space, sum);
+    CubeIndex onIndex(space, table.on);
+    CubeIndex freeIndex(space, table.free);
+    if (!DoCoverAll(space, table.on, sumIndex, freeIndex, work))
+        return false;
     if (table.type == PlaType::Fr || table.type == PlaType::Fdr) {
         size_t left = 0;
         size_t right = 0;
         return !FindMeeting(space, sum, table.off, work, left, right);
     }
-    for (size_t index = 0; index < sum.Size(); ++index) // everything else is off
-        if (!IsCovered(space, sum.At(index), table.on, table.on.Size(), table.free, work))
-            return false;
-    return true;
+    return DoCoverAll(space, sum, onIndex, freeIndex, work); // everything else is off
 }
 
 // The inverted sum: 1 on every row that nothing is said of or that is off; 0 where on and not free.
@@ -46,30 +56,31 @@ bool IsInversionRight(const Pla& table, const CubeList& sum, Work& work)
 {
     const CubeSpace& space = table.space;
     const bool areZerosGiven = table.type == PlaType::Fr || table.type == PlaType::Fdr;
+    const CubeList none(space.NumWords());
+    CubeIndex sumIndex(space, sum);
+    CubeIndex freeIndex(space, table.free);
+    CubeIndex noIndex(space, none);
     if (areZerosGiven) {
-        for (size_t index = 0; index < table.off.Size(); ++index)
-            if (!IsCovered(space, table.off.At(index), sum, sum.Size(), CubeList(space.NumWords()),
-                           work))
-                return false;
+        if (!DoCoverAll(space, table.off, sumIndex, noIndex, work))
+            return false;
     } else {
         CubeList known = table.on;
         known.Append(table.free);
         std::vector<uint64_t> all(space.NumWords());
         for (size_t word = 0; word < all.size(); ++word)
             all[word] = space.All(word);
-        if (!IsCovered(space, all.data(), sum, sum.Size(), known, work))
+        if (!IsCovered(space, all.data(), sum, known, work))
             return false;
     }
-    const CubeList none(space.NumWords());
+    Cofactors ofFree(space, freeIndex, noIndex, work);
     std::vector<uint64_t> common(space.NumWords());
+    std::vector<uint32_t> found;
     for (size_t index = 0; index < table.on.Size(); ++index) {
-        work.Spend(sum.Size());
-        for (size_t term = 0; term < sum.Size(); ++term) {
-            if (IsDisjoint(space, table.on.At(index), sum.At(term)))
-                continue;
+        sumIndex.Find(table.on.At(index), 0, work, found);
+        for (const uint32_t term : found) {
             for (size_t word = 0; word < common.size(); ++word)
                 common[word] = table.on.At(index)[word] & sum.At(term)[word];
-            if (!IsCovered(space, common.data(), table.free, table.free.Size(), none, work))
+            if (!ofFree.Cover(common.data(), SIZE_MAX))
                 return false;
         }
     }
@@ -87,7 +98,7 @@ void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work&
     Cover primes(space.NumWords());
     primes.cubes = sum.cubes;
     primes.isPrime.assign(sum.cubes.Size(), 0);
-    ExpandCover(space, expander, nullptr, primes, work);
+    ExpandCover(space, expander, primes, work);
     std::vector<uint8_t> isEssential = FindEssential(space, primes.cubes, problem.free, work);
     primes.cubes.Keep(isEssential);
     ShedOutputs(problem, sum.cubes, work);

@@ -129,84 +129,10 @@ class TautologyCheck {
 
 } // namespace
 
-namespace {
-
-// The same for cubes of one word, which most are: nothing is looked up in the loop.
-void AppendMeetingOfWord(const CubeSpace& space, const CubeList& cubes, uint64_t by, size_t left,
-                         CubeList& target)
-{
-    const uint64_t low = space.InputLow(0);
-    const uint64_t inputs = space.Inputs(0);
-    const uint64_t outputs = space.Outputs(0);
-    const uint64_t* const words = cubes.At(0);
-    const size_t numCubes = cubes.Size();
-    for (size_t index = 0; index < numCubes; ++index) {
-        const uint64_t common = words[index] & by;
-        if ((low & ~(common | common >> 1)) != 0 || (common & outputs) == 0 || index == left)
-            continue;
-        const uint64_t cofactor = ((words[index] | ~by) & inputs) | (common & outputs);
-        target.Append(&cofactor);
-    }
-}
-
-} // namespace
-
-void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
-                   CubeList& target)
-{
-    if (space.NumWords() == 1) {
-        AppendMeetingOfWord(space, cubes, by[0], left, target);
-        return;
-    }
-    for (size_t index = 0; index < cubes.Size(); ++index) {
-        const uint64_t* cube = cubes.At(index);
-        if (index == left || IsDisjoint(space, cube, by))
-            continue;
-        target.Resize(target.Size() + 1);
-        uint64_t* cofactor = target.At(target.Size() - 1);
-        for (size_t word = 0; word < space.NumWords(); ++word)
-            cofactor[word] = ((cube[word] | ~by[word]) & space.Inputs(word)) |
-                             (cube[word] & by[word] & space.Outputs(word));
-    }
-}
-
-void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target)
-{
-    assert(target.NumWords() == space.NumInputWords());
-    const size_t bit = space.OutputBit(output);
-    for (size_t index = 0; index < cubes.Size(); ++index) {
-        if (!GetBit(cubes.At(index), bit))
-            continue;
-        target.Resize(target.Size() + 1);
-        for (size_t word = 0; word < space.NumInputWords(); ++word)
-            target.At(target.Size() - 1)[word] = cubes.At(index)[word] | ~space.Inputs(word);
-    }
-}
-
 bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work)
 {
     assert(cubes.NumWords() == space.NumInputWords());
     return TautologyCheck(space, cubes, work).Check({0, cubes.Size()});
-}
-
-bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
-               const CubeList& second, Work& work)
-{
-    CubeList meeting(space.NumWords());
-    work.Spend((first.Size() + second.Size()) * space.NumWords());
-    AppendMeeting(space, first, cube, left, meeting);
-    AppendMeeting(space, second, cube, second.Size(), meeting);
-    CubeList ofOutput(space.NumInputWords());
-    for (size_t output = 0; output < space.NumOutputs(); ++output) {
-        if (!GetBit(cube, space.OutputBit(output)))
-            continue;
-        ofOutput.Resize(0);
-        work.Spend(meeting.Size());
-        AppendOfOutput(space, meeting, output, ofOutput);
-        if (!IsTautology(space, ofOutput, work))
-            return false;
-    }
-    return true;
 }
 
 } // namespace booleq

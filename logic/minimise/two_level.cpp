@@ -25,7 +25,9 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
-constexpr uint64_t kMaxSpentForPool = 30u << 20; // where the loop took longer, more turns would too
+constexpr uint64_t kMaxSpentForMore = 14u << 20; // where the loop took longer, more of it would too
+constexpr size_t kMaxToCompare = 20000;
+constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start from
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
 
@@ -36,30 +38,27 @@ class SmallSumSearch {
           m_cover(m_space.NumWords()), m_best(m_space.NumWords()), m_pool(m_space.NumWords()),
           m_essential(m_space.NumWords())
     {
-        m_cover.cubes = problem.on;
     }
 
-    CubeList Run()
+    CubeList Run(const CubeList& on)
     {
         Work& work = m_work;
         const Work::Clock::time_point deadline = work.Deadline();
         work.SetDeadline(Work::Clock::time_point::max()); // there is to be an answer
-        UniteOutputs(m_space, m_cover.cubes);
-        RemoveContained(m_cover.cubes, m_work);
-        m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
-        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
-        MakeIrredundant(m_space, m_cover, m_free, m_work);
+        StartFrom(SplitOutputs(on));
         SetEssentialAside();
         m_best = m_cover;
         work.SetDeadline(deadline);
         try {
-            do
-                Improve();
-            while (GainByLastGasp());
-            ChooseFromPool();
+            Descend();
+            if (work.Spent() <= kMaxSpentForMore) {
+                DescendFromUnited(on);
+                ChooseFromPool();
+            }
         } catch (const OutOfWork&) {
-            m_cover = m_best; // what was under way is lost
+            // what was under way is lost
         }
+        m_cover = m_best;
         work.SetDeadline(Work::Clock::time_point::max());
         m_cover.cubes.Append(m_essential);
         m_cover.isPrime.resize(m_cover.cubes.Size(), 1);
@@ -85,11 +84,67 @@ class SmallSumSearch {
         m_cover.isPrime.assign(m_cover.cubes.Size(), 1);
     }
 
+    // A cube that several outputs share is a choice that the search might not make: it starts from
+    // a cube for each output, unless these are too many.
+    CubeList SplitOutputs(const CubeList& on) const
+    {
+        CubeList united = on;
+        UniteOutputs(m_space, united);
+        CubeList split(m_space.NumWords());
+        for (size_t index = 0; index < united.Size(); ++index) {
+            for (size_t output = 0; output < m_space.NumOutputs(); ++output) {
+                if (!GetBit(united.At(index), m_space.OutputBit(output)))
+                    continue;
+                if (split.Size() == kMaxSplit)
+                    return united;
+                split.Append(united.At(index));
+                uint64_t* cube = split.At(split.Size() - 1);
+                for (size_t word = 0; word < m_space.NumWords(); ++word)
+                    cube[word] &= m_space.Inputs(word);
+                SetBit(cube, m_space.OutputBit(output));
+            }
+        }
+        return split;
+    }
+
+    void StartFrom(CubeList cubes)
+    {
+        m_cover.cubes = std::move(cubes);
+        if (m_cover.cubes.Size() <= kMaxToCompare) // expansion takes contained cubes in as well
+            RemoveContained(m_space, m_cover.cubes, m_work);
+        m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
+        ExpandCover(m_space, m_expander, m_cover, m_work);
+        m_pool.Append(m_cover.cubes);
+        MakeIrredundant(m_space, m_cover, m_free, m_work);
+    }
+
+    // Turns and last gasps as long as they gain, from m_cover; m_best is the better of what it was
+    // and what that comes to.
+    void Descend()
+    {
+        do
+            Improve();
+        while (GainByLastGasp());
+    }
+
+    // The other start: products that outputs share as they are given.
+    void DescendFromUnited(const CubeList& on)
+    {
+        const Cover best = m_best;
+        CubeList united = on;
+        UniteOutputs(m_space, united);
+        StartFrom(std::move(united));
+        m_best = m_cover;
+        Descend();
+        if (!IsCheaper(CostOf(m_space, m_best.cubes), CostOf(m_space, best.cubes)))
+            m_best = best;
+        m_cover = m_best;
+    }
+
     void Improve()
     {
         bool isBySize = false;
         int numStale = 0;
-        m_best = m_cover;
         while (numStale < 2 && !m_cover.cubes.IsEmpty()) {
             Turn(isBySize);
             isBySize = !isBySize;
@@ -109,7 +164,7 @@ class SmallSumSearch {
     void Turn(bool isBySize)
     {
         ReduceCover(m_space, m_cover, m_free, isBySize, m_work);
-        ExpandCover(m_space, m_expander, nullptr, m_cover, m_work);
+        ExpandCover(m_space, m_expander, m_cover, m_work);
         m_pool.Append(m_cover.cubes);
         MakeIrredundant(m_space, m_cover, m_free, m_work);
     }
@@ -118,8 +173,6 @@ class SmallSumSearch {
     // most a share of what has been spent before.
     void ChooseFromPool()
     {
-        if (m_work.Spent() > kMaxSpentForPool)
-            return;
         const uint64_t limit = m_work.Limit();
         m_work.SetLimit(std::min(limit, m_work.Spent() + m_work.Spent() * kPoolShare));
         bool isBySize = true;
@@ -157,7 +210,7 @@ class SmallSumSearch {
         MakeIrredundant(m_space, gasp, m_free, m_work);
         const bool isGain = gasp.cubes.Size() < m_cover.cubes.Size();
         if (isGain)
-            m_cover = gasp;
+            m_best = m_cover = gasp;
         return isGain;
     }
 
@@ -176,7 +229,7 @@ class SmallSumSearch {
 
 CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work)
 {
-    return SmallSumSearch(problem, work).Run();
+    return SmallSumSearch(problem, work).Run(problem.on);
 }
 
 void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)

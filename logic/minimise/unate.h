@@ -10,16 +10,6 @@
 
 namespace booleq {
 
-// Appends to 'target' the cofactors with respect to 'by' of the cubes that meet it: their inputs as
-// far as 'by' leaves them open, all others admitted, and the outputs that both have. 'left' is left
-// out (cubes.Size() for none).
-void AppendMeeting(const CubeSpace& space, const CubeList& cubes, const uint64_t* by, size_t left,
-                   CubeList& target);
-
-// Appends the inputs of each cube that has the output to 'target', as the functions below want
-// them.
-void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
-
 // Whether the cubes cover all rows. 'cubes' is scratch space afterwards.
 bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);
 
@@ -32,10 +22,28 @@ CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work);
 // scratch space afterwards.
 void AddUncovered(const CubeSpace& space, CubeList& cubes, Work& work, uint64_t* found);
 
-// A row of an output of 'cube' that no cube of the list covers: all inputs fixed, one output.
-// Fails: false when there is none.
-bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
-                      Work& work, uint64_t* row);
+// Rows of outputs of a cube that no cube of a list covers, one after the other while the list
+// grows.
+class UncoveredRows {
+  public:
+    UncoveredRows(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes, Work& work);
+
+    // All inputs fixed, one output. The row is to be covered before the next one is asked for.
+    // Fails: false when there is none; 'row' is unspecified then.
+    bool Next(uint64_t* row);
+    // Adds a cube to the list.
+    void Cover(const uint64_t* cube);
+
+  private:
+    void ListOutput();
+
+    const CubeSpace& m_space;
+    Work& m_work;
+    std::vector<uint64_t> m_cube;
+    CubeList m_meeting;   // cofactors of the list
+    CubeList m_of_output; // those with the output
+    size_t m_output = 0;  // outputs before it are covered
+};
 
 // Cubes of the same inputs become one, with the outputs of all.
 void UniteOutputs(const CubeSpace& space, CubeList& cubes);
@@ -48,10 +56,6 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
 // Fails: false; 'result' is empty then.  Requires: 'result' is neither of the lists.
 bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     size_t maxCubes, Work& work, CubeList& result);
-
-// Whether the two lists together cover 'cube', without cube 'left' of the first.
-bool IsCovered(const CubeSpace& space, const uint64_t* cube, const CubeList& first, size_t left,
-               const CubeList& second, Work& work);
 
 } // namespace booleq
 

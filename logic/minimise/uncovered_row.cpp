@@ -1,4 +1,5 @@
 // One row that a cover leaves out.
+#include "cofactors.h"
 #include "unate.h"
 #include "unate_walk.h"
 
@@ -90,26 +91,53 @@ class RowSearch {
 
 } // namespace
 
-bool FindUncoveredRow(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
-                      Work& work, uint64_t* row)
+UncoveredRows::UncoveredRows(const CubeSpace& space, const uint64_t* cube, const CubeList& cubes,
+                             Work& work)
+    : m_space(space), m_work(work), m_cube(cube, cube + space.NumWords()),
+      m_meeting(space.NumWords()), m_of_output(space.NumInputWords())
 {
-    CubeList meeting(space.NumWords());
     work.Spend(cubes.Size() * space.NumWords());
-    AppendMeeting(space, cubes, cube, cubes.Size(), meeting);
-    for (size_t output = 0; output < space.NumOutputs(); ++output) {
-        if (!GetBit(cube, space.OutputBit(output)))
+    for (size_t index = 0; index < cubes.Size(); ++index)
+        if (!IsDisjoint(space, cubes.At(index), cube))
+            AppendCofactor(space, cubes.At(index), cube, m_meeting);
+    ListOutput();
+}
+
+void UncoveredRows::ListOutput()
+{
+    while (m_output < m_space.NumOutputs() && !GetBit(m_cube.data(), m_space.OutputBit(m_output)))
+        ++m_output;
+    m_of_output.Resize(0);
+    if (m_output < m_space.NumOutputs())
+        AppendOfOutput(m_space, m_meeting, m_output, m_of_output);
+}
+
+void UncoveredRows::Cover(const uint64_t* cube)
+{
+    if (IsDisjoint(m_space, cube, m_cube.data()))
+        return;
+    AppendCofactor(m_space, cube, m_cube.data(), m_meeting);
+    if (m_output == m_space.NumOutputs() || !GetBit(cube, m_space.OutputBit(m_output)))
+        return;
+    m_of_output.Append(m_meeting.At(m_meeting.Size() - 1)); // as far as its inputs go
+    uint64_t* const inputs = m_of_output.At(m_of_output.Size() - 1);
+    for (size_t word = 0; word < m_space.NumInputWords(); ++word)
+        inputs[word] |= ~m_space.Inputs(word);
+}
+
+bool UncoveredRows::Next(uint64_t* row)
+{
+    for (; m_output < m_space.NumOutputs(); ++m_output, ListOutput()) {
+        for (size_t word = 0; word < m_space.NumWords(); ++word)
+            row[word] = m_cube[word] & m_space.Inputs(word);
+        CubeList stack = m_of_output; // the search drops cubes of its own
+        if (!RowSearch(m_space, stack, m_work, row).Find({0, stack.Size()}))
             continue;
-        CubeList ofOutput(space.NumInputWords());
-        AppendOfOutput(space, meeting, output, ofOutput);
-        for (size_t word = 0; word < space.NumWords(); ++word)
-            row[word] = cube[word] & space.Inputs(word);
-        if (!RowSearch(space, ofOutput, work, row).Find({0, ofOutput.Size()}))
-            continue;
-        for (size_t input = 0; input < space.NumInputs(); ++input)
+        for (size_t input = 0; input < m_space.NumInputs(); ++input)
             if (GetBit(row, 2 * input) && GetBit(row, 2 * input + 1))
                 ClearBit(row, 2 * input + 1);
-        SetBit(row, space.OutputBit(output));
-        assert(Contains(cube, row, space.NumWords()));
+        SetBit(row, m_space.OutputBit(m_output));
+        assert(Contains(m_cube.data(), row, m_space.NumWords()));
         return true;
     }
     return false;

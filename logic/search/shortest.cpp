@@ -2,6 +2,7 @@
 
 #include <cassert>
 #include <mutex>
+#include <shared_mutex>
 #include <utility>
 
 #include "watch.h"
@@ -51,12 +52,28 @@ class ShortestTable {
         }
     }
 
+    bool Has(Column column) const { return m_origins[Normal(column)].op != Operator::Zero; }
     // Requires: not a constant.
-    Formula Find(Column column)
+    void Add(Column column)
     {
-        while (m_origins[Normal(column)].op == Operator::Zero)
+        while (!Has(column))
             AddWeight();
-        return Make(column);
+    }
+    // The depth is at most the number of literals.  Requires: it has it.
+    Formula Make(Column column) const
+    {
+        const Column normal = Normal(column);
+        const Origin& origin = m_origins[normal];
+        Formula formula;
+        if (origin.op == Operator::Input) {
+            uint32_t input = 0;
+            while (InputColumn(input) != normal)
+                ++input;
+            formula = MakeInput(input);
+        } else {
+            formula = Join(origin.op, Make(origin.left), Make(origin.right));
+        }
+        return column == normal ? formula : MakeNot(std::move(formula));
     }
 
   private:
@@ -115,23 +132,6 @@ class ShortestTable {
         origin = {op, left, right};
     }
 
-    // The depth is at most the number of literals.
-    Formula Make(Column column) const
-    {
-        const Column normal = Normal(column);
-        const Origin& origin = m_origins[normal];
-        Formula formula;
-        if (origin.op == Operator::Input) {
-            uint32_t input = 0;
-            while (InputColumn(input) != normal)
-                ++input;
-            formula = MakeInput(input);
-        } else {
-            formula = Join(origin.op, Make(origin.left), Make(origin.right));
-        }
-        return column == normal ? formula : MakeNot(formula);
-    }
-
     std::vector<Origin> m_origins;
     std::vector<std::vector<Column>> m_by_weight;
 };
@@ -162,11 +162,19 @@ Formula FindShortest(const Rows& function)
     for (unsigned int place = 0; place < kMaxShortestInputs; ++place)
         order.push_back((place + numIdle) % kMaxShortestInputs);
     const auto column = static_cast<Column>(PermuteInputs(std::move(rows), order).Words()[0]);
-    static std::mutex mutex;    // guards the table
-    static ShortestTable table; // it grows as far as it was asked for
-    std::unique_lock<std::mutex> lock(mutex);
-    Formula formula = table.Find(column);
-    lock.unlock();
+    static std::shared_mutex mutex; // guards the table
+    static ShortestTable table;     // it grows as far as it was asked for
+    std::shared_lock<std::shared_mutex> reading(mutex);
+    if (!table.Has(column)) {
+        reading.unlock();
+        {
+            const std::unique_lock<std::shared_mutex> growing(mutex);
+            table.Add(column);
+        }
+        reading.lock();
+    }
+    Formula formula = table.Make(column);
+    reading.unlock();
     Renumber(formula, support);
     return formula;
 }

@@ -160,9 +160,12 @@ booleq::Rows RowsOf(const Equation& equation)
     return rows;
 }
 
-booleq::Function FunctionOf(const Equation& equation)
+kq_logic::Function FunctionOf(const Equation& equation)
 {
-    return {equation.InputBytes(), RowsOf(equation)};
+    kq_logic::Function function;
+    if (!function.Set(equation.Get()))
+        throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
+    return function;
 }
 
 unsigned int RequireBit(const py::handle& value, const py::handle& name)

@@ -11,6 +11,7 @@
 #include <pybind11/pybind11.h>
 
 #include <Kq_BoolEquation.h>
+#include <kq_logic/function.h>
 
 #include "function.h"
 #include "listed_inputs.h"
@@ -82,7 +83,7 @@ std::unique_ptr<Equation> MakeEquation(const Arguments&... arguments)
 
 // Fails: ValueError for more than 30 inputs; what a signal's handler raises.
 booleq::Rows RowsOf(const Equation& equation);
-booleq::Function FunctionOf(const Equation& equation);
+kq_logic::Function FunctionOf(const Equation& equation);
 
 // 'value' as 0 or 1.  Fails: TypeError, ValueError.
 unsigned int RequireBit(const py::handle& value, const py::handle& name);

@@ -2,13 +2,13 @@
 #include <string>
 #include <vector>
 
+#include <kq_logic/decide.h>
 #include <kq_logic/explain.h>
+#include <kq_logic/permute.h>
 #include <kq_logic/short_form.h>
 
 #include "bind.h"
-#include "equality.h"
 #include "errors.h"
-#include "function_access.h"
 #include "lint.h"
 #include "permute.h"
 #include "text.h"
@@ -77,18 +77,19 @@ py::object Equivalent(const Equation& equation, const py::object& otherObject)
         throw py::type_error("other must be an Equation, not " +
                              std::string(Py_TYPE(otherObject.ptr())->tp_name));
     const auto& other = otherObject.cast<const Equation&>();
-    const booleq::Decision decision = booleq::DecideEquations(equation.Get(), other.Get(), {});
-    if (decision.verdict == booleq::Verdict::Undecided)
-        throw py::value_error(booleq::UndecidedText(decision, {}));
+    const kq_logic::Decision decision = kq_logic::DecideEqual(equation.Get(), other.Get());
+    if (decision.verdict == kq_logic::Verdict::Undecided)
+        throw py::value_error("not decided: " + decision.reason);
+    const bool isEqual = decision.verdict == kq_logic::Verdict::Equal;
     py::object counterexample = py::none();
     py::object values = py::none();
-    if (decision.IsDifferent()) {
+    if (!isEqual) {
         counterexample = py::dict();
         for (size_t input = 0; input < decision.inputs.size(); ++input)
             counterexample[Decode(decision.inputs[input])] = decision.assignment[input] ? 1 : 0;
         values = py::make_tuple(decision.left ? 1 : 0, decision.right ? 1 : 0);
     }
-    return ResultClass("Equivalence")(decision.IsEqual(), counterexample, values);
+    return ResultClass("Equivalence")(isEqual, counterexample, values);
 }
 
 std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& inputs)
@@ -101,7 +102,10 @@ std::unique_ptr<Equation> Permute(const Equation& equation, const py::object& in
     const std::string forgotten = booleq::FirstUnlisted(equation.InputBytes(), order);
     if (!forgotten.empty())
         throw py::value_error("inputs does not list " + booleq::Excerpt(forgotten));
-    const booleq::Function function = FunctionOf(equation).Over(order);
+    kq_logic::Function function;
+    const std::string fault = kq_logic::Permute(FunctionOf(equation), order, function);
+    if (!fault.empty())
+        throw py::value_error(fault);
     // A constant has no init value; over one input only the binary form reads back.
     if (order.empty())
         return MakeEquation(py::str(function.At(0) ? "1" : "0"), names, py::bool_(false));
@@ -119,12 +123,11 @@ py::object OrNone(const std::string& text)
 
 py::object Explain(const Equation& equation)
 {
-    const booleq::Function function = FunctionOf(equation);
-    const kq_logic::Function asked = kq_logic::FunctionAccess::Make(function);
-    const kq_logic::Explanation explanation = kq_logic::Explain(asked);
+    const kq_logic::Function function = FunctionOf(equation);
+    const kq_logic::Explanation explanation = kq_logic::Explain(function);
     if (!explanation.fault.empty())
         throw py::value_error(explanation.fault);
-    const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(asked);
+    const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(function);
     const py::object operands =
         shortForm.fault.empty() ? py::object(py::int_(shortForm.numOperands)) : py::none();
     return ResultClass("Explanation")(
@@ -232,7 +235,8 @@ void BindReports(EquationClass& type)
 
 Whether both are one function of their inputs, by name; if not, the first row that differs.
 
-ValueError for more than 30 inputs together.
+With more than 30 inputs together it is one of them. ValueError where a module built without a
+solver cannot tell.
 
 >>> from booleq import Equation
 >>> Equation("a | b & c").equivalent(Equation("a | (b & c)"))

@@ -86,7 +86,7 @@ py::object FromInit(const py::object& type, const py::object& value, const py::o
     return made;
 }
 
-booleq::Function FunctionWithRows(const Equation& equation)
+kq_logic::Function FunctionWithRows(const Equation& equation)
 {
     if (equation.NumInputs() == 0)
         throw py::value_error("an equation without inputs has no init value");

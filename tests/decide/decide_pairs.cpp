@@ -1,6 +1,6 @@
 // Decides random pairs and writes them for other programs: decide_pairs DIRECTORY FIRST LAST.
 // For each pair a line "NUMBER VERDICT PROOF REWRITTEN MICROSECONDS", and in the directory
-// NUMBER.cnf and NUMBERa.blif, NUMBERb.blif.
+// NUMBER.cnf, NUMBERa.blif, NUMBERb.blif, and the texts NUMBERa.txt, NUMBERb.txt.
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
@@ -10,6 +10,7 @@
 #include "cnf.h"
 #include "decision.h"
 #include "network.h"
+#include "notation_writer.h"
 #include "pairs.h"
 
 namespace {
@@ -24,6 +25,11 @@ void Write(const std::string& path, const std::string& text)
         std::fprintf(stderr, "decide_pairs: cannot write %s\n", path.c_str());
         std::exit(2);
     }
+}
+
+std::string OwnText(const booleq::Expression& expression)
+{
+    return WriteOwn(expression, booleq::OwnSyntax::First, booleq::Parentheses::Clear);
 }
 
 const char* WordOf(booleq::Verdict verdict)
@@ -76,6 +82,8 @@ int main(int argc, char** argv)
         const booleq::UnitNames names = {pair.left.names, "y", "pair"};
         Write(path + "a.blif", WriteBlif(pair.left, names));
         Write(path + "b.blif", WriteBlif(pair.right, names));
+        Write(path + "a.txt", OwnText(pair.left));
+        Write(path + "b.txt", OwnText(pair.right));
         std::printf("%llu %s %s %s %lld\n", static_cast<unsigned long long>(number),
                     WordOf(decision.verdict), WordOf(decision.proof),
                     pair.isRewritten ? "rewritten" : "changed",

@@ -1,4 +1,5 @@
 // The second library through its public headers alone: values, limits and refusals.
+#include <chrono>
 #include <random>
 
 #include <gtest/gtest.h>
@@ -138,6 +139,36 @@ TEST(LogicDecide, FindsADifferenceThatIsOne)
     EXPECT_EQ(DecideConstant(Kq_BoolEquation("a & ~a"), false).verdict, Verdict::Equal);
     EXPECT_EQ(DecideConstant(left, true).verdict, Verdict::Different);
     EXPECT_EQ(DecideEqual(left, Kq_BoolEquation()).verdict, Verdict::Undecided);
+    EXPECT_FALSE(DecideEqual(left, Kq_BoolEquation()).isTimeOver);
+}
+
+// An init value of 20 inputs is an expression of a million terms, and a column of 128 KB.
+TEST(LogicDecide, InitValuesByTheirColumns)
+{
+    std::vector<Port::StringBase<char>> names;
+    std::string conjunction;
+    for (size_t input = 0; input < 20; ++input) {
+        names.push_back(("i" + std::to_string(input)).c_str());
+        conjunction += (input == 0 ? "i" : " & i") + std::to_string(input);
+    }
+    std::string digits = "0x" + std::string(size_t(1) << 18, '0');
+    digits[2] = '8';
+    Kq_BoolEquation value;
+    ASSERT_TRUE(value.SetEquationWithExplicitTerms(names, digits.c_str(), false, false));
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(DecideEqual(value, Kq_BoolEquation(conjunction.c_str())).verdict, Verdict::Equal);
+    EXPECT_EQ(DecideConstant(value, true).verdict, Verdict::Different);
+    EXPECT_TRUE(DecideConstant(value, false).assignment == std::vector<bool>(20, true));
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(5));
+}
+
+TEST(LogicFunction, TellsWhichInputsMatter)
+{
+    Function function;
+    ASSERT_TRUE(function.Set(Kq_BoolEquation("a & (b | ~b) ^ c")));
+    EXPECT_TRUE(function.DependsOn(0));
+    EXPECT_FALSE(function.DependsOn(1));
+    EXPECT_TRUE(function.DependsOn(2));
 }
 
 std::string Blif(const std::string& cover)

@@ -151,6 +151,58 @@ TEST(Canonical, IsTheLeastOfAllTransformationsOfFiveAndSixInputs)
     }
 }
 
+// Functions whose inputs hardly anything tells apart: linear, bent, symmetric ones, and sparse ones
+// with many upper blocks of zeros.
+TEST(Canonical, IsTheLeastWhereInputsAreAlike)
+{
+    const uint64_t tables[] = {0,
+                               UINT64_MAX,
+                               0x6996966996696996,
+                               0x8777788878887888,
+                               0xfee8e880e8808000,
+                               0x8000000000000001,
+                               0x40d0850204000020,
+                               0x0000080000012100,
+                               0xffff0000ffff0000};
+    std::mt19937_64 random(14);
+    for (const uint64_t table : tables) {
+        const CanonicalLut found = FindCanonical(table, 6, CanonicalScope::OrderAndInversions);
+        ASSERT_EQ(found.form, LeastByTrying(table, 6, CanonicalScope::OrderAndInversions));
+        for (int repeat = 0; repeat < 200; ++repeat) {
+            const uint64_t other = Transform(
+                RandomTransformation(6, CanonicalScope::OrderAndInversions, random), table, 6);
+            ASSERT_EQ(FindCanonical(other, 6, CanonicalScope::OrderAndInversions).form, found.form);
+        }
+    }
+}
+
+// Every word and width gives what single tables give, whoever shares the work.
+TEST(Canonical, OfAnArrayIsThatOfEachTable)
+{
+    std::mt19937_64 random(15);
+    for (const CanonicalScope scope : kScopes) {
+        for (unsigned int numInputs = 0; numInputs <= kMaxCanonicalInputs; ++numInputs) {
+            std::vector<uint64_t> words(3000);
+            for (uint64_t& word : words)
+                word = random() & RowMask(numInputs);
+            const LutArray luts = LutsOf(words, numInputs);
+            std::vector<uint64_t> forms(words.size());
+            std::vector<LutTransformation> transformations(words.size());
+            FindCanonicals(luts, scope, forms.data(), transformations.data(), LutWork{3});
+            for (size_t place = 0; place < words.size(); ++place) {
+                ASSERT_EQ(Transform(transformations[place], words[place], numInputs), forms[place]);
+                ASSERT_EQ(FindCanonical(words[place], numInputs, scope).form, forms[place]);
+            }
+            if (numInputs > 4)
+                continue;
+            std::vector<uint16_t> narrow(words.begin(), words.end());
+            FindCanonicals({narrow.data(), narrow.size(), numInputs, 2}, scope, narrow.data(),
+                           nullptr);
+            ASSERT_TRUE(std::equal(narrow.begin(), narrow.end(), forms.begin()));
+        }
+    }
+}
+
 TEST(Canonical, IsOneForAllTransformationsOfAFunction)
 {
     std::mt19937_64 random(13);

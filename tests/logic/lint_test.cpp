@@ -7,6 +7,7 @@
 #include "foreign_tree.h"
 #include "lint.h"
 #include "notation_writer.h"
+#include "solver.h"
 
 namespace {
 
@@ -138,7 +139,11 @@ TEST(Lint, ComputesWithNumbersOfAnyNumberOfInputs)
         sum += " + v" + std::to_string(input);
     const LintReport report = Linted(sum);
     EXPECT_TRUE(ReadingOf(report, "Verilog").decision.IsDifferent());
-    EXPECT_TRUE(ReadingOf(report, "C").decision.IsEqual());
+    const Decision& inC = ReadingOf(report, "C").decision;
+    if (Solver::IsThere())
+        EXPECT_TRUE(inC.IsEqual());
+    else
+        EXPECT_EQ(inC.verdict, Verdict::Undecided);
     EXPECT_TRUE(ReadingOf(report, "Liberty").decision.IsEqual());
 }
 

@@ -53,6 +53,27 @@ inline booleq::Function RandomFunction(const std::vector<std::string>& inputs,
     return {inputs, rows};
 }
 
+// One pigeon more than holes, each in a hole and no two in one: never 1, and hard for every search
+// that resolves clauses (Haken, "The intractability of resolution", 1985).
+inline std::string Pigeons(int numHoles)
+{
+    const auto sits = [](int pigeon, int hole) {
+        return "p" + std::to_string(pigeon) + "_" + std::to_string(hole);
+    };
+    std::string text;
+    for (int pigeon = 0; pigeon <= numHoles; ++pigeon) {
+        text += pigeon == 0 ? "(" : " & (";
+        for (int hole = 0; hole < numHoles; ++hole)
+            text += (hole == 0 ? "" : " | ") + sits(pigeon, hole);
+        text += ")";
+    }
+    for (int hole = 0; hole < numHoles; ++hole)
+        for (int pigeon = 0; pigeon <= numHoles; ++pigeon)
+            for (int other = 0; other < pigeon; ++other)
+                text += " & (" + sits(pigeon, hole) + " ~& " + sits(other, hole) + ")";
+    return text;
+}
+
 } // namespace logic_support
 
 #endif

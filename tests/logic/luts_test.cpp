@@ -1,17 +1,15 @@
 // Arrays of look-up tables: every kernel, for every word, against the same written row by row.
 #include <algorithm>
+#include <bitset>
 #include <cstring>
 #include <map>
 #include <numeric>
 #include <random>
-#include <thread>
 
 #include <gtest/gtest.h>
 
 #include "distinct_luts.h"
 #include "lut_kernels.h"
-#include "parallel.h"
-#include "watch.h"
 
 namespace {
 
@@ -318,49 +316,40 @@ TEST(Luts, DistinctOnesAreSortedAndCounted)
     });
 }
 
-TEST(Parallel, EveryElementIsDoneOnce)
+// Arrays of several parts, which threads share: each result stands in its own place.
+TEST(Luts, ManyAreDoneByThreadsAsByOne)
 {
-    for (const unsigned int numThreads : {0u, 1u, 2u, 5u}) {
-        for (const size_t count : {size_t(0), size_t(1), size_t(99), size_t(100), size_t(1001)}) {
-            std::vector<int> times(count);
-            RunInParts(count, 100, LutWork{numThreads}, [&](size_t begin, size_t end) {
-                ASSERT_LE(end - begin, 100u);
-                for (size_t place = begin; place < end; ++place)
-                    ++times[place];
-            });
-            ASSERT_EQ(std::count(times.begin(), times.end(), 1),
-                      static_cast<std::ptrdiff_t>(count));
+    constexpr unsigned int kNumInputs = 6;
+    constexpr uint8_t kOrder[kNumInputs] = {5, 0, 4, 1, 3, 2};
+    std::mt19937_64 random(4);
+    std::vector<uint64_t> words(300001);
+    std::generate(words.begin(), words.end(), random);
+    const LutArray luts = LutsOf(words, kNumInputs);
+    for (const unsigned int numThreads : {1u, 4u}) {
+        const LutWork work = {numThreads};
+        std::vector<uint64_t> permuted(words.size());
+        std::vector<uint8_t> counts(words.size());
+        std::vector<uint8_t> differences(words.size());
+        PermuteLuts(luts, kOrder, permuted.data(), work);
+        CountLutOnes(luts, counts.data(), work);
+        CompareLuts(luts, LutsOf(permuted, kNumInputs), differences.data(), work);
+        for (size_t place = 0; place < words.size(); ++place) {
+            const uint64_t word = words[place];
+            ASSERT_EQ(counts[place], std::bitset<64>(word).count());
+            ASSERT_EQ(std::bitset<64>(permuted[place]).count(), counts[place]);
+            ASSERT_EQ(differences[place] == kSameLut, word == permuted[place]);
+            const auto row = static_cast<unsigned int>(place % 64);
+            unsigned int source = 0;
+            for (unsigned int input = 0; input < kNumInputs; ++input)
+                source =
+                    WithInput(source, kOrder[input], InputAt(row, input, kNumInputs), kNumInputs);
+            ASSERT_EQ(permuted[place] >> row & 1u, word >> source & 1u);
         }
     }
-}
-
-TEST(Parallel, WhatOneThrowsEndsAll)
-{
-    EXPECT_THROW(RunInParts(100000, 1, LutWork{3},
-                            [&](size_t begin, size_t) {
-                                if (begin == 5000)
-                                    throw std::bad_alloc();
-                            }),
-                 std::bad_alloc);
-}
-
-TEST(Parallel, TheWatcherEndsItAndIsCalledByTheCallerAlone)
-{
-    static std::thread::id caller;
-    static int numCalls;
-    caller = std::this_thread::get_id();
-    numCalls = 0;
-    SetWatch([] {
-        EXPECT_EQ(std::this_thread::get_id(), caller);
-        if (++numCalls == 10)
-            throw 10;
-    });
-    const auto run = [](size_t, size_t) {
-        Watch(); // in whatever thread
-        std::this_thread::sleep_for(std::chrono::microseconds(100));
-    };
-    EXPECT_THROW(RunInParts(1000000000, 1, LutWork{3}, run), int);
-    SetWatch(nullptr);
+    const uint64_t first = 150000;
+    std::vector<uint64_t> narrow(words.size(), 1);
+    narrow[first] = narrow[299999] = uint64_t(1) << 40;
+    EXPECT_EQ(FirstUncleanLut(LutsOf(narrow, 5), LutWork{4}), first);
 }
 
 } // namespace

@@ -87,7 +87,7 @@ TEST(MinimiseWithoutOff, GrowsByTautologyToPrimesToo)
         cover.isPrime.assign(cover.cubes.Size(), 0);
         Expander byTautology(without, work);
         Expander byOffSet(problem, work);
-        ExpandCover(table.space, byTautology, nullptr, cover, work);
+        ExpandCover(table.space, byTautology, cover, work);
         for (size_t index = 0; index < cover.cubes.Size(); ++index) {
             const uint64_t* cube = cover.cubes.At(index);
             ASSERT_TRUE(byOffSet.IsImplicant(cube)) << text;

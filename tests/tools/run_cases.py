@@ -4,8 +4,8 @@
 # of a line tells what the line is:
 #   = name of a case   $ command for sh -c   | output   ! error output   ? exit status (none: 0)
 # An empty line or one that starts with # says nothing. --update writes the answers found. --differing
-# names a file of cases that another system answers otherwise, "GROUP: CASE -- reason"; one of them
-# that passes is a failure, so that the list stays true.
+# names a file of cases that another system or build answers otherwise, "GROUP: CASE -- reason"; one
+# of them that passes is a failure, so that the list stays true. It may be given more than once.
 import argparse
 import difflib
 import os
@@ -124,7 +124,7 @@ def main():
     parser.add_argument("--tool", required=True)
     parser.add_argument("--version", required=True)
     parser.add_argument("--update", action="store_true")
-    parser.add_argument("--differing")
+    parser.add_argument("--differing", action="append", default=[])
     parser.add_argument("files", nargs="+")
     arguments = parser.parse_args()
     tool = os.path.abspath(arguments.tool)
@@ -137,7 +137,7 @@ def main():
             update(path, head, cases, tool, arguments.version)
         else:
             group = os.path.splitext(os.path.basename(path))[0]
-            differing = read_differing(arguments.differing, group) if arguments.differing else set()
+            differing = set().union(*(read_differing(name, group) for name in arguments.differing))
             failures += check(cases, tool, arguments.version, differing)
     print(f"{count} cases, {failures} failed")
     return 1 if failures or not count else 0

@@ -10,7 +10,7 @@ import sys
 NAMES = ["A", "B", "C", "a", "b", "'a'", "'a b'", "'a'+b", "'x,y'", "n1", "'a'&'b'", "'a'b", "'q'~"]
 OPERATORS = ["&", "|", "^", "~&", "~|", "!^", "+", "*", "@", ".AND.", ".NOR."]
 COMMANDS = ["check", "show", "init", "table", "explain", "match", "equal", "convert", "lint", "kmap",
-            "tree"]
+            "tree", "sat"]
 
 
 def random_text(rng):
@@ -82,6 +82,24 @@ def reported(command, result):
     return result["inputs"], result.get("hex")
 
 
+def column_of(known):
+    return int(known[0], 16) if known[0] != "-" else None
+
+
+# The rows that any cube has, as an init value; None without inputs.
+def ones_of(cubes, num_inputs):
+    if num_inputs == 0:
+        return None
+    value = 0
+    for cube in cubes:
+        digits = cube.split(" ")[0]
+        for row in range(1 << num_inputs):
+            if all(digit in ("-", bit)
+                   for digit, bit in zip(digits, f"{row:0{num_inputs}b}")):
+                value |= 1 << row
+    return value
+
+
 class Comparison:
     def __init__(self):
         self.differences = []
@@ -116,6 +134,11 @@ def compare_commands(tool, group, comparison):
             if command == "tree":
                 continue
             names, column = reported(command, answer["result"])
+            if command == "sat": # the first row that is 1, found by rows and not by columns
+                value = column_of(known)
+                if value is not None:
+                    comparison.expect((value & -value).bit_length() - 1 if value else None,
+                                      answer["result"]["row"], *where)
             if command == "equal":
                 comparison.expect(True, set(group.names(index)) <= set(names), *where)
                 continue
@@ -134,6 +157,20 @@ def compare_values(tool, group, comparison):
         answer = run([tool, "eval", *group.options(), "--", group.texts[index], *values], [])
         comparison.expect([str(int(known[0], 16) >> row & 1)], answer, "eval", group.options(),
                           group.texts[index], values)
+
+
+# The lines of a file are outputs of one table for 'minimize', so it gets one text at a time.
+def compare_minimize(tool, group, comparison):
+    for index, known in enumerate(group.known):
+        where = ("minimize", group.options(), group.texts[index])
+        answer = json.loads(run([tool, "minimize", "--json", *group.options(), "--",
+                                 group.texts[index]], [])[0])
+        if known is None:
+            comparison.expect("refused", answer["status"], *where)
+            continue
+        names = group.names(index)
+        comparison.expect(names, answer["result"]["inputs"], *where)
+        comparison.expect(column_of(known), ones_of(answer["result"]["cubes"], len(names)), *where)
 
 
 def compare_batch(tool, group, comparison):
@@ -189,6 +226,11 @@ def compare_members(group, comparison):
         comparison.expect(names, list(equation), "iter", *where)
         comparison.expect(len(names), len(equation), "len", *where)
         comparison.expect(names, list(equation.explain().inputs), "explain", *where)
+        comparison.expect(tuple(names), equation.minimize().inputs, "minimize", *where)
+        if not any("'" in name.rstrip("'")[1:] for name in names): # an init value over such is none
+            turned = equation.permute(reversed(names))
+            comparison.expect(tuple(reversed(names)), turned.inputs, "permute", *where)
+            comparison.expect(True, bool(equation.equivalent(turned)), "equivalent", *where)
         comparison.expect(names, list(equation.lint().inputs), "lint", *where)
         comparison.expect((1 << len(names), len(names) + 1), equation.truth_table().shape,
                           "truth_table", *where)
@@ -228,6 +270,7 @@ def main():
             compare_values(options.tool, group, comparison)
             compare_batch(options.tool, group, comparison)
             compare_permute(options.tool, group, comparison)
+            compare_minimize(options.tool, group, comparison)
     for difference in comparison.differences[:20]:
         print(difference)
     print(f"{num_accepted} accepted texts, {comparison.num_compared} comparisons, "

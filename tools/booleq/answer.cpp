@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "function.h"
 #include "lines.h"
 #include "progress.h"
 #include "refusal.h"
@@ -98,12 +99,13 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
     return false;
 }
 
-bool SetFunction(const Text& text, const Request& request, Output& output, Function& function)
+bool SetFunction(const Text& text, const Request& request, Output& output,
+                 kq_logic::Function& function)
 {
     Kq_BoolEquation equation;
     if (!SetEquation(text, request, output, equation))
         return false;
-    if (FunctionOf(equation, function))
+    if (function.Set(equation))
         return true;
     Refuse(text, request, output, NoFunctionReason(equation.GetNumVariables()));
     return false;

@@ -10,9 +10,9 @@
 #include <nlohmann/json.hpp>
 
 #include <Kq_BoolEquation.h>
+#include <kq_logic/function.h>
 
 #include "command.h"
-#include "function.h"
 #include "output.h"
 #include "refusal.h"
 #include "status.h"
@@ -39,7 +39,8 @@ bool SetEquation(const Text& text, const Request& request, Output& output,
                  Kq_BoolEquation& equation);
 // The same, and the function over the equation's inputs in their order.
 // Fails: false as above, also for more than kMaxFunctionInputs inputs.
-bool SetFunction(const Text& text, const Request& request, Output& output, Function& function);
+bool SetFunction(const Text& text, const Request& request, Output& output,
+                 kq_logic::Function& function);
 
 // Fails: UsageError, when both --json and 'option', which asks for another format, are given.
 void RefuseTwoFormats(const Request& request, const std::string& option);

@@ -80,24 +80,49 @@ unsigned int ParseJobs(const Request& request)
     return static_cast<unsigned int>(std::stoul(text));
 }
 
+// What became of some lines, in their order.
 struct Answered {
-    std::string text; // with its line end
-    size_t line;
-    BatchOutcome outcome;
-    std::string message;
+    struct Complaint {
+        size_t end; // of the line's text
+        std::string message;
+    };
+    std::string text;
+    std::vector<Complaint> complaints;
+    uint64_t counts[5] = {}; // by outcome
 };
 
-Answered AnswerLine(const Line& line, const Request& request, TableFormat& format)
-{
-    BatchRow row;
-    BatchResult result = format.ReadRow(line.text, row);
-    if (result.outcome == BatchOutcome::kOk)
-        result = CompleteRow(row);
-    if (request.json)
-        return {Envelope(line, request, row, result), line.number, result.outcome, std::string()};
-    return {format.WriteRow(line.text, row, result) + "\n", line.number, result.outcome,
-            std::move(result.message)};
-}
+// One line after the other. It remembers what lines have in common.
+class Answering {
+  public:
+    Answering(const Request& request, const TableFormat& header)
+        : m_request(request), m_format(header.Clone())
+    {
+    }
+
+    void Answer(const Line& line, Answered& answered)
+    {
+        BatchRow row;
+        BatchResult result = m_format->ReadRow(line.text, row);
+        if (result.outcome == BatchOutcome::kOk)
+            result = m_completer.Complete(row);
+        ++answered.counts[static_cast<size_t>(result.outcome)];
+        if (m_request.json) {
+            answered.text += Envelope(line, m_request, row, result);
+            return;
+        }
+        answered.text += m_format->WriteRow(line.text, row, result);
+        answered.text += '\n';
+        if (!result.message.empty())
+            answered.complaints.push_back(
+                {answered.text.size(), "line " + std::to_string(line.number) + ": " +
+                                           OutcomeName(result.outcome) + ": " + result.message});
+    }
+
+  private:
+    const Request& m_request;
+    std::unique_ptr<TableFormat> m_format;
+    RowCompleter m_completer;
+};
 
 // The lines of a table, read one after the other; empty ones and the header are no rows.
 class TableReader {
@@ -147,14 +172,21 @@ class Answers {
   public:
     Answers(const Request& request, Output& output) : m_request(request), m_output(output) {}
 
+    // A complaint comes right after its line.
     void Put(const Answered& answered)
     {
-        ++m_counts[static_cast<size_t>(answered.outcome)];
-        m_status = std::max(m_status, StatusOf(answered.outcome));
-        m_output.Put(answered.text);
-        if (!answered.message.empty())
-            Complain(m_output, "line " + std::to_string(answered.line) + ": " +
-                                   OutcomeName(answered.outcome) + ": " + answered.message);
+        for (size_t outcome = 0; outcome < 5; ++outcome) {
+            m_counts[outcome] += answered.counts[outcome];
+            if (answered.counts[outcome] > 0)
+                m_status = std::max(m_status, StatusOf(static_cast<BatchOutcome>(outcome)));
+        }
+        size_t start = 0;
+        for (const Answered::Complaint& complaint : answered.complaints) {
+            m_output.Put(answered.text.data() + start, complaint.end - start);
+            start = complaint.end;
+            Complain(m_output, complaint.message);
+        }
+        m_output.Put(answered.text.data() + start, answered.text.size() - start);
         if (m_request.Has("--line-buffered"))
             m_output.Flush();
     }
@@ -177,23 +209,24 @@ class Answers {
 void RunAlone(const Request& request, TableReader& reader, Answers& answers)
 {
     Line line;
-    std::unique_ptr<TableFormat> format;
+    std::unique_ptr<Answering> answering;
     while (reader.Next(line)) {
-        if (!format)
-            format = reader.Format().Clone();
-        answers.Put(AnswerLine(line, request, *format));
+        if (!answering)
+            answering = std::make_unique<Answering>(request, reader.Format());
+        Answered answered;
+        answering->Answer(line, answered);
+        answers.Put(answered);
     }
 }
 
 // Some lines at a time for a thread; what they become keeps their order.
-std::vector<Answered> AnswerLines(const std::vector<Line>& lines, const Request& request,
-                                  const TableFormat& header)
+Answered AnswerLines(const std::vector<Line>& lines, const Request& request,
+                     const TableFormat& header)
 {
-    const std::unique_ptr<TableFormat> format = header.Clone();
-    std::vector<Answered> answered;
-    answered.reserve(lines.size());
+    Answering answering(request, header);
+    Answered answered;
     for (const Line& line : lines)
-        answered.push_back(AnswerLine(line, request, *format));
+        answering.Answer(line, answered);
     return answered;
 }
 
@@ -202,11 +235,7 @@ void RunTogether(const Request& request, unsigned int numJobs, TableReader& read
                  Answers& answers)
 {
     constexpr size_t kLinesTogether = 512;
-    WorkQueue<std::vector<Answered>> queue(numJobs, 4 * size_t(numJobs));
-    const auto put = [&](const std::vector<Answered>& group) {
-        for (const Answered& answered : group)
-            answers.Put(answered);
-    };
+    WorkQueue<Answered> queue(numJobs, 4 * size_t(numJobs));
     for (bool isMore = true; isMore;) {
         auto lines = std::make_shared<std::vector<Line>>();
         Line line;
@@ -215,12 +244,12 @@ void RunTogether(const Request& request, unsigned int numJobs, TableReader& read
         if (lines->empty())
             break;
         if (queue.IsFull())
-            put(queue.Take());
+            answers.Put(queue.Take());
         const TableFormat& header = reader.Format();
         queue.Add([lines, &request, &header] { return AnswerLines(*lines, request, header); });
     }
     while (!queue.IsEmpty())
-        put(queue.Take());
+        answers.Put(queue.Take());
 }
 
 int RunBatch(const Request& request, Output& output)

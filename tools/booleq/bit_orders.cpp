@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cassert>
 
+#include <kq_logic/permute.h>
+
 #include "text.h"
 
 namespace booleq {
@@ -10,8 +12,8 @@ namespace booleq {
 namespace {
 
 // Two columns; the digits of the second are made when those of the first are written.
-void PutBoth(const char* label, const Function& msb, const Function& lsb, size_t width,
-             std::string (Function::*digits)() const, Output& output)
+void PutBoth(const char* label, const kq_logic::Function& msb, const kq_logic::Function& lsb,
+             size_t width, std::string (kq_logic::Function::*digits)() const, Output& output)
 {
     PutLabel(output, label);
     {
@@ -25,7 +27,18 @@ void PutBoth(const char* label, const Function& msb, const Function& lsb, size_t
 
 } // namespace
 
-void PutBitOrders(const Function& msb, const Function& lsb, Output& output)
+kq_logic::Function Reversed(const kq_logic::Function& function)
+{
+    std::vector<std::string> inputs = function.Inputs();
+    std::reverse(inputs.begin(), inputs.end());
+    kq_logic::Function reversed;
+    const std::string fault = kq_logic::Permute(function, inputs, reversed);
+    assert(fault.empty());
+    static_cast<void>(fault);
+    return reversed;
+}
+
+void PutBitOrders(const kq_logic::Function& msb, const kq_logic::Function& lsb, Output& output)
 {
     assert(msb.NumInputs() >= 1);
     assert(msb.NumInputs() == lsb.NumInputs());
@@ -41,13 +54,13 @@ void PutBitOrders(const Function& msb, const Function& lsb, Output& output)
     PutLabel(output, "");
     output.Put(first + std::string(width - first.size() + 2, ' ') + name +
                " least (--lsb-first)\n");
-    PutBoth("hexadecimal", msb, lsb, width, &Function::Hex, output);
-    PutBoth("binary", msb, lsb, width, &Function::Binary, output);
+    PutBoth("hexadecimal", msb, lsb, width, &kq_logic::Function::Hex, output);
+    PutBoth("binary", msb, lsb, width, &kq_logic::Function::Binary, output);
 }
 
-Json LsbFirstJson(const Function& function)
+Json LsbFirstJson(const kq_logic::Function& function)
 {
-    const Function reversed = function.Reversed();
+    const kq_logic::Function reversed = Reversed(function);
     return {{"hex", reversed.Hex()}, {"binary", reversed.Binary()}};
 }
 

@@ -1,6 +1,7 @@
 // The command 'check': accepted, or the refusal that every command gives.
 #include "answer.h"
 #include "commands.h"
+#include "function.h"
 #include "table_rows.h"
 #include "text.h"
 

@@ -1,10 +1,14 @@
 // The command 'convert': an equation as text of another notation, proved equal before it is
 // printed.
-#include "convert.h"
+#include <cassert>
+
+#include <kq_logic/convert.h>
+#include <kq_logic/short_form.h>
 
 #include "commands.h"
+#include "convert.h"
 #include "decide.h"
-#include "short_form.h"
+#include "function.h"
 #include "text.h"
 
 namespace booleq {
@@ -45,7 +49,7 @@ std::string ParseUnit(const Request& request, const Target& target)
     return name.empty() ? "f" : name;
 }
 
-Json ToJson(const Expression& expression, const Request& request, const Conversion& conversion)
+Json ToJson(const Request& request, const kq_logic::Conversion& conversion)
 {
     Json json;
     json["to"] = request.Get("--to");
@@ -55,16 +59,16 @@ Json ToJson(const Expression& expression, const Request& request, const Conversi
     json["inputs"] = Json::array();
     for (size_t input = 0; input < conversion.names.size(); ++input)
         json["inputs"].push_back(
-            {{"input", expression.names[input]}, {"name", conversion.names[input]}});
+            {{"input", conversion.inputs[input]}, {"name", conversion.names[input]}});
     json["compared_all"] = conversion.isProved;
     return json;
 }
 
-void PutText(const Expression& expression, const Conversion& conversion, Output& output)
+void PutText(const kq_logic::Conversion& conversion, Output& output)
 {
     // An expression alone must stay one, without a comment.
     if (!conversion.saysNames)
-        for (const auto& change : ChangedNames(expression, conversion))
+        for (const auto& change : ChangedNames(conversion.inputs, conversion.names))
             Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
     if (!conversion.isProved)
         Complain(output, "warning: not decided whether this reads back as the same function: " +
@@ -72,33 +76,36 @@ void PutText(const Expression& expression, const Conversion& conversion, Output&
     output.Put(conversion.text);
 }
 
-// The short form in place of the expression.  Fails: why there is none.
-std::string Shorten(const Kq_BoolEquation& equation, Expression& expression)
+// The short form in place of the equation, over the same inputs.  Fails: why there is none.
+std::string Shorten(Kq_BoolEquation& equation)
 {
     const size_t numInputs = equation.GetNumVariables();
-    Function function;
-    if (numInputs > kMaxShortFormInputs || !FunctionOf(equation, function))
-        return Count(numInputs, "input") + ": at most " + std::to_string(kMaxShortFormInputs) +
-               " are shortened";
-    const ShortForm shortForm = FindShortForm(function);
-    if (!shortForm.isFound)
-        return "no expression of bearable length was found";
-    expression = shortForm.expression;
-    return std::string();
+    kq_logic::Function function;
+    if (numInputs > kq_logic::kMaxShortFormInputs || !function.Set(equation))
+        return Count(numInputs, "input") + ": at most " +
+               std::to_string(kq_logic::kMaxShortFormInputs) + " are shortened";
+    const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(function);
+    if (!shortForm.fault.empty())
+        return shortForm.fault;
+    Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = function.Inputs();
+    const bool isSet = SetVerbatim(equation, shortForm.text, reading);
+    assert(isSet);
+    return isSet ? std::string() : "the short form does not read back";
 }
 
 int RunConvert(const Request& request, Output& output)
 {
     const Target& target = ParseTarget(request.Get("--to"));
     std::string unit = ParseUnit(request, target);
-    const Limits limits = ParseLimits(request, kDefaultSeconds);
+    const double seconds = ParseSeconds(request, kDefaultSeconds);
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        Expression expression = ToExpression(equation);
         const std::string fault =
-            request.Has("--short") ? Shorten(equation, expression) : std::string();
+            request.Has("--short") ? Watched([&] { return Shorten(equation); }) : std::string();
         if (!fault.empty()) {
             Refuse(text, request, output, fault);
             return kRefused;
@@ -107,7 +114,8 @@ int RunConvert(const Request& request, Output& output)
         if (text.line > 0 && target.wrapping != Wrapping::Never &&
             (!unit.empty() || target.wrapping == Wrapping::Always))
             ownUnit = (unit.empty() ? "f" : unit) + "_" + std::to_string(text.line);
-        const Conversion conversion = Convert(expression, target, ownUnit, limits);
+        const kq_logic::Conversion conversion =
+            Watched([&] { return kq_logic::Convert(equation, target.name, ownUnit, {seconds}); });
         if (!conversion.fault.empty()) {
             Refuse(text, request, output, conversion.fault);
             return kRefused;
@@ -115,8 +123,8 @@ int RunConvert(const Request& request, Output& output)
         return Say(text, request, output,
                    {conversion.isProved ? kDone : kUndecided,
                     conversion.isProved ? "done" : "undecided", LineMark::Nothing,
-                    [&] { return ToJson(expression, request, conversion); },
-                    [&] { PutText(expression, conversion, output); }});
+                    [&] { return ToJson(request, conversion); },
+                    [&] { PutText(conversion, output); }});
     });
 }
 

@@ -2,6 +2,7 @@
 
 #include <cassert>
 #include <cerrno>
+#include <cstdio>
 #include <cstdlib>
 #include <optional>
 
@@ -16,7 +17,7 @@ namespace {
 constexpr double kMaxSeconds = 1e9;
 
 struct Shown {
-    Progress progress{"deciding, seconds", 0};
+    Progress progress{"working, seconds", 0};
     std::chrono::steady_clock::time_point start = std::chrono::steady_clock::now();
 };
 std::optional<Shown> shown;
@@ -24,7 +25,7 @@ std::optional<Shown> shown;
 void ShowSeconds()
 {
     const auto passed = std::chrono::steady_clock::now() - shown->start;
-    shown->progress.Show(
+    shown->progress.ShowNow(
         static_cast<uint64_t>(std::chrono::duration_cast<std::chrono::seconds>(passed).count()));
 }
 
@@ -52,10 +53,10 @@ std::vector<Option> ClauseOptions()
             {"--proof", "FILE", "Write a proof (DRAT) that these clauses contradict each other"}};
 }
 
-Limits ParseLimits(const Request& request, double seconds)
+double ParseSeconds(const Request& request, double seconds)
 {
     if (!request.Has("--seconds"))
-        return {seconds};
+        return seconds;
     const std::string text = request.Get("--seconds");
     const bool isPlain = !text.empty() && text.size() <= 18 &&
                          text.find_first_not_of("0123456789.") == std::string::npos;
@@ -64,17 +65,17 @@ Limits ParseLimits(const Request& request, double seconds)
     if (!isPlain || *end != '\0' || value <= 0 || value > kMaxSeconds)
         throw UsageError("--seconds takes a number above 0, such as 10 or 0.5, not '" +
                          Visible(text) + "'");
-    return {value};
+    return value;
 }
 
-DecidingProgress::DecidingProgress()
+WorkingProgress::WorkingProgress()
 {
     assert(!shown);
     shown.emplace();
     SetWatch(ShowSeconds);
 }
 
-DecidingProgress::~DecidingProgress()
+WorkingProgress::~WorkingProgress()
 {
     SetWatch(nullptr);
     shown.reset();
@@ -94,21 +95,21 @@ void CheckClauseOptions(const Request& request)
         throw UsageError("--proof: this build has no solver to prove anything");
 }
 
-int WriteClauses(const Request& request, Output& output, const Cnf& cnf, Verdict verdict,
-                 const Limits& limits)
+int WriteClauses(const Request& request, Output& output, const Cnf& cnf, kq_logic::Verdict verdict,
+                 double seconds)
 {
     if (request.Has("--cnf"))
         WriteFile(request.Get("--cnf"), ToDimacs(cnf));
     if (!request.Has("--proof"))
         return kDone;
     const std::string path = request.Get("--proof");
-    if (verdict == Verdict::Different) {
+    if (verdict == kq_logic::Verdict::Different) {
         Complain(output, "note: an assignment satisfies the clauses, so there is no proof: " +
                              Visible(path) + " was not written");
         return kDone;
     }
     errno = 0;
-    const ProofEnd end = WriteProof(cnf, path, limits);
+    const ProofEnd end = WriteProof(cnf, path, {seconds});
     if (end == ProofEnd::CannotWrite)
         throw IoError("cannot write " + Visible(path), errno);
     if (end == ProofEnd::Proved)
@@ -119,35 +120,49 @@ int WriteClauses(const Request& request, Output& output, const Cnf& cnf, Verdict
     return kUndecided;
 }
 
-std::string AssignmentLine(const Decision& decision)
+uint64_t RowOf(const kq_logic::Decision& decision)
 {
-    std::string text;
-    for (size_t index = 0; index < decision.inputs.size(); ++index)
-        text += (index == 0 ? "" : " ") + Visible(decision.inputs[index]) +
-                (decision.assignment[index] ? "=1" : "=0");
-    return text.empty() ? "no inputs" : text;
+    assert(IsDifferent(decision) && decision.assignment.size() <= 64);
+    uint64_t row = 0;
+    for (const bool value : decision.assignment)
+        row = row << 1 | (value ? 1u : 0u);
+    return row;
 }
 
-Json AssignmentJson(const Decision& decision)
+std::string NotDecidedIn(double seconds)
 {
+    char number[32];
+    std::snprintf(number, sizeof number, "%g", seconds);
+    return "not decided in " + std::string(number) + (seconds == 1 ? " second" : " seconds");
+}
+
+std::string UndecidedText(const kq_logic::Decision& decision, double seconds)
+{
+    assert(decision.verdict == kq_logic::Verdict::Undecided);
+    return decision.isTimeOver ? NotDecidedIn(seconds) : "not decided: " + decision.reason;
+}
+
+Json AssignmentJson(const std::vector<std::string>& inputs, const std::vector<bool>& values)
+{
+    assert(inputs.size() == values.size());
     Json json = Json::object();
-    for (size_t index = 0; index < decision.inputs.size(); ++index)
-        PutMember(json, decision.inputs[index], decision.assignment[index] ? 1 : 0);
+    for (size_t index = 0; index < inputs.size(); ++index)
+        PutMember(json, inputs[index], values[index] ? 1 : 0);
     return json;
 }
 
-std::string PlaceText(const Decision& decision)
+std::string PlaceText(const kq_logic::Decision& decision)
 {
     const size_t numInputs = decision.inputs.size();
-    if (numInputs > kMaxFirstRowInputs)
+    if (numInputs > kq_logic::kMaxFunctionInputs)
         return "for one assignment of " + Count(numInputs, "input");
     return std::string(decision.isFirstRow ? "first at row " : "at row ") +
-           std::to_string(decision.Row()) + " of " + std::to_string(uint64_t(1) << numInputs);
+           std::to_string(RowOf(decision)) + " of " + std::to_string(uint64_t(1) << numInputs);
 }
 
-Json RowJson(const Decision& decision)
+Json RowJson(const kq_logic::Decision& decision)
 {
-    return decision.inputs.size() > kMaxFirstRowInputs ? Json() : Json(decision.Row());
+    return decision.inputs.size() > kq_logic::kMaxFunctionInputs ? Json() : Json(RowOf(decision));
 }
 
 } // namespace booleq

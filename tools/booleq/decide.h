@@ -3,9 +3,11 @@
 #ifndef BOOLEQ_DECIDE_H
 #define BOOLEQ_DECIDE_H
 
+#include <kq_logic/decide.h>
+
 #include "answer.h"
 #include "cnf.h"
-#include "decision.h"
+#include "deadline.h"
 #include "progress.h"
 
 namespace booleq {
@@ -16,37 +18,59 @@ Option SecondsOption();
 std::vector<Option> ClauseOptions();
 
 // What --seconds says; 'seconds' without it.  Fails: UsageError.
-Limits ParseLimits(const Request& request, double seconds);
+double ParseSeconds(const Request& request, double seconds);
 
-// Says on a terminal for how long something is being decided, as long as it lives. One at a time.
-class DecidingProgress {
+// Says on a terminal for how long something is being decided or searched for, as long as it lives.
+// One at a time.
+class WorkingProgress {
   public:
-    DecidingProgress();
-    ~DecidingProgress();
-    DecidingProgress(const DecidingProgress&) = delete;
-    DecidingProgress& operator=(const DecidingProgress&) = delete;
+    WorkingProgress();
+    ~WorkingProgress();
+    WorkingProgress(const WorkingProgress&) = delete;
+    WorkingProgress& operator=(const WorkingProgress&) = delete;
 };
+// What 'work' gives back, with that meanwhile.
+template <class Work>
+auto Watched(const Work& work)
+{
+    const WorkingProgress progress;
+    return work();
+}
 
 // Fails: UsageError, when a file is asked for that cannot be: of many lines, or a proof from a
 // build without a solver. To be called first.
 void CheckClauseOptions(const Request& request);
 // Writes the files that are asked for. 'verdict' is what was decided about the question; only
-// Verdict::Equal, nothing satisfies the clauses, can be proved. Gives back a status: kDone, or
-// kUndecided when the proof was not finished in time, and there is no file then.
-// Fails: IoError.
-int WriteClauses(const Request& request, Output& output, const Cnf& cnf, Verdict verdict,
-                 const Limits& limits);
+// kq_logic::Verdict::Equal, nothing satisfies the clauses, can be proved. Gives back a status:
+// kDone, or kUndecided when the proof was not finished in time, and there is no file then. Fails:
+// IoError.
+int WriteClauses(const Request& request, Output& output, const Cnf& cnf, kq_logic::Verdict verdict,
+                 double seconds);
 // Whether any file is asked for.
 bool WantsClauses(const Request& request);
 
-// "a=1 b=0"; "no inputs" without any.
-std::string AssignmentLine(const Decision& decision);
+inline bool IsEqual(const kq_logic::Decision& decision)
+{
+    return decision.verdict == kq_logic::Verdict::Equal;
+}
+inline bool IsDifferent(const kq_logic::Decision& decision)
+{
+    return decision.verdict == kq_logic::Verdict::Different;
+}
+// The assignment that differs, as a row number.  Requires: Different, at most 64 inputs.
+uint64_t RowOf(const kq_logic::Decision& decision);
+
+// "not decided in 10 seconds"
+std::string NotDecidedIn(double seconds);
+// The same, or "not decided: " and the reason.
+// Requires: the decision is undecided, and so many seconds were allowed.
+std::string UndecidedText(const kq_logic::Decision& decision, double seconds);
 // Name and value of each input.
-Json AssignmentJson(const Decision& decision);
+Json AssignmentJson(const std::vector<std::string>& inputs, const std::vector<bool>& values);
 // "first at row 4 of 8", or what else is known of it.
-std::string PlaceText(const Decision& decision);
+std::string PlaceText(const kq_logic::Decision& decision);
 // The row number, null for more inputs than a row number is given for.
-Json RowJson(const Decision& decision);
+Json RowJson(const kq_logic::Decision& decision);
 
 } // namespace booleq
 

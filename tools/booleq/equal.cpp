@@ -1,6 +1,4 @@
 // The command 'equal': are two equations the same function.
-#include "equality.h"
-
 #include <algorithm>
 
 #include "commands.h"
@@ -11,32 +9,32 @@ namespace booleq {
 
 namespace {
 
-const char* StatusWord(const Decision& decision)
+const char* StatusWord(const kq_logic::Decision& decision)
 {
-    if (decision.verdict == Verdict::Undecided)
+    if (decision.verdict == kq_logic::Verdict::Undecided)
         return "undecided";
-    return decision.IsEqual() ? "yes" : "no";
+    return IsEqual(decision) ? "yes" : "no";
 }
 
-int StatusOf(const Decision& decision)
+int StatusOf(const kq_logic::Decision& decision)
 {
-    if (decision.verdict == Verdict::Undecided)
+    if (decision.verdict == kq_logic::Verdict::Undecided)
         return kUndecided;
-    return decision.IsEqual() ? kDone : kFindings;
+    return IsEqual(decision) ? kDone : kFindings;
 }
 
-Json AsJson(const Decision& decision)
+Json AsJson(const kq_logic::Decision& decision)
 {
     Json result;
-    const bool isDecided = decision.verdict != Verdict::Undecided;
-    result["equal"] = isDecided ? Json(decision.IsEqual()) : Json();
+    const bool isDecided = decision.verdict != kq_logic::Verdict::Undecided;
+    result["equal"] = isDecided ? Json(IsEqual(decision)) : Json();
     result["inputs"] = decision.inputs;
     result["first_difference"] = nullptr;
-    if (decision.IsDifferent()) {
+    if (IsDifferent(decision)) {
         Json& difference = result["first_difference"] = Json::object();
         difference["row"] = RowJson(decision);
         difference["is_first"] = decision.isFirstRow;
-        difference["assignment"] = AssignmentJson(decision);
+        difference["assignment"] = AssignmentJson(decision.inputs, decision.assignment);
         difference["values"] = {decision.left ? 1 : 0, decision.right ? 1 : 0};
     }
     if (!isDecided)
@@ -44,21 +42,22 @@ Json AsJson(const Decision& decision)
     return result;
 }
 
-void PutText(const Decision& decision, const Limits& limits, Output& output)
+void PutText(const kq_logic::Decision& decision, double seconds, Output& output)
 {
-    if (decision.IsEqual())
+    if (IsEqual(decision))
         output.Put("equal, over " + Count(decision.inputs.size(), "input") + "\n");
-    else if (decision.IsDifferent())
-        output.Put("not equal, " + PlaceText(decision) + "\n  " + AssignmentLine(decision) + ": " +
+    else if (IsDifferent(decision))
+        output.Put("not equal, " + PlaceText(decision) + "\n  " +
+                   ValuesByName(decision.inputs, decision.assignment) + ": " +
                    (decision.left ? "1" : "0") + " and " + (decision.right ? "1" : "0") + "\n");
     else
-        output.Put(UndecidedText(decision, limits) + "\n");
+        output.Put(UndecidedText(decision, seconds) + "\n");
 }
 
 int RunEqual(const Request& request, Output& output)
 {
     CheckClauseOptions(request);
-    const Limits limits = ParseLimits(request, 0);
+    const double seconds = ParseSeconds(request, 0);
     const Text other{request.operands.back(), 0};
     Kq_BoolEquation right;
     if (!SetEquation(other, request, output, right))
@@ -67,19 +66,19 @@ int RunEqual(const Request& request, Output& output)
         Kq_BoolEquation left;
         if (!SetEquation(text, request, output, left))
             return kRefused;
-        Decision decision;
+        kq_logic::Decision decision;
         int status = kDone;
         {
-            const DecidingProgress progress;
-            decision = DecideEquations(left, right, limits);
+            const WorkingProgress progress;
+            decision = kq_logic::DecideEqual(left, right, {seconds});
             if (WantsClauses(request))
                 status = WriteClauses(request, output,
                                       ClausesOfDifference(ToExpression(left), ToExpression(right)),
-                                      decision.verdict, limits);
+                                      decision.verdict, seconds);
         }
         return Say(text, request, output,
                    {std::max(status, StatusOf(decision)), StatusWord(decision), LineMark::Prefix,
-                    [&] { return AsJson(decision); }, [&] { PutText(decision, limits, output); }});
+                    [&] { return AsJson(decision); }, [&] { PutText(decision, seconds, output); }});
     });
 }
 

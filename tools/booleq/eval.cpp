@@ -3,6 +3,7 @@
 
 #include "answer.h"
 #include "commands.h"
+#include "function.h"
 #include "table_rows.h"
 #include "text.h"
 

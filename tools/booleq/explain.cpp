@@ -5,7 +5,7 @@
 #include "answer.h"
 #include "bit_orders.h"
 #include "commands.h"
-#include "function_access.h"
+#include "decide.h"
 #include "options.h"
 #include "table_rows.h"
 #include "text.h"
@@ -29,7 +29,7 @@ std::string ShortNote(const kq_logic::ShortForm& shortForm)
     return count + "; shorter ones may exist";
 }
 
-void PutText(const Function& function, const kq_logic::Explanation& explanation,
+void PutText(const kq_logic::Function& function, const kq_logic::Explanation& explanation,
              const kq_logic::ShortForm& shortForm, uint64_t maxRows, Output& output)
 {
     const std::vector<std::string>& inputs = function.Inputs();
@@ -40,7 +40,7 @@ void PutText(const Function& function, const kq_logic::Explanation& explanation,
     if (inputs.empty())
         PutField(output, "init value", "none: there are no rows to number");
     else if (inputs.size() <= kMaxShownInputs)
-        PutBitOrders(function, function.Reversed(), output);
+        PutBitOrders(function, Reversed(function), output);
     PutField(output, "without effect", Listed(explanation.idle));
     PutField(output, "function",
              explanation.kind.empty() ? "none with a common name" : Visible(explanation.text));
@@ -55,7 +55,7 @@ void PutText(const Function& function, const kq_logic::Explanation& explanation,
         output);
 }
 
-Json ToJson(const Function& function, const kq_logic::Explanation& explanation,
+Json ToJson(const kq_logic::Function& function, const kq_logic::Explanation& explanation,
             const kq_logic::ShortForm& shortForm)
 {
     const bool isNamed = !explanation.kind.empty();
@@ -78,16 +78,17 @@ int RunExplain(const Request& request, Output& output)
 {
     const uint64_t maxRows = request.Has("--rows") ? ParseRows(request.Get("--rows")) : 64;
     return ForEachText(request, output, [&](const Text& text) {
-        Function function;
+        kq_logic::Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
-        const kq_logic::Function asked = kq_logic::FunctionAccess::Make(function);
-        const kq_logic::Explanation explanation = kq_logic::Explain(asked);
+        const kq_logic::Explanation explanation =
+            Watched([&] { return kq_logic::Explain(function); });
         if (!explanation.fault.empty()) {
             Refuse(text, request, output, explanation.fault);
             return kRefused;
         }
-        const kq_logic::ShortForm shortForm = kq_logic::FindShortForm(asked);
+        const kq_logic::ShortForm shortForm =
+            Watched([&] { return kq_logic::FindShortForm(function); });
         return Say(text, request, output,
                    {kDone, "done", LineMark::Block,
                     [&] { return ToJson(function, explanation, shortForm); },

@@ -1,6 +1,8 @@
 // The command 'init': init values in both orders of counting, and what reads back.
 #include <algorithm>
 
+#include <kq_logic/permute.h>
+
 #include "answer.h"
 #include "bit_orders.h"
 #include "commands.h"
@@ -17,13 +19,13 @@ constexpr size_t kMaxJsonInputs = 24;
 // One of the two orders of counting. The digits are made when they are written: with 30 inputs
 // they are 256 MB and 1 GB.
 struct Order {
-    const Function& column; // as somebody sees it who counts so
+    const kq_logic::Function& column; // as somebody sees it who counts so
     bool lsbFirst;
 };
 
 // Whether the library reads 'text' as this function, and renders it as 'rendering' afterwards.
-bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst, bool reverse,
-               const std::string& rendering)
+bool ReadsBack(const kq_logic::Function& function, const std::string& text, bool lsbFirst,
+               bool reverse, const std::string& rendering)
 {
     Reading reading;
     reading.hasInputs = true;
@@ -31,10 +33,12 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     reading.lsbFirst = lsbFirst;
     reading.reverse = reverse;
     Kq_BoolEquation equation;
-    Function read;
+    kq_logic::Function read;
+    kq_logic::Function inOrder;
     // Over a name like 'a'+b the library reads the inputs of the expression that it stands for.
-    if (!SetVerbatim(equation, text, reading) || !FunctionOf(equation, read) ||
-        read.NumInputs() != function.NumInputs() || read.Over(function.Inputs()) != function)
+    if (!SetVerbatim(equation, text, reading) || !read.Set(equation) ||
+        read.NumInputs() != function.NumInputs() ||
+        !kq_logic::Permute(read, function.Inputs(), inOrder).empty() || inOrder != function)
         return false;
     const Port::StringBase<char> rendered = rendering[1] == 'x'
                                                 ? equation.GetEquationAsHexInitValue(false)
@@ -42,7 +46,7 @@ bool ReadsBack(const Function& function, const std::string& text, bool lsbFirst,
     return rendering.compare(0, std::string::npos, rendered.c_str(), rendered.length()) == 0;
 }
 
-std::string Names(const Function& function)
+std::string Names(const kq_logic::Function& function)
 {
     return Visible(Join(function.Inputs(), ", "));
 }
@@ -53,14 +57,15 @@ std::string Shortened(const std::string& digits)
     return digits.size() <= 40 ? digits : digits.substr(0, 40) + "...";
 }
 
-std::string Call(const Function& function, const std::string& text, bool lsbFirst, bool reverse)
+std::string Call(const kq_logic::Function& function, const std::string& text, bool lsbFirst,
+                 bool reverse)
 {
     return "SetEquationWithExplicitTerms({" + Names(function) + "}, \"" + Shortened(text) + "\", " +
            (lsbFirst ? "true" : "false") + ", " + (reverse ? "true" : "false") + ")";
 }
 
-void PutTried(const Function& function, const std::string& text, bool lsbFirst, bool reverse,
-              const std::string& rendering, Output& output)
+void PutTried(const kq_logic::Function& function, const std::string& text, bool lsbFirst,
+              bool reverse, const std::string& rendering, Output& output)
 {
     const bool reads = ReadsBack(function, text, lsbFirst, reverse, rendering);
     PutField(output, reads ? "reads back" : "does not", Call(function, text, lsbFirst, reverse));
@@ -68,7 +73,7 @@ void PutTried(const Function& function, const std::string& text, bool lsbFirst, 
 
 void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
 {
-    const Function& function = msb.column;
+    const kq_logic::Function& function = msb.column;
     const std::string hex = function.Hex();
     if (function.NumInputs() == 1) {
         PutTried(function, function.Binary(), false, false, function.Binary(), output);
@@ -89,7 +94,7 @@ void PutReadsBack(const Order& msb, const Order& lsb, Output& output)
                  " being the first variable now");
 }
 
-void PutConstant(const Function& function, Output& output)
+void PutConstant(const kq_logic::Function& function, Output& output)
 {
     const std::string value = function.At(0) ? "1" : "0";
     PutField(output, "inputs", "none: the equation is always " + value);
@@ -101,7 +106,7 @@ void PutConstant(const Function& function, Output& output)
 
 void PutInit(const Order& msb, const Order& lsb, Output& output)
 {
-    const Function& function = msb.column;
+    const kq_logic::Function& function = msb.column;
     if (function.NumInputs() == 0) {
         PutConstant(function, output);
         return;
@@ -118,7 +123,7 @@ void PutInit(const Order& msb, const Order& lsb, Output& output)
 
 Json AsJson(const Order& msb, const Order& lsb)
 {
-    const Function& function = msb.column;
+    const kq_logic::Function& function = msb.column;
     Json result;
     result["inputs"] = function.Inputs();
     result["num_rows"] = function.NumInputs() == 0 ? 0 : function.NumRows();
@@ -128,7 +133,7 @@ Json AsJson(const Order& msb, const Order& lsb)
     for (const Order* order : {&msb, &lsb}) {
         Json& json = result[order->lsbFirst ? "lsb_first" : "msb_first"];
         for (const bool isHex : {true, false}) {
-            const auto digits = isHex ? &Function::Hex : &Function::Binary;
+            const auto digits = isHex ? &kq_logic::Function::Hex : &kq_logic::Function::Binary;
             const std::string name = isHex ? "hex" : "binary";
             const std::string text = (order->column.*digits)();
             json[name] = function.NumInputs() > 0 ? Json(text) : Json();
@@ -151,7 +156,7 @@ constexpr size_t kDigitWidth = 24;
 constexpr size_t kTableTop = 110;
 
 // Where the column of each input begins, and behind them that of the result.
-std::vector<size_t> ColumnPlaces(const Function& function)
+std::vector<size_t> ColumnPlaces(const kq_logic::Function& function)
 {
     std::vector<size_t> places = {kMargin + kRowNumberWidth};
     for (const std::string& name : function.Inputs())
@@ -161,7 +166,7 @@ std::vector<size_t> ColumnPlaces(const Function& function)
     return places;
 }
 
-std::string SignificanceText(const Function& function)
+std::string SignificanceText(const kq_logic::Function& function)
 {
     const std::string first = Visible(function.Inputs().front());
     if (function.NumInputs() == 1)
@@ -170,7 +175,8 @@ std::string SignificanceText(const Function& function)
            " the least";
 }
 
-void PutPictureTable(const Function& function, const std::vector<size_t>& places, Output& output)
+void PutPictureTable(const kq_logic::Function& function, const std::vector<size_t>& places,
+                     Output& output)
 {
     output.Put(SvgText(kMargin, kTableTop - 32, "start", "row"));
     output.Put(SvgNote(kMargin, kTableTop - 10, "start", "weight"));
@@ -194,7 +200,7 @@ void PutPictureTable(const Function& function, const std::vector<size_t>& places
 }
 
 // The digits of both bases below each other, from 'left' and 'top' on.
-void PutPictureDigits(const Function& function, size_t left, size_t top, Output& output)
+void PutPictureDigits(const kq_logic::Function& function, size_t left, size_t top, Output& output)
 {
     const size_t numRows = function.NumRows();
     output.Put(SvgNote(left - kCharacterWidth, top - 8, "end", "bit"));
@@ -215,7 +221,7 @@ void PutPictureDigits(const Function& function, size_t left, size_t top, Output&
                           std::string(1, hex[digit])));
 }
 
-void PutPicture(const Function& function, Output& output)
+void PutPicture(const kq_logic::Function& function, Output& output)
 {
     const std::vector<size_t> places = ColumnPlaces(function);
     const size_t tableRight = places.back() + kResultWidth;
@@ -242,7 +248,7 @@ int RunInit(const Request& request, Output& output)
 {
     RefuseTwoFormats(request, "--svg");
     return ForEachText(request, output, [&](const Text& text) {
-        Function function;
+        kq_logic::Function function;
         if (!SetFunction(text, request, output, function))
             return kRefused;
         if (request.Has("--svg")) {
@@ -251,7 +257,7 @@ int RunInit(const Request& request, Output& output)
             PutPicture(function, output);
             return kDone;
         }
-        const Function turned = function.Reversed();
+        const kq_logic::Function turned = Reversed(function);
         const Order msb = {function, false};
         const Order lsb = {turned, true};
         if (request.json && function.NumInputs() > kMaxJsonInputs) {

@@ -84,7 +84,8 @@ Json DifferenceJson(const ForeignReading& reading)
 {
     Json json;
     const bool isKnown = reading.decision.IsDifferent();
-    json["assignment"] = isKnown ? AssignmentJson(reading.decision) : Json();
+    json["assignment"] =
+        isKnown ? AssignmentJson(reading.decision.inputs, reading.decision.assignment) : Json();
     json["here"] = isKnown ? Json(reading.decision.left ? 1 : 0) : Json();
     json["grouping"] = reading.grouping;
     json["reason"] = reading.reason;
@@ -125,12 +126,13 @@ Json ToJson(const LintReport& report)
 
 int RunLint(const Request& request, Output& output)
 {
-    const Limits limits = ParseLimits(request, kDefaultSeconds);
+    const Limits limits = {ParseSeconds(request, kDefaultSeconds)};
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const LintReport report = Lint(text.text, equation, request.reading, limits);
+        const LintReport report =
+            Watched([&] { return Lint(text.text, equation, request.reading, limits); });
         const int status = report.IsClean() ? kDone : kFindings;
         const auto putText = [&] {
             if (status == kDone)

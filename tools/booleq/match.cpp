@@ -1,8 +1,12 @@
 // The command 'match': are two functions one up to the order of inputs, or up to inversions.
-#include "match.h"
+#include <algorithm>
+#include <cassert>
+
+#include <kq_logic/match.h>
 
 #include "commands.h"
 #include "decide.h"
+#include "function.h"
 #include "init_literal.h"
 #include "text.h"
 
@@ -44,7 +48,7 @@ bool IsInitOver(const std::string& text, const Reading& reading)
 // The inputs that --inputs names, or --second-inputs for the second. An init value gets letters
 // when none are listed, or when the list is for the other one. Anything else is read as usual.
 bool SetNamed(const Text& text, const Request& request, bool isListForOther, Output& output,
-              Function& function)
+              kq_logic::Function& function)
 {
     const size_t width = WidthOf(text.text);
     const bool hasNames =
@@ -71,125 +75,125 @@ Request ForSecond(const Request& request)
     return second;
 }
 
-struct Answer {
-    const char* level = nullptr; // null: no match
-    Matching matching;
-};
-
-// First by order alone, then with inversions; both within the time.
-Answer FindMatch(const Function& first, const Function& second, bool orderOnly,
-                 const Limits& limits)
+// "order" or "inversions"; null: no match. One by order alone is found before any other.
+const char* LevelOf(const kq_logic::Matching& matching)
 {
-    const Deadline deadline(limits);
-    Answer answer;
-    answer.matching = Match(first, second, false, limits.seconds);
-    answer.level = answer.matching.isFound ? "order" : nullptr;
-    if (answer.level || orderOnly || !answer.matching.isDecided)
-        return answer;
-    answer.matching = Match(first, second, true, limits.seconds > 0 ? deadline.Left() : 0);
-    answer.level = answer.matching.isFound ? "inversions" : nullptr;
-    return answer;
+    if (!matching.isFound)
+        return nullptr;
+    const bool hasInversion = std::find(matching.inverted.begin(), matching.inverted.end(), true) !=
+                              matching.inverted.end();
+    return hasInversion || matching.isInverted ? "inversions" : "order";
 }
 
-std::string SourceText(const Function& second, const Matching& matching, size_t place)
+std::string SourceText(const kq_logic::Function& second, const kq_logic::Matching& matching,
+                       size_t place)
 {
     return (matching.inverted[place] ? "~" : "") + Visible(second.Inputs()[place]);
 }
 
-std::vector<std::string> IdleInputs(const Function& function)
+std::vector<std::string> IdleInputs(const kq_logic::Function& function)
 {
     std::vector<std::string> idle;
-    for (unsigned int input = 0; input < function.NumInputs(); ++input)
-        if (!DependsOn(function.GetRows(), input))
+    for (size_t input = 0; input < function.NumInputs(); ++input)
+        if (!function.DependsOn(input))
             idle.push_back(function.Inputs()[input]);
     return idle;
 }
 
-void PutIdle(const char* which, const Function& function, Output& output)
+size_t NumEffective(const kq_logic::Function& function)
+{
+    return function.NumInputs() - IdleInputs(function).size();
+}
+
+void PutIdle(const char* which, const kq_logic::Function& function, Output& output)
 {
     const std::string list = Visible(Join(IdleInputs(function), ", "));
     if (!list.empty())
         output.Put("    without effect in the " + std::string(which) + ": " + list + "\n");
 }
 
-void PutText(const Request& request, const Function& first, const Function& second,
-             const Answer& answer, Output& output)
+void PutText(double seconds, const kq_logic::Function& first, const kq_logic::Function& second,
+             const kq_logic::Matching& matching, Output& output)
 {
-    if (!answer.matching.isDecided) {
-        output.Put("not decided in " + request.Get("--seconds") + " seconds\n");
+    if (!matching.isDecided) {
+        output.Put(NotDecidedIn(seconds) + "\n");
         return;
     }
-    const size_t numFirst = EffectiveInputs(first).size();
-    const size_t numSecond = EffectiveInputs(second).size();
-    if (!answer.level) {
+    const char* const level = LevelOf(matching);
+    const size_t numFirst = NumEffective(first);
+    const size_t numSecond = NumEffective(second);
+    if (!level) {
         output.Put("no match" + (numFirst == numSecond
                                      ? "\n"
                                      : ": " + Count(numFirst, "input") + " with an effect, and " +
                                            std::to_string(numSecond) + "\n"));
         return;
     }
-    const bool isOrder = std::string(answer.level) == "order";
+    const bool isOrder = std::string(level) == "order";
     output.Put((isOrder ? "match, by the order of inputs alone\n" : "match, with inversions\n"));
-    output.Put("  the second is the first" +
-               std::string(answer.matching.isInverted ? " inverted" : "") +
+    output.Put("  the second is the first" + std::string(matching.isInverted ? " inverted" : "") +
                (numFirst > 0 ? ", where\n" : "\n"));
     // In the order of the first one's inputs.
     for (size_t input = 0; input < first.NumInputs(); ++input)
         for (size_t other = 0; other < second.NumInputs(); ++other)
-            if (answer.matching.sources[other] == input)
+            if (matching.sources[other] == input)
                 output.Put("    " + Visible(first.Inputs()[input]) + " of the first is " +
-                           SourceText(second, answer.matching, other) + " of the second\n");
+                           SourceText(second, matching, other) + " of the second\n");
     PutIdle("first", first, output);
     PutIdle("second", second, output);
 }
 
-Json ToJson(const Function& first, const Function& second, const Answer& answer)
+Json ToJson(const kq_logic::Function& first, const kq_logic::Function& second,
+            const kq_logic::Matching& matching)
 {
+    const char* const level = LevelOf(matching);
     Json json;
-    json["match"] = answer.level ? Json(answer.level) : Json(nullptr);
+    json["match"] = level ? Json(level) : Json(nullptr);
     json["first_inputs"] = first.Inputs();
     json["second_inputs"] = second.Inputs();
-    json["output_inverted"] = answer.level ? Json(answer.matching.isInverted) : Json(nullptr);
+    json["output_inverted"] = level ? Json(matching.isInverted) : Json(nullptr);
     json["mapping"] = Json::array();
-    if (answer.level)
+    if (level)
         for (size_t other = 0; other < second.NumInputs(); ++other) {
-            if (answer.matching.sources[other] == Matching::kIdle)
+            if (matching.sources[other] == kq_logic::Matching::kIdle)
                 continue;
-            json["mapping"].push_back(
-                {{"first", first.Inputs()[answer.matching.sources[other]]},
-                 {"second", second.Inputs()[other]},
-                 {"inverted", static_cast<bool>(answer.matching.inverted[other])}});
+            json["mapping"].push_back({{"first", first.Inputs()[matching.sources[other]]},
+                                       {"second", second.Inputs()[other]},
+                                       {"inverted", static_cast<bool>(matching.inverted[other])}});
         }
     json["first_without_effect"] = IdleInputs(first);
     json["second_without_effect"] = IdleInputs(second);
     return json;
 }
 
-bool RefuseTooMany(const Text& text, const Request& request, const Function& function,
+bool RefuseTooMany(const Text& text, const Request& request, const kq_logic::Function& function,
                    Output& output)
 {
-    const size_t numInputs = EffectiveInputs(function).size();
-    if (numInputs <= kMaxMatchInputs)
+    const size_t numInputs = NumEffective(function);
+    if (numInputs <= kq_logic::kMaxMatchedInputs)
         return false;
     Refuse(text, request, output,
            Count(numInputs, "input") + " with an effect: at most " +
-               std::to_string(kMaxMatchInputs) + " are matched");
+               std::to_string(kq_logic::kMaxMatchedInputs) + " are matched");
     return true;
 }
 
-const char* StatusName(const Answer& answer)
+const char* StatusName(const kq_logic::Matching& matching)
 {
-    if (!answer.matching.isDecided)
+    if (!matching.isDecided)
         return "undecided";
-    return answer.level ? "yes" : "no";
+    return matching.isFound ? "yes" : "no";
 }
 
 int RunMatch(const Request& request, Output& output)
 {
-    const Limits limits = ParseLimits(request, 0);
+    const double seconds = ParseSeconds(request, 0);
+    const kq_logic::MatchScope scope = request.Has("--order-only")
+                                           ? kq_logic::MatchScope::Order
+                                           : kq_logic::MatchScope::OrderAndInversions;
     const Request forSecond = ForSecond(request);
     const Text other{request.operands.back(), 0};
-    Function second;
+    kq_logic::Function second;
     const bool hasOwnList = request.Has("--second-inputs");
     const bool isForFirst =
         !hasOwnList && (request.hasLines || IsInitOver(request.operands.front(), request.reading));
@@ -198,16 +202,18 @@ int RunMatch(const Request& request, Output& output)
         RefuseTooMany(other, request, second, output))
         return kRefused;
     return ForEachText(request, output, [&](const Text& text) {
-        Function first;
+        kq_logic::Function first;
         if (!SetNamed(text, request, isForSecond, output, first) ||
             RefuseTooMany(text, request, first, output))
             return kRefused;
-        const Answer answer = FindMatch(first, second, request.Has("--order-only"), limits);
-        const int found = answer.level ? kDone : kFindings;
+        const kq_logic::Matching matching =
+            Watched([&] { return kq_logic::Match(first, second, scope, {seconds}); });
+        assert(matching.fault.empty());
+        const int found = matching.isFound ? kDone : kFindings;
         return Say(text, request, output,
-                   {answer.matching.isDecided ? found : kUndecided, StatusName(answer),
-                    LineMark::Prefix, [&] { return ToJson(first, second, answer); },
-                    [&] { PutText(request, first, second, answer, output); }});
+                   {matching.isDecided ? found : kUndecided, StatusName(matching), LineMark::Prefix,
+                    [&] { return ToJson(first, second, matching); },
+                    [&] { PutText(seconds, first, second, matching, output); }});
     });
 }
 

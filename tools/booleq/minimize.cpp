@@ -58,7 +58,7 @@ SumOptions ParseOptions(const Request& request)
     if (request.Has("--terms") && request.Has("--literals"))
         throw UsageError("--terms and --literals: one of them counts first");
     options.goal = request.Has("--literals") ? Goal::Literals : Goal::Terms;
-    options.seconds = ParseLimits(request, 0).seconds;
+    options.seconds = ParseSeconds(request, 0);
     return options;
 }
 
@@ -123,7 +123,7 @@ int PutEquations(const MinimizeInput& input, const Request& request, const Forma
             return kRefused;
         }
         if (!conversion.saysNames)
-            for (const auto& change : ChangedNames(expression, conversion))
+            for (const auto& change : ChangedNames(expression.names, conversion.names))
                 Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
         if (!conversion.isProved) {
             Complain(output, "warning: not decided whether this reads back as the same function: " +

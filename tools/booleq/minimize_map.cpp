@@ -16,9 +16,7 @@ constexpr int kAnsiColours[kNumColours] = {34, 31, 32, 35, 33, 36};
 // The cells of one output: in the map's row and column order.
 struct Cells {
     Cells(const Pla& itsTable, const Sum& sum, size_t itsOutput)
-        : table(itsTable), output(itsOutput),
-          function(table.inputs, Rows(static_cast<unsigned int>(itsTable.inputs.size()))),
-          map(function)
+        : table(itsTable), output(itsOutput), map(itsTable.inputs)
     {
         for (size_t index = 0; index < sum.cubes.Size(); ++index)
             if (GetBit(sum.cubes.At(index), table.space.OutputBit(output)))
@@ -51,7 +49,6 @@ struct Cells {
 
     const Pla& table;
     size_t output;
-    Function function; // the inputs' names, for the map
     Map map;
     std::vector<const uint64_t*> terms;
 };
@@ -93,31 +90,17 @@ void PutTextMap(const Cells& cells, bool isColoured, Output& output)
                 width += cells.Has(cells.terms[term], row, column) ? Letter(term).size() : 0;
             cellWidth = std::max(cellWidth, width);
         }
-    const size_t width = std::max(map.RowNames().size(), map.numRowInputs);
-    output.Put(std::string(width, ' ') + "  " + map.ColumnNames() + "\n");
-    output.Put(map.RowNames() + std::string(width - map.RowNames().size(), ' '));
-    for (size_t column = 0; column < map.NumColumns(); ++column)
-        output.Put("  " + map.ColumnLabel(column) +
-                   (column + 1 < map.NumColumns()
-                        ? std::string(cellWidth - map.numColumnInputs, ' ')
-                        : std::string()));
-    output.Put("\n");
-    for (size_t row = 0; row < map.NumRows(); ++row) {
-        std::string line = map.RowLabel(row) + std::string(width - map.RowLabel(row).size(), ' ');
-        size_t numBlanks = 0; // not written at the end of a line
-        for (size_t column = 0; column < map.NumColumns(); ++column) {
-            line += std::string(numBlanks + 2, ' ') + cells.Value(row, column);
-            size_t used = 1;
-            for (size_t term = 0; term < cells.terms.size(); ++term) {
-                if (!cells.Has(cells.terms[term], row, column))
-                    continue;
-                line += Coloured(Letter(term), term, isColoured);
-                used += Letter(term).size();
-            }
-            numBlanks = cellWidth - used;
+    const auto cellAt = [&](size_t row, size_t column) {
+        MapCell cell = {std::string(1, cells.Value(row, column)), 1};
+        for (size_t term = 0; term < cells.terms.size(); ++term) {
+            if (!cells.Has(cells.terms[term], row, column))
+                continue;
+            cell.text += Coloured(Letter(term), term, isColoured);
+            cell.width += Letter(term).size();
         }
-        output.Put(line + "\n");
-    }
+        return cell;
+    };
+    PutMapText(map, cellWidth, cellAt, output);
     for (size_t term = 0; term < cells.terms.size(); ++term)
         output.Put("  " + Coloured(Letter(term), term, isColoured) + "  " +
                    TermText(cells.table, cells.terms[term]) + "\n");
@@ -159,30 +142,16 @@ void PutMapOfTerms(const Pla& table, const Sum& sum, bool isColoured, Output& ou
 
 void PutPictureOfTerms(const Pla& table, const Sum& sum, Output& output)
 {
-    constexpr size_t kCell = 56;
-    constexpr size_t kTop = 60;
     const Cells cells(table, sum, 0);
     const Map& map = cells.map;
-    const size_t left = 40 + kCharacterWidth * std::max(map.RowNames().size(), map.numRowInputs);
-    size_t widest = std::max(kCell * map.NumColumns(), kCharacterWidth * map.ColumnNames().size());
+    const MapPicture picture(map, 56);
+    size_t right = picture.Right();
     for (const uint64_t* term : cells.terms)
-        widest = std::max(widest, kCharacterWidth * (TermText(table, term).size() + 2));
-    const size_t bottom = kTop + kCell * map.NumRows();
-    output.Put(SvgHead(left + widest + 20, bottom + 30 + 20 * cells.terms.size()));
-    output.Put(SvgText(left, 20, "start", map.ColumnNames()));
-    output.Put(SvgText(left - 20, kTop - 12, "end", map.RowNames()));
-    for (size_t column = 0; column < map.NumColumns(); ++column)
-        output.Put(SvgText(left + kCell * column + kCell / 2, kTop - 12, "middle",
-                           map.ColumnLabel(column)));
-    for (size_t row = 0; row < map.NumRows(); ++row) {
-        const size_t y = kTop + kCell * row;
-        output.Put(SvgText(left - 20, y + kCell / 2 + 5, "end", map.RowLabel(row)));
-        for (size_t column = 0; column < map.NumColumns(); ++column) {
-            const char value = cells.Value(row, column);
-            output.Put(SvgBox(left + kCell * column, y, kCell, kCell, value == '1',
-                              std::string(1, value)));
-        }
-    }
+        right =
+            std::max(right, picture.left + kCharacterWidth * (TermText(table, term).size() + 2));
+    output.Put(SvgHead(right + 20, picture.Bottom() + 30 + 20 * cells.terms.size()));
+    PutMapBoxes(
+        picture, [&](size_t row, size_t column) { return cells.Value(row, column); }, output);
     for (size_t term = 0; term < cells.terms.size(); ++term) {
         std::vector<bool> rows(map.NumRows());
         std::vector<bool> columns(map.NumColumns());
@@ -193,13 +162,13 @@ void PutPictureOfTerms(const Pla& table, const Sum& sum, Output& output)
         const size_t inset = 3 + 3 * (term % 6);
         for (const auto& rowRun : Runs(rows.size(), rows))
             for (const auto& columnRun : Runs(columns.size(), columns))
-                output.Put(Frame(left + kCell * columnRun.first + inset,
-                                 kTop + kCell * rowRun.first + inset,
-                                 kCell * (columnRun.second - columnRun.first + 1) - 2 * inset,
-                                 kCell * (rowRun.second - rowRun.first + 1) - 2 * inset, term));
-        const size_t y = bottom + 25 + 20 * term;
-        output.Put(Frame(left, y - 12, 14, 14, term));
-        output.Put(SvgText(left + 24, y, "start", TermText(table, cells.terms[term])));
+                output.Put(Frame(
+                    picture.X(columnRun.first) + inset, picture.Y(rowRun.first) + inset,
+                    picture.X(columnRun.second + 1) - picture.X(columnRun.first) - 2 * inset,
+                    picture.Y(rowRun.second + 1) - picture.Y(rowRun.first) - 2 * inset, term));
+        const size_t y = picture.Bottom() + 25 + 20 * term;
+        output.Put(Frame(picture.left, y - 12, 14, 14, term));
+        output.Put(SvgText(picture.left + 24, y, "start", TermText(table, cells.terms[term])));
     }
     output.Put(SvgTail());
 }

@@ -1,6 +1,8 @@
 // The command 'permute': an init value for another order of the same inputs.
 #include "permute.h"
 
+#include <kq_logic/permute.h>
+
 #include "answer.h"
 #include "bit_orders.h"
 #include "commands.h"
@@ -28,14 +30,14 @@ std::vector<std::string> ParseNames(const Request& request, const char* option)
     return names;
 }
 
-void PutText(const Function& function, Output& output)
+void PutText(const kq_logic::Function& function, Output& output)
 {
     std::string names = Visible(Join(function.Inputs(), ", "));
     if (function.NumInputs() > 1)
         names +=
             "; " + Visible(function.Inputs().front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", names);
-    PutBitOrders(function, function.Reversed(), output);
+    PutBitOrders(function, Reversed(function), output);
 }
 
 int RunPermute(const Request& request, Output& output)
@@ -50,7 +52,7 @@ int RunPermute(const Request& request, Output& output)
     if (!forgotten.empty())
         throw UsageError("--to does not list " + Excerpt(forgotten));
     return ForEachText(own, output, [&](const Text& text) {
-        Function function;
+        kq_logic::Function function;
         if (!SetFunction(text, own, output, function))
             return kRefused;
         const std::string unknown = FirstUnlisted(function.Inputs(), to);
@@ -58,7 +60,12 @@ int RunPermute(const Request& request, Output& output)
             Refuse(text, own, output, Visible(unknown) + " is not in --from");
             return kRefused;
         }
-        const Function permuted = function.Over(to);
+        kq_logic::Function permuted;
+        const std::string fault = kq_logic::Permute(function, to, permuted);
+        if (!fault.empty()) {
+            Refuse(text, own, output, fault);
+            return kRefused;
+        }
         const auto toJson = [&] {
             return Json{{"from", {{"inputs", function.Inputs()}, {"hex", function.Hex()}}},
                         {"inputs", to},

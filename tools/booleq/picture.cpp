@@ -35,7 +35,7 @@ std::string TextElement(size_t x, size_t y, const std::string& attributes, const
 
 } // namespace
 
-bool HasPicture(const Function& function, const std::string& what, const Text& text,
+bool HasPicture(const kq_logic::Function& function, const std::string& what, const Text& text,
                 const Request& request, Output& output)
 {
     if (function.NumInputs() > 0 && function.NumInputs() <= kMaxInputs)

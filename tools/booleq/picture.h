@@ -14,7 +14,7 @@ constexpr size_t kCharacterWidth = 9; // of the font, about; all lengths are pix
 
 // True for one to six inputs.
 // Fails: false, and the refusal has been said: return kRefused. 'what' has so many inputs: "a map".
-bool HasPicture(const Function& function, const std::string& what, const Text& text,
+bool HasPicture(const kq_logic::Function& function, const std::string& what, const Text& text,
                 const Request& request, Output& output);
 
 std::string SvgHead(size_t width, size_t height);

@@ -23,6 +23,12 @@ class Progress {
         if (m_is_terminal && done >= m_next)
             Write(done);
     }
+    // The same for work that counts slowly: the clock is asked each time.
+    void ShowNow(uint64_t done)
+    {
+        if (m_is_terminal)
+            Write(done);
+    }
 
   private:
     void Write(uint64_t done);

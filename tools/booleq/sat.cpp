@@ -3,7 +3,6 @@
 
 #include "commands.h"
 #include "decide.h"
-#include "equality.h"
 #include "text.h"
 
 namespace booleq {
@@ -12,40 +11,41 @@ namespace {
 
 // The question: is there an assignment for which the equation has the value that is looked for.
 // Different answers yes, Equal no.
-bool IsYes(const Decision& decision, bool asksAlways)
+bool IsYes(const kq_logic::Decision& decision, bool asksAlways)
 {
-    return asksAlways ? decision.IsEqual() : decision.IsDifferent();
+    return asksAlways ? IsEqual(decision) : IsDifferent(decision);
 }
 
-int StatusOf(const Decision& decision, bool asksAlways)
+int StatusOf(const kq_logic::Decision& decision, bool asksAlways)
 {
-    if (decision.verdict == Verdict::Undecided)
+    if (decision.verdict == kq_logic::Verdict::Undecided)
         return kUndecided;
     return IsYes(decision, asksAlways) ? kDone : kFindings;
 }
 
-void PutText(const Decision& decision, bool asksAlways, const Limits& limits, Output& output)
+void PutText(const kq_logic::Decision& decision, bool asksAlways, double seconds, Output& output)
 {
-    if (decision.IsEqual())
+    if (IsEqual(decision))
         output.Put((asksAlways ? "always 1, over " : "never 1, over ") +
                    Count(decision.inputs.size(), "input") + "\n");
-    else if (decision.IsDifferent())
+    else if (IsDifferent(decision))
         output.Put((asksAlways ? "not always 1, 0 " : "satisfiable, 1 ") + PlaceText(decision) +
-                   "\n  " + AssignmentLine(decision) + "\n");
+                   "\n  " + ValuesByName(decision.inputs, decision.assignment) + "\n");
     else
-        output.Put(UndecidedText(decision, limits) + "\n");
+        output.Put(UndecidedText(decision, seconds) + "\n");
 }
 
-Json AsJson(const Decision& decision, bool asksAlways)
+Json AsJson(const kq_logic::Decision& decision, bool asksAlways)
 {
     Json result;
-    const bool isDecided = decision.verdict != Verdict::Undecided;
+    const bool isDecided = decision.verdict != kq_logic::Verdict::Undecided;
     result[asksAlways ? "always" : "satisfiable"] =
         isDecided ? Json(IsYes(decision, asksAlways)) : Json();
     result["inputs"] = decision.inputs;
-    result["row"] = decision.IsDifferent() ? RowJson(decision) : Json();
-    result["is_first"] = decision.IsDifferent() ? Json(decision.isFirstRow) : Json();
-    result["assignment"] = decision.IsDifferent() ? AssignmentJson(decision) : Json();
+    result["row"] = IsDifferent(decision) ? RowJson(decision) : Json();
+    result["is_first"] = IsDifferent(decision) ? Json(decision.isFirstRow) : Json();
+    result["assignment"] =
+        IsDifferent(decision) ? AssignmentJson(decision.inputs, decision.assignment) : Json();
     if (!isDecided)
         result["reason"] = decision.reason;
     return result;
@@ -54,22 +54,21 @@ Json AsJson(const Decision& decision, bool asksAlways)
 int RunSat(const Request& request, Output& output)
 {
     CheckClauseOptions(request);
-    const Limits limits = ParseLimits(request, 0);
+    const double seconds = ParseSeconds(request, 0);
     const bool asksAlways = request.Has("--always");
     return ForEachText(request, output, [&](const Text& text) {
         Kq_BoolEquation equation;
         if (!SetEquation(text, request, output, equation))
             return kRefused;
-        const Kq_BoolEquation constant(asksAlways ? "1" : "0");
-        Decision decision;
+        kq_logic::Decision decision;
         int status = kDone;
         {
-            const DecidingProgress progress;
-            decision = DecideEquations(equation, constant, limits);
+            const WorkingProgress progress;
+            decision = kq_logic::DecideConstant(equation, asksAlways, {seconds});
             if (WantsClauses(request))
                 status = WriteClauses(request, output,
                                       ClausesOfValue(ToExpression(equation), !asksAlways),
-                                      decision.verdict, limits);
+                                      decision.verdict, seconds);
         }
         const int answer = StatusOf(decision, asksAlways);
         const char* const word =
@@ -77,7 +76,7 @@ int RunSat(const Request& request, Output& output)
         return Say(text, request, output,
                    {std::max(status, answer), word, LineMark::Prefix,
                     [&] { return AsJson(decision, asksAlways); },
-                    [&] { PutText(decision, asksAlways, limits, output); }});
+                    [&] { PutText(decision, asksAlways, seconds, output); }});
     });
 }
 

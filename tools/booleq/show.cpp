@@ -1,6 +1,7 @@
 // The command 'show': everything the library answers about one equation.
 #include "answer.h"
 #include "commands.h"
+#include "function.h"
 #include "options.h"
 #include "table_rows.h"
 #include "text.h"

@@ -41,8 +41,8 @@ void AnnounceSize(const std::vector<std::string>& names, uint64_t maxRows, RowFo
                          std::to_string(numBytes / 1000000) + " MB");
 }
 
-void PutRows(const Text& text, const Request& request, const Function& function, RowFormat format,
-             Output& output)
+void PutRows(const Text& text, const Request& request, const kq_logic::Function& function,
+             RowFormat format, Output& output)
 {
     const std::vector<std::string>& names = function.Inputs();
     const uint64_t maxRows = request.Has("--rows") ? ParseRows(request.Get("--rows"))
@@ -71,7 +71,7 @@ int RunTable(const Request& request, Output& output)
     Request asJson = request;             // refusals are answered in the format asked for
     asJson.json = format == RowFormat::kJson;
     return ForEachText(asJson, output, [&](const Text& text) {
-        Function function;
+        kq_logic::Function function;
         if (!SetFunction(text, asJson, output, function))
             return kRefused;
         if (text.line > 0 && format != RowFormat::kJson)

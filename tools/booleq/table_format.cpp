@@ -18,15 +18,24 @@ constexpr size_t kNoColumn = static_cast<size_t>(-1);
 // swallow the rest of the file.  Fails: false when a quote is not closed or has text behind it.
 bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
 {
-    fields.assign(1, std::string());
-    for (size_t position = 0; position < line.size(); ++position) {
-        if (line[position] == ',') {
+    size_t numFields = 0;
+    // The texts of the line before are written over, so that their memory serves again.
+    const auto next = [&]() -> std::string& {
+        if (numFields == fields.size())
             fields.emplace_back();
+        fields[numFields].clear();
+        return fields[numFields++];
+    };
+    std::string* field = &next();
+    bool isSplit = true;
+    for (size_t position = 0; isSplit && position < line.size(); ++position) {
+        if (line[position] == ',') {
+            field = &next();
             continue;
         }
         if (line[position] != '"') {
             const size_t end = std::min(line.find(',', position), line.size());
-            fields.back().assign(line, position, end - position);
+            field->assign(line, position, end - position);
             position = end - 1;
             continue;
         }
@@ -35,12 +44,13 @@ bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
             if (isQuote && (position + 1 == line.size() || line[position + 1] != '"'))
                 break;
             position += isQuote ? 1u : 0u;
-            fields.back() += line[position];
+            *field += line[position];
         }
-        if (position == line.size() || (position + 1 < line.size() && line[position + 1] != ','))
-            return false;
+        isSplit =
+            position < line.size() && (position + 1 == line.size() || line[position + 1] == ',');
     }
-    return true;
+    fields.resize(numFields);
+    return isSplit;
 }
 
 BatchResult Refused(std::string message)
@@ -84,7 +94,6 @@ class CsvFormat : public TableFormat {
 
     BatchResult ReadRow(const std::string& line, BatchRow& row) override
     {
-        m_fields.clear();
         const bool isSplit = SplitCsv(WithoutLineEnd(line), m_fields);
         const size_t numFields = m_fields.size();
         m_fields.resize(m_num_columns); // what a bad row has stays in its columns
@@ -99,8 +108,16 @@ class CsvFormat : public TableFormat {
                            std::to_string(m_num_columns));
         row.equation = m_fields[m_equation];
         row.init = m_fields[m_init];
-        if (!IsBlank(m_fields[m_inputs]) && !SplitInputs(m_fields[m_inputs], row.inputs))
+        if (IsBlank(m_fields[m_inputs]))
+            return {};
+        if (m_fields[m_inputs] != m_list) { // often it is that of the line before
+            m_list = m_fields[m_inputs];
+            m_listed.clear();
+            m_is_listed = SplitInputs(m_list, m_listed);
+        }
+        if (!m_is_listed)
             return Refused("a single quote is not closed among the inputs");
+        row.inputs = m_listed;
         return {};
     }
 
@@ -109,8 +126,10 @@ class CsvFormat : public TableFormat {
     {
         if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
             m_fields[m_inputs] = Join(row.inputs, ",");
-            m_fields[m_equation] = row.equation;
-            m_fields[m_init] = row.init;
+            if (result.outcome == BatchOutcome::kFilled) {
+                m_fields[m_equation] = row.equation;
+                m_fields[m_init] = row.init;
+            }
         }
         m_fields[m_result] = OutcomeName(result.outcome);
         return CsvLine(m_fields);
@@ -132,7 +151,7 @@ class CsvFormat : public TableFormat {
     {
         std::string line;
         for (const std::string& field : fields) {
-            line += CsvField(field);
+            AppendCsvField(field, line);
             line += ',';
         }
         line.pop_back(); // a header has a field at least
@@ -146,6 +165,9 @@ class CsvFormat : public TableFormat {
     size_t m_result = kNoColumn;
     size_t m_num_written = 0;          // columns of what is written
     std::vector<std::string> m_fields; // of the line read last
+    std::string m_list;                // the inputs that were split last, and into what
+    std::vector<std::string> m_listed;
+    bool m_is_listed = true; // false: a quote is not closed
 };
 
 class JsonFormat : public TableFormat {

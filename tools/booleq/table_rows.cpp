@@ -104,14 +104,6 @@ uint64_t NumPrinted(const std::vector<std::string>& names, uint64_t maxRows)
 
 } // namespace
 
-std::vector<std::string> InputNames(const Kq_BoolEquation& equation)
-{
-    std::vector<std::string> names;
-    for (const auto& variable : equation.GetVariables())
-        names.push_back(ToStd(variable.first));
-    return names;
-}
-
 bool HasNumberedColumn(const std::vector<std::string>& names)
 {
     for (size_t index = 0; index < names.size(); ++index)
@@ -181,15 +173,26 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
 
 std::string CsvField(const std::string& text)
 {
-    const auto isSpecial = [](char character) {
-        return character == ',' || character == '"' || character == '\r' || character == '\n';
-    };
-    if (std::none_of(text.begin(), text.end(), isSpecial))
-        return text;
-    std::string field = "\"";
-    for (const char character : text)
-        field.append(character == '"' ? 2 : 1, character);
-    return field + "\"";
+    std::string field;
+    AppendCsvField(text, field);
+    return field;
+}
+
+void AppendCsvField(const std::string& text, std::string& line)
+{
+    if (text.find_first_of(",\"\r\n") == std::string::npos) {
+        line += text;
+        return;
+    }
+    line += '"';
+    for (size_t start = 0; start < text.size();) {
+        const size_t quote = std::min(text.find('"', start), text.size());
+        line.append(text, start, quote - start);
+        if (quote < text.size())
+            line += "\"\"";
+        start = quote + 1;
+    }
+    line += '"';
 }
 
 } // namespace booleq

@@ -33,10 +33,9 @@ uint64_t EstimateBytes(const std::vector<std::string>& names, uint64_t maxRows, 
 // bytes) where that is less.
 void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output);
 
-std::vector<std::string> InputNames(const Kq_BoolEquation& equation);
-
 // A field of CSV: in double quotes where it must be.
 std::string CsvField(const std::string& text);
+void AppendCsvField(const std::string& text, std::string& line);
 
 } // namespace booleq
 

@@ -67,7 +67,7 @@ def main():
     parser.add_argument("--rounds", type=int, default=7)
     parser.add_argument("--filter", default="/ours$")
     parser.add_argument("--min-time", default="0.05")
-    arguments = parser.parse_args()
+    arguments = parser.parse_intermixed_args()
 
     names = arguments.names or sorted(list_executables(arguments.old) &
                                       list_executables(arguments.new))

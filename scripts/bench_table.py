@@ -1,13 +1,13 @@
 #!/usr/bin/env python3
-"""Turns the results of the benchmark executables into tables.
+"""Runs benchmark executables and turns their results into tables.
 
-usage: bench_table.py RESULTS... [--pairs] [--doc FILE]
+usage: bench_table.py BUILD [NAME...] [--pairs] [--doc] [--benchmark_OPTION...]
 
-Reads the files of results, as Google Benchmark writes them in JSON, and prints what the library
-takes against its baselines, then how each step grows, and what two threads get done; with --pairs
-also every formula by itself.
-With --doc the tables, and the machine they come from, replace what FILE holds between its two
-'figures' marks.
+Runs BUILD/bench/bench_NAME, all when there is no NAME, keeps the results in BUILD/results, and
+prints what the library takes against its baselines, then how each step grows, and what two threads
+get done; with --pairs also every formula by itself.
+With --doc the tables, and the machine they come from, replace what docs/benchmarks.md holds between
+its two 'figures' marks.
 Times are processor time: the median of all repetitions, the shortest in brackets. Of several
 formulas in one line, the one with the worst ratio is shown.
 Exit status: 1 when a case gave a wrong answer or could not be measured.
@@ -278,24 +278,52 @@ def write_document(path, parts):
     pathlib.Path(path).write_text(before + figures + after)
 
 
-def main():
-    parser = argparse.ArgumentParser(description="tables of benchmark results")
-    parser.add_argument("results", nargs="+")
-    parser.add_argument("--pairs", action="store_true")
-    parser.add_argument("--doc", metavar="FILE")
-    arguments = parser.parse_args()
+ALL = ["set", "read", "eval", "render", "column", "init_value", "truth_table", "road", "threads",
+       "luts"]
 
-    cases, contexts = read_results(arguments.results)
+
+def run_executables(build, names, options):
+    """Runs bench_NAME of each name; the files of results."""
+    folder = build / "results"
+    folder.mkdir(parents=True, exist_ok=True)
+    results = []
+    for name in (word.removeprefix("bench_") for word in names or ALL):
+        executable = build / "bench" / f"bench_{name}"
+        if not executable.exists():
+            sys.exit(f"no such benchmark: {name} ({', '.join(ALL)})")
+        print(f"running bench_{name}", file=sys.stderr)
+        results.append(folder / f"bench_{name}.json")
+        done = subprocess.run(
+            [executable, *options, f"--benchmark_out={results[-1]}", "--benchmark_out_format=json"],
+            stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True, check=False)
+        if done.returncode != 0:
+            sys.exit(f"{done.stdout}bench_{name} failed")
+    return results
+
+
+def main():
+    parser = argparse.ArgumentParser(prog="./dev bench", description="runs benchmarks, shows tables")
+    parser.add_argument("build", type=pathlib.Path, help=argparse.SUPPRESS)
+    parser.add_argument("names", nargs="*")
+    parser.add_argument("--pairs", action="store_true")
+    parser.add_argument("--doc", action="store_true")
+    arguments, options = parser.parse_known_intermixed_args()
+    strange = [option for option in options if not option.startswith("--benchmark_")]
+    if strange:
+        parser.error(f"no such option: {strange[0]}")
+
+    cases, contexts = read_results(run_executables(arguments.build, arguments.names, options))
     if not cases:
-        sys.exit("bench_table.py: there are no results in these files")
+        sys.exit("there are no results")
     targets, shapes, threads = target_table(cases), shape_table(cases), thread_table(cases)
     run = [["run", ""]] + describe_run(contexts)
     shown = [run[1:], targets, shapes, threads]
     shown += [pair_table(cases)] if arguments.pairs else []
     print("\n\n".join(format_text(table) for table in shown if len(table) > 1))
     if arguments.doc:
-        write_document(arguments.doc, [format_markdown(table)
-                                       for table in (run, targets, shapes, threads)])
+        document = pathlib.Path(__file__).resolve().parent.parent / "docs" / "benchmarks.md"
+        write_document(document, [format_markdown(table)
+                                  for table in (run, targets, shapes, threads)])
     failed = [f"{name}: {case.error}" for name, case in cases.items() if case.error]
     for line in failed:
         print("failed:", line, file=sys.stderr)

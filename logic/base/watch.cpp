@@ -6,6 +6,7 @@ namespace booleq {
 namespace {
 
 Watcher current = nullptr;
+thread_local unsigned int numPauses = 0;
 
 } // namespace
 
@@ -16,8 +17,18 @@ void SetWatch(Watcher watcher)
 
 void Watch()
 {
-    if (current)
+    if (current && numPauses == 0)
         current();
+}
+
+WatchPause::WatchPause()
+{
+    ++numPauses;
+}
+
+WatchPause::~WatchPause()
+{
+    --numPauses;
 }
 
 bool WatchAndGoOn(void* /*context*/)

@@ -14,6 +14,16 @@ void SetWatch(Watcher watcher);
 
 void Watch();
 
+// As long as one lives, Watch() does nothing in its thread: a watcher is called in the thread that
+// a caller waits in, not in those that help it.
+class WatchPause {
+  public:
+    WatchPause();
+    ~WatchPause();
+    WatchPause(const WatchPause&) = delete;
+    WatchPause& operator=(const WatchPause&) = delete;
+};
+
 // Every how many words Watch is called where a word's cost is anybody's.
 constexpr uint64_t kWatchedWords = 16;
 

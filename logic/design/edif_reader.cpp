@@ -526,10 +526,11 @@ class EdifReader {
             m_cells[joint.instance == kNone ? cell : m_instances[joint.instance].cell];
         joint.port = FindPort(owner, port);
         const uint32_t numBits = owner.ports[joint.port].numBits;
-        if (member != kNone && member >= numBits)
+        const bool isVector = VectorType(owner, owner.ports[joint.port]) != nullptr;
+        if (member != kNone && member >= numBits && !isVector)
             Refuse("port " + Quoted(port) + " has " + Count(numBits, "bit") + ", and no member " +
                    std::to_string(member));
-        if (member == kNone && numBits != 1)
+        if (member == kNone && numBits != 1 && !isVector)
             Refuse("port " + Quoted(port) + " is an array; say which member");
         joint.member = member == kNone ? 0 : static_cast<uint32_t>(member);
         m_joints.push_back(joint);
@@ -659,9 +660,10 @@ class EdifReader {
     {
         const EdifCell& cell = m_cells[instance.cell];
         const EdifPort& port = cell.ports[first->port];
-        uint32_t numBits = port.numBits;
-        if (numBits > 1)
-            numBits = std::max(first->member + 1, OwnWidth(instance, port, numBits));
+        const CellType* vector = VectorType(cell, port);
+        const uint32_t numBits = vector == nullptr
+                                     ? port.numBits
+                                     : std::max(first->member + 1, OwnWidth(instance, *vector));
         m_pin_nets.assign(numBits, kNetOpen);
         for (const EdifJoint* joint = first; joint != last; ++joint) {
             LocalNet& net = m_pin_nets[BitOf(*joint, numBits)];
@@ -673,24 +675,29 @@ class EdifReader {
         m_intake.AddPin(m_job.design.names.Text(port.name), m_pin_nets.data(), m_pin_nets.size());
     }
 
-    // Yosys has one cell $lut with as many bits as the widest needs; a narrower one says its own
-    // width and leaves out the last members.
-    uint32_t OwnWidth(const EdifInstance& instance, const EdifPort& port, uint32_t numBits) const
+    // The type of a cell whose port has any number of bits, else null. Yosys has one cell $lut for
+    // all of them, with the bits of one: an instance says its own width, and members count from it.
+    const CellType* VectorType(const EdifCell& cell, const EdifPort& port) const
     {
-        const EdifCell& cell = m_cells[instance.cell];
         const std::vector<uint32_t>* variants = m_job.cellTypes.Find(std::string(cell.typeText));
         if (variants == nullptr)
-            return numBits;
+            return nullptr;
         const CellType& type = m_job.cellTypes.All()[variants->front()];
-        if (type.vectorPin.empty() || type.vectorPin != m_job.design.names.Text(port.name))
-            return numBits;
+        return !type.vectorPin.empty() && type.vectorPin == m_job.design.names.Text(port.name)
+                   ? &type
+                   : nullptr;
+    }
+
+    // 0 where the instance does not say it: as many as are joined.
+    uint32_t OwnWidth(const EdifInstance& instance, const CellType& type) const
+    {
         for (uint32_t property = 0; property < instance.numProperties; ++property) {
             const EdifProperty& own = m_properties[instance.firstProperty + property];
             if (own.name == type.widthParameter && own.value.isNumber &&
-                own.value.number <= numBits)
+                own.value.number <= kMaxPortBits)
                 return static_cast<uint32_t>(own.value.number);
         }
-        return 0; // as many as are joined
+        return 0;
     }
 
     // What an identifier means in the view that is read.

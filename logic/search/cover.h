@@ -23,6 +23,8 @@ constexpr unsigned int kMaxCoverInputs = 16;
 // None for the constant 0; one without inputs for the constant 1.
 // Requires: at most kMaxCoverInputs inputs.
 std::vector<Cube> FindCover(const Rows& function);
+// CountLiterals(FindCover(function)), without the products.  Requires: as above.
+size_t CountCoverLiterals(const Rows& function);
 
 size_t CountLiterals(const std::vector<Cube>& cubes);
 

@@ -1,17 +1,13 @@
 #include "formula.h"
 
 #include <algorithm>
+#include <array>
+#include <iterator>
 #include <utility>
 
 namespace booleq {
 
 namespace {
-
-// A formula and its inversion, each with inversions placed so that they are fewest.
-struct Settled {
-    Formula formula[2];
-    size_t numInversions[2];
-};
 
 Operator Dual(Operator op)
 {
@@ -26,73 +22,105 @@ Formula Plain(Operator op, std::vector<Formula> operands)
     return formula;
 }
 
-Settled Settle(const Formula& formula);
-
-// AND of the operands is the inversion of the OR of their inversions, and the other way round.
-Settled SettleProduct(Operator op, const std::vector<Settled>& operands)
+Formula Around(Operator op, Formula operand)
 {
-    std::vector<Formula> sides[2];
-    size_t numInversions[2] = {0, 0};
-    for (const Settled& operand : operands) {
-        for (const int side : {0, 1}) {
-            sides[side].push_back(operand.formula[side]);
-            numInversions[side] += operand.numInversions[side];
-        }
-    }
-    Settled settled;
-    for (const int side : {0, 1}) {
-        // Without an inversion of its own the result has the operands of the same side.
-        const bool isInverted = numInversions[1 - side] + 1 < numInversions[side];
-        const int used = isInverted ? 1 - side : side;
-        const Formula inner = Plain(used == 0 ? op : Dual(op), sides[used]);
-        settled.formula[side] = isInverted ? Plain(Operator::Not, {inner}) : inner;
-        settled.numInversions[side] = numInversions[used] + (isInverted ? 1 : 0);
-    }
-    return settled;
+    std::vector<Formula> operands;
+    operands.push_back(std::move(operand));
+    return Plain(op, std::move(operands));
 }
 
-Settled SettleSum(const std::vector<Settled>& operands)
+// How many inversions a formula (side 0) and its inversion (side 1) need, placed so that they are
+// fewest; and what is needed to write either.
+typedef std::array<size_t, 2> Sides;
+struct Settled {
+    const Formula* formula = nullptr; // not a Not
+    bool isFlipped = false;           // side 0 is that formula's inversion
+    uint32_t firstInput = UINT32_MAX; // the least it mentions
+    Sides numInversions = {0, 0};
+    std::vector<Settled> operands;
+};
+
+// AND of the operands is the inversion of the OR of their inversions, and the other way round.
+// Whether a side is written so.
+bool IsByInversion(const Sides& sums, size_t side)
 {
-    std::vector<Formula> chosen;
-    size_t numInversions = 0;
+    return sums[1 - side] + 1 < sums[side];
+}
+
+Sides SumInversions(const std::vector<Settled>& operands)
+{
+    Sides sums = {0, 0};
+    for (const Settled& operand : operands)
+        for (const size_t side : {0, 1})
+            sums[side] += operand.numInversions[side];
+    return sums;
+}
+
+// The side of an operand of an exclusive OR that needs fewer.
+size_t BetterSide(const Settled& settled)
+{
+    return settled.numInversions[1] < settled.numInversions[0] ? 1 : 0;
+}
+
+// The side of an exclusive OR that needs no inversion of its own.
+size_t PlainSide(const std::vector<Settled>& operands)
+{
     size_t numFlips = 0;
-    for (const Settled& operand : operands) {
-        const int side = operand.numInversions[1] < operand.numInversions[0] ? 1 : 0;
-        chosen.push_back(operand.formula[side]);
-        numInversions += operand.numInversions[side];
-        numFlips += static_cast<size_t>(side);
-    }
-    const size_t wantedSide = numFlips % 2; // the side that needs no inversion of its own
-    Settled settled;
-    settled.formula[wantedSide] = Plain(Operator::Xor, chosen);
-    settled.numInversions[wantedSide] = numInversions;
-    settled.formula[1 - wantedSide] = Plain(Operator::Not, {Plain(Operator::Xor, chosen)});
-    settled.numInversions[1 - wantedSide] = numInversions + 1;
-    return settled;
+    for (const Settled& operand : operands)
+        numFlips += BetterSide(operand);
+    return numFlips % 2;
 }
 
 Settled Settle(const Formula& formula)
 {
     if (formula.op == Operator::Not) {
         Settled settled = Settle(formula.operands[0]);
-        std::swap(settled.formula[0], settled.formula[1]);
+        settled.isFlipped = !settled.isFlipped;
         std::swap(settled.numInversions[0], settled.numInversions[1]);
         return settled;
     }
-    if (formula.operands.empty())
-        return {{formula, MakeNot(formula)}, {0, formula.op == Operator::Input ? 1u : 0u}};
-    std::vector<Settled> operands;
-    for (const Formula& operand : formula.operands)
-        operands.push_back(Settle(operand));
-    return formula.op == Operator::Xor ? SettleSum(operands) : SettleProduct(formula.op, operands);
+    Settled settled;
+    settled.formula = &formula;
+    if (formula.operands.empty()) {
+        if (formula.op == Operator::Input) {
+            settled.firstInput = formula.input;
+            settled.numInversions[1] = 1;
+        }
+        return settled;
+    }
+    settled.operands.reserve(formula.operands.size());
+    for (const Formula& operand : formula.operands) {
+        settled.operands.push_back(Settle(operand));
+        settled.firstInput = std::min(settled.firstInput, settled.operands.back().firstInput);
+    }
+    if (formula.op == Operator::Xor) {
+        size_t least = 0;
+        for (const Settled& operand : settled.operands)
+            least += operand.numInversions[BetterSide(operand)];
+        const size_t plainSide = PlainSide(settled.operands);
+        settled.numInversions[plainSide] = least;
+        settled.numInversions[1 - plainSide] = least + 1;
+        return settled;
+    }
+    const Sides sums = SumInversions(settled.operands);
+    for (const size_t side : {0, 1})
+        settled.numInversions[side] = IsByInversion(sums, side) ? sums[1 - side] + 1 : sums[side];
+    return settled;
 }
 
-uint32_t FirstInput(const Formula& formula)
+// Operands in the order of their inputs.
+std::vector<const Settled*> Sorted(const std::vector<Settled>& operands)
 {
-    uint32_t first = formula.op == Operator::Input ? formula.input : UINT32_MAX;
-    for (const Formula& operand : formula.operands)
-        first = std::min(first, FirstInput(operand));
-    return first;
+    std::vector<const Settled*> sorted;
+    sorted.reserve(operands.size());
+    for (const Settled& operand : operands)
+        sorted.push_back(&operand);
+    // As they were where that is the same: they stand in one array.
+    std::sort(sorted.begin(), sorted.end(), [](const Settled* left, const Settled* right) {
+        return left->firstInput != right->firstInput ? left->firstInput < right->firstInput
+                                                     : left < right;
+    });
+    return sorted;
 }
 
 Operator Negated(Operator op)
@@ -101,35 +129,33 @@ Operator Negated(Operator op)
                                : (op == Operator::Or ? Operator::Nor : Operator::Nxor);
 }
 
-uint32_t Append(const Formula& formula, Expression& expression)
+// Adds the formula, or for side 1 its inversion, with inversions where they were settled.
+uint32_t Append(const Settled& settled, size_t side, Expression& expression)
 {
-    if (formula.op == Operator::Input)
-        return AddInput(expression, formula.input);
-    if (formula.operands.empty())
-        return AddConstant(expression, formula.op == Operator::One);
-    Operator last = formula.op;
-    const Formula* inner = &formula;
-    if (formula.op == Operator::Not) {
-        inner = &formula.operands[0];
-        // Of two operands the operator itself is negated.
-        if (inner->operands.size() != 2)
-            return AddNot(expression, Append(*inner, expression));
-        last = Negated(inner->op);
+    const size_t own = settled.isFlipped ? 1 - side : side; // of the formula that is pointed to
+    const Formula& formula = *settled.formula;
+    if (formula.op == Operator::Input) {
+        const uint32_t node = AddInput(expression, formula.input);
+        return own == 0 ? node : AddNot(expression, node);
     }
-    std::vector<const Formula*> operands;
-    for (const Formula& operand : inner->operands)
-        operands.push_back(&operand);
-    std::stable_sort(operands.begin(), operands.end(),
-                     [](const Formula* left, const Formula* right) {
-                         return FirstInput(*left) < FirstInput(*right);
-                     });
-    uint32_t node = Append(*operands[0], expression);
-    for (size_t operand = 1; operand < operands.size(); ++operand) {
-        const uint32_t right = Append(*operands[operand], expression);
-        const bool isLast = operand + 1 == operands.size();
-        node = AddBinary(expression, isLast ? last : inner->op, node, right);
+    if (settled.operands.empty())
+        return AddConstant(expression, (formula.op == Operator::One) == (own == 0));
+    const bool isXor = formula.op == Operator::Xor;
+    const bool isInverted = isXor ? own != PlainSide(settled.operands)
+                                  : IsByInversion(SumInversions(settled.operands), own);
+    const size_t used = isInverted ? 1 - own : own; // of the operands, but for exclusive OR
+    const Operator op = isXor || used == 0 ? formula.op : Dual(formula.op);
+    const std::vector<const Settled*> operands = Sorted(settled.operands);
+    // Of two operands the operator itself is negated.
+    const bool isNegated = isInverted && operands.size() == 2;
+    uint32_t node = 0;
+    for (size_t place = 0; place < operands.size(); ++place) {
+        const Settled& operand = *operands[place];
+        const uint32_t right = Append(operand, isXor ? BetterSide(operand) : used, expression);
+        node =
+            place == 0 ? right : AddBinary(expression, isNegated ? Negated(op) : op, node, right);
     }
-    return node;
+    return isInverted && !isNegated ? AddNot(expression, node) : node;
 }
 
 } // namespace
@@ -149,23 +175,27 @@ Formula MakeInput(uint32_t input)
     return formula;
 }
 
-Formula MakeNot(const Formula& operand)
+Formula MakeNot(Formula operand)
 {
     if (operand.op == Operator::Zero || operand.op == Operator::One)
         return MakeConstant(operand.op == Operator::Zero);
-    if (operand.op == Operator::Not)
-        return operand.operands[0];
-    return Plain(Operator::Not, {operand});
+    if (operand.op == Operator::Not) {
+        Formula inner = std::move(operand.operands[0]);
+        return inner;
+    }
+    return Around(Operator::Not, std::move(operand));
 }
 
-Formula Join(Operator op, const Formula& left, const Formula& right)
+Formula Join(Operator op, Formula left, Formula right)
 {
     std::vector<Formula> operands;
-    for (const Formula* side : {&left, &right}) {
-        if (side->op == op)
-            operands.insert(operands.end(), side->operands.begin(), side->operands.end());
+    for (Formula* const side : {&left, &right}) {
+        if (side->op == op && operands.empty())
+            operands = std::move(side->operands);
+        else if (side->op == op)
+            std::move(side->operands.begin(), side->operands.end(), std::back_inserter(operands));
         else
-            operands.push_back(*side);
+            operands.push_back(std::move(*side));
     }
     return Plain(op, std::move(operands));
 }
@@ -182,7 +212,7 @@ Expression ToExpression(const Formula& formula, const std::vector<std::string>& 
 {
     Expression expression;
     expression.names = names;
-    Append(Settle(formula).formula[0], expression);
+    Append(Settle(formula), 0, expression);
     return expression;
 }
 

@@ -20,9 +20,9 @@ struct Formula {
 Formula MakeConstant(bool value);
 Formula MakeInput(uint32_t input);
 // The inversion; constants and inversions of inversions are taken away.
-Formula MakeNot(const Formula& operand);
+Formula MakeNot(Formula operand);
 // And, Or or Xor of two formulas that are no constants; a chain of one operator becomes one.
-Formula Join(Operator op, const Formula& left, const Formula& right);
+Formula Join(Operator op, Formula left, Formula right);
 
 // Inputs as they are written, repeated ones counted again.
 size_t CountLiterals(const Formula& formula);

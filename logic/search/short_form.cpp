@@ -1,7 +1,10 @@
 #include "short_form.h"
 
 #include <algorithm>
+#include <array>
+#include <cassert>
 #include <map>
+#include <utility>
 
 #include "cover.h"
 #include "formula.h"
@@ -17,69 +20,151 @@ constexpr size_t kMaxProducts = 1000;         // more are no expression for peop
 constexpr unsigned int kMaxSplitInputs = 10;  // two sets of these are tried each way
 constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of these are compared
 
-// Some input of 'inputs' being 1 or 0 makes it 1 (isSome), or both do.
-Rows Quantify(const Rows& function, const std::vector<unsigned int>& inputs, bool isSome)
-{
-    Rows result(function);
-    for (const unsigned int input : inputs) {
-        const Rows low = Cofactor(result, input, false);
-        const Rows high = Cofactor(result, input, true);
-        result = isSome ? (low | high) : (low & high);
+// Sets of inputs: bit k is input k.
+typedef uint32_t InputSet;
+
+// What is left of a function when inputs are taken from it: Some is 1 where any values of theirs
+// make it 1, All where all do, Fixed where they are 0.
+class Parts {
+  public:
+    explicit Parts(const Rows& function) : m_function(function) {}
+
+    Rows Some(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& high) { return low | high; });
     }
-    return result;
-}
+    Rows All(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& high) { return low & high; });
+    }
+    Rows Fixed(InputSet inputs) const
+    {
+        return Without(inputs, [](const Rows& low, const Rows& /*high*/) { return low; });
+    }
 
-Rows FixAll(const Rows& function, const std::vector<unsigned int>& inputs)
-{
-    Rows result(function);
-    for (const unsigned int input : inputs)
-        result = Cofactor(result, input, false);
-    return result;
-}
+  private:
+    template <class Merge>
+    Rows Without(InputSet inputs, const Merge& merge) const
+    {
+        Rows result(m_function);
+        for (; inputs != 0; inputs &= inputs - 1) {
+            const auto input = static_cast<unsigned int>(__builtin_ctz(inputs));
+            result = merge(Cofactor(result, input, false), Cofactor(result, input, true));
+        }
+        return result;
+    }
 
-// Takes out the literal that most products share, again and again.
-// The depth is at most the number of products and literals.
-Formula Factor(const std::vector<Cube>& cubes, unsigned int numInputs)
+    const Rows& m_function;
+};
+
+// The same of a function in one word, made for all sets at once: each of one with an input less.
+class WordParts {
+  public:
+    static constexpr unsigned int kMaxInputs = 6;
+
+    explicit WordParts(const Rows& function) : m_num_inputs(function.NumInputs())
+    {
+        assert(m_num_inputs <= kMaxInputs);
+        m_some[0] = m_all[0] = m_fixed[0] = function.Words()[0];
+        for (InputSet inputs = 1; inputs < InputSet(1) << m_num_inputs; ++inputs) {
+            const InputSet others = inputs & (inputs - 1);
+            const unsigned int bit =
+                m_num_inputs - 1 - static_cast<unsigned int>(__builtin_ctz(inputs));
+            m_some[inputs] = Low(m_some[others], bit) | High(m_some[others], bit);
+            m_all[inputs] = Low(m_all[others], bit) & High(m_all[others], bit);
+            m_fixed[inputs] = Low(m_fixed[others], bit);
+        }
+    }
+
+    Rows Some(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_some[inputs]); }
+    Rows All(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_all[inputs]); }
+    Rows Fixed(InputSet inputs) const { return Rows::OfWord(m_num_inputs, m_fixed[inputs]); }
+
+  private:
+    typedef std::array<uint64_t, size_t(1) << kMaxInputs> OfSets;
+
+    static uint64_t Low(uint64_t word, unsigned int bit)
+    {
+        const uint64_t half = word & ~BitPattern(bit);
+        return half | half << (1u << bit);
+    }
+    static uint64_t High(uint64_t word, unsigned int bit)
+    {
+        const uint64_t half = word & BitPattern(bit);
+        return half | half >> (1u << bit);
+    }
+
+    unsigned int m_num_inputs;
+    OfSets m_some;
+    OfSets m_all;
+    OfSets m_fixed;
+};
+
+// Brings the products with the literal that most share to the front, and takes it out of them.
+// Gives back the end of those; 'begin' when the products have no literals.
+Cube* TakeOutLiteral(Cube* begin, Cube* end, Cube& literal)
 {
-    if (cubes.empty())
-        return MakeConstant(false);
-    size_t best = 0;
-    Cube literal = {0, 0};
-    for (unsigned int input = 0; input < numInputs; ++input) {
+    std::array<std::array<uint16_t, 2>, kMaxCoverInputs> counts = {}; // at most kMaxProducts
+    uint32_t allUsed = 0;
+    for (const Cube* cube = begin; cube != end; ++cube) {
+        allUsed |= cube->used;
+        for (uint32_t used = cube->used; used != 0; used &= used - 1) {
+            const auto input = static_cast<unsigned int>(__builtin_ctz(used));
+            ++counts[input][cube->values >> input & 1u];
+        }
+    }
+    size_t most = 0;
+    for (; allUsed != 0; allUsed &= allUsed - 1) {
+        const auto input = static_cast<unsigned int>(__builtin_ctz(allUsed));
         for (const uint32_t value : {0u, 1u}) {
-            const uint32_t bit = uint32_t(1) << input;
-            const auto count = static_cast<size_t>(
-                std::count_if(cubes.begin(), cubes.end(), [=](const Cube& cube) {
-                    return (cube.used & bit) != 0 && (cube.values & bit) == value << input;
-                }));
-            if (count > best) {
-                best = count;
-                literal = {bit, value << input};
+            if (counts[input][value] > most) {
+                most = counts[input][value];
+                literal = {uint32_t(1) << input, value << input};
             }
         }
     }
-    if (best == 0)
+    if (most == 0)
+        return begin;
+    Cube* const rest = std::partition(begin, end, [&](const Cube& cube) {
+        return (cube.used & literal.used) != 0 && (cube.values & literal.used) == literal.values;
+    });
+    for (Cube* cube = begin; cube != rest; ++cube)
+        *cube = {cube->used & ~literal.used, cube->values & ~literal.used};
+    assert(static_cast<size_t>(rest - begin) == most);
+    return rest;
+}
+
+// Takes out the literal that most products share, again and again. The products are changed.
+// The depth is at most the number of products and literals.
+Formula Factor(Cube* begin, Cube* end)
+{
+    if (begin == end)
+        return MakeConstant(false);
+    Cube literal = {0, 0};
+    Cube* const rest = TakeOutLiteral(begin, end, literal);
+    if (rest == begin)
         return MakeConstant(true); // a product without literals
-    std::vector<Cube> with;
-    std::vector<Cube> without;
-    for (const Cube& cube : cubes) {
-        if ((cube.used & literal.used) != 0 && (cube.values & literal.used) == literal.values)
-            with.push_back({cube.used & ~literal.used, cube.values & ~literal.used});
-        else
-            without.push_back(cube);
-    }
-    const auto input = static_cast<uint32_t>(__builtin_ctz(literal.used));
-    Formula formula = literal.values != 0 ? MakeInput(input) : MakeNot(MakeInput(input));
-    const Formula rest = Factor(with, numInputs);
-    if (rest.op != Operator::One)
-        formula = Join(Operator::And, formula, rest);
-    return without.empty() ? formula : Join(Operator::Or, formula, Factor(without, numInputs));
+    Formula formula = MakeInput(static_cast<uint32_t>(__builtin_ctz(literal.used)));
+    if (literal.values == 0)
+        formula = MakeNot(std::move(formula));
+    Formula with = Factor(begin, rest);
+    if (with.op != Operator::One)
+        formula = Join(Operator::And, std::move(formula), std::move(with));
+    if (rest == end)
+        return formula;
+    return Join(Operator::Or, std::move(formula), Factor(rest, end));
+}
+
+// CountLiterals(Factor(begin, end)), without the formula.
+size_t CountFactored(Cube* begin, Cube* end)
+{
+    Cube literal = {0, 0};
+    Cube* const rest = begin == end ? begin : TakeOutLiteral(begin, end, literal);
+    return rest == begin ? 0 : 1 + CountFactored(begin, rest) + CountFactored(rest, end);
 }
 
 class Search {
   public:
-    explicit Search(unsigned int numInputs) : m_num_inputs(numInputs) {}
-
     // False when a cover is too long. The depth is at most the number of inputs.
     bool Find(const Rows& function, Formula& formula)
     {
@@ -111,48 +196,61 @@ class Search {
             const Formula plain = MakeInput(input);
             Formula rest;
             if (IsZero(low))
-                return Find(high, rest) && Set(formula, Join(Operator::And, plain, rest));
+                return Find(high, rest) &&
+                       Set(formula, Join(Operator::And, plain, std::move(rest)));
             if (IsZero(high))
-                return Find(low, rest) && Set(formula, Join(Operator::And, MakeNot(plain), rest));
+                return Find(low, rest) &&
+                       Set(formula, Join(Operator::And, MakeNot(plain), std::move(rest)));
             if (IsOne(low))
-                return Find(high, rest) && Set(formula, Join(Operator::Or, MakeNot(plain), rest));
+                return Find(high, rest) &&
+                       Set(formula, Join(Operator::Or, MakeNot(plain), std::move(rest)));
             if (IsOne(high))
-                return Find(low, rest) && Set(formula, Join(Operator::Or, plain, rest));
+                return Find(low, rest) && Set(formula, Join(Operator::Or, plain, std::move(rest)));
             if (low == ~high)
-                return Find(low, rest) && Set(formula, Join(Operator::Xor, plain, rest));
+                return Find(low, rest) && Set(formula, Join(Operator::Xor, plain, std::move(rest)));
         }
         return false;
     }
 
-    // Two functions without a common input. The first input is always on the first side.
+    // Two functions without a common input.
     bool FindSplit(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
         if (support.size() > kMaxSplitInputs)
             return false;
+        return function.NumInputs() <= WordParts::kMaxInputs
+                   ? FindSplit(function, WordParts(function), support, formula)
+                   : FindSplit(function, Parts(function), support, formula);
+    }
+
+    // The first input is always on the first side.
+    template <class PartsOf>
+    bool FindSplit(const Rows& function, const PartsOf& parts,
+                   const std::vector<unsigned int>& support, Formula& formula)
+    {
         const uint32_t numSets = uint32_t(1) << (support.size() - 1);
         for (uint32_t set = 1; set < numSets; ++set) {
             Watch();
-            std::vector<unsigned int> sides[2];
-            sides[0].push_back(support[0]);
+            InputSet sides[2] = {InputSet(1) << support[0], 0};
             for (size_t place = 1; place < support.size(); ++place)
-                sides[set >> (place - 1) & 1u].push_back(support[place]);
-            if (Split(function, sides[0], sides[1], formula))
+                sides[set >> (place - 1) & 1u] |= InputSet(1) << support[place];
+            if (Split(function, parts, sides[0], sides[1], formula))
                 return true;
         }
         return false;
     }
 
-    bool Split(const Rows& function, const std::vector<unsigned int>& first,
-               const std::vector<unsigned int>& second, Formula& formula)
+    template <class PartsOf>
+    bool Split(const Rows& function, const PartsOf& parts, InputSet first, InputSet second,
+               Formula& formula)
     {
-        const Rows product[2] = {Quantify(function, second, true), Quantify(function, first, true)};
+        const Rows product[2] = {parts.Some(second), parts.Some(first)};
         if ((product[0] & product[1]) == function)
             return JoinParts(Operator::And, product[0], product[1], formula);
-        const Rows sum[2] = {Quantify(function, second, false), Quantify(function, first, false)};
+        const Rows sum[2] = {parts.All(second), parts.All(first)};
         if ((sum[0] | sum[1]) == function)
             return JoinParts(Operator::Or, sum[0], sum[1], formula);
-        const Rows left = FixAll(function, second);
-        const Rows right = function.At(0) ? ~FixAll(function, first) : FixAll(function, first);
+        const Rows left = parts.Fixed(second);
+        const Rows right = function.At(0) ? ~parts.Fixed(first) : parts.Fixed(first);
         if ((left ^ right) == function)
             return JoinParts(Operator::Xor, left, right, formula);
         return false;
@@ -163,39 +261,54 @@ class Search {
         Formula leftFormula;
         Formula rightFormula;
         return Find(left, leftFormula) && Find(right, rightFormula) &&
-               Set(formula, Join(op, leftFormula, rightFormula));
+               Set(formula, Join(op, std::move(leftFormula), std::move(rightFormula)));
     }
 
     // The shortest of the factored covers and an expansion.
     bool FindBest(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
-        bool isFound = false;
-        for (const bool isInverted : {false, true}) {
-            const std::vector<Cube> cover = FindCover(isInverted ? ~function : function);
+        size_t leastLiterals = SIZE_MAX;
+        std::vector<Cube> best;
+        bool isInverted = false;
+        for (const bool ofInverse : {false, true}) {
+            std::vector<Cube> cover = FindCover(ofInverse ? ~function : function);
             if (cover.size() > kMaxProducts)
                 continue;
-            const Formula factored = Factor(cover, m_num_inputs);
-            Keep(isInverted ? MakeNot(factored) : factored, isFound, formula);
+            std::vector<Cube> changed(cover);
+            const size_t numLiterals =
+                CountFactored(changed.data(), changed.data() + changed.size());
+            if (numLiterals >= leastLiterals)
+                continue;
+            leastLiterals = numLiterals;
+            best = std::move(cover);
+            isInverted = ofInverse;
         }
-        if (support.size() <= kMaxExpandInputs)
-            Expand(function, support, isFound, formula);
-        return isFound;
+        if (support.size() <= kMaxExpandInputs && Expand(function, support, leastLiterals, formula))
+            return true;
+        if (leastLiterals == SIZE_MAX)
+            return false;
+        Formula factored = Factor(best.data(), best.data() + best.size());
+        assert(CountLiterals(factored) == leastLiterals);
+        return Set(formula, isInverted ? MakeNot(std::move(factored)) : std::move(factored));
     }
 
-    // By the input whose parts have the shortest covers: as a multiplexer, or as one part that the
-    // input turns into the other.
-    void Expand(const Rows& function, const std::vector<unsigned int>& support, bool& isFound,
-                Formula& formula)
+    // An expansion by one input: a multiplexer, or one part that the input turns into the other.
+    struct Expansion {
+        unsigned int input = 0;
+        int kind = 0; // 0: a multiplexer; 1, 2: the part where the input is 0, or 1, is turned
+    };
+
+    // That whose parts have the shortest covers.
+    static Expansion ChooseExpansion(const Rows& function, const std::vector<unsigned int>& support)
     {
         size_t leastLiterals = SIZE_MAX;
-        unsigned int best = 0;
-        int bestKind = 0;
+        Expansion best;
         for (const unsigned int input : support) {
             const Rows low = Cofactor(function, input, false);
             const Rows high = Cofactor(function, input, true);
-            const size_t lowLiterals = CountLiterals(FindCover(low));
-            const size_t highLiterals = CountLiterals(FindCover(high));
-            const size_t changeLiterals = CountLiterals(FindCover(low ^ high));
+            const size_t lowLiterals = CountCoverLiterals(low);
+            const size_t highLiterals = CountCoverLiterals(high);
+            const size_t changeLiterals = CountCoverLiterals(low ^ high);
             const size_t counts[3] = {lowLiterals + highLiterals + 2,
                                       lowLiterals + changeLiterals + 1,
                                       highLiterals + changeLiterals + 1};
@@ -203,43 +316,44 @@ class Search {
                 if (counts[kind] >= leastLiterals)
                     continue;
                 leastLiterals = counts[kind];
-                best = input;
-                bestKind = kind;
+                best = {input, kind};
             }
         }
-        const Rows low = Cofactor(function, best, false);
-        const Rows high = Cofactor(function, best, true);
-        const Formula plain = MakeInput(best);
-        Formula first;
-        Formula second;
-        if (bestKind == 0) {
-            if (Find(high, first) && Find(low, second))
-                Keep(Join(Operator::Or, Join(Operator::And, plain, first),
-                          Join(Operator::And, MakeNot(plain), second)),
-                     isFound, formula);
-            return;
-        }
-        const Formula turn = bestKind == 1 ? plain : MakeNot(plain);
-        if (Find(bestKind == 1 ? low : high, first) && Find(low ^ high, second))
-            Keep(Join(Operator::Xor, first,
-                      second.op == Operator::One ? turn : Join(Operator::And, turn, second)),
-                 isFound, formula);
+        return best;
     }
 
-    static bool Set(Formula& formula, const Formula& found)
+    // True, and 'formula' is set, where an expansion has fewer literals than 'leastLiterals'.
+    bool Expand(const Rows& function, const std::vector<unsigned int>& support,
+                size_t leastLiterals, Formula& formula)
     {
-        formula = found;
+        const Expansion best = ChooseExpansion(function, support);
+        const Rows low = Cofactor(function, best.input, false);
+        const Rows high = Cofactor(function, best.input, true);
+        const Formula plain = MakeInput(best.input);
+        Formula first;
+        Formula second;
+        if (best.kind == 0) {
+            if (!Find(high, first) || !Find(low, second))
+                return false;
+            first = Join(Operator::Or, Join(Operator::And, plain, std::move(first)),
+                         Join(Operator::And, MakeNot(plain), std::move(second)));
+        } else {
+            if (!Find(best.kind == 1 ? low : high, first) || !Find(low ^ high, second))
+                return false;
+            Formula turn = best.kind == 1 ? plain : MakeNot(plain);
+            if (second.op != Operator::One)
+                turn = Join(Operator::And, std::move(turn), std::move(second));
+            first = Join(Operator::Xor, std::move(first), std::move(turn));
+        }
+        return CountLiterals(first) < leastLiterals && Set(formula, std::move(first));
+    }
+
+    static bool Set(Formula& formula, Formula found)
+    {
+        formula = std::move(found);
         return true;
     }
 
-    static void Keep(const Formula& found, bool& isFound, Formula& formula)
-    {
-        if (!isFound || CountLiterals(found) < CountLiterals(formula))
-            formula = found;
-        isFound = true;
-    }
-
-    unsigned int m_num_inputs;
     std::map<Rows, Formula> m_known;
 };
 
@@ -250,7 +364,7 @@ ShortForm FindShortForm(const Function& function)
     ShortForm result;
     const Rows& rows = function.GetRows();
     Formula formula;
-    if (!Search(rows.NumInputs()).Find(rows, formula))
+    if (!Search().Find(rows, formula))
         return result;
     result.expression = ToExpression(formula, function.Inputs());
     // What is printed is proved, not what was meant to be written.

@@ -129,7 +129,7 @@ class ShortestTable {
         } else {
             formula = Join(origin.op, Make(origin.left), Make(origin.right));
         }
-        return column == normal ? formula : MakeNot(formula);
+        return column == normal ? formula : MakeNot(std::move(formula));
     }
 
     std::vector<Origin> m_origins;

@@ -35,8 +35,10 @@ inline __attribute__((always_inline)) void JoinGranule(const Inversions<V>& inve
                                                        uint64_t* words)
 {
     for (size_t word = 0; word < kKqGranuleWords; word += V::kWords) {
-        const typename V::Value a = V::Load(lower + word);
-        const typename V::Value b = V::Load(upper + word);
+        typename V::Value a;
+        typename V::Value b;
+        V::Load(lower + word, a);
+        V::Load(upper + word, b);
         if (kIsXor)
             V::Store(a ^ b ^ inversions.result, words + word);
         else

@@ -4,6 +4,8 @@
 #ifndef KQ_KERNEL_H
 #define KQ_KERNEL_H
 
+#include <cstring>
+
 #include "Column.h"
 #include "Word.h"
 
@@ -40,24 +42,31 @@ constexpr TilePatterns MakeTilePatterns()
 
 alignas(64) constexpr TilePatterns kTilePatterns = MakeTilePatterns();
 
-// A vector of kBytes in registers, and as it lies in memory, at any multiple of eight bytes.
+// A vector of kBytes; in memory it lies at any multiple of eight bytes.
 template <unsigned int kBytes>
 struct Vectors {
     typedef uint64_t Value __attribute__((vector_size(kBytes)));
-    typedef uint64_t InMemory __attribute__((vector_size(kBytes), aligned(8), may_alias));
 
     static constexpr unsigned int kWords = kBytes / sizeof(uint64_t);
 
-    // By reference: without vector registers, a vector as a value has no agreed way to pass.
-    static const InMemory& Load(const uint64_t* words)
-    {
-        return *reinterpret_cast<const InMemory*>(words);
-    }
-    static void Store(const Value& value, uint64_t* words)
-    {
-        *reinterpret_cast<InMemory*>(words) = value;
-    }
+    // Copied, because a type of smaller alignment is not one to every compiler when it is an
+    // operand. By reference, because without vector registers there is no agreed way to pass a
+    // vector.
+    static void Load(const uint64_t* words, Value& value) { std::memcpy(&value, words, kBytes); }
+    static void Store(const Value& value, uint64_t* words) { std::memcpy(words, &value, kBytes); }
 };
+
+// Combines each value with the vector of the operand.
+template <class V, unsigned int kNum, class Combine>
+inline __attribute__((always_inline)) void ForEach(const uint64_t* operand,
+                                                   typename V::Value* values, Combine combine)
+{
+    for (unsigned int i = 0; i < kNum; ++i) {
+        typename V::Value upper;
+        V::Load(operand + i * V::kWords, upper);
+        combine(values[i], upper);
+    }
+}
 
 // Runs all steps for 'kNum' vectors of each operand; the value at hand stays in registers.
 template <class V, unsigned int kNum>
@@ -77,38 +86,40 @@ RunStrip(const KqCode* codes, size_t numCodes, bool isInverted, const uint64_t* 
         case kKqTake:
             for (unsigned int i = 0; i < kNum; ++i) {
                 V::Store(value[i], stack + i * V::kWords);
-                value[i] = V::Load(operand + i * V::kWords);
+                V::Load(operand + i * V::kWords, value[i]);
             }
             stack += kKqTileWords;
             break;
         case kKqCombine | kKqAnd:
         case kKqUnstack | kKqAnd:
-            for (unsigned int i = 0; i < kNum; ++i)
-                value[i] = value[i] & V::Load(operand + i * V::kWords);
+            ForEach<V, kNum>(operand, value,
+                             [](auto& lower, const auto& upper) { lower &= upper; });
             break;
         case kKqCombine | kKqAnd | kKqInvertLower:
         case kKqUnstack | kKqAnd | kKqInvertLower:
-            for (unsigned int i = 0; i < kNum; ++i)
-                value[i] = ~value[i] & V::Load(operand + i * V::kWords);
+            ForEach<V, kNum>(operand, value,
+                             [](auto& lower, const auto& upper) { lower = ~lower & upper; });
             break;
         case kKqCombine | kKqAnd | kKqInvertUpper:
         case kKqUnstack | kKqAnd | kKqInvertUpper:
-            for (unsigned int i = 0; i < kNum; ++i)
-                value[i] = value[i] & ~V::Load(operand + i * V::kWords);
+            ForEach<V, kNum>(operand, value,
+                             [](auto& lower, const auto& upper) { lower &= ~upper; });
             break;
         case kKqCombine | kKqAnd | kKqInvertLower | kKqInvertUpper:
         case kKqUnstack | kKqAnd | kKqInvertLower | kKqInvertUpper:
-            for (unsigned int i = 0; i < kNum; ++i)
-                value[i] = ~(value[i] | V::Load(operand + i * V::kWords));
+            ForEach<V, kNum>(operand, value,
+                             [](auto& lower, const auto& upper) { lower = ~(lower | upper); });
             break;
         default: // XOR
-            for (unsigned int i = 0; i < kNum; ++i)
-                value[i] = value[i] ^ V::Load(operand + i * V::kWords);
+            ForEach<V, kNum>(operand, value,
+                             [](auto& lower, const auto& upper) { lower ^= upper; });
             break;
         }
     }
-    for (unsigned int i = 0; i < kNum; ++i)
-        V::Store(isInverted ? ~value[i] : value[i], words + offset + i * V::kWords);
+    for (unsigned int i = 0; i < kNum; ++i) {
+        const typename V::Value result = isInverted ? ~value[i] : value[i];
+        V::Store(result, words + offset + i * V::kWords);
+    }
 }
 
 // The kernel: tile after tile, and in each as many vectors at a time as registers hold.

@@ -62,45 +62,77 @@ class Compiler {
 // The operator's result for lower and upper value, bit lower + 2 * upper, by kind.
 constexpr uint8_t kTables[8] = {0x6, 0, 0, 0, 0x8, 0x4, 0x2, 0x1};
 
-// Compiles operands as they stand, but a leaf after an operand that is none, and gives up when that
-// stacks too many values.
+// Compiles operands as they stand, but a leaf after an operand that is an operator, and gives up
+// when that stacks too many values. A walk's step costs more than a leaf's code, so leaves are
+// written with their operator.
 struct CompilerAsItStands {
-    // An operand, and the value of its first operand once that is written.
+    // An operator, its child that is put last, and the value of the other one once that is written.
     struct Place {
-        KqOperand operand;
-        KqValue first;
+        const Node* node;
+        const Node* last;
+        KqValue before;
+        uint32_t inversion;
     };
 
-    unsigned int Enter(Place& place, Place& first, Place& second)
+    explicit CompilerAsItStands(Compiler& writer) : compiler(writer) {}
+
+    void Compile(const Node* root)
     {
-        if (!KqIsOperator(place.operand)) {
-            value = compiler.PutLeaf(place.operand);
-            return KQ_NONE;
-        }
-        first.operand = KqFindOperand(place.operand.node->GetLeftChild());
-        second.operand = KqFindOperand(place.operand.node->GetRightChild());
-        if (!KqIsOperator(first.operand))
-            std::swap(first.operand, second.operand);
-        return KQ_BOTH | KQ_RETURN;
+        const KqOperand operand = KqFindOperand(root);
+        if (KqIsOperator(operand))
+            KqWalk(PlaceOf(operand), *this);
+        else
+            value = compiler.PutLeaf(operand);
     }
 
-    void Between(Place& place)
+    static Place PlaceOf(const KqOperand& operand)
     {
-        place.first = value;
+        return {operand.node, nullptr, KqValue(), operand.inversion};
+    }
+
+    unsigned int Enter(Place& place, Place& first, Place&)
+    {
+        place.last = place.node->GetRightChild();
+        KqOperand operand = KqFindOperand(place.node->GetLeftChild());
+        // The right child may be far away in memory: it is looked at when it is needed.
+        if (!KqIsOperator(operand)) {
+            place.last = place.node->GetLeftChild();
+            operand = KqFindOperand(place.node->GetRightChild());
+        }
+        if (KqIsOperator(operand)) {
+            first = PlaceOf(operand);
+            return KQ_BOTH | KQ_RETURN;
+        }
+        value = compiler.PutLeaf(operand);
+        Between(place, first);
+        Leave(place);
+        return KQ_NONE;
+    }
+
+    bool Between(Place& place, Place& second)
+    {
+        place.before = value;
         ++numStacked;
         maxStacked = std::max(maxStacked, numStacked);
+        const KqOperand operand = KqFindOperand(place.last);
+        if (KqIsOperator(operand)) {
+            second = PlaceOf(operand);
+            return true;
+        }
+        value = compiler.PutLeaf(operand);
+        return false;
     }
 
     void Leave(const Place& place)
     {
-        value = compiler.PutOperator(place.operand, value, place.first);
+        value = compiler.PutOperator({place.node, place.inversion}, value, place.before);
         --numStacked;
     }
 
     Compiler& compiler;
     KqValue value;
-    size_t numStacked;
-    size_t maxStacked;
+    size_t numStacked = 0;
+    size_t maxStacked = 0;
 };
 
 // An operator or a leaf of the tree, for a walk that must know all before it starts.
@@ -146,25 +178,34 @@ struct CompilerByNeed {
         KqValue first;
     };
 
-    unsigned int Enter(const Place& place, Place& first, Place& second)
+    unsigned int Enter(const Place& place, Place& first, Place&)
     {
         const Item& item = *place.item;
         if (item.left == 0) {
             value = compiler.PutLeaf(item.operand);
             return KQ_NONE;
         }
-        // All operators are symmetric, so either operand may go first.
-        const bool isRightFirst = items[item.right].need > items[item.left].need;
-        first.item = &items[isRightFirst ? item.right : item.left];
-        second.item = &items[isRightFirst ? item.left : item.right];
+        first.item = &items[IsRightFirst(item) ? item.right : item.left];
         return KQ_BOTH | KQ_RETURN;
     }
 
-    void Between(Place& place) { place.first = value; }
+    bool Between(Place& place, Place& second)
+    {
+        place.first = value;
+        const Item& item = *place.item;
+        second.item = &items[IsRightFirst(item) ? item.left : item.right];
+        return true;
+    }
 
     void Leave(const Place& place)
     {
         value = compiler.PutOperator(place.item->operand, value, place.first);
+    }
+
+    // All operators are symmetric, so either operand may go first.
+    bool IsRightFirst(const Item& item) const
+    {
+        return items[item.right].need > items[item.left].need;
     }
 
     Compiler& compiler;
@@ -178,8 +219,8 @@ KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
 {
     KqProgram program;
     Compiler compiler(numVariables, isReversed, program.codes);
-    CompilerAsItStands asItStands{compiler, KqValue(), 0, 0};
-    KqWalk(CompilerAsItStands::Place{KqFindOperand(root), KqValue()}, asItStands);
+    CompilerAsItStands asItStands(compiler);
+    asItStands.Compile(root);
     KqValue value = asItStands.value;
     program.numCodes = compiler.GetEnd();
     if (asItStands.maxStacked >= kKqMaxStack) {

@@ -34,25 +34,36 @@ uint64_t ApplyToWords(Node::TYPE type, uint64_t left, uint64_t right)
 struct WordOfTree {
     explicit WordOfTree(unsigned int number) : numVariables(number) {}
 
-    unsigned int Enter(Place& place, Place& left, Place& right)
+    unsigned int Enter(Place& place, Place& left, Place&)
     {
-        const KqOperand operand = KqFindOperand(place.node);
-        place.inversion = operand.inversion;
-        place.node = operand.node;
-        if (KqIsOperator(operand)) {
-            left.node = operand.node->GetLeftChild();
-            right.node = operand.node->GetRightChild();
-            return KQ_BOTH | KQ_RETURN;
-        }
-        word = LeafWord(operand.node) ^ AllBits(operand.inversion);
-        return KQ_NONE;
+        if (!ResolveOperator(place))
+            return KQ_NONE;
+        left = {place.node->GetLeftChild(), 0, 0};
+        return KQ_BOTH | KQ_RETURN;
     }
 
-    void Between(Place& place) { place.left = word; }
+    bool Between(Place& place, Place& right)
+    {
+        place.left = word;
+        right = {place.node->GetRightChild(), 0, 0};
+        return ResolveOperator(right);
+    }
 
     void Leave(const Place& place)
     {
         word = ApplyToWords(place.node->GetType(), place.left, word) ^ AllBits(place.inversion);
+    }
+
+    // Goes to the operator at or below the place; false for a leaf, whose word is known then.
+    bool ResolveOperator(Place& place)
+    {
+        const KqOperand operand = KqFindOperand(place.node);
+        place.node = operand.node;
+        place.inversion ^= operand.inversion;
+        if (KqIsOperator(operand))
+            return true;
+        word = LeafWord(operand.node) ^ AllBits(operand.inversion);
+        return false;
     }
 
     uint64_t LeafWord(const Node* node)

@@ -66,7 +66,7 @@ template <class AfterLeave>
 struct Evaluator {
     Evaluator(const Variables& table, AfterLeave after) : variables(table), afterLeave(after) {}
 
-    unsigned int Enter(Place& place, Place& left, Place& right)
+    unsigned int Enter(Place& place, Place& left, Place&)
     {
         if (!place.node) {
             value = 0;
@@ -79,11 +79,15 @@ struct Evaluator {
             return KQ_NONE;
         }
         left.node = place.node->GetLeftChild();
-        right.node = place.node->GetRightChild();
         return (numOperands == 2 ? KQ_BOTH : KQ_ONE) | KQ_RETURN;
     }
 
-    void Between(Place& place) { place.left = value; }
+    bool Between(Place& place, Place& right)
+    {
+        place.left = value;
+        right.node = place.node->GetRightChild();
+        return true;
+    }
 
     void Leave(const Place& place)
     {

@@ -44,7 +44,12 @@ class Writer {
         return left.node ? KQ_ONE : KQ_NONE;
     }
 
-    void Between(const Place& place) { WriteTokens(place); }
+    bool Between(const Place& place, Place& right)
+    {
+        WriteTokens(place);
+        right.node = right.pendingTop = place.node->GetRightChild();
+        return true;
+    }
 
     void Leave(const Place& place)
     {

@@ -10,7 +10,7 @@
 #include <vector>
 
 // A last-in first-out stack of plain values; the first kInline of them need no heap.
-// Requires: Pop and Top on a stack that is not empty.  Fails: std::bad_alloc from Push.
+// Requires: Pop and Top on a stack that is not empty.  Fails: std::bad_alloc from Add.
 template <class Entry, size_t kInline>
 class KqStack {
     static_assert(std::is_trivially_copyable<Entry>::value, "entries are plain values");
@@ -18,24 +18,22 @@ class KqStack {
   public:
     bool IsEmpty() const { return m_size == 0; }
 
-    void Push(const Entry& entry)
+    // A new entry on top, to be filled in place: one that is copied there as a whole waits for the
+    // parts it was just made of.
+    Entry& Add()
     {
-        if (m_size < kInline)
-            m_first[m_size] = entry;
-        else
-            m_rest.push_back(entry);
+        if (m_size >= kInline)
+            m_rest.emplace_back();
         ++m_size;
+        return Top();
     }
 
-    Entry Pop()
+    void Pop()
     {
         assert(m_size > 0);
+        if (m_size > kInline)
+            m_rest.pop_back();
         --m_size;
-        if (m_size < kInline)
-            return m_first[m_size];
-        const Entry entry = m_rest.back();
-        m_rest.pop_back();
-        return entry;
     }
 
     Entry& Top()
@@ -64,17 +62,19 @@ enum KqBelow : unsigned int {
 // A place is whatever the visitor needs to know of a node, a plain value: a pointer, a pair, a
 // pointer with a depth or a result. The visitor has
 //     unsigned int Enter(Place& place, Place& first, Place& second)
-//         the place is reached; sets the places below, returns a KqBelow, or'ed with KQ_RETURN;
-//     void Between(Place& place)    all below the first is done;
-//     void Leave(Place& place)      all below is done.
+//         the place is reached; sets the places below, but not the second when it will return;
+//         gives back a KqBelow, or'ed with KQ_RETURN;
+//     bool Between(Place& place, Place& second)
+//         all below the first is done; sets the second, or returns false to pass it over;
+//     void Leave(Place& place)
+//         all below is done.
 // Fails: std::bad_alloc.  Cost: O(places); memory for as many as wait for others at a time.
 template <class Place, class Visitor>
 void KqWalk(Place place, Visitor&& visitor)
 {
     enum STAGE : unsigned int { TO_ENTER, AFTER_FIRST, AFTER_LAST };
     struct Waiting {
-        Place place;
-        Place second;
+        Place place; // for TO_ENTER the second one below the place that is done
         STAGE stage;
     };
     KqStack<Waiting, 64> waiting;
@@ -84,10 +84,15 @@ void KqWalk(Place place, Visitor&& visitor)
         const unsigned int below = visitor.Enter(place, first, second);
         if ((below & KQ_END) != 0)
             return;
-        if ((below & KQ_RETURN) != 0)
-            waiting.Push({place, second, (below & KQ_BOTH) != 0 ? AFTER_FIRST : AFTER_LAST});
-        else if ((below & KQ_BOTH) != 0)
-            waiting.Push({second, second, TO_ENTER});
+        if ((below & KQ_RETURN) != 0) {
+            Waiting& top = waiting.Add();
+            top.place = place;
+            top.stage = (below & KQ_BOTH) != 0 ? AFTER_FIRST : AFTER_LAST;
+        } else if ((below & KQ_BOTH) != 0) {
+            Waiting& top = waiting.Add();
+            top.place = second;
+            top.stage = TO_ENTER;
+        }
         if ((below & (KQ_ONE | KQ_BOTH)) != 0) {
             place = first;
             continue;
@@ -101,14 +106,14 @@ void KqWalk(Place place, Visitor&& visitor)
                 waiting.Pop();
                 continue;
             }
-            place = top.second;
+            place = top.place;
             if (top.stage == TO_ENTER) {
                 waiting.Pop();
-            } else {
-                visitor.Between(top.place);
-                top.stage = AFTER_LAST;
+                break;
             }
-            break;
+            top.stage = AFTER_LAST;
+            if (visitor.Between(top.place, place))
+                break;
         }
     }
 }
@@ -116,8 +121,9 @@ void KqWalk(Place place, Visitor&& visitor)
 // For visitors that never return to a place.
 struct KqPreOrder {
     template <class Place>
-    void Between(Place&)
+    bool Between(Place&, Place&)
     {
+        return true;
     }
     template <class Place>
     void Leave(Place&)

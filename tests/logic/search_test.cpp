@@ -139,6 +139,7 @@ TEST(Cover, IsExactAndHasNoProductToSpare)
         for (int count = 0; count < 20; ++count) {
             const Rows function = RandomFunction(FirstNames(numInputs), random, true).GetRows();
             const std::vector<Cube> cubes = FindCover(function);
+            ASSERT_EQ(CountCoverLiterals(function), CountLiterals(cubes));
             const auto covers = [&](const Cube& cube, uint64_t row) {
                 for (size_t input = 0; input < numInputs; ++input)
                     if ((cube.used >> input & 1u) != 0 &&

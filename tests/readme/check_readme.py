@@ -67,34 +67,40 @@ def find_directory(root, file):
     sys.exit(f"no {file} below {root}")
 
 
-def build_with_cmake(readme, directory, prefix, compiler, flags):
+# The lines that README gives, in a folder with example.cpp. Its prefix $HOME/kq is 'prefix', which is
+# left out of them when the system has the library.
+def run_lines(readme, kind, directory, prefix, compiler, flags):
+    home = os.path.join(directory, "home")
+    os.mkdir(home)
+    lines = one_block(readme, kind)
+    environment = dict(os.environ, HOME=home, CXX=compiler, CXXFLAGS=flags)
+    if prefix:
+        os.symlink(prefix, os.path.join(home, "kq"))
+        libraries = os.path.relpath(find_directory(prefix, "libkq_boolequation.so"), prefix)
+        lines = lines.replace("$HOME/kq/lib", f"$HOME/kq/{libraries}")
+    else:
+        lines = lines.replace(" -DCMAKE_PREFIX_PATH=$HOME/kq", "")
+    lines = lines.replace("c++ ", f"'{compiler}' {flags} ")
+    output = must_run(["bash", "-euc", lines], cwd=directory, env=environment)
+    return "".join(output.splitlines(True)[-2:])  # CMake talks before
+
+
+def build_with_cmake(readme, directory, *where):
     with open(os.path.join(directory, "CMakeLists.txt"), "w", encoding="utf-8") as file:
         file.write(one_block(readme, "cmake"))
-    build = os.path.join(directory, "build")
-    where = [f"-DCMAKE_PREFIX_PATH={prefix}"] if prefix else []
-    must_run(["cmake", "-S", directory, "-B", build, *where, f"-DCMAKE_CXX_COMPILER={compiler}", f"-DCMAKE_CXX_FLAGS={flags}"])
-    must_run(["cmake", "--build", build])
-    return must_run([os.path.join(build, "example")])
+    return run_lines(readme, "sh cmake", directory, *where)
 
 
-def build_with_pkg_config(readme, directory, prefix, compiler, flags):
-    command = one_block(readme, "sh pkg-config").replace("c++ ", f"'{compiler}' {flags} ", 1)
-    environment = dict(os.environ)
-    if prefix:
-        # The command is for a prefix without blanks, as an unquoted $(...) is.
-        link = os.path.join(directory, "prefix")
-        os.symlink(prefix, link)
-        environment["LD_LIBRARY_PATH"] = find_directory(link + os.sep, "libkq_boolequation.so")
-        environment["PKG_CONFIG_PATH"] = find_directory(link + os.sep, "kq_boolequation.pc")
-    must_run(["sh", "-c", command], cwd=directory, env=environment)
-    return must_run([os.path.join(directory, "example")], env=environment)
+def build_with_pkg_config(readme, directory, *where):
+    return run_lines(readme, "sh pkg-config", directory, *where)
 
 
 def check_program(readme, build, compiler, flags):
     if not shutil.which("pkg-config"):
         print("skipped: there is no pkg-config")
         return SKIPPED
-    expected = one_block(readme, "text")
+    expected = "".join(line + "\n" for line in re.findall(r"// prints (.*)$", one_block(readme, "cpp"),
+                                                          re.M))
     failures = 0
     with tempfile.TemporaryDirectory() as top:
         prefix = None # the system's

@@ -1,0 +1,121 @@
+#include "distinct_luts.h"
+
+#include <algorithm>
+#include <cassert>
+#include <numeric>
+
+#include "lut_word.h"
+#include "watch.h"
+
+namespace booleq {
+
+namespace {
+
+constexpr size_t kWatchedTables = 65536;
+
+// Tables that were met, found by a hash: open addressing, at most half full. Elements of the table
+// of hashes are places among the distinct ones, one more than that; 0 is free.
+template <class Word>
+class Meeting {
+  public:
+    Meeting() : m_slots(1024) {}
+
+    size_t Meet(Word word, uint64_t place)
+    {
+        size_t slot = SlotOf(word);
+        while (m_slots[slot] != 0 && m_words[m_slots[slot] - 1] != word)
+            slot = (slot + 1) & (m_slots.size() - 1);
+        if (m_slots[slot] == 0) {
+            m_words.push_back(word);
+            m_first_places.push_back(place);
+            m_counts.push_back(0);
+            m_slots[slot] = m_words.size();
+            if (2 * m_words.size() > m_slots.size())
+                Grow();
+            ++m_counts.back();
+            return m_words.size() - 1;
+        }
+        ++m_counts[m_slots[slot] - 1];
+        return m_slots[slot] - 1;
+    }
+
+    const std::vector<Word>& Words() const { return m_words; }
+    uint64_t FirstPlace(size_t distinct) const { return m_first_places[distinct]; }
+    uint64_t Count(size_t distinct) const { return m_counts[distinct]; }
+
+  private:
+    // A multiplication by an odd constant near the golden ratio of 2^64 mixes into the upper bits.
+    size_t SlotOf(Word word) const
+    {
+        constexpr uint64_t kMix = 0x9e3779b97f4a7c15;
+        uint64_t hash = LutWord<Word>::Upper(word) * kMix;
+        hash = (hash ^ (hash >> 32) ^ LutWord<Word>::Lower(word)) * kMix;
+        hash = (hash ^ (hash >> 29)) * kMix;
+        return static_cast<size_t>(hash >> 20) & (m_slots.size() - 1);
+    }
+
+    void Grow()
+    {
+        m_slots.assign(4 * m_slots.size(), 0);
+        for (size_t distinct = 0; distinct < m_words.size(); ++distinct) {
+            size_t slot = SlotOf(m_words[distinct]);
+            while (m_slots[slot] != 0)
+                slot = (slot + 1) & (m_slots.size() - 1);
+            m_slots[slot] = distinct + 1;
+        }
+    }
+
+    std::vector<size_t> m_slots; // a power of two of them
+    std::vector<Word> m_words;
+    std::vector<uint64_t> m_first_places;
+    std::vector<uint64_t> m_counts;
+};
+
+template <class Word>
+DistinctLuts FindDistinct(const Word* tables, size_t count, bool isTwo, uint64_t* distinctPlaces)
+{
+    Meeting<Word> meeting;
+    for (size_t place = 0; place < count; ++place) {
+        if (place % kWatchedTables == 0)
+            Watch();
+        const size_t distinct = meeting.Meet(tables[place], place);
+        if (distinctPlaces != nullptr)
+            distinctPlaces[place] = distinct;
+    }
+    const std::vector<Word>& words = meeting.Words();
+    std::vector<size_t> sorted(words.size());
+    std::iota(sorted.begin(), sorted.end(), size_t(0));
+    std::sort(sorted.begin(), sorted.end(),
+              [&](size_t left, size_t right) { return words[left] < words[right]; });
+    DistinctLuts result;
+    std::vector<uint64_t> placeOf(words.size());
+    for (size_t place = 0; place < sorted.size(); ++place) {
+        const size_t distinct = sorted[place];
+        placeOf[distinct] = place;
+        result.words.push_back(LutWord<Word>::Lower(words[distinct]));
+        if (isTwo)
+            result.words.push_back(LutWord<Word>::Upper(words[distinct]));
+        result.firstPlaces.push_back(meeting.FirstPlace(distinct));
+        result.counts.push_back(meeting.Count(distinct));
+    }
+    if (distinctPlaces != nullptr)
+        std::transform(distinctPlaces, distinctPlaces + count, distinctPlaces,
+                       [&](uint64_t distinct) { return placeOf[distinct]; });
+    assert(std::accumulate(result.counts.begin(), result.counts.end(), uint64_t(0)) == count);
+    return result;
+}
+
+} // namespace
+
+DistinctLuts FindDistinctLuts(const LutArray& luts, uint64_t* distinctPlaces)
+{
+    DistinctLuts result;
+    WithLutWord(luts, [&](auto zero) {
+        typedef decltype(zero) Word;
+        result = FindDistinct(static_cast<const Word*>(luts.tables), luts.count,
+                              luts.tableBytes == 16, distinctPlaces);
+    });
+    return result;
+}
+
+} // namespace booleq

@@ -1,0 +1,54 @@
+// Very many look-up tables of one width, as they lie in memory: the form in which arrays of Python,
+// netlists and canonical forms hand tables to each other. It owns nothing.
+// Input 0 is the most significant bit of a row's number, row k is bit k of the table, as in rows.h;
+// a table of seven inputs is two words of 64 bits, rows 0 to 63 first.
+// Fails: nothing does; what must hold is asked before by FirstUncleanLut.
+#ifndef BOOLEQ_LUTS_LUT_ARRAY_H
+#define BOOLEQ_LUTS_LUT_ARRAY_H
+
+#include <cstddef>
+#include <cstdint>
+#include <vector>
+
+namespace booleq {
+
+constexpr unsigned int kMaxLutInputs = 7;
+constexpr size_t kNoLut = SIZE_MAX; // instead of a place in an array
+
+// How work on an array is done: by some threads at once, where it is long enough for more than one.
+// The calling thread calls Watch() (watch.h) every few milliseconds, the others never; what that
+// throws ends them all, and results are then partly written.
+struct LutWork {
+    unsigned int numThreads = 0; // 0: as many as there are processors
+};
+
+// Tables to be read.
+// Invariants, which FirstUncleanLut and HasLutShape check:
+// 1. A table has tableBytes bytes: 1, 2, 4 or 8, or 16 for two words; enough for 2^numInputs rows.
+// 2. Bits beyond the last row are 0.
+struct LutArray {
+    const void* tables; // aligned as words of tableBytes, at most 8
+    size_t count;
+    unsigned int numInputs; // 0 to kMaxLutInputs
+    unsigned int tableBytes;
+};
+
+// The fewest bytes that a table takes: 1 up to three inputs, 16 for seven.
+constexpr unsigned int LutBytes(unsigned int numInputs)
+{
+    return numInputs <= 3 ? 1u : 1u << (numInputs - 3);
+}
+
+// One word of 64 bits a table, two of seven inputs.
+LutArray LutsOf(const std::vector<uint64_t>& words, unsigned int numInputs);
+
+// Whether numInputs and tableBytes go together (invariant 1).
+bool HasLutShape(unsigned int numInputs, unsigned int tableBytes);
+
+// The place of the first table with a bit beyond its last row, kNoLut when there is none.
+// Requires: invariant 1.
+size_t FirstUncleanLut(const LutArray& luts, const LutWork& work = LutWork());
+
+} // namespace booleq
+
+#endif

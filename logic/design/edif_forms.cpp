@@ -53,7 +53,8 @@ EdifName EdifForms::CurrentName()
         m_tokens.Next();
         name.ident = Ident();
         m_tokens.Next();
-        name.text = m_tokens.Kind() == EdifToken::String ? Decoded(m_tokens.Text()) : name.ident;
+        name.text = m_tokens.Kind() == EdifToken::String ? WithoutMark(Decoded(m_tokens.Text()))
+                                                         : name.ident;
         m_tokens.Skip();
         Close("rename");
         return name;

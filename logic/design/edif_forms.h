@@ -22,6 +22,7 @@ struct EdifName {
     bool isArray = false;
 };
 
+// Strings that had to be decoded live as long as this.
 class EdifForms {
   public:
     explicit EdifForms(const ReadJob& job) : m_pace(job), m_tokens(job.source.Text()) {}
@@ -30,11 +31,10 @@ class EdifForms {
     [[noreturn]] void Refuse(const std::string& what) const { m_tokens.Refuse(what); }
     // The next part of a form; false at its end.
     bool NextPart(const char* form);
+    // Skips the rest of a form.
     void Close(const char* form);
-    // The strings that had to be decoded, and names that are made: they live as long as the reader.
+    // A string with its escapes replaced.
     std::string_view Decoded(std::string_view text);
-    // A word: an '&' before it only lets it begin with a digit.
-    std::string_view Ident() const;
     // (rename ident "text") or ident, being the current token.
     EdifName CurrentName();
     // The next token is a name, or an array of one with a number of bits.
@@ -43,6 +43,9 @@ class EdifForms {
     uint64_t Number(uint64_t max) const;
 
   private:
+    // A word: an '&' before it only lets it begin with a digit.
+    std::string_view Ident() const;
+
     Pace m_pace;
     EdifTokens m_tokens;
     std::string m_buffer;

@@ -61,26 +61,27 @@ class EdifView {
     LocalNet AddNet(std::string_view name);
     // Each bit of a port is a net of its own where none is joined to it.
     void MakePorts(const EdifCell& cell);
-    LocalNet PortNet(const EdifPort& port, uint32_t bit, LocalNet joined);
-    static uint32_t BitOf(const EdifJoint& joint, uint32_t numBits);
     // Sorted by instance, then by port and bit, which are the pins of its cell in order.
     void MakeCells(const std::vector<EdifCell>& cells);
-    void MakeCell(const EdifInstance& instance, const std::vector<EdifCell>& cells,
-                  EdifJoint* first, EdifJoint* last);
-    // The joints of one port, the last member first.
-    void AddPin(const EdifInstance& instance, const EdifCell& cell, const EdifJoint* first,
-                const EdifJoint* last);
     // The type of a cell whose port has any number of bits, else null. Yosys has one cell $lut for
     // all of them, with the bits of one: an instance says its own width, and members count from it.
     const CellType* VectorType(const EdifCell& cell, const EdifPort& port) const;
-    // 0 where the instance does not say it: as many as are joined.
-    uint32_t OwnWidth(const EdifInstance& instance, const CellType& type) const;
 
     std::vector<EdifInstance> instances;
     std::vector<EdifProperty> properties;
     std::vector<EdifJoint> joints;
 
   private:
+    LocalNet PortNet(const EdifPort& port, uint32_t bit, LocalNet joined);
+    static uint32_t BitOf(const EdifJoint& joint, uint32_t numBits);
+    void MakeCell(const EdifInstance& instance, const std::vector<EdifCell>& cells,
+                  EdifJoint* first, EdifJoint* last);
+    // The joints of one port, the last member first.
+    void AddPin(const EdifInstance& instance, const EdifCell& cell, const EdifJoint* first,
+                const EdifJoint* last);
+    // 0 where the instance does not say it: as many as are joined.
+    uint32_t OwnWidth(const EdifInstance& instance, const CellType& type) const;
+
     const ReadJob& m_job;
     Pace m_pace;
     CellIntake m_intake;

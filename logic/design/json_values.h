@@ -90,14 +90,6 @@ inline std::string_view Token(json::value value)
     return token.substr(0, token.find_last_not_of(" \t\r\n") + 1);
 }
 
-// Yosys writes a backslash before a name of the design that looks like one of its own.
-inline std::string_view WithoutMark(std::string_view name)
-{
-    const bool isMarked = name.size() > 1 && name[0] == '\\' &&
-                          (name[1] == '$' || name[1] == '\\' || (name[1] >= '0' && name[1] <= '9'));
-    return isMarked ? name.substr(1) : name;
-}
-
 inline PortDirection DirectionOf(std::string_view word)
 {
     return word == "input"    ? PortDirection::Input

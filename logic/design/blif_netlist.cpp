@@ -174,7 +174,7 @@ class BlifNetlistReader {
         Flush();
         for (size_t word = 1; word < m_words.size(); ++word) {
             ModulePort port;
-            port.bits.name = m_job.design.names.Add(m_words[word]);
+            port.bits.name = m_job.design.names.Add(WithoutMark(m_words[word]));
             port.bits.first = static_cast<uint32_t>(m_module->bits.size());
             port.bits.count = 1;
             port.direction = direction;
@@ -206,6 +206,7 @@ class BlifNetlistReader {
 
     LocalNet NetOf(std::string_view name)
     {
+        name = WithoutMark(name);
         const NameId id = m_job.design.names.Add(name);
         if (id >= m_nets.size())
             m_nets.resize(id + id / 2 + size_t(64), {0, 0});
@@ -378,7 +379,7 @@ class BlifNetlistReader {
     void ReadCellName()
     {
         RequireOpen();
-        m_intake.SetName(m_job.design.names.Add(m_words[1]));
+        m_intake.SetName(m_job.design.names.Add(WithoutMark(m_words[1])));
         m_is_named = true;
     }
 

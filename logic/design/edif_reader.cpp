@@ -1,12 +1,9 @@
 // Reads EDIF 2.0.0: libraries of cells, each with an interface of ports and a view of instances and
 // nets. Nets say which pins they join, so the cells of a view are made when all of it is read.
 #include <algorithm>
-#include <cassert>
-#include <deque>
 #include <unordered_map>
 
-#include "cell_intake.h"
-#include "edif_tokens.h"
+#include "edif_view.h"
 #include "read_fault.h"
 #include "readers.h"
 
@@ -14,57 +11,10 @@ namespace booleq {
 
 namespace {
 
-constexpr uint32_t kMaxPortBits = 1u << 20;
-constexpr uint32_t kNone = UINT32_MAX;
-
-struct EdifPort {
-    NameId ident = 0; // of m_idents, by which pins refer to it
-    NameId name = 0;  // without a range, "A" of "A[5:0]"
-    uint32_t numBits = 1;
-    PortDirection direction = PortDirection::Both;
-};
-
-struct EdifCell {
-    NameId type = 0;           // the name of its module, different for each cell
-    std::string_view typeText; // the name of its type, which may be a known one
-    std::vector<EdifPort> ports;
-};
-
-// A pin of an instance, or of the cell itself, on a net.
-struct EdifJoint {
-    uint32_t instance; // kNone: a port of the cell itself
-    uint32_t port;
-    uint32_t member; // from the most significant bit
-    LocalNet net;
-};
-
-struct EdifInstance {
-    NameId name = 0;
-    NameId key = 0;
-    uint32_t cell = 0;
-    uint32_t line = 0;
-    uint32_t firstProperty = 0;
-    uint32_t numProperties = 0;
-};
-
-struct EdifProperty {
-    std::string_view name;
-    CellValue value;
-};
-
-// An identifier, and the name that it stands for.
-struct EdifName {
-    std::string_view ident;
-    std::string_view text;
-    uint32_t numBits = 1;
-    bool isArray = false;
-};
-
 class EdifReader {
   public:
     explicit EdifReader(const ReadJob& job)
-        : m_job(job), m_pace(job), m_intake(job.design, job.cellTypes, BareDigits::ByFormat),
-          m_tokens(job.source.Text())
+        : m_job(job), m_forms(job), m_tokens(m_forms.Tokens()), m_view(job)
     {
     }
 
@@ -72,9 +22,9 @@ class EdifReader {
     {
         m_tokens.Next();
         if (!m_tokens.IsOpen("edif"))
-            Refuse("expected (edif ...");
-        ReadName();
-        while (NextPart("edif")) {
+            m_forms.Refuse("expected (edif ...");
+        m_forms.ReadName();
+        while (m_forms.NextPart("edif")) {
             if (m_tokens.IsOpen("library") || m_tokens.IsOpen("external"))
                 ReadLibrary();
             else if (m_tokens.IsOpen("design"))
@@ -83,125 +33,16 @@ class EdifReader {
                 m_tokens.Skip();
         }
         if (m_tokens.Next() != EdifToken::End)
-            Refuse("something follows the last ')'");
+            m_forms.Refuse("something follows the last ')'");
     }
 
   private:
-    [[noreturn]] void Refuse(const std::string& what) const { m_tokens.Refuse(what); }
-
-    // The next part of a form; false at its end.
-    bool NextPart(const char* form)
-    {
-        if (m_pace.IsDue())
-            m_pace.Report(m_tokens.Position());
-        switch (m_tokens.Next()) {
-        case EdifToken::Open:
-        case EdifToken::Word:
-        case EdifToken::String:
-            return true;
-        case EdifToken::Close:
-            return false;
-        case EdifToken::End:
-            break;
-        }
-        Refuse(std::string("the text ends within (") + form + " ...");
-    }
-
-    void Close(const char* form)
-    {
-        while (NextPart(form))
-            m_tokens.Skip();
-    }
-
-    // --- names
-
-    // The strings that had to be decoded, and names that are made: they live as long as the reader.
-    std::string_view Decoded(std::string_view text)
-    {
-        const std::string_view decoded = DecodeEdifString(text, m_buffer);
-        if (decoded.data() == text.data())
-            return text;
-        m_strings.push_back(m_buffer);
-        return m_strings.back();
-    }
-
-    // A word: an '&' before it only lets it begin with a digit.
-    std::string_view Ident() const
-    {
-        if (m_tokens.Kind() != EdifToken::Word)
-            Refuse("expected a name");
-        std::string_view ident = m_tokens.Text();
-        if (ident.size() > 1 && ident[0] == '&')
-            ident.remove_prefix(1);
-        return ident;
-    }
-
-    // (rename ident "text") or ident, being the current token.
-    EdifName CurrentName()
-    {
-        EdifName name;
-        if (m_tokens.IsOpen("rename")) {
-            m_tokens.Next();
-            name.ident = Ident();
-            m_tokens.Next();
-            name.text =
-                m_tokens.Kind() == EdifToken::String ? Decoded(m_tokens.Text()) : name.ident;
-            m_tokens.Skip();
-            Close("rename");
-            return name;
-        }
-        if (m_tokens.IsOpen("name")) { // with a place on a drawing
-            m_tokens.Next();
-            name.ident = name.text = Ident();
-            Close("name");
-            return name;
-        }
-        if (m_tokens.Kind() == EdifToken::String) {
-            name.ident = name.text = Decoded(m_tokens.Text());
-            return name;
-        }
-        name.ident = name.text = Ident();
-        return name;
-    }
-
-    // The next token is a name, or an array of one with a number of bits.
-    EdifName ReadName()
-    {
-        m_tokens.Next();
-        if (!m_tokens.IsOpen("array"))
-            return CurrentName();
-        m_tokens.Next();
-        EdifName name = CurrentName();
-        name.isArray = true;
-        m_tokens.Next();
-        name.numBits = static_cast<uint32_t>(Number(kMaxPortBits));
-        Close("array");
-        return name;
-    }
-
-    // The current token as a number.
-    uint64_t Number(uint64_t max) const
-    {
-        uint64_t number = 0;
-        const std::string_view text = m_tokens.Text();
-        bool isNumber = m_tokens.Kind() == EdifToken::Word && !text.empty() && text.size() < 20;
-        for (const char character : text) {
-            isNumber = isNumber && character >= '0' && character <= '9';
-            if (isNumber)
-                number = number * 10 + static_cast<uint64_t>(character - '0');
-        }
-        if (!isNumber || number > max)
-            Refuse("expected a number up to " + std::to_string(max) + " instead of " +
-                   Quoted(text));
-        return number;
-    }
-
     // --- libraries and cells
 
     void ReadLibrary()
     {
-        m_library = m_idents.Add(ReadName().ident);
-        while (NextPart("library")) {
+        m_library = m_idents.Add(m_forms.ReadName().ident);
+        while (m_forms.NextPart("library")) {
             if (m_tokens.IsOpen("cell"))
                 ReadCell();
             else
@@ -213,17 +54,17 @@ class EdifReader {
 
     void ReadCell()
     {
-        const EdifName name = ReadName();
+        const EdifName name = m_forms.ReadName();
         const auto index = static_cast<uint32_t>(m_cells.size());
         const NameId ident = m_idents.Add(name.ident);
         if (!m_cell_numbers.emplace(CellKey(m_library, ident), index).second)
-            Refuse("the library has two cells " + Quoted(name.ident));
+            m_forms.Refuse("the library has two cells " + Quoted(name.ident));
         m_last_with[ident] = index;
         m_cells.emplace_back();
         m_cells.back().typeText = name.text;
         m_cells.back().type = ModuleName(name.text);
         bool hasContents = false;
-        while (NextPart("cell")) {
+        while (m_forms.NextPart("cell")) {
             if (m_tokens.IsOpen("view"))
                 ReadView(index, hasContents);
             else
@@ -245,8 +86,8 @@ class EdifReader {
 
     void ReadView(uint32_t cell, bool& hasContents)
     {
-        ReadName();
-        while (NextPart("view")) {
+        m_forms.ReadName();
+        while (m_forms.NextPart("view")) {
             if (m_tokens.IsOpen("interface")) {
                 if (m_cells[cell].ports.empty())
                     ReadInterface(cell);
@@ -254,7 +95,7 @@ class EdifReader {
                     m_tokens.Skip();
             } else if (m_tokens.IsOpen("contents")) {
                 if (hasContents)
-                    Refuse("the cell has a second view with contents");
+                    m_forms.Refuse("the cell has a second view with contents");
                 hasContents = true;
                 ReadContents(cell);
             } else {
@@ -265,7 +106,7 @@ class EdifReader {
 
     void ReadInterface(uint32_t cell)
     {
-        while (NextPart("interface")) {
+        while (m_forms.NextPart("interface")) {
             if (m_tokens.IsOpen("port"))
                 ReadPort(m_cells[cell]);
             else
@@ -275,7 +116,7 @@ class EdifReader {
 
     void ReadPort(EdifCell& cell)
     {
-        const EdifName name = ReadName();
+        const EdifName name = m_forms.ReadName();
         EdifPort port;
         port.ident = m_idents.Add(name.ident);
         std::string_view text = name.text;
@@ -283,7 +124,7 @@ class EdifReader {
             text = text.substr(0, text.find('[')); // a range
         port.name = m_job.design.names.Add(text);
         port.numBits = name.numBits;
-        while (NextPart("port")) {
+        while (m_forms.NextPart("port")) {
             if (!m_tokens.IsOpen("direction")) {
                 m_tokens.Skip();
                 continue;
@@ -293,18 +134,18 @@ class EdifReader {
             port.direction = word == "INPUT"    ? PortDirection::Input
                              : word == "OUTPUT" ? PortDirection::Output
                                                 : PortDirection::Both;
-            Close("direction");
+            m_forms.Close("direction");
         }
         for (const EdifPort& other : cell.ports)
             if (other.ident == port.ident && cell.ports.size() < 1000) // else the square would cost
-                Refuse("there are two ports " + Quoted(name.ident));
+                m_forms.Refuse("there are two ports " + Quoted(name.ident));
         cell.ports.push_back(port);
     }
 
     void ReadDesignForm()
     {
-        ReadName();
-        while (NextPart("design")) {
+        m_forms.ReadName();
+        while (m_forms.NextPart("design")) {
             if (!m_tokens.IsOpen("cellRef")) {
                 m_tokens.Skip();
                 continue;
@@ -319,18 +160,18 @@ class EdifReader {
     // The rest of (cellRef name (libraryRef library)), as the number of a cell.
     uint32_t ReadCellRef()
     {
-        const EdifName name = ReadName();
-        NameId library = kNone;
-        while (NextPart("cellRef")) {
+        const EdifName name = m_forms.ReadName();
+        NameId library = EdifView::kNone;
+        while (m_forms.NextPart("cellRef")) {
             if (!m_tokens.IsOpen("libraryRef")) {
                 m_tokens.Skip();
                 continue;
             }
-            library = m_idents.Add(ReadName().ident);
-            Close("libraryRef");
+            library = m_idents.Add(m_forms.ReadName().ident);
+            m_forms.Close("libraryRef");
         }
         const NameId ident = m_idents.Add(name.ident);
-        if (library == kNone) {
+        if (library == EdifView::kNone) {
             // That of the library, or the one that stood last.
             const auto own = m_cell_numbers.find(CellKey(m_library, ident));
             if (own != m_cell_numbers.end())
@@ -341,7 +182,7 @@ class EdifReader {
         }
         const auto found = m_cell_numbers.find(CellKey(library, ident));
         if (found == m_cell_numbers.end())
-            Refuse("there is no cell " + Quoted(name.ident) + " before");
+            m_forms.Refuse("there is no cell " + Quoted(name.ident) + " before");
         return found->second;
     }
 
@@ -349,17 +190,11 @@ class EdifReader {
 
     void ReadContents(uint32_t cell)
     {
-        m_job.modules.emplace_back();
-        m_module = &m_job.modules.back();
-        m_module->name = m_cells[cell].type;
-        m_intake.EnterModule(*m_module);
-        m_instances.clear();
-        m_properties.clear();
-        m_joints.clear();
+        m_view.Begin(m_cells[cell].type);
         ++m_epoch;
         ReadContentsParts("contents", cell);
-        MakePorts(cell);
-        MakeCells();
+        m_view.MakePorts(m_cells[cell]);
+        m_view.MakeCells(m_cells);
     }
 
     // Bundles of nets are read as the nets in them; they stand in one another twice at most.
@@ -367,7 +202,7 @@ class EdifReader {
     {
         uint64_t depth = 1;
         while (depth != 0) {
-            if (!NextPart(form)) {
+            if (!m_forms.NextPart(form)) {
                 --depth;
                 continue;
             }
@@ -376,7 +211,7 @@ class EdifReader {
             } else if (m_tokens.IsOpen("net")) {
                 ReadNet(cell);
             } else if (m_tokens.IsOpen("netBundle")) {
-                ReadName();
+                m_forms.ReadName();
                 ++depth;
             } else if (m_tokens.IsOpen("listOfNets")) {
                 ++depth;
@@ -390,16 +225,16 @@ class EdifReader {
     {
         EdifInstance instance;
         instance.line = static_cast<uint32_t>(m_tokens.Line());
-        const EdifName name = ReadName();
+        const EdifName name = m_forms.ReadName();
         if (name.isArray)
-            Refuse("an array of instances is not read: " + Quoted(name.ident));
+            m_forms.Refuse("an array of instances is not read: " + Quoted(name.ident));
         instance.name = m_job.design.names.Add(name.text);
-        instance.cell = kNone;
-        instance.firstProperty = static_cast<uint32_t>(m_properties.size());
-        while (NextPart("instance")) {
+        instance.cell = EdifView::kNone;
+        instance.firstProperty = static_cast<uint32_t>(m_view.properties.size());
+        while (m_forms.NextPart("instance")) {
             if (m_tokens.IsOpen("viewRef")) {
-                ReadName();
-                while (NextPart("viewRef")) {
+                m_forms.ReadName();
+                while (m_forms.NextPart("viewRef")) {
                     if (m_tokens.IsOpen("cellRef"))
                         instance.cell = ReadCellRef();
                     else
@@ -411,25 +246,25 @@ class EdifReader {
                 m_tokens.Skip();
             }
         }
-        if (instance.cell == kNone)
+        if (instance.cell == EdifView::kNone)
             ThrowAtLine(instance.line, "instance " + Quoted(name.text) + " does not say its cell");
         instance.numProperties =
-            static_cast<uint32_t>(m_properties.size()) - instance.firstProperty;
+            static_cast<uint32_t>(m_view.properties.size()) - instance.firstProperty;
         Known& known = KnownOf(name.ident);
         if (known.instanceEpoch == m_epoch)
             ThrowAtLine(instance.line, "there are two instances " + Quoted(name.ident));
         known.instanceEpoch = m_epoch;
-        known.instance = static_cast<uint32_t>(m_instances.size());
-        m_instances.push_back(instance);
+        known.instance = static_cast<uint32_t>(m_view.instances.size());
+        m_view.instances.push_back(instance);
     }
 
     // (property NAME (string "...")), (integer 6), (boolean (true)).
     void ReadProperty(EdifInstance& instance)
     {
         EdifProperty property;
-        property.name = ReadName().text;
+        property.name = m_forms.ReadName().text;
         bool isRead = false;
-        while (NextPart("property")) {
+        while (m_forms.NextPart("property")) {
             const bool isString = m_tokens.IsOpen("string");
             const bool isInteger = m_tokens.IsOpen("integer") || m_tokens.IsOpen("number");
             if (!isString && !isInteger) {
@@ -439,16 +274,16 @@ class EdifReader {
             m_tokens.Next();
             if (m_tokens.Kind() == EdifToken::Close)
                 continue; // no value
-            property.value.text = isString ? Decoded(m_tokens.Text()) : m_tokens.Text();
+            property.value.text = isString ? m_forms.Decoded(m_tokens.Text()) : m_tokens.Text();
             property.value.isNumber = isInteger && ToNumber(property.value);
             m_tokens.Skip();
-            Close("property");
+            m_forms.Close("property");
             isRead = true;
         }
         if (isRead && property.name == m_job.options.keyAttribute)
             instance.key = m_job.design.names.Add(property.value.text);
         if (isRead)
-            m_properties.push_back(property);
+            m_view.properties.push_back(property);
     }
 
     // A number of 64 bits; another one stays a text, which is then not an init value.
@@ -465,20 +300,20 @@ class EdifReader {
 
     void ReadNet(uint32_t cell)
     {
-        const EdifName name = ReadName();
+        const EdifName name = m_forms.ReadName();
         if (name.isArray)
-            Refuse("an array of nets is not read: " + Quoted(name.ident));
+            m_forms.Refuse("an array of nets is not read: " + Quoted(name.ident));
         Known& known = KnownOf(name.ident);
         if (known.netEpoch == m_epoch)
-            Refuse("there are two nets " + Quoted(name.ident));
+            m_forms.Refuse("there are two nets " + Quoted(name.ident));
         known.netEpoch = m_epoch;
-        const LocalNet net = AddNet(name.text);
-        while (NextPart("net")) {
+        const LocalNet net = m_view.AddNet(name.text);
+        while (m_forms.NextPart("net")) {
             if (!m_tokens.IsOpen("joined")) {
                 m_tokens.Skip();
                 continue;
             }
-            while (NextPart("joined")) {
+            while (m_forms.NextPart("joined")) {
                 if (m_tokens.IsOpen("portRef"))
                     ReadPortRef(cell, net);
                 else
@@ -487,52 +322,47 @@ class EdifReader {
         }
     }
 
-    LocalNet AddNet(std::string_view name)
-    {
-        m_module->netNames.push_back(m_job.design.names.Add(name));
-        m_module->isHidden.push_back(!name.empty() && name[0] == '$');
-        return static_cast<LocalNet>(m_module->netNames.size() - 1);
-    }
-
     // (portRef name (instanceRef instance)) and (portRef (member name index) ...).
     void ReadPortRef(uint32_t cell, LocalNet net)
     {
-        EdifJoint joint = {kNone, 0, 0, net};
-        uint64_t member = kNone;
+        EdifJoint joint = {EdifView::kNone, 0, 0, net};
+        uint64_t member = EdifView::kNone;
         std::string_view port;
         m_tokens.Next();
         if (m_tokens.IsOpen("member")) {
             m_tokens.Next();
-            port = CurrentName().ident;
+            port = m_forms.CurrentName().ident;
             m_tokens.Next();
-            member = Number(kMaxPortBits);
-            Close("member");
+            member = m_forms.Number(kMaxPortBits);
+            m_forms.Close("member");
         } else {
-            port = CurrentName().ident;
+            port = m_forms.CurrentName().ident;
         }
-        while (NextPart("portRef")) {
+        while (m_forms.NextPart("portRef")) {
             if (!m_tokens.IsOpen("instanceRef")) {
                 m_tokens.Skip();
                 continue;
             }
-            const std::string_view ident = ReadName().ident;
+            const std::string_view ident = m_forms.ReadName().ident;
             const Known& known = KnownOf(ident);
             if (known.instanceEpoch != m_epoch)
-                Refuse("there is no instance " + Quoted(ident) + " before");
+                m_forms.Refuse("there is no instance " + Quoted(ident) + " before");
             joint.instance = known.instance;
-            Close("instanceRef");
+            m_forms.Close("instanceRef");
         }
         const EdifCell& owner =
-            m_cells[joint.instance == kNone ? cell : m_instances[joint.instance].cell];
+            m_cells[joint.instance == EdifView::kNone ? cell
+                                                      : m_view.instances[joint.instance].cell];
         joint.port = FindPort(owner, port);
         const uint32_t numBits = owner.ports[joint.port].numBits;
-        if (member != kNone && member >= numBits)
-            Refuse("port " + Quoted(port) + " has " + Count(numBits, "bit") + ", and no member " +
-                   std::to_string(member));
-        if (member == kNone && numBits != 1)
-            Refuse("port " + Quoted(port) + " is an array; say which member");
-        joint.member = member == kNone ? 0 : static_cast<uint32_t>(member);
-        m_joints.push_back(joint);
+        const bool isVector = m_view.VectorType(owner, owner.ports[joint.port]) != nullptr;
+        if (member != EdifView::kNone && member >= numBits && !isVector)
+            m_forms.Refuse("port " + Quoted(port) + " has " + Count(numBits, "bit") +
+                           ", and no member " + std::to_string(member));
+        if (member == EdifView::kNone && numBits != 1 && !isVector)
+            m_forms.Refuse("port " + Quoted(port) + " is an array; say which member");
+        joint.member = member == EdifView::kNone ? 0 : static_cast<uint32_t>(member);
+        m_view.joints.push_back(joint);
     }
 
     // A cell has few ports; those of a large one are found by a map that is made once.
@@ -551,146 +381,7 @@ class EdifReader {
                 if (cell.ports[port].ident == id)
                     return port;
         }
-        Refuse("cell " + Quoted(cell.typeText) + " has no port " + Quoted(ident));
-    }
-
-    // --- what a view makes
-
-    // Each bit of a port is a net of its own where none is joined to it.
-    void MakePorts(uint32_t cell)
-    {
-        std::vector<uint32_t> first;
-        uint32_t numBits = 0;
-        for (const EdifPort& port : m_cells[cell].ports) {
-            first.push_back(numBits);
-            numBits += port.numBits;
-            if (numBits > kMaxPortBits * 16)
-                Refuse("the ports of the cell have too many bits");
-        }
-        std::vector<LocalNet> nets(numBits, 0);
-        for (const EdifJoint& joint : m_joints) {
-            if (joint.instance != kNone)
-                continue;
-            LocalNet& net =
-                nets[first[joint.port] + BitOf(joint, m_cells[cell].ports[joint.port].numBits)];
-            if (net == 0)
-                net = joint.net;
-            else
-                m_module->joins.emplace_back(net, joint.net);
-        }
-        for (size_t index = 0; index < first.size(); ++index) {
-            const EdifPort& port = m_cells[cell].ports[index];
-            ModulePort made;
-            made.bits = {port.name, static_cast<uint32_t>(m_module->bits.size()), port.numBits};
-            made.direction = port.direction;
-            for (uint32_t bit = 0; bit < port.numBits; ++bit)
-                m_module->bits.push_back(PortNet(port, bit, nets[first[index] + bit]));
-            m_module->ports.push_back(made);
-        }
-    }
-
-    LocalNet PortNet(const EdifPort& port, uint32_t bit, LocalNet joined)
-    {
-        std::string text(m_job.design.names.Text(port.name));
-        if (port.numBits != 1)
-            text += "[" + std::to_string(bit) + "]";
-        if (joined == 0)
-            return AddNet(text);
-        const NameId name = m_job.design.names.Add(text);
-        if (name != m_module->netNames[joined])
-            m_module->aliases.push_back({joined, name});
-        return joined;
-    }
-
-    static uint32_t BitOf(const EdifJoint& joint, uint32_t numBits)
-    {
-        assert(joint.member < numBits);
-        return numBits - 1 - joint.member;
-    }
-
-    // Sorted by instance, then by port and bit, which are the pins of its cell in order.
-    void MakeCells()
-    {
-        std::vector<uint32_t> starts(m_instances.size() + 1, 0);
-        for (const EdifJoint& joint : m_joints)
-            if (joint.instance != kNone)
-                ++starts[joint.instance + 1];
-        for (size_t instance = 0; instance < m_instances.size(); ++instance)
-            starts[instance + 1] += starts[instance];
-        std::vector<EdifJoint> sorted(starts.back());
-        std::vector<uint32_t> places(starts.begin(), starts.end() - 1);
-        for (const EdifJoint& joint : m_joints)
-            if (joint.instance != kNone)
-                sorted[places[joint.instance]++] = joint;
-        for (size_t instance = 0; instance < m_instances.size(); ++instance)
-            MakeCell(m_instances[instance], sorted.data() + starts[instance],
-                     sorted.data() + starts[instance + 1]);
-    }
-
-    void MakeCell(const EdifInstance& instance, EdifJoint* first, EdifJoint* last)
-    {
-        if (m_pace.IsDue())
-            m_pace.Report(m_tokens.Position());
-        std::sort(first, last, [](const EdifJoint& left, const EdifJoint& right) {
-            return left.port != right.port ? left.port < right.port : left.member > right.member;
-        });
-        const EdifCell& cell = m_cells[instance.cell];
-        m_intake.Begin(instance.name, instance.line);
-        m_intake.SetKey(instance.key);
-        m_intake.SetType(m_job.cellTypes.Find(std::string(cell.typeText)) != nullptr
-                             ? cell.typeText
-                             : m_job.design.names.Text(cell.type));
-        for (uint32_t property = 0; property < instance.numProperties; ++property) {
-            const EdifProperty& own = m_properties[instance.firstProperty + property];
-            m_intake.AddParameter(own.name, own.value);
-        }
-        while (first != last) {
-            EdifJoint* end = first;
-            while (end != last && end->port == first->port)
-                ++end;
-            AddPin(instance, first, end);
-            first = end;
-        }
-        m_intake.End();
-    }
-
-    // The joints of one port, the last member first.
-    void AddPin(const EdifInstance& instance, const EdifJoint* first, const EdifJoint* last)
-    {
-        const EdifCell& cell = m_cells[instance.cell];
-        const EdifPort& port = cell.ports[first->port];
-        uint32_t numBits = port.numBits;
-        if (numBits > 1)
-            numBits = std::max(first->member + 1, OwnWidth(instance, port, numBits));
-        m_pin_nets.assign(numBits, kNetOpen);
-        for (const EdifJoint* joint = first; joint != last; ++joint) {
-            LocalNet& net = m_pin_nets[BitOf(*joint, numBits)];
-            if (net == kNetOpen)
-                net = joint->net;
-            else
-                m_module->joins.emplace_back(net, joint->net);
-        }
-        m_intake.AddPin(m_job.design.names.Text(port.name), m_pin_nets.data(), m_pin_nets.size());
-    }
-
-    // Yosys has one cell $lut with as many bits as the widest needs; a narrower one says its own
-    // width and leaves out the last members.
-    uint32_t OwnWidth(const EdifInstance& instance, const EdifPort& port, uint32_t numBits) const
-    {
-        const EdifCell& cell = m_cells[instance.cell];
-        const std::vector<uint32_t>* variants = m_job.cellTypes.Find(std::string(cell.typeText));
-        if (variants == nullptr)
-            return numBits;
-        const CellType& type = m_job.cellTypes.All()[variants->front()];
-        if (type.vectorPin.empty() || type.vectorPin != m_job.design.names.Text(port.name))
-            return numBits;
-        for (uint32_t property = 0; property < instance.numProperties; ++property) {
-            const EdifProperty& own = m_properties[instance.firstProperty + property];
-            if (own.name == type.widthParameter && own.value.isNumber &&
-                own.value.number <= numBits)
-                return static_cast<uint32_t>(own.value.number);
-        }
-        return 0; // as many as are joined
+        m_forms.Refuse("cell " + Quoted(cell.typeText) + " has no port " + Quoted(ident));
     }
 
     // What an identifier means in the view that is read.
@@ -709,11 +400,9 @@ class EdifReader {
     }
 
     const ReadJob& m_job;
-    Pace m_pace;
-    CellIntake m_intake;
-    EdifTokens m_tokens;
-    std::string m_buffer;
-    std::deque<std::string> m_strings;
+    EdifForms m_forms;
+    EdifTokens& m_tokens;
+    EdifView m_view;
 
     NameArena m_idents; // names of the file's own, apart from those of the design
     NameId m_library = 0;
@@ -723,13 +412,8 @@ class EdifReader {
     std::unordered_map<NameId, bool> m_module_names;
     std::unordered_map<uint32_t, std::unordered_map<NameId, uint32_t>> m_ports_of;
 
-    ModuleContent* m_module = nullptr;
     uint32_t m_epoch = 0; // of the view
     std::vector<Known> m_known;
-    std::vector<EdifInstance> m_instances;
-    std::vector<EdifProperty> m_properties;
-    std::vector<EdifJoint> m_joints;
-    std::vector<LocalNet> m_pin_nets;
 };
 
 } // namespace

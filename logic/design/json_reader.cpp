@@ -3,44 +3,14 @@
 #include <cassert>
 #include <unordered_map>
 
-#include <simdjson.h>
-
 #include "cell_intake.h"
+#include "json_values.h"
 #include "read_fault.h"
 #include "readers.h"
 
 namespace booleq {
 
 namespace {
-
-namespace json = simdjson::ondemand;
-
-// The local nets of a module by their number in the file. Numbers are dense, but need not be.
-class BitNumbers {
-  public:
-    explicit BitNumbers(size_t numBytes) : m_max_dense(numBytes / 8) {}
-
-    void Clear()
-    {
-        m_dense.clear();
-        m_sparse.clear();
-    }
-
-    // The element of a bit, 0 at first; valid until the next call.
-    LocalNet& At(uint64_t bit)
-    {
-        if (bit >= m_max_dense)
-            return m_sparse[bit];
-        if (bit >= m_dense.size())
-            m_dense.resize(static_cast<size_t>(bit + bit / 2 + 64), 0);
-        return m_dense[static_cast<size_t>(bit)];
-    }
-
-  private:
-    uint64_t m_max_dense;
-    std::vector<LocalNet> m_dense;
-    std::unordered_map<uint64_t, LocalNet> m_sparse;
-};
 
 class JsonReader {
   public:
@@ -112,54 +82,12 @@ class JsonReader {
         throw ReadFault{where + what};
     }
 
-    // The text of a string that has no escapes as it stands in the file, so that it need not be
-    // copied. Empty data: it has some. The first quotation mark ends it then.
-    static std::string_view Plain(json::raw_json_string raw)
-    {
-        const char* start = raw.raw();
-        const char* end = start;
-        while (*end != '"' && *end != '\\')
-            ++end;
-        return *end == '"' ? std::string_view(start, static_cast<size_t>(end - start))
-                           : std::string_view();
-    }
-
-    static std::string_view KeyOf(simdjson::simdjson_result<json::field>& field)
-    {
-        const std::string_view plain = Plain(field.key());
-        return plain.data() != nullptr ? plain : std::string_view(field.unescaped_key());
-    }
-
-    static std::string_view StringOf(json::value value)
-    {
-        const std::string_view plain = Plain(value.get_raw_json_string());
-        return plain.data() != nullptr ? plain : std::string_view(value.get_string());
-    }
-
-    // Fails: false for what is not a string.
-    static bool GetString(json::value value, std::string_view& text)
-    {
-        if (value.type() != json::json_type::string)
-            return false;
-        text = StringOf(value);
-        return true;
-    }
-
     // Says of each name whether it stood in this section before.
     void EnterSection(const char* section)
     {
         m_place.section = section;
         m_place.item = m_place.part = std::string_view();
         ++m_section;
-    }
-
-    // Yosys writes a backslash before a name of the design that looks like one of its own.
-    static std::string_view WithoutMark(std::string_view name)
-    {
-        const bool isMarked =
-            name.size() > 1 && name[0] == '\\' &&
-            (name[1] == '$' || name[1] == '\\' || (name[1] >= '0' && name[1] <= '9'));
-        return isMarked ? name.substr(1) : name;
     }
 
     NameId AddOnce(std::string_view name)
@@ -222,14 +150,6 @@ class JsonReader {
         NameTheRest();
     }
 
-    // A flag is a number other than 0, or binary digits with a 1.
-    static bool IsSet(json::value value)
-    {
-        if (value.type() == json::json_type::string)
-            return StringOf(value).find('1') != std::string_view::npos;
-        return value.type() == json::json_type::number && double(value.get_double()) != 0;
-    }
-
     void ReadModuleAttributes(json::value attributes)
     {
         for (auto field : attributes.get_object()) {
@@ -275,13 +195,6 @@ class JsonReader {
             else
                 m_bits.push_back(ConstantOf(StringOf(bit)));
         }
-    }
-
-    static PortDirection DirectionOf(std::string_view word)
-    {
-        return word == "input"    ? PortDirection::Input
-               : word == "output" ? PortDirection::Output
-                                  : PortDirection::Both;
     }
 
     void ReadPorts(json::value ports)
@@ -334,13 +247,6 @@ class JsonReader {
             ReadKey(part);
         else if (key == "connections")
             ReadConnections(part);
-    }
-
-    // What is not a string, as it stands there.
-    static std::string_view Token(json::value value)
-    {
-        const std::string_view token = value.raw_json_token();
-        return token.substr(0, token.find_last_not_of(" \t\r\n") + 1);
     }
 
     void ReadParameters(json::value parameters)

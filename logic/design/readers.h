@@ -4,6 +4,7 @@
 #ifndef BOOLEQ_DESIGN_READERS_H
 #define BOOLEQ_DESIGN_READERS_H
 
+#include <string_view>
 #include <vector>
 
 #include "module_content.h"
@@ -24,6 +25,14 @@ struct ReadJob {
 void ReadYosysJson(const ReadJob& job);
 void ReadBlifNetlist(const ReadJob& job);
 void ReadEdif(const ReadJob& job);
+
+// Yosys writes a backslash before a name of the design that looks like one of its own.
+inline std::string_view WithoutMark(std::string_view name)
+{
+    const bool isMarked = name.size() > 1 && name[0] == '\\' &&
+                          (name[1] == '$' || name[1] == '\\' || (name[1] >= '0' && name[1] <= '9'));
+    return isMarked ? name.substr(1) : name;
+}
 
 // Says when it is time to look whether somebody wants the work to end, and tells how far it is.
 class Pace {

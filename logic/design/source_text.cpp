@@ -112,6 +112,10 @@ void SourceText::Finish()
     const auto* head = reinterpret_cast<const unsigned char*>(m_bytes);
     if (m_size >= 2 && head[0] == 0x1f && head[1] == 0x8b)
         Inflate();
+    if (std::memcmp(m_bytes, "\xef\xbb\xbf", 3) == 0) { // the mark of UTF-8; the padding moves, too
+        m_size -= 3;
+        std::memmove(m_bytes, m_bytes + 3, m_size + kPadding);
+    }
     assert(m_bytes[m_size] == 0);
 }
 

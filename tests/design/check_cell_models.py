@@ -66,7 +66,7 @@ def has_pins(text, pins):
 
 def literal(value, bits, own_text, parameter):
     """Some models take a string of hexadecimal digits."""
-    if re.search(rf'parameter\s+{parameter}\s*=\s*"0x', module_text):
+    if re.search(rf'parameter\s+{parameter}\s*=\s*"0x', own_text):
         return f'"0x{value:0{bits // 4}x}"'
     return f"{bits}'h{value:x}"
 

@@ -450,6 +450,12 @@ TEST(NetlistFiles, WhatIsNotANetlistIsRefused)
     EXPECT_EQ(fault, "/: it is a directory");
 }
 
+TEST(NetlistFiles, AByteOrderMarkIsSkipped)
+{
+    EXPECT_EQ(tests::TableLines(MustRead("\xef\xbb\xbf" + std::string(kBlif))),
+              tests::TableLines(MustRead(kBlif)));
+}
+
 // A file that says it has 10 GB costs nothing.
 TEST(NetlistFiles, HugeFilesAreRefusedBeforeTheyAreRead)
 {

@@ -1,5 +1,5 @@
 // Reads a netlist and prints it, for tests that compare netlists.
-// usage: show_design FILE [REFERENCE]
+// usage: show_design FILE [REFERENCE], show_design --count FILE
 // Without a reference: its tables, cell by cell. With one: its tables as functions of nets, which
 // have the names that they have there.
 #include <cstdio>
@@ -27,6 +27,12 @@ int main(int argc, char** argv)
 {
     booleq::Design design;
     booleq::Design reference;
+    if (argc == 3 && std::string(argv[1]) == "--count") { // only reads, for measurements
+        std::string fault;
+        const bool isRead = ReadDesign(argv[2], booleq::ReadOptions(), design, fault);
+        std::printf("%zu tables %s\n", design.tables.size(), fault.c_str());
+        return isRead ? 0 : 2;
+    }
     if (argc < 2 || argc > 3 || !MustRead(argv[1], design) ||
         (argc == 3 && !MustRead(argv[2], reference)))
         return 2;

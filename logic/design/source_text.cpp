@@ -8,11 +8,11 @@
 #include <new>
 
 #include <fcntl.h>
-#include <sys/mman.h>
 #include <sys/stat.h>
 #include <unistd.h>
-
-#include <zlib.h>
+#if !defined(_WIN32)
+#include <sys/mman.h>
+#endif
 
 #include "read_fault.h"
 #include "watch.h"
@@ -21,10 +21,12 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kFirstBytes = size_t(1) << 16;
 constexpr size_t kLargePage = size_t(1) << 21;
-constexpr size_t kReadBytes = size_t(1) << 24;
-constexpr char kTooLarge[] = "the text is larger than 4,294,967,000 bytes";
+#if defined(_WIN32)
+constexpr int kReading = O_RDONLY | O_BINARY;
+#else
+constexpr int kReading = O_RDONLY | O_CLOEXEC;
+#endif
 
 std::string SystemReason()
 {
@@ -34,11 +36,15 @@ std::string SystemReason()
 // In large pages, where the system has them: filling small ones takes as long as reading the file.
 void* AllocateLarge(size_t numBytes)
 {
+#if defined(MADV_HUGEPAGE)
     void* block = nullptr;
     if (posix_memalign(&block, kLargePage, numBytes) != 0)
         return nullptr;
     madvise(block, numBytes, MADV_HUGEPAGE); // a hint
     return block;
+#else
+    return std::malloc(numBytes);
+#endif
 }
 
 class Descriptor {
@@ -55,24 +61,6 @@ class Descriptor {
 
   private:
     int m_descriptor;
-};
-
-// A stream of zlib that is ended.
-class Inflater {
-  public:
-    Inflater()
-    {
-        std::memset(&m_stream, 0, sizeof m_stream);
-        if (inflateInit2(&m_stream, 15 + 16) != Z_OK) // gzip's header
-            throw std::bad_alloc();
-    }
-    ~Inflater() { inflateEnd(&m_stream); }
-    Inflater(const Inflater&) = delete;
-    Inflater& operator=(const Inflater&) = delete;
-    z_stream& Stream() { return m_stream; }
-
-  private:
-    z_stream m_stream;
 };
 
 } // namespace
@@ -93,7 +81,7 @@ void SourceText::Release()
 void SourceText::Reserve(size_t numBytes)
 {
     if (numBytes > kMaxSourceBytes + kPadding)
-        throw ReadFault{kTooLarge};
+        throw ReadFault{kSourceTooLarge};
     if (numBytes <= m_capacity)
         return;
     auto* bytes = static_cast<char*>(m_bytes == nullptr && numBytes >= kLargePage
@@ -125,7 +113,7 @@ void SourceText::ReadFile(const std::string& file)
         ReadStream(STDIN_FILENO);
         return;
     }
-    const Descriptor descriptor(open(file.c_str(), O_RDONLY | O_CLOEXEC));
+    const Descriptor descriptor(open(file.c_str(), kReading));
     if (descriptor.Get() < 0)
         throw ReadFault{"cannot open it: " + SystemReason()};
     struct stat status;
@@ -135,7 +123,7 @@ void SourceText::ReadFile(const std::string& file)
         throw ReadFault{"it is a directory"};
     if (S_ISREG(status.st_mode)) {
         if (static_cast<uint64_t>(status.st_size) > kMaxSourceBytes)
-            throw ReadFault{kTooLarge};
+            throw ReadFault{kSourceTooLarge};
         Reserve(static_cast<size_t>(status.st_size) + kPadding + 1);
     }
     ReadStream(descriptor.Get());
@@ -146,13 +134,14 @@ void SourceText::ReadStream(int descriptor)
     for (;;) {
         Watch();
         if (m_capacity < m_size + kPadding + 1)
-            Reserve(std::max(kFirstBytes,
+            Reserve(std::max(kFirstSourceBytes,
                              static_cast<size_t>(std::min<uint64_t>(
                                  m_size + m_size / 2 + kPadding + 1, kMaxSourceBytes + kPadding))));
         if (m_capacity < m_size + kPadding + 1)
-            throw ReadFault{kTooLarge};
-        const size_t room = std::min(m_capacity - m_size - kPadding, kReadBytes);
-        const ssize_t numRead = read(descriptor, m_bytes + m_size, room);
+            throw ReadFault{kSourceTooLarge};
+        const size_t room = std::min(m_capacity - m_size - kPadding, kSourceReadBytes);
+        const ssize_t numRead =
+            read(descriptor, m_bytes + m_size, static_cast<unsigned int>(room)); // small
         if (numRead < 0 && errno == EINTR)
             continue;
         if (numRead < 0)
@@ -171,46 +160,6 @@ void SourceText::Copy(std::string_view text)
         std::memcpy(m_bytes, text.data(), text.size());
     m_size = text.size();
     Finish();
-}
-
-// One member after another, as gzip files may have them; the length that the file announces is not
-// believed.
-void SourceText::Inflate()
-{
-    SourceText plain;
-    Inflater inflater;
-    z_stream& stream = inflater.Stream();
-    size_t numTaken = 0;
-    int status = Z_OK;
-    while (status != Z_STREAM_END || numTaken < m_size) {
-        Watch();
-        if (status == Z_STREAM_END && inflateReset(&stream) != Z_OK)
-            throw ReadFault{"the compressed file is damaged"};
-        plain.Reserve(std::max(plain.m_capacity, static_cast<size_t>(std::min<uint64_t>(
-                                                     plain.m_size * 3 / 2 + kFirstBytes,
-                                                     kMaxSourceBytes + kPadding))));
-        const size_t room = std::min(plain.m_capacity - plain.m_size - kPadding, kReadBytes);
-        if (room == 0)
-            throw ReadFault{kTooLarge};
-        stream.next_in = reinterpret_cast<Bytef*>(m_bytes + numTaken);
-        stream.avail_in = static_cast<uInt>(std::min(m_size - numTaken, kReadBytes));
-        stream.next_out = reinterpret_cast<Bytef*>(plain.m_bytes + plain.m_size);
-        stream.avail_out = static_cast<uInt>(room);
-        const uInt numOffered = stream.avail_in;
-        status = inflate(&stream, Z_NO_FLUSH);
-        numTaken += numOffered - stream.avail_in;
-        plain.m_size += room - stream.avail_out;
-        if (status == Z_BUF_ERROR ||
-            (status == Z_OK && numTaken == m_size && stream.avail_out != 0))
-            throw ReadFault{"the compressed file is not whole"};
-        if (status != Z_OK && status != Z_STREAM_END)
-            throw ReadFault{"the compressed file is damaged"};
-    }
-    plain.Reserve(plain.m_size + kPadding);
-    std::memset(plain.m_bytes + plain.m_size, 0, kPadding);
-    std::swap(m_bytes, plain.m_bytes);
-    std::swap(m_size, plain.m_size);
-    std::swap(m_capacity, plain.m_capacity);
 }
 
 uint64_t SourceText::LineOf(size_t position) const

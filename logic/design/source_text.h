@@ -11,6 +11,9 @@ namespace booleq {
 
 // Positions in a text are 32 bits in the readers.
 constexpr uint64_t kMaxSourceBytes = 4294967000;
+constexpr char kSourceTooLarge[] = "the text is larger than 4,294,967,000 bytes";
+constexpr size_t kFirstSourceBytes = size_t(1) << 16;
+constexpr size_t kSourceReadBytes = size_t(1) << 24; // at a time
 
 // Invariant: kPadding zero bytes follow the text.
 class SourceText {

@@ -1,0 +1,13 @@
+// In place of gzip_text.cpp, for a build without zlib.
+#include "source_text.h"
+
+#include "read_fault.h"
+
+namespace booleq {
+
+void SourceText::Inflate()
+{
+    throw ReadFault{"it is compressed, and this build has no zlib; uncompress it first (gunzip)"};
+}
+
+} // namespace booleq

@@ -1,0 +1,13 @@
+// In place of json_reader.cpp, for a build without simdjson.
+#include "read_fault.h"
+#include "readers.h"
+
+namespace booleq {
+
+void ReadYosysJson(const ReadJob&)
+{
+    throw ReadFault{
+        "this build cannot read JSON, because simdjson was missing; write BLIF or EDIF"};
+}
+
+} // namespace booleq

@@ -18,6 +18,15 @@ bool IsPrintableByte(char byte)
     return byte >= ' ' && byte <= '~';
 }
 
+// Signs without a picture of their own, some of which turn the direction of the text around them:
+// locales call them printable.
+bool IsUnseen(wchar_t character)
+{
+    const auto code = static_cast<unsigned long>(character);
+    return (code >= 0x200b && code <= 0x200f) || (code >= 0x2028 && code <= 0x202e) ||
+           (code >= 0x2060 && code <= 0x206f) || code == 0xfeff;
+}
+
 // Bytes of the printable character that begins there, 0 for none.
 size_t PrintableLength(const std::string& text, size_t position)
 {
@@ -30,7 +39,10 @@ size_t PrintableLength(const std::string& text, size_t position)
     const size_t length =
         std::mbrtowc(&character, text.data() + position, text.size() - position, &state);
     const bool isWhole = length != 0 && length <= text.size() - position;
-    return isWhole && std::iswprint(static_cast<std::wint_t>(character)) != 0 ? length : 0;
+    return isWhole && !IsUnseen(character) &&
+                   std::iswprint(static_cast<std::wint_t>(character)) != 0
+               ? length
+               : 0;
 }
 
 } // namespace

@@ -67,8 +67,9 @@ constexpr size_t kAnyNumber = static_cast<size_t>(-1);
 const std::vector<Command>& Commands();
 // Null for a word that is no command.
 const Command* FindCommand(const std::string& word);
-// The command whose name is most like the word, a letter or two apart; null when none is.
-const Command* NearestCommand(const std::string& word);
+// The command whose name is most like the word, a letter or two apart; null when none is. A word
+// that must be a command may be a short one, or a name's beginning.
+const Command* NearestCommand(const std::string& word, bool isCommand);
 // Options that every command takes.
 const std::vector<Option>& CommonOptions();
 

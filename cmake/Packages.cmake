@@ -109,6 +109,7 @@ python3 (<< ${Python_VERSION_MAJOR}.${kq_next_minor})")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
   set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS
       "${kq_library_package} (>= ${PROJECT_VERSION}), ${kq_python_dependency}, python3-numpy")
+  set(CPACK_DEBIAN_PYTHON_PACKAGE_RECOMMENDS booleq) # 'python3 -m booleq' starts it
   set(CPACK_DEBIAN_PYTHON_PACKAGE_SUGGESTS "kq-boolequation-doc")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA
       "${CMAKE_CURRENT_LIST_DIR}/packages/python/postinst"

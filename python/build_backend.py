@@ -2,7 +2,15 @@
 
 Standard library only, so that nothing has to be fetched. The wheel holds the module, the libraries
 that it uses beside it, and metadata; the source distribution holds what building a wheel takes.
+Called as a program it writes the directory *.dist-info of an installation that CMake makes:
+build_backend.py dist-info DIRECTORY.
 """
+import sys
+
+if sys.version_info < (3, 11):  # said before what follows fails to be imported
+    raise SystemExit("booleq needs Python 3.11 or newer; this is Python " +
+                     ".".join(str(number) for number in sys.version_info[:3]))
+
 import base64
 import hashlib
 import io
@@ -10,7 +18,6 @@ import os
 import re
 import shutil
 import subprocess
-import sys
 import sysconfig
 import tarfile
 import tempfile
@@ -22,7 +29,7 @@ ROOT = Path(__file__).resolve().parent.parent
 PROJECT = tomllib.loads((ROOT / "pyproject.toml").read_text(encoding="utf-8"))["project"]
 NAME = PROJECT["name"]
 SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
-           "include", "logic", "port", "python", "s"]
+           "include", "logic", "port", "python", "s", "tools"]
 DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
 
 
@@ -66,8 +73,14 @@ def _run(*command):
                          "apt-get install cmake g++ make pybind11-dev python3-dev")
 
 
-def _build_and_install(prefix):
-    """Installs the package below 'prefix'; the build directory stays, for the next time."""
+def _has_tool_headers():
+    """Whether the command-line tool can be built, which takes two libraries of headers."""
+    return all(any((Path(root) / header).exists() for root in ("/usr/include", "/usr/local/include"))
+               for header in ("CLI/CLI.hpp", "nlohmann/json.hpp"))
+
+
+def _build():
+    """Builds the package; the build directory, which it returns, stays for the next time."""
     if shutil.which("cmake") is None:
         raise SystemExit(f"{NAME} is built by CMake, and there is none; on Debian 12: "
                          "apt-get install cmake g++ make pybind11-dev python3-dev")
@@ -78,10 +91,12 @@ def _build_and_install(prefix):
             shutil.rmtree(build)  # the tree was moved
     generator = ["-G", "Ninja"] if shutil.which("ninja") else []
     _run("cmake", "-S", ROOT, "-B", build, *generator, "-DCMAKE_BUILD_TYPE=Release",
-         "-DBUILD_TESTING=OFF", "-DKQ_BUILD_TOOLS=OFF", "-DKQ_BUILD_LOGIC=OFF", "-DKQ_BUILD_PYTHON=ON",
+         "-DBUILD_TESTING=OFF", "-DKQ_BUILD_LOGIC=OFF",
+         f"-DKQ_BUILD_TOOLS={'ON' if _has_tool_headers() else 'OFF'}", "-DKQ_BUILD_PYTHON=ON",
          "-DKQ_PYTHON_BUNDLE=ON", "-DKQ_PYTHON_DIR=.", f"-DPython_EXECUTABLE={sys.executable}")
-    _run("cmake", "--build", build, "--target", "_booleq", "--parallel", os.cpu_count() or 1)
-    _run("cmake", "--install", build, "--component", "python", "--prefix", prefix, "--strip")
+    targets = ["_booleq", *(["booleq"] if _has_tool_headers() else [])]
+    _run("cmake", "--build", build, "--target", *targets, "--parallel", os.cpu_count() or 1)
+    return build
 
 
 class _Wheel:
@@ -134,14 +149,32 @@ def build_wheel(wheel_directory, config_settings=None, metadata_directory=None):
     information = f"{NAME}-{_version()}.dist-info"
     file_name = f"{NAME}-{_version()}-{_tag()}.whl"
     with tempfile.TemporaryDirectory() as prefix:
-        _build_and_install(prefix)
+        _run("cmake", "--install", _build(), "--component", "python", "--prefix", prefix, "--strip")
         wheel = _Wheel(Path(wheel_directory) / file_name, information)
         for path in sorted(Path(prefix).rglob("*")):
             if path.is_file():
                 name = path.relative_to(prefix).as_posix()
-                wheel.add(name, path.read_bytes(), 0o755 if ".so" in path.name else 0o644)
+                wheel.add(name, path.read_bytes(), 0o755 if ".so" in path.name or path.name == "_tool" else 0o644)
         _write_information(lambda name, content: wheel.add(f"{information}/{name}", content))
         wheel.close()
+    return file_name
+
+
+def get_requires_for_build_editable(config_settings=None):
+    return []
+
+
+prepare_metadata_for_build_editable = prepare_metadata_for_build_wheel
+
+
+def build_editable(wheel_directory, config_settings=None, metadata_directory=None):
+    """A wheel that points at the build directory, whose package is links to the sources' files."""
+    information = f"{NAME}-{_version()}.dist-info"
+    file_name = f"{NAME}-{_version()}-{_tag()}.whl"
+    wheel = _Wheel(Path(wheel_directory) / file_name, information)
+    wheel.add(f"__editable__.{NAME}.pth", f"{_build() / 'python'}\n".encode())
+    _write_information(lambda name, content: wheel.add(f"{information}/{name}", content))
+    wheel.close()
     return file_name
 
 
@@ -170,3 +203,17 @@ def build_sdist(sdist_directory, config_settings=None):
         entry.size = len(content)
         sdist.addfile(entry, io.BytesIO(content))
     return file_name
+
+
+def _write_installed(directory):
+    """What pip and importlib.metadata read of a package that another program has installed."""
+    information = Path(directory) / f"{NAME}-{_version()}.dist-info"
+    information.mkdir(parents=True, exist_ok=True)
+    _write_information(lambda name, content: (information / name).write_bytes(content))
+    (information / "INSTALLER").write_text("cmake\n", encoding="utf-8")
+
+
+if __name__ == "__main__":
+    if len(sys.argv) != 3 or sys.argv[1] != "dist-info":
+        raise SystemExit("usage: build_backend.py dist-info DIRECTORY")
+    _write_installed(sys.argv[2])

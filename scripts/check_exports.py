@@ -5,8 +5,8 @@ usage: check_exports.py LIBRARY [--host NAME] [--second FIRST] [--objects FILE..
 
 Exported names belong to the classes Kq_BoolEquation and Kq_BoolEquationImp; the needed libraries are
 the host library, the C++ library and the C library. With --second LIBRARY is the second library: its
-names belong to the namespace kq_logic, and it needs FIRST, the first library, too. With --objects, static objects with a run-time
-initialiser are looked for too: only the engine's main source may have them (and the node model its
+names belong to the namespace kq_logic, and it needs FIRST, the first library, and what reads netlists
+too. With --objects, static objects with a run-time initialiser are looked for too: only the engine's main source may have them (and the node model its
 class allocator), because the order of initialisation across files is undefined.
 Exit status: 1 when something was found.
 """
@@ -21,6 +21,7 @@ import sys
 EXPORTED = re.compile(r"_ZNK?(15Kq_BoolEquation|18Kq_BoolEquationImp)")
 SECOND = re.compile(r"_ZNK?8kq_logic")
 NEEDED = re.compile(r"(libstdc\+\+|libc\+\+|libc\+\+abi|libgcc_s|libc|libm|ld-linux[-\w]*)\.so[.\d]*")
+NETLIST_READERS = ["libsimdjson.so", "libz.so"]
 WITH_INITIALISERS = {"Kq_BoolEquationImp.cpp.o", "Kq_BoolEquationImpNode.cpp.o"}
 
 
@@ -62,8 +63,9 @@ def main():
     parser.add_argument("--objects", nargs="*", default=[])
     arguments = parser.parse_args()
     ours = [name.removesuffix(".so") + ".so" for name in (arguments.host, arguments.second) if name]
+    known = ours + (NETLIST_READERS if arguments.second else [])
     found = [*find_foreign_exports(arguments.library, SECOND if arguments.second else EXPORTED),
-             *find_foreign_libraries(arguments.library, ours, ours[-1]),
+             *find_foreign_libraries(arguments.library, known, ours[-1]),
              *find_initialisers(arguments.objects)]
     print("\n".join(found), end="\n" if found else "")
     return 1 if found else 0

@@ -189,7 +189,7 @@ tool_finds_library() {
 }
 
 module_answers() {
-    in_root user 60 python3 -c 'from booleq import Equation; print(Equation("A & ~B").hex_init)' |
+    in_root user 60 python3 -c 'from booleq import Equation; print(Equation("A & ~B").hex_init())' |
         grep -x 0x4
 }
 

@@ -4,11 +4,10 @@
 #include <unordered_map>
 
 #include "convert.h"
-#include "foreign_tree.h"
+#include "foreign_text.h"
 #include "function.h"
 #include "lint_reason.h"
 #include "notation_writer.h"
-#include "short_form.h"
 #include "text.h"
 
 namespace booleq {
@@ -16,7 +15,6 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
-constexpr size_t kMaxShortenedInputs = 8;
 constexpr double kMaxCauses = 16; // that lint_reason.h tries
 
 std::string WithoutLineEnd(std::string text)
@@ -44,13 +42,9 @@ void Renumber(const Notation& notation, const std::vector<std::string>& names, F
 std::string TextHere(const ForeignTree& tree, const WordFunction& function)
 {
     Expression expression;
-    if (ToExpression(tree, expression))
-        return WriteOwn(expression, OwnSyntax::First, Parentheses::Clear);
-    if (tree.names.size() > kMaxShortenedInputs)
-        return std::string();
-    const ShortForm shortForm = FindShortForm(Tabulate(function, tree.names));
-    return shortForm.isFound ? WriteOwn(shortForm.expression, OwnSyntax::First, Parentheses::Clear)
-                             : std::string();
+    return ToBits(tree, function, expression)
+               ? WriteOwn(expression, OwnSyntax::First, Parentheses::Clear)
+               : std::string();
 }
 
 ForeignReading ReadAs(const Notation& notation, const std::string& text,

@@ -3,6 +3,10 @@
 #ifndef BOOLEQ_BASE_MESSAGES_H
 #define BOOLEQ_BASE_MESSAGES_H
 
+#include <cassert>
+#include <cstddef>
+#include <cstdio>
+#include <mutex>
 #include <type_traits>
 #include <utility>
 
@@ -10,8 +14,9 @@
 
 namespace booleq {
 
-// Drops the host's messages while it lives, and then lets them go where they went before.
+// Drops the messages of this thread while it lives; those of other threads go on as before.
 // A host whose message manager cannot be redirected keeps its own way.
+// Threads: any number of them may be silent, each for as long as it likes.
 template <class Manager, class = void>
 class Silence {
 };
@@ -20,15 +25,60 @@ template <class Manager>
 class Silence<Manager, std::void_t<decltype(Manager::setSink(typename Manager::Sink()))>> {
   public:
     Silence()
-        : m_sink(Manager::setSink([](const char*, const char*, int, const char*, const char*) {}))
     {
+        Shared& shared = GetShared();
+        const std::lock_guard<std::mutex> guard(shared.mutex);
+        if (shared.numSilences == 0)
+            shared.former = Manager::setSink(&Pass);
+        ++shared.numSilences;
+        ++Depth();
     }
-    ~Silence() { Manager::setSink(std::move(m_sink)); }
+    ~Silence()
+    {
+        typename Manager::Sink mine; // destroyed with the mutex free
+        Shared& shared = GetShared();
+        const std::lock_guard<std::mutex> guard(shared.mutex);
+        assert(shared.numSilences > 0 && Depth() > 0);
+        --Depth();
+        if (--shared.numSilences == 0)
+            mine = Manager::setSink(std::exchange(shared.former, nullptr));
+    }
     Silence(const Silence&) = delete;
     Silence& operator=(const Silence&) = delete;
 
   private:
-    typename Manager::Sink m_sink;
+    // Invariant: our sink is installed while there are silences, 'former' is whose turn it was.
+    struct Shared {
+        std::mutex mutex;
+        size_t numSilences = 0;
+        typename Manager::Sink former;
+    };
+    static Shared& GetShared()
+    {
+        static Shared shared;
+        return shared;
+    }
+    static size_t& Depth()
+    {
+        static thread_local size_t depth = 0;
+        return depth;
+    }
+    static void Pass(const char* id, const char* file, int line, const char* revision,
+                     const char* text)
+    {
+        if (Depth() > 0)
+            return;
+        typename Manager::Sink former;
+        {
+            Shared& shared = GetShared();
+            const std::lock_guard<std::mutex> guard(shared.mutex);
+            former = shared.former;
+        }
+        if (former)
+            former(id, file, line, revision, text);
+        else
+            std::fputs(text, stderr);
+    }
 };
 
 typedef Silence<Port_MsgManData> NoMessages;

@@ -2,8 +2,6 @@
 
 #include <algorithm>
 #include <cassert>
-#include <cwchar>
-#include <cwctype>
 
 namespace booleq {
 
@@ -11,7 +9,7 @@ namespace {
 
 constexpr size_t kExcerptBytes = 60;
 
-bool isUtf8Shown = false;
+CharacterTest isShown = nullptr;
 
 bool IsPrintableByte(char byte)
 {
@@ -20,11 +18,33 @@ bool IsPrintableByte(char byte)
 
 // Signs without a picture of their own, some of which turn the direction of the text around them:
 // locales call them printable.
-bool IsUnseen(wchar_t character)
+bool IsUnseen(uint32_t code)
 {
-    const auto code = static_cast<unsigned long>(character);
     return (code >= 0x200b && code <= 0x200f) || (code >= 0x2028 && code <= 0x202e) ||
            (code >= 0x2060 && code <= 0x206f) || code == 0xfeff;
+}
+
+// Bytes of the character of UTF-8 that begins there, and which it is; 0 for none.
+size_t ReadCharacter(const std::string& text, size_t position, uint32_t& character)
+{
+    constexpr uint32_t kLowest[] = {0, 0, 0x80, 0x800, 0x10000}; // that takes so many bytes
+    const auto first = static_cast<unsigned char>(text[position]);
+    const size_t length = first < 0xc2   ? 0
+                          : first < 0xe0 ? 2
+                          : first < 0xf0 ? 3
+                          : first < 0xf5 ? 4
+                                         : 0;
+    if (length == 0 || position + length > text.size())
+        return 0;
+    character = first & (0x7fu >> length);
+    for (size_t next = 1; next < length; ++next) {
+        const auto byte = static_cast<unsigned char>(text[position + next]);
+        if ((byte & 0xc0u) != 0x80u)
+            return 0;
+        character = character << 6 | (byte & 0x3fu);
+    }
+    const bool isSurrogate = character >= 0xd800 && character < 0xe000;
+    return character < kLowest[length] || isSurrogate || character > 0x10ffff ? 0 : length;
 }
 
 // Bytes of the printable character that begins there, 0 for none.
@@ -32,24 +52,16 @@ size_t PrintableLength(const std::string& text, size_t position)
 {
     if (IsPrintableByte(text[position]))
         return 1;
-    if (!isUtf8Shown || static_cast<unsigned char>(text[position]) < 0x80)
-        return 0;
-    wchar_t character = 0;
-    std::mbstate_t state = {};
-    const size_t length =
-        std::mbrtowc(&character, text.data() + position, text.size() - position, &state);
-    const bool isWhole = length != 0 && length <= text.size() - position;
-    return isWhole && !IsUnseen(character) &&
-                   std::iswprint(static_cast<std::wint_t>(character)) != 0
-               ? length
-               : 0;
+    uint32_t character = 0;
+    const size_t length = isShown ? ReadCharacter(text, position, character) : 0;
+    return length > 0 && !IsUnseen(character) && isShown(character) ? length : 0;
 }
 
 } // namespace
 
-void ShowUtf8(bool isShown)
+void ShowUtf8(CharacterTest test)
 {
-    isUtf8Shown = isShown;
+    isShown = test;
 }
 
 size_t Width(const std::string& visible)
@@ -95,8 +107,11 @@ std::string Excerpt(const std::string& text)
 {
     if (text.size() <= kExcerptBytes)
         return Visible(text);
-    return Visible(text.substr(0, kExcerptBytes)) + "... (" + std::to_string(text.size()) +
-           " bytes)";
+    size_t length = kExcerptBytes; // and no part of a character
+    while (length > kExcerptBytes - 3 &&
+           (static_cast<unsigned char>(text[length]) & 0xc0u) == 0x80u)
+        --length;
+    return Visible(text.substr(0, length)) + "... (" + std::to_string(text.size()) + " bytes)";
 }
 
 std::string Count(uint64_t number, const std::string& noun)

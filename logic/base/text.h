@@ -14,15 +14,16 @@ std::string ToStd(const Port::StringBase<char>& text);
 
 // True when every byte is printable ASCII, so that Visible changes nothing.
 bool IsPrintable(const std::string& text);
-// From now on Visible leaves characters of UTF-8 that the locale can print; at first it does not.
-// Threads: before others start.
-void ShowUtf8(bool isShown);
+// From now on Visible leaves characters of UTF-8, of more than one byte, for which the test is
+// true; at first, and for null, it leaves none. Threads: before others start.
+typedef bool (*CharacterTest)(uint32_t character);
+void ShowUtf8(CharacterTest test);
 // How many columns of a terminal a visible text takes.
 size_t Width(const std::string& visible);
 // Every byte that is not printable ASCII as \xNN: a name may hold any byte, an escape sequence for
 // the terminal too.
 std::string Visible(const std::string& text);
-// Visible, cut behind 60 bytes; what was cut is counted.
+// Visible, cut after 60 bytes; what was cut is counted.
 std::string Excerpt(const std::string& text);
 // "1 input", "2 inputs".
 std::string Count(uint64_t number, const std::string& noun);

@@ -1,116 +1,120 @@
-// Reads files of gates of the form BLIF: as much of it as the writer uses, one model, one output.
-// Fails: false, 'network' is as it was.  Cost: in step with the text.
-#include <sstream>
-
+// Makes a network of a BLIF text, which is read as any netlist is. Of what such a file may say it
+// takes what a network has room for: one model, one output, tables alone, each signal defined
+// before its use. Fails: false, 'network' is as it was.  Cost: in step with the text and the rows
+// of the tables.
+#include "fold.h"
 #include "network_builder.h"
+#include "read_design.h"
 
 namespace booleq {
 
 namespace {
 
-class BlifReader {
+constexpr uint32_t kNoSignal = UINT32_MAX;
+
+class DesignNetwork {
   public:
-    // Fails: false, also for a text without an end.
-    bool Read(const std::string& text)
+    explicit DesignNetwork(const Design& design)
+        : m_design(design), m_signals(design.nets.size(), kNoSignal)
     {
-        std::istringstream lines(text);
-        for (std::string line; !m_is_at_end && std::getline(lines, line);) {
-            m_words = SplitWords(line);
-            if (!m_words.empty() && m_words[0][0] != '#' && !ReadLine())
-                return false;
-        }
-        return m_is_at_end;
     }
 
-    bool Take(Network& network) { return m_builder.Take(m_output, network); }
+    bool Make(Network& network)
+    {
+        if (!m_design.findings.empty() || !m_design.unread.empty() ||
+            m_design.numCells != m_design.tables.size() || m_design.scopes.size() != 1)
+            return false;
+        std::string output;
+        NetId outputNet = kNetOpen;
+        for (const DesignPort& port : m_design.ports) {
+            const std::string name(m_design.names.Text(port.name));
+            if (port.direction != PortDirection::Input) {
+                if (!output.empty())
+                    return false;
+                output = name;
+                outputNet = port.net;
+            } else if (!AddInput(name, port.net)) {
+                return false;
+            }
+        }
+        for (const DesignTable& table : m_design.tables)
+            if (!AddTable(table,
+                          table.output == outputNet ? output : NetName(m_design, table.output)))
+                return false;
+        return Connect(output, outputNet) && m_builder.Take(output, network);
+    }
 
   private:
-    struct Directive {
-        const char* word;
-        bool (BlifReader::*read)();
-    };
-
-    bool ReadLine()
+    bool AddInput(const std::string& name, NetId net)
     {
-        static constexpr Directive kDirectives[] = {{".model", &BlifReader::ReadModel},
-                                                    {".inputs", &BlifReader::ReadInputs},
-                                                    {".outputs", &BlifReader::ReadOutputs},
-                                                    {".names", &BlifReader::ReadNames},
-                                                    {".end", &BlifReader::ReadEnd}};
-        if (m_words[0][0] != '.')
-            return ReadRow();
-        EndTable();
-        for (const Directive& directive : kDirectives)
-            if (m_words[0] == directive.word)
-                return (this->*directive.read)();
-        return false;
+        m_signals[net] = static_cast<uint32_t>(m_num_signals++);
+        return net >= kNumFixedNets && m_builder.AddInput(name);
     }
 
-    bool ReadModel() { return true; }
-
-    bool ReadInputs()
+    bool AddSignal(const std::string& name, Expression expression)
     {
-        for (size_t word = 1; word < m_words.size(); ++word)
-            if (!m_builder.AddInput(m_words[word]))
-                return false;
-        return true;
-    }
-
-    bool ReadOutputs()
-    {
-        if (m_words.size() != 2)
+        if (!m_builder.AddSignal(name))
             return false;
-        m_output = m_words[1];
+        ++m_num_signals;
+        m_builder.DefineLast(std::move(expression));
         return true;
     }
 
-    // Opens the table of the signal that is named last.
-    bool ReadNames()
+    bool AddTable(const DesignTable& table, const std::string& name)
     {
-        if (m_words.size() < 2)
-            return false;
-        m_operands.assign(m_words.size() - 2, 0);
-        for (size_t operand = 0; operand < m_operands.size(); ++operand)
-            if (!m_builder.Find(m_words[operand + 1], m_operands[operand]))
+        const FoldedRows folded = FoldTable(m_design, table);
+        std::vector<uint32_t> operands;
+        for (const NetId net : folded.nets) {
+            if (m_signals[net] == kNoSignal)
                 return false;
-        m_is_in_table = true;
-        return m_builder.AddSignal(m_words.back());
-    }
-
-    bool ReadRow()
-    {
-        return m_is_in_table && m_words.size() <= 2 && m_words.back() == "1" &&
-               m_table.Add(m_words.size() == 2 ? m_words[0] : std::string(), m_operands);
-    }
-
-    bool ReadEnd()
-    {
-        m_is_at_end = true;
+            operands.push_back(m_signals[net]);
+        }
+        SumOfRows sum;
+        for (uint64_t row = 0; row < folded.rows.NumRows(); ++row) {
+            std::string text;
+            for (size_t input = operands.size(); input-- > 0;)
+                text += (row >> input & 1u) != 0 ? '1' : '0';
+            if (folded.rows.At(row) && !sum.Add(text, operands))
+                return false;
+        }
+        const auto signal = static_cast<uint32_t>(m_num_signals);
+        if (!AddSignal(name, sum.Take()))
+            return false;
+        m_signals[table.output] = signal;
         return true;
     }
 
-    void EndTable()
+    // An output that no table drives is a constant or another name of a signal.
+    bool Connect(const std::string& name, NetId net)
     {
-        if (m_is_in_table)
-            m_builder.DefineLast(m_table.Take());
-        m_is_in_table = false;
+        Expression expression;
+        if (net <= kNetOne) {
+            AddConstant(expression, net == kNetOne);
+            return AddSignal(name, std::move(expression));
+        }
+        uint32_t signal = 0;
+        if (m_builder.Find(name, signal))
+            return true;
+        if (m_signals[net] == kNoSignal)
+            return false;
+        expression.nodes.push_back({Operator::Input, 0, m_signals[net], 0});
+        return AddSignal(name, std::move(expression));
     }
 
+    const Design& m_design;
     NetworkBuilder m_builder;
-    TableRows m_table;
-    std::vector<std::string> m_words; // of the line
-    std::vector<uint32_t> m_operands; // of the table
-    std::string m_output;
-    bool m_is_in_table = false;
-    bool m_is_at_end = false;
+    std::vector<uint32_t> m_signals; // by net
+    size_t m_num_signals = 0;
 };
 
 } // namespace
 
 bool ReadBlif(const std::string& text, Network& network)
 {
-    BlifReader reader;
-    return reader.Read(text) && reader.Take(network);
+    Design design;
+    std::string fault;
+    return ReadDesignText(text, "text", ReadOptions(), design, fault) && design.format == "BLIF" &&
+           DesignNetwork(design).Make(network);
 }
 
 } // namespace booleq

@@ -57,7 +57,7 @@ bool NetworkBuilder::Take(const std::string& output, Network& network)
     return true;
 }
 
-bool TableRows::Add(const std::string& row, const std::vector<uint32_t>& signals)
+bool SumOfRows::Add(const std::string& row, const std::vector<uint32_t>& signals)
 {
     if (row.size() != signals.size())
         return false;
@@ -84,7 +84,7 @@ bool TableRows::Add(const std::string& row, const std::vector<uint32_t>& signals
     return true;
 }
 
-Expression TableRows::Take()
+Expression SumOfRows::Take()
 {
     if (m_sum.nodes.empty())
         AddConstant(m_sum, false);

@@ -33,7 +33,7 @@ class NetworkBuilder {
 };
 
 // A table of rows over signals as a sum of products.
-class TableRows {
+class SumOfRows {
   public:
     // Fails: false for other characters than "01-", or too many or few.
     bool Add(const std::string& row, const std::vector<uint32_t>& signals);

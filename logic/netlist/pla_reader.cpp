@@ -26,7 +26,7 @@ bool ReadPla(const std::string& text, Network& network)
         return false;
     std::vector<uint32_t> inputs(table.inputs.size());
     std::iota(inputs.begin(), inputs.end(), 0u);
-    TableRows rows;
+    SumOfRows rows;
     for (size_t index = 0; index < table.on.Size(); ++index) {
         const std::string row = CubeText(table.space, table.on.At(index));
         if (!rows.Add(row.substr(0, inputs.size()), inputs))

@@ -1,25 +1,22 @@
 #!/usr/bin/env python3
-"""What eval_many and truth_table take, beside plain Python and NumPy, in one run.
+"""What eval_many, tables of look-up tables and equations in bulk take, beside NumPy, in one run.
 
 usage: ./dev python python/bench/bench_arrays.py [REPEATS]
 
-All three compute the same and are compared before they are timed. "Python" calls a compiled lambda
-for each row, "NumPy" the same lambda once, on whole columns. The lambda is the formula as Python
-writes it, without a parser; the module reads its own text. Times are the least of REPEATS (5).
-Prints the table that docs/python.md shows.
+Beside eval_many stands NumPy in its strongest form: the formula as Python writes it, without a
+parser, on contiguous columns of uint8. Results are compared before they are timed. Times are the
+least of REPEATS (5). Prints the tables that docs/python.md shows.
 """
-import itertools
 import sys
 import time
 from typing import Any, Callable, List
 
+import booleq
 import numpy as np
-import numpy.typing as npt
-
-from booleq import Equation
+from booleq import Equation, LutArray
 
 NUM_ROWS = 1_000_000
-Rows = npt.NDArray[np.uint8]
+NUM_LUTS = 1_000_000
 
 
 def formula(num_inputs: int) -> str:
@@ -49,54 +46,66 @@ def shown(duration: float) -> str:
     return f"{duration:.2f} s" if duration >= 1 else f"{duration * 1e3:.3g} ms"
 
 
-def row(what: str, works: List[Callable[[], Any]], repeats: int) -> None:
-    results = [np.asarray(work(), dtype=np.uint8) for work in works]
-    assert all(np.array_equal(results[0], result) for result in results[1:]), what
-    times = [seconds(work, repeats) for work in works]
-    print(f"| {what} | " + " | ".join(shown(duration) for duration in times) +
-          f" | {times[2] / times[0]:.1f} |")
-
-
 def bench_eval_many(num_inputs: int, repeats: int) -> None:
     text = formula(num_inputs)
-    equation = Equation(text, [f"x{k}" for k in range(num_inputs)])
+    names = [f"x{k}" for k in range(num_inputs)]
+    equation = Equation(text, names)
     function = as_lambda(text, num_inputs)
     rows = np.random.default_rng(1).integers(0, 2, (NUM_ROWS, num_inputs), dtype=np.uint8)
-    lists = rows.tolist()  # indexing an array row by row would take Python longer
-    row(f"`eval_many`, {num_inputs} inputs, a million rows",
-        [lambda: equation.eval_many(rows),
-         lambda: [function(*values) for values in lists],
-         lambda: function(*rows.T)], repeats)
+    contiguous = [np.ascontiguousarray(column) for column in rows.T]
+    columns = dict(zip(names, contiguous))
+    by_columns = np.asfortranarray(rows)
+    works: List[Callable[[], Any]] = [
+        lambda: equation.eval_many(columns), lambda: equation.eval_many(by_columns),
+        lambda: equation.eval_many(rows), lambda: function(*contiguous)]
+    results = [work() for work in works]
+    assert all(np.array_equal(results[-1], result) for result in results)
+    times = [seconds(work, repeats) for work in works]
+    print(f"| {num_inputs} | " + " | ".join(shown(duration) for duration in times) +
+          f" | {times[-1] / times[0]:.1f} |")
 
 
-def numpy_table(function: Callable[..., Any], num_inputs: int) -> Rows:
-    numbers = np.arange(2 ** num_inputs, dtype=np.uint32)
-    table = np.empty((2 ** num_inputs, num_inputs + 1), dtype=np.uint8)
-    for k in range(num_inputs):
-        table[:, k] = numbers >> (num_inputs - 1 - k) & 1
-    table[:, -1] = function(*table.T[:-1])
-    return table
+def bench_luts(repeats: int) -> None:
+    generator = np.random.default_rng(2)
+    luts = LutArray(generator.integers(0, 2 ** 64, NUM_LUTS, dtype=np.uint64), 6)
+    few = LutArray(generator.choice(luts.words[:1000], NUM_LUTS), 6)
+    orders = np.argsort(generator.random((NUM_LUTS, 6)), axis=1).astype(np.uint8)
+    names = list("abcdef")
+    works: List[Any] = [
+            ("`permute`, one order", lambda: luts.permute([3, 1, 5, 0, 2, 4])),
+            ("`permute`, an order each", lambda: luts.permute(orders)),
+            ("`support`", luts.support), ("`count_ones`", luts.count_ones),
+            ("`unique`, all different", luts.unique),
+            ("`canonical`, random tables", luts.canonical),
+            ("`explain`, 1,000 distinct functions", lambda: few.explain(names)),
+            ("`equations`", lambda: luts.equations(names))]
+    for what, work in works:
+        print(f"| {what} | {shown(seconds(work, repeats))} |")
 
 
-def bench_truth_table(num_inputs: int, repeats: int) -> None:
-    text = formula(num_inputs)
-    equation = Equation(text, [f"x{k}" for k in range(num_inputs)])
-    function = as_lambda(text, num_inputs)
-    row(f"`truth_table`, {num_inputs} inputs, {2 ** num_inputs:,} rows",
-        [lambda: equation.truth_table(),
-         lambda: [(*values, function(*values))
-                  for values in itertools.product((0, 1), repeat=num_inputs)],
-         lambda: numpy_table(function, num_inputs)], repeats)
+def bench_equations(repeats: int) -> None:
+    texts = [f"(a{k % 100} & ~b | c) ^ (d | e{k % 50})" for k in range(200_000)]
+    bulk = seconds(lambda: booleq.equations(texts), repeats)
+    single = seconds(lambda: [Equation(text) for text in texts], repeats)
+    lut = [Equation.from_init(int(value), list("abcdef"))
+           for value in np.random.default_rng(3).integers(0, 2 ** 63, 200)]
+    explain = seconds(lambda: [equation.explain() for equation in lut], repeats)
+    per_text = 1e6 / len(texts)
+    print(f"| `booleq.equations`, a text of 14 tokens | {bulk * per_text:.2f} us |")
+    print(f"| `Equation`, the same | {single * per_text:.2f} us |")
+    print(f"| `explain` of a random six-input function | {explain / len(lut) * 1e3:.2f} ms |")
 
 
 def main() -> None:
     repeats = int(sys.argv[1]) if len(sys.argv) > 1 else 5
-    print("| what | booleq | Python | NumPy | NumPy / booleq |")
-    print("|---|---|---|---|---|")
+    print("| inputs | columns by name | column-major | row-major | NumPy, contiguous columns | "
+          "NumPy / by name |\n|---|---|---|---|---|---|")
     for num_inputs in (4, 8, 16, 40):
         bench_eval_many(num_inputs, repeats)
-    for num_inputs in (12, 20):
-        bench_truth_table(num_inputs, repeats)
+    print("\n| a million six-input tables | |\n|---|---|")
+    bench_luts(max(1, repeats // 2))
+    print("\n| one | |\n|---|---|")
+    bench_equations(repeats)
 
 
 if __name__ == "__main__":

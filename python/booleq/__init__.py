@@ -2,17 +2,30 @@
 
 >>> from booleq import Equation
 >>> eq = Equation("A & ~B")
->>> eq(A=1, B=0), eq.hex_init
+>>> eq(A=1, B=0), eq.hex_init()
 (1, '0x4')
 """
-from ._booleq import Equation, __version__, minimize_pla
-from ._results import (Difference, Equivalence, Explanation, Finding, LintReport,
-                       Minimum, Node, ParseError, Reading)
+import sys as _sys
 
-__all__ = ["Difference", "Equation", "Equivalence", "Explanation", "Finding", "LintReport",
-           "Minimum", "Node", "ParseError", "Reading", "__version__", "minimize_pla"]
+if _sys.version_info < (3, 11):
+    raise ImportError("booleq needs Python 3.11 or newer; this is Python " +
+                      ".".join(str(number) for number in _sys.version_info[:3]))
 
-for _type in (Difference, Equivalence, Explanation, Finding, LintReport, Minimum, Node, ParseError,
-              Reading):
-    _type.__module__ = __name__
-del _type
+from ._booleq import __version__
+from ._equation import Equation, Operand, Syntax, Target, equations, minimize_pla
+from ._luts import Canonical, Described, Distinct, LutArray
+from ._results import (Assignment, Conversion, Difference, Equivalence, Explanation, Finding,
+                       KarnaughMap, LintReport, Match, Minimum, Node, ParseError, Reading,
+                       Satisfiability)
+
+__all__ = ["Assignment", "Canonical", "Conversion", "Described", "Difference",
+           "Distinct", "Equation",
+           "Equivalence", "Explanation", "Finding", "KarnaughMap", "LintReport", "LutArray",
+           "Match", "Minimum", "Node", "Operand", "ParseError", "Reading", "Satisfiability",
+           "Syntax", "Target", "__version__", "equations", "minimize_pla"]
+
+for _name in __all__:  # where users import it from, for help() and pickles
+    if isinstance(globals()[_name], type):
+        globals()[_name].__module__ = __name__
+equations.__module__ = minimize_pla.__module__ = __name__
+del _name

@@ -1,12 +1,81 @@
-"""Plain values that equations answer with, and the exception of a refused text."""
+"""Plain values that equations answer with, and the exception of a refused text.
+
+All are immutable and can be keys of a dictionary. Each has a form for notebooks, and a repr that
+stays short when equations are long.
+"""
+from __future__ import annotations
+
+import reprlib
 import typing
-from dataclasses import dataclass
-from typing import Dict, Optional, Tuple
+from dataclasses import dataclass, fields
+from typing import Dict, Iterator, Literal, Mapping, Optional, Tuple
 
-from ._booleq import Equation
+__all__ = ["Assignment", "Conversion", "Difference", "Equivalence", "Explanation", "Finding",
+           "KarnaughMap", "LintReport", "Match", "Minimum", "Node", "ParseError", "Reading",
+           "Satisfiability"]
 
-__all__ = ["Difference", "Equivalence", "Explanation", "Finding", "LintReport", "Minimum",
-           "Node", "ParseError", "Reading"]
+_short = reprlib.Repr()
+_short.maxstring = _short.maxother = 200
+_short.maxtuple = 20
+_short.maxdict = 20
+
+
+class Report:
+    """What reports share: how they are shown."""
+
+    __slots__ = ()
+
+    def __repr__(self) -> str:
+        shown = (f"{field.name}={_short.repr(getattr(self, field.name))}"
+                 for field in fields(self))  # type: ignore[arg-type]
+        return f"{type(self).__name__}({', '.join(shown)})"
+
+    def _repr_html_(self) -> str:
+        from ._display import report_html
+        return report_html(self)
+
+
+class Assignment(Mapping[str, int]):
+    """A value, 0 or 1, for each input: a mapping that never changes.
+
+    >>> from booleq import Assignment
+    >>> assignment = Assignment({"a": 1, "b": 0})
+    >>> assignment["a"], dict(assignment)
+    (1, {'a': 1, 'b': 0})
+    """
+
+    __slots__ = ("_values",)
+    _values: Dict[str, int]
+
+    def __init__(self, values: Mapping[str, int]) -> None:
+        object.__setattr__(self, "_values", dict(values))
+
+    def __setattr__(self, name: str, value: object) -> typing.NoReturn:
+        raise AttributeError("an Assignment never changes")
+
+    def __getitem__(self, name: str) -> int:
+        return self._values[name]
+
+    def __iter__(self) -> Iterator[str]:
+        return iter(self._values)
+
+    def __len__(self) -> int:
+        return len(self._values)
+
+    def __eq__(self, other: object) -> bool:
+        return super().__eq__(other)
+
+    def __hash__(self) -> int:
+        return hash(frozenset(self._values.items()))
+
+    def __reduce__(self) -> Tuple[typing.Any, ...]:
+        return (Assignment, (self._values,))
+
+    def __repr__(self) -> str:
+        if len(self._values) > 40:
+            ones = sum(self._values.values())
+            return f"<Assignment of {len(self._values)} inputs, {ones} of them 1>"
+        return f"Assignment({self._values!r})"
 
 
 class ParseError(ValueError):
@@ -45,20 +114,95 @@ class Node(typing.NamedTuple):
     right: Optional[int]
 
 
-@dataclass(frozen=True)
-class Equivalence:
-    """Whether two equations are one function; true in a condition when they are."""
+@dataclass(frozen=True, repr=False)
+class Equivalence(Report):
+    """Whether two equations are one function; true in a condition when they are.
+
+    If not, counterexample is an assignment where they differ, and values what they are there.
+    """
 
     equal: bool
-    counterexample: Optional[Dict[str, int]]
+    counterexample: Optional[Assignment]
     values: Optional[Tuple[int, int]]
 
     def __bool__(self) -> bool:
         return self.equal
 
 
-@dataclass(frozen=True)
-class Explanation:
+@dataclass(frozen=True, repr=False)
+class Satisfiability(Report):
+    """Whether an equation is ever 1, and for which assignment; true in a condition when it is."""
+
+    satisfiable: bool
+    assignment: Optional[Assignment]
+
+    def __bool__(self) -> bool:
+        return self.satisfiable
+
+
+@dataclass(frozen=True, repr=False)
+class Match(Report):
+    """How one equation becomes the other; true in a condition when it does.
+
+    mapping has an input of the first, the input of the second in its place, and whether that is
+    inverted; output_inverted is about the result.
+    """
+
+    level: Optional[Literal["order", "inversions"]]
+    mapping: Tuple[Tuple[str, str, bool], ...]
+    output_inverted: bool
+
+    def __bool__(self) -> bool:
+        return self.level is not None
+
+
+@dataclass(frozen=True, repr=False)
+class Conversion(Report):
+    """An equation as text of another program; str() is that text.
+
+    names has an input and its name in the text. proved says that the text, read again, is the same
+    function; otherwise doubt says why that is not known.
+    """
+
+    target: str
+    text: str
+    unit: Optional[str]
+    output: Optional[str]
+    names: Tuple[Tuple[str, str], ...]
+    proved: bool
+    doubt: Optional[str]
+
+    def __str__(self) -> str:
+        return self.text
+
+
+@dataclass(frozen=True, repr=False)
+class KarnaughMap(Report):
+    """A Karnaugh map: cells has a tuple for each row; str() is a picture of letters."""
+
+    row_inputs: Tuple[str, ...]
+    column_inputs: Tuple[str, ...]
+    row_labels: Tuple[str, ...]
+    column_labels: Tuple[str, ...]
+    cells: Tuple[Tuple[int, ...], ...]
+
+    def __str__(self) -> str:
+        row_names = " ".join(self.row_inputs)
+        width = max(len(row_names), len(self.row_inputs))
+        cell = len(self.column_inputs)
+        lines = [" " * width + "  " + " ".join(self.column_inputs),
+                 "  ".join([row_names.ljust(width), *self.column_labels])]
+        for label, values in zip(self.row_labels, self.cells):
+            lines.append("  ".join([label.ljust(width), *(str(v).rjust(cell) for v in values)]))
+        return "\n".join(lines)
+
+    def _repr_html_(self) -> str:
+        from ._display import map_html
+        return map_html(self)
+
+
+@dataclass(frozen=True, repr=False)
+class Explanation(Report):
     """What Equation.explain() finds out; None where there is no common name, or no expression."""
 
     inputs: Tuple[str, ...]
@@ -72,8 +216,8 @@ class Explanation:
     minimal: bool
 
 
-@dataclass(frozen=True)
-class Minimum:
+@dataclass(frozen=True, repr=False)
+class Minimum(Report):
     """What Equation.minimize() finds; no sum has fewer terms than lower_bound."""
 
     inputs: Tuple[str, ...]
@@ -85,11 +229,11 @@ class Minimum:
     proved: bool
 
 
-@dataclass(frozen=True)
-class Difference:
+@dataclass(frozen=True, repr=False)
+class Difference(Report):
     """The first assignment for which another notation reads another value."""
 
-    assignment: Dict[str, int]
+    assignment: Assignment
     here: int
     grouping: str
     reason: str
@@ -97,8 +241,8 @@ class Difference:
     write_here: Optional[str]
 
 
-@dataclass(frozen=True)
-class Reading:
+@dataclass(frozen=True, repr=False)
+class Reading(Report):
     """How another notation reads the text; refusal says why it does not."""
 
     notation: str
@@ -110,17 +254,17 @@ class Reading:
     difference: Optional[Difference]
 
 
-@dataclass(frozen=True)
-class Finding:
+@dataclass(frozen=True, repr=False)
+class Finding(Report):
     """Where the library itself does what the writer of the text may not expect."""
 
     code: str
     message: str
-    details: Dict[str, str]
+    details: Tuple[Tuple[str, str], ...]
 
 
-@dataclass(frozen=True)
-class LintReport:
+@dataclass(frozen=True, repr=False)
+class LintReport(Report):
     """Who reads the text as another function, and what surprises here."""
 
     inputs: Tuple[str, ...]
@@ -128,12 +272,3 @@ class LintReport:
     readers: Tuple[Reading, ...]
     findings: Tuple[Finding, ...]
     is_clean: bool
-
-
-def restore(text: str, inputs: Optional[typing.Iterable[str]], lsb_first: bool,
-            ones: typing.Iterable[str]) -> Equation:
-    """The equation that pickle was given."""
-    equation = Equation(text, inputs, lsb_first)
-    for name in ones:
-        equation[name] = 1
-    return equation

@@ -1,5 +1,8 @@
 // Many rows at once: arrays of assignments, truth tables and columns. NumPy is used through its
 // Python interface and the buffers of its arrays, so any version of it does.
+#include <algorithm>
+#include <atomic>
+#include <cassert>
 #include <memory>
 #include <string>
 #include <utility>
@@ -7,15 +10,21 @@
 
 #include "bind.h"
 #include "errors.h"
-#include "expression.h"
+#include "lock.h"
 #include "packing.h"
+#include "parallel.h"
 #include "text.h"
+#include "unicode.h"
+#include "watch.h"
+#include "word_program.h"
 
 namespace booleq_python {
 
 namespace {
 
-constexpr size_t kNodesLikeLookUps = 40;
+constexpr size_t kPartRows = 16 * kBlockRows; // of a thread at a time
+constexpr size_t kNodesLikeLookUps = 1500;    // steps that take as long as a look-up in a column
+constexpr size_t kNoRow = static_cast<size_t>(-1);
 
 // A packed column that an array shows.
 struct Words {
@@ -32,230 +41,278 @@ py::object NewArray(const py::tuple& shape)
     return NumPy().attr("empty")(shape, "uint8");
 }
 
-uint8_t* DataOf(const py::buffer_info& info)
+uint8_t* DataOf(const py::object& array)
 {
-    return static_cast<uint8_t*>(info.ptr);
+    return static_cast<uint8_t*>(py::buffer(array).request(true).ptr);
 }
 
-// The argument of eval_many as an array of integers of this machine's byte order.
-py::buffer RequireAssignments(const Equation& equation, const py::object& assignments)
+ItemKind KindOf(const py::buffer_info& info)
 {
-    py::object array = NumPy().attr("asarray")(assignments);
-    const py::object type = array.attr("dtype");
-    const std::string kind = py::str(type.attr("kind"));
-    if (kind != "b" && kind != "i" && kind != "u")
-        throw py::type_error("assignments must be bool or integers, not " +
-                             std::string(py::str(type)));
-    const py::object shape = array.attr("shape");
-    if (py::len(shape) != 2 || shape[py::int_(1)].cast<size_t>() != equation.NumInputs())
-        throw py::value_error("assignments must have the shape (rows, " +
-                              std::to_string(equation.NumInputs()) +
-                              "), a column for each input, "
-                              "not " +
-                              std::string(py::str(shape)));
-    if (!type.attr("isnative").cast<bool>())
-        array = array.attr("astype")(type.attr("newbyteorder")("="));
-    return py::buffer(array);
-}
-
-// Packs all rows and hands each block to 'answer', which gives back the block's results as a word.
-template <class Answer>
-void ForEachBlock(const Table& table, const py::object& array, uint8_t* results,
-                  const Answer& answer)
-{
-    RowPacker packer(table);
-    for (size_t row = 0; row < table.numRows; row += RowPacker::kBlockRows) {
-        if (!packer.Pack(row)) {
-            const TableFault& fault = packer.Fault();
-            const std::string place =
-                std::to_string(fault.row) + ", " + std::to_string(fault.column);
-            const py::object value = array[py::make_tuple(fault.row, fault.column)];
-            throw py::value_error("assignments[" + place + "] must be 0 or 1, not " +
-                                  std::string(py::str(value)));
-        }
-        UnpackBits(answer(packer), packer.NumRows(), results + row);
-        CheckSignals();
+    const bool isFloat = info.format == "f" || info.format == "d";
+    switch (info.itemsize) {
+    case 1:
+        return ItemKind::Byte;
+    case 2:
+        return ItemKind::Word16;
+    case 4:
+        return isFloat ? ItemKind::Float32 : ItemKind::Word32;
+    default:
+        assert(info.itemsize == 8);
+        return isFloat ? ItemKind::Float64 : ItemKind::Word64;
     }
 }
 
-// 64 rows a word, through the expression.
-void EvalByWords(const booleq::Expression& expression, const Table& table, const py::object& array,
-                 uint8_t* results)
-{
-    std::vector<uint64_t> inputs;
-    std::vector<uint64_t> stack;
-    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
-        packer.ToWords(inputs);
-        return EvaluateWord(expression, inputs, stack);
-    });
-}
+// What is evaluated: a column for each input, or bytes row by row.
+struct Assignments {
+    size_t numRows = 0;
+    std::vector<ValueColumn> columns;
+    bool isRows = false;
+    ByteRows rows = {};
 
-// Row by row, from the column.
-void EvalByColumn(const Equation& equation, const Table& table, const py::object& array,
-                  uint8_t* results)
-{
-    const booleq::Rows column = RowsOf(equation);
-    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
-        uint64_t word = 0;
-        for (size_t row = 0; row < packer.NumRows(); ++row) {
-            const uint64_t number = packer.RowNumber(row);
-            word |= static_cast<uint64_t>(column.At(number) ? 1 : 0) << row;
+    bool Pack(size_t first, size_t numRowsOfBlock, uint64_t* block) const
+    {
+        if (isRows)
+            return PackRows(rows, first, numRowsOfBlock, block, kBlockWords);
+        bool isFine = true;
+        for (size_t input = 0; input < columns.size(); ++input)
+            isFine =
+                PackColumn(columns[input], first, numRowsOfBlock, block + kBlockWords * input) &&
+                isFine;
+        return isFine;
+    }
+};
+
+// How a function is evaluated for blocks of assignments.
+class Evaluator {
+  public:
+    // Cost: that of the column, where one is taken.
+    Evaluator(const Content& content, size_t numRows) : m_num_inputs(content.NumInputs())
+    {
+        const bool hasColumn = m_num_inputs <= booleq::kMaxFunctionInputs;
+        const size_t numTableRows = hasColumn ? size_t(1) << m_num_inputs : kNoRow;
+        const bool isInit = content.IsInit();
+        if (isInit && m_num_inputs <= kMaxExpandedInputs) {
+            RequireRows(content);
+            m_program = std::make_unique<WordProgram>(Expanded(m_rows));
+            return;
         }
-        return word;
-    });
-}
-
-// Row by row, as somebody would who sets each input.
-void EvalByRows(const Equation& equation, const Table& table, const py::object& array,
-                uint8_t* results)
-{
-    Equation copy(equation);
-    ForEachBlock(table, array, results, [&](const RowPacker& packer) {
-        uint64_t word = 0;
-        for (size_t row = 0; row < packer.NumRows(); ++row) {
-            for (size_t column = 0; column < table.numColumns; ++column)
-                copy.SetValue(column, packer.At(row, column) ? 1 : 0);
-            word |= static_cast<uint64_t>(copy.Get().Eval()) << row;
+        // Digits are a column that only needs copying; the expression would be large.
+        if (isInit && numTableRows / 64 <= numRows) {
+            RequireRows(content);
+            return;
         }
-        return word;
-    });
-}
-
-py::object EvalMany(const Equation& equation, const py::object& assignments)
-{
-    const py::buffer array = RequireAssignments(equation, assignments);
-    const py::buffer_info info = array.request();
-    Table table;
-    table.data = static_cast<const uint8_t*>(info.ptr);
-    table.numRows = static_cast<size_t>(info.shape[0]);
-    table.numColumns = static_cast<size_t>(info.shape[1]);
-    table.rowStride = info.strides[0];
-    table.columnStride = info.strides[1];
-    table.itemSize = static_cast<size_t>(info.itemsize);
-
-    py::object results = NewArray(py::make_tuple(table.numRows));
-    const py::buffer_info resultsInfo = py::buffer(results).request(true);
-    uint8_t* const bytes = DataOf(resultsInfo);
-    const bool hasColumn = table.numColumns <= booleq::kMaxFunctionInputs;
-    const uint64_t numTableRows = hasColumn ? uint64_t(1) << table.numColumns : UINT64_MAX;
-    if (!equation.Get().IsExpression()) {
-        // The digits are a column that only needs copying; the expression would be large.
-        if (numTableRows <= 64 * static_cast<uint64_t>(table.numRows))
-            EvalByColumn(equation, table, array, bytes);
+        const booleq::Expression expression = booleq::ToExpression(content.equation);
+        if (numTableRows <= numRows && expression.nodes.size() > kNodesLikeLookUps)
+            RequireRows(content);
         else
-            EvalByRows(equation, table, array, bytes);
-        return results;
+            m_program = std::make_unique<WordProgram>(expression);
     }
-    // A column takes as much work as that many rows through the expression, and then a look-up for
-    // each row, as much as some forty nodes for 64 rows.
-    const booleq::Expression expression = booleq::ToExpression(equation.Get());
-    if (numTableRows <= table.numRows && expression.nodes.size() > kNodesLikeLookUps)
-        EvalByColumn(equation, table, array, bytes);
-    else
-        EvalByWords(expression, table, array, bytes);
-    return results;
+
+    // Results of the rows that are packed in the block, as bytes.
+    void Run(std::vector<uint64_t>& block, size_t numRows, uint8_t* results) const
+    {
+        if (m_program) {
+            UnpackBits(m_program->Run(block.data(), (numRows + 63) / 64), numRows, results);
+            return;
+        }
+        std::vector<uint32_t> numbers(numRows);
+        std::vector<uint8_t> values(numRows);
+        for (size_t input = 0; input < m_num_inputs; ++input) {
+            UnpackBits(block.data() + kBlockWords * input, numRows, values.data());
+            for (size_t row = 0; row < numRows; ++row)
+                numbers[row] = 2 * numbers[row] + values[row];
+        }
+        for (size_t row = 0; row < numRows; ++row)
+            results[row] = m_rows.At(numbers[row]) ? 1 : 0;
+    }
+
+    size_t BlockSize() const
+    {
+        return m_program ? m_program->BlockSize() : kBlockWords * m_num_inputs;
+    }
+
+  private:
+    void RequireRows(const Content& content)
+    {
+        const bool hasRows = booleq::RowsOf(content.equation, m_rows);
+        assert(hasRows);
+        static_cast<void>(hasRows);
+    }
+
+    size_t m_num_inputs;
+    std::unique_ptr<WordProgram> m_program; // null: rows are looked up
+    booleq::Rows m_rows;
+};
+
+// Evaluates all rows; gives back the first block with a value that is neither 0 nor 1, or kNoRow.
+size_t EvaluateAll(const Content& content, const Assignments& assignments, uint8_t* results)
+{
+    const Evaluator evaluator(content, assignments.numRows);
+    std::atomic<size_t> fault{kNoRow};
+    booleq::RunInParts(assignments.numRows, kPartRows, booleq::LutWork(),
+                       [&](size_t begin, size_t end) {
+                           std::vector<uint64_t> block(evaluator.BlockSize());
+                           for (size_t row = begin; row < end; row += kBlockRows) {
+                               const size_t numRows = std::min(kBlockRows, end - row);
+                               if (!assignments.Pack(row, numRows, block.data())) {
+                                   size_t known = fault;
+                                   while (row < known && !fault.compare_exchange_weak(known, row)) {
+                                   }
+                                   return;
+                               }
+                               evaluator.Run(block, numRows, results + row);
+                           }
+                       });
+    return fault;
 }
 
-py::object TruthTable(const Equation& equation)
+// Results as an array, or the row and the input of the first value that is neither 0 nor 1.
+py::object Evaluate(const Equation& equation, const Assignments& assignments)
 {
+    py::object results = NewArray(py::make_tuple(assignments.numRows));
+    uint8_t* const bytes = DataOf(results);
+    const SharedContent content = equation.Shared();
+    const bool isLong = assignments.numRows > kBlockRows || equation.IsLarge();
+    const size_t fault =
+        FreelyIf(isLong, [&] { return EvaluateAll(*content, assignments, bytes); });
+    if (fault == kNoRow)
+        return results;
+    for (size_t row = fault; row < assignments.numRows; ++row)
+        for (size_t input = 0; input < equation.NumInputs(); ++input) {
+            const ValueColumn column = assignments.isRows
+                                           ? ValueColumn{assignments.rows.data + input,
+                                                         assignments.rows.rowStride, ItemKind::Byte}
+                                           : assignments.columns[input];
+            if (IsFault(column, row))
+                return py::make_tuple(row, input);
+        }
+    assert(false && "there is a fault");
+    return py::none();
+}
+
+// 'columns' are one-dimensional arrays of this machine's order, a column for each input, all of one
+// length, 'numRows'; or one array of two dimensions.
+py::object EvalColumns(const py::object& self, const py::list& columns, size_t numRows)
+{
+    const Equation& equation = Own(self);
+    std::vector<py::buffer_info> infos;
+    Assignments assignments;
+    assignments.numRows = numRows;
+    for (const py::handle column : columns) {
+        infos.push_back(py::reinterpret_borrow<py::buffer>(column).request());
+        const py::buffer_info& info = infos.back();
+        assert(info.ndim == 1 && static_cast<size_t>(info.shape[0]) == numRows);
+        assignments.columns.push_back(
+            {static_cast<const uint8_t*>(info.ptr), info.strides[0], KindOf(info)});
+    }
+    if (assignments.columns.size() != equation.NumInputs())
+        throw py::value_error("a column for each input");
+    return Evaluate(equation, assignments);
+}
+
+py::object EvalTable(const py::object& self, const py::buffer& table)
+{
+    const Equation& equation = Own(self);
+    const py::buffer_info info = table.request();
+    if (info.ndim != 2 || static_cast<size_t>(info.shape[1]) != equation.NumInputs())
+        throw py::value_error("a column for each input");
+    Assignments assignments;
+    assignments.numRows = static_cast<size_t>(info.shape[0]);
+    const auto* const data = static_cast<const uint8_t*>(info.ptr);
+    const ItemKind kind = KindOf(info);
+    const auto numColumns = static_cast<size_t>(info.shape[1]);
+    assignments.isRows = kind == ItemKind::Byte && info.strides[1] == 1 && numColumns > 0 &&
+                         info.strides[0] >= info.shape[1];
+    if (assignments.isRows)
+        assignments.rows = {data, assignments.numRows, numColumns, info.strides[0]};
+    for (py::ssize_t column = 0; column < info.shape[1]; ++column)
+        assignments.columns.push_back({data + column * info.strides[1], info.strides[0], kind});
+    return Evaluate(equation, assignments);
+}
+
+py::object TruthTable(const py::object& self)
+{
+    const Equation& equation = Own(self);
     const size_t numInputs = equation.NumInputs();
     if (numInputs > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(numInputs));
-    const uint64_t numRows = uint64_t(1) << numInputs;
+    const size_t numRows = size_t(1) << numInputs;
     py::object table = NewArray(py::make_tuple(numRows, numInputs + 1));
-    const py::buffer_info info = py::buffer(table).request(true);
+    uint8_t* const bytes = DataOf(table);
     const booleq::Rows column = RowsOf(equation);
-    uint8_t* byte = DataOf(info);
-    for (uint64_t row = 0; row < numRows; ++row) {
-        // The first input is the highest bit of the row number.
-        for (size_t input = 0; input < numInputs; ++input)
-            *byte++ = static_cast<uint8_t>(row >> (numInputs - 1 - input) & 1u);
-        *byte++ = column.At(row) ? 1 : 0;
-        if (row % 4096 == 0)
-            CheckSignals();
-    }
+    FreelyIf(numRows > 1024, [&] {
+        booleq::RunInParts(numRows, 65536, booleq::LutWork(), [&](size_t begin, size_t end) {
+            uint8_t* byte = bytes + begin * (numInputs + 1);
+            for (size_t row = begin; row < end; ++row) {
+                // The first input is the highest bit of the row number.
+                for (size_t input = 0; input < numInputs; ++input)
+                    *byte++ = static_cast<uint8_t>(row >> (numInputs - 1 - input) & 1u);
+                *byte++ = column.At(row) ? 1 : 0;
+            }
+        });
+    });
     return table;
 }
 
-py::object Column(const Equation& equation)
+py::object Column(const py::object& self)
 {
+    const Equation& equation = Own(self);
     const booleq::Rows rows = RowsOf(equation);
-    const uint64_t numRows = uint64_t(1) << equation.NumInputs();
+    const size_t numRows = rows.NumRows();
     py::object column = NewArray(py::make_tuple(numRows));
-    const py::buffer_info info = py::buffer(column).request(true);
-    for (uint64_t row = 0; row < numRows; row += 64) {
-        UnpackBits(rows.Words()[row / 64], std::min<uint64_t>(64, numRows - row),
-                   DataOf(info) + row);
-        CheckSignals();
-    }
+    uint8_t* const bytes = DataOf(column);
+    FreelyIf(numRows > 65536, [&] {
+        booleq::RunInParts(numRows, size_t(1) << 20, booleq::LutWork(),
+                           [&](size_t begin, size_t end) {
+                               UnpackBits(rows.Words() + begin / 64, end - begin, bytes + begin);
+                           });
+    });
     return column;
 }
 
-py::object PackedColumn(const Equation& equation)
+py::object PackedColumn(const py::object& self)
 {
-    auto owner = std::make_unique<Words>(Words{RowsOf(equation)});
+    auto owner = std::make_unique<Words>(Words{RowsOf(Own(self))});
     return NumPy().attr("frombuffer")(py::cast(std::move(owner)), "uint64");
+}
+
+// 0 and 1 of an array of objects as bytes; 2 for anything else, 3 for None and what is not itself
+// (not a number, pandas' NA).
+py::object NarrowObjects(const py::object& array, const py::object& missing)
+{
+    const py::tuple values(array.attr("tolist")());
+    py::object narrowed = NewArray(py::make_tuple(values.size()));
+    uint8_t* byte = DataOf(narrowed);
+    for (const py::handle value : values) {
+        unsigned int bit = 2;
+        if (value.is_none() || value.is(missing))
+            bit = 3;
+        else if (PyFloat_Check(value.ptr()))
+            bit = PyFloat_AS_DOUBLE(value.ptr()) == 0.0   ? 0
+                  : PyFloat_AS_DOUBLE(value.ptr()) == 1.0 ? 1
+                                                          : 2;
+        else if (!IsBit(value, bit))
+            bit = 2;
+        *byte++ = static_cast<uint8_t>(bit);
+    }
+    return narrowed;
 }
 
 } // namespace
 
-void BindArrays(py::module_& module, EquationClass& type)
+void BindArrays(py::module_& module)
 {
     // What owns a packed column while an array shows it; nobody makes one by hand.
     py::class_<Words>(module, "_Words", py::buffer_protocol(), py::module_local())
         .def_buffer([](Words& self) {
             return py::buffer_info(self.rows.Words(), static_cast<py::ssize_t>(self.rows.Size()));
         });
-    type.def("eval_many", &EvalMany, py::arg("assignments"),
-             R"doc(eval_many($record, self, assignments)
---
-
-The results for many assignments at once, as a uint8 array.
-
-assignments has a row for each assignment and a column for each input: bool or integers, 0 and 1.
-Any number of inputs will do. ValueError for another shape or value, TypeError for another kind.
-
->>> from booleq import Equation
->>> Equation("A & ~B").eval_many([[1, 0], [1, 1]])
-array([1, 0], dtype=uint8)
-)doc");
-    type.def("truth_table", &TruthTable,
-             R"doc(truth_table($record, self)
---
-
-All rows as a uint8 array: the inputs' values and, last, the result.
-
-ValueError with more than 30 inputs, MemoryError for a table that does not fit.
-
->>> from booleq import Equation
->>> Equation("A & ~B").truth_table()
-array([[0, 0, 0],
-       [0, 1, 0],
-       [1, 0, 1],
-       [1, 1, 0]], dtype=uint8)
-)doc");
-    type.def("column", &Column,
-             R"doc(column($record, self)
---
-
-The results of all rows as a uint8 array. ValueError with more than 30 inputs.
-
->>> from booleq import Equation
->>> Equation("A & ~B").column()
-array([0, 0, 1, 0], dtype=uint8)
-)doc");
-    type.def("packed_column", &PackedColumn,
-             R"doc(packed_column($record, self)
---
-
-The results of all rows, packed: row k is bit k % 64 of word k // 64 of a uint64 array.
-
-ValueError with more than 30 inputs. The library's own memory is handed out, without a copy.
-
->>> from booleq import Equation
->>> Equation("A & ~B").packed_column()
-array([4], dtype=uint64)
-)doc");
+    module.def("eval_columns", &EvalColumns);
+    module.def("eval_table", &EvalTable);
+    module.def("truth_table", &TruthTable);
+    module.def("column", &Column);
+    module.def("packed_column", &PackedColumn);
+    module.def("narrow_objects", &NarrowObjects);
 }
 
 } // namespace booleq_python

@@ -1,6 +1,5 @@
-// The members of booleq.Equation, a file for each group.
-// The first line of a docstring is the signature that inspect, help() and the check of the stubs
-// read. Its first argument stands for what the function is bound to inside, and is not shown.
+// The functions that Python's half of the module calls, a file for each group. Their arguments come
+// by position from booleq/*.py, which checks what users give where Python's words do it best.
 #ifndef BOOLEQ_PYTHON_BIND_H
 #define BOOLEQ_PYTHON_BIND_H
 
@@ -10,13 +9,14 @@
 
 namespace booleq_python {
 
-typedef py::class_<Equation> EquationClass;
-
-void BindTexts(EquationClass& type);   // construction, renderings, equality, copies
-void BindMapping(EquationClass& type); // values of inputs, evaluation
-void BindArrays(py::module_& module, EquationClass& type);   // many rows at once
-void BindMinimize(py::module_& module, EquationClass& type); // smallest sums
-void BindReports(EquationClass& type);                       // trees and what the searches find
+void BindTexts(py::module_& module);     // renderings, init values, other notations
+void BindMany(py::module_& module);      // equations by the thousand
+void BindAlgebra(py::module_& module);   // equations made of equations
+void BindQuestions(py::module_& module); // what is decided, counted and matched
+void BindArrays(py::module_& module);    // many rows at once
+void BindLuts(py::module_& module);      // arrays of look-up tables
+void BindMinimize(py::module_& module);  // smallest sums
+void BindReports(py::module_& module);   // trees, maps, explanations, lint
 
 } // namespace booleq_python
 

@@ -1,11 +1,15 @@
 #include "equation.h"
 
 #include <algorithm>
+#include <cassert>
+#include <cstring>
 #include <functional>
+#include <utility>
 
 #include "errors.h"
-#include "expression.h"
+#include "lock.h"
 #include "messages.h"
+#include "notation_writer.h"
 #include "permute.h"
 #include "text.h"
 #include "unicode.h"
@@ -15,24 +19,194 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kMaxListedInputs = 20;
-
-// The name by which the library knows a variable, for as long as the table is long enough: a handle
-// is a cached number, so one is enough for all variables of all equations.
-Kq_BoolEquation::Handle HandleOf(size_t input)
-{
-    static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
-    Kq_BoolEquation::Handle handle = first;
-    *handle.begin() = static_cast<unsigned int>(input);
-    return handle;
-}
+constexpr size_t kLargeText = 2000;     // characters that take some ten microseconds
+constexpr size_t kEndlessText = 200000; // those that take so long that somebody may not wait
 
 size_t Mix(size_t hash, size_t value)
 {
     return (hash ^ value) * 0x9e3779b97f4a7c15u + (hash >> 29);
 }
 
+size_t HashOf(const Content& content)
+{
+    const std::hash<std::string> hashText;
+    size_t hash = 1;
+    std::vector<size_t> names;
+    for (const auto& variable : content.equation.GetVariables()) {
+        names.push_back(hashText(booleq::ToStd(variable.first)));
+        hash = Mix(hash, names.back());
+    }
+    booleq::Rows rows;
+    if (content.IsInit() && booleq::RowsOf(content.equation, rows)) {
+        for (size_t word = 0; word < rows.Size(); ++word)
+            hash = Mix(hash, static_cast<size_t>(rows.Words()[word]));
+        return hash;
+    }
+    for (const booleq::Expression::Node& node : booleq::ToExpression(content.equation).nodes)
+        hash = Mix(hash, node.op == booleq::Operator::Input ? names[node.left]
+                                                            : static_cast<size_t>(node.op));
+    return hash;
+}
+
+bool HaveSameInputs(const Content& left, const Content& right)
+{
+    const auto& own = left.equation.GetVariables();
+    const auto& other = right.equation.GetVariables();
+    return std::equal(own.begin(), own.end(), other.begin(), other.end(),
+                      [](const auto& mine, const auto& yours) {
+                          return mine.first.length() == yours.first.length() &&
+                                 std::memcmp(mine.first.c_str(), yours.first.c_str(),
+                                             mine.first.length()) == 0;
+                      });
+}
+
+bool AreSame(const Content& left, const Content& right)
+{
+    if (left.IsInit() != right.IsInit() || !HaveSameInputs(left, right))
+        return false;
+    booleq::Rows own;
+    booleq::Rows other;
+    if (left.IsInit() && booleq::RowsOf(left.equation, own) &&
+        booleq::RowsOf(right.equation, other))
+        return own == other;
+    return left.equation == right.equation;
+}
+
+// What sorting goes by: of texts their tokens and then how they are grouped; of init values the
+// digits, the highest row first.
+std::vector<std::string> SortKey(const Content& content)
+{
+    std::vector<std::string> key = {content.IsInit() ? "1" : "0"};
+    booleq::Function function;
+    if (content.IsInit() && booleq::FunctionOf(content.equation, function)) {
+        key.push_back(function.Hex());
+    } else {
+        key.push_back(booleq::ToStd(content.equation.GetEquationAlt1(true)));
+        key.push_back(WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::First,
+                               booleq::Parentheses::Whole));
+    }
+    for (const auto& variable : content.equation.GetVariables())
+        key.push_back(booleq::ToStd(variable.first));
+    return key;
+}
+
+// Null for a text that is refused.
+SharedContent Read(const std::string& bytes, const booleq::Reading& reading)
+{
+    const booleq::NoMessages silence;
+    const auto content = std::make_shared<Content>();
+    if (bytes.find('\0') != std::string::npos || !SetFromText(content->equation, bytes, reading))
+        return nullptr;
+    return content;
+}
+
 } // namespace
+
+Equation::Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst)
+    : m_content(std::move(content)), m_text(std::move(text)),
+      m_given_inputs(std::move(givenInputs)), m_lsb_first(lsbFirst)
+{
+    assert(m_content && (m_text || m_content->IsInit()));
+}
+
+const py::object& Equation::Text() const
+{
+    if (!m_text)
+        m_text = py::str(FunctionOf(*this).Hex());
+    return m_text;
+}
+
+booleq::Reading Equation::GetReading() const
+{
+    booleq::Reading reading;
+    reading.inputsName = "inputs=";
+    reading.lsbFirst = m_lsb_first;
+    reading.hasInputs = !m_given_inputs.is_none();
+    if (reading.hasInputs)
+        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(m_given_inputs));
+    return reading;
+}
+
+const py::object& Equation::Inputs() const
+{
+    if (!m_inputs)
+        m_inputs = DecodeAll(InputBytes());
+    return m_inputs;
+}
+
+std::vector<std::string> Equation::InputBytes() const
+{
+    std::vector<std::string> names;
+    names.reserve(NumInputs());
+    for (const auto& variable : Get().GetVariables())
+        names.push_back(booleq::ToStd(variable.first));
+    return names;
+}
+
+bool Equation::IsLargeText() const
+{
+    return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kLargeText;
+}
+
+bool Equation::IsEndlessText() const
+{
+    return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kEndlessText;
+}
+
+unsigned int Equation::Evaluate(const std::vector<unsigned int>& values) const
+{
+    assert(values.size() == NumInputs());
+    const auto evaluate = [&](Kq_BoolEquation& equation) {
+        // The handle is a cached number, which any equation with so many variables honours.
+        static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
+        Kq_BoolEquation::Handle handle = first;
+        for (size_t input = 0; input < values.size(); ++input) {
+            *handle.begin() = static_cast<unsigned int>(input);
+            equation.SetVariable(handle, values[input]);
+        }
+        return equation.Eval();
+    };
+    if (IsLargeText()) { // without the lock, so with a copy that no other call knows
+        Kq_BoolEquation copy(Get());
+        return Freely([&] { return evaluate(copy); });
+    }
+    if (!m_scratch)
+        m_scratch = std::make_unique<Kq_BoolEquation>(Get());
+    return evaluate(*m_scratch);
+}
+
+bool Equation::IsSame(const Equation& other) const
+{
+    if (m_content == other.m_content)
+        return true;
+    const SharedContent own = m_content; // the lock is given up: nobody else may keep them
+    const SharedContent theirs = other.m_content;
+    return FreelyIf(IsLarge() && other.IsLarge(), [&] { return AreSame(*own, *theirs); });
+}
+
+int Equation::Compare(const Equation& other) const
+{
+    if (IsSame(other))
+        return 0;
+    const SharedContent own = m_content;
+    const SharedContent theirs = other.m_content;
+    return FreelyIf(IsLarge() || other.IsLarge(), [&] {
+        const std::vector<std::string> left = SortKey(*own);
+        const std::vector<std::string> right = SortKey(*theirs);
+        assert(left != right);
+        return left < right ? -1 : 1;
+    });
+}
+
+size_t Equation::Hash() const
+{
+    if (!m_has_hash) {
+        const SharedContent content = m_content;
+        m_hash = FreelyIf(IsLarge(), [&] { return HashOf(*content); });
+        m_has_hash = true;
+    }
+    return m_hash;
+}
 
 py::tuple RequireInputs(const py::object& inputs)
 {
@@ -48,114 +222,38 @@ py::tuple RequireInputs(const py::object& inputs)
     return names;
 }
 
-Equation::Equation(const py::object& text, const py::object& inputs, const py::object& lsbFirst)
-    : m_text(RequireStr(text, "text")),
-      m_given_inputs(inputs.is_none() ? inputs : RequireInputs(inputs)),
-      m_lsb_first(RequireFlag(lsbFirst, "lsb_first"))
+py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool lsbFirst)
 {
-    const std::string bytes = Encode(m_text);
-    const booleq::Reading reading = GetReading();
-    const booleq::NoMessages silence;
-    if (bytes.find('\0') != std::string::npos || !SetFromText(m_equation, bytes, reading))
-        RaiseParseError(m_text, booleq::ExplainRefusal(bytes, reading));
-    m_inputs = DecodeAll(InputBytes());
-    for (size_t input = 0; input < m_inputs.size(); ++input)
-        m_numbers[m_inputs[input]] = input;
-}
-
-void* Equation::operator new(size_t /*size*/)
-{
-    throw py::type_error("this Equation was made without a text: Equation.__init__ did not run");
-}
-
-booleq::Reading Equation::GetReading() const
-{
+    const std::string bytes = Encode(text);
     booleq::Reading reading;
     reading.inputsName = "inputs=";
-    reading.lsbFirst = m_lsb_first;
-    reading.hasInputs = !m_given_inputs.is_none();
+    reading.lsbFirst = lsbFirst;
+    reading.hasInputs = !givenInputs.is_none();
     if (reading.hasInputs)
-        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(m_given_inputs));
-    return reading;
+        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(givenInputs));
+    SharedContent content;
+    if (bytes.size() > kEndlessText)
+        content = Beside([bytes, reading] { return Read(bytes, reading); });
+    else
+        content = FreelyIf(bytes.size() > kLargeText, [&] { return Read(bytes, reading); });
+    if (!content)
+        RaiseParseError(text, bytes, reading);
+    return Wrap({content, text, givenInputs, lsbFirst});
 }
 
-std::vector<std::string> Equation::InputBytes() const
+py::object MakeEquation(const py::object& text, const py::object& inputs,
+                        const py::object& lsbFirst)
 {
-    std::vector<std::string> names;
-    names.reserve(NumInputs());
-    for (const auto& variable : m_equation.GetVariables())
-        names.push_back(booleq::ToStd(variable.first));
-    return names;
-}
-
-size_t Equation::FindInput(const py::handle& name) const
-{
-    const py::object number = FindNumber(name);
-    if (number)
-        return number.cast<size_t>();
-    std::string listed;
-    for (size_t input = 0; input < std::min(NumInputs(), kMaxListedInputs); ++input)
-        listed += (input == 0 ? "" : ", ") +
-                  booleq::Excerpt(booleq::ToStd(m_equation.GetVariables()[input].first));
-    if (NumInputs() > kMaxListedInputs)
-        listed += " and " + std::to_string(NumInputs() - kMaxListedInputs) + " more";
-    throw py::key_error("there is no input " + Shown(name) +
-                        (listed.empty() ? "; there are none" : "; the inputs are " + listed));
-}
-
-bool Equation::HasInput(const py::handle& name) const
-{
-    return static_cast<bool>(FindNumber(name));
-}
-
-// Null for what is no input. Strs that stand for the same bytes are one name: escaped bytes that
-// together are UTF-8 are listed as the character.
-py::object Equation::FindNumber(const py::handle& name) const
-{
-    PyObject* number = PyDict_GetItemWithError(m_numbers.ptr(), name.ptr());
-    if (!number && !PyErr_Occurred() && PyUnicode_Check(name.ptr()) &&
-        !PyUnicode_IS_ASCII(name.ptr())) {
-        const py::object same = SameInBytes(py::reinterpret_borrow<py::str>(name));
-        if (same)
-            number = PyDict_GetItemWithError(m_numbers.ptr(), same.ptr());
-    }
-    if (!number && PyErr_Occurred())
-        throw py::error_already_set();
-    return py::reinterpret_borrow<py::object>(number);
-}
-
-void Equation::SetValue(size_t input, unsigned int value)
-{
-    m_equation.SetVariable(HandleOf(input), value);
-}
-
-// Equal equations have equal trees, or equal init values; their variables may differ in order.
-size_t Equation::Hash() const
-{
-    if (m_has_hash)
-        return m_hash;
-    const std::hash<std::string> hashText;
-    size_t hash = 1;
-    if (!m_equation.IsExpression()) {
-        hash = hashText(booleq::ToStd(m_equation.GetEquation(false)));
-    } else {
-        const booleq::Expression expression = booleq::ToExpression(m_equation);
-        std::vector<size_t> names;
-        for (const std::string& name : expression.names)
-            names.push_back(hashText(name));
-        for (const booleq::Expression::Node& node : expression.nodes)
-            hash = Mix(hash, node.op == booleq::Operator::Input ? names[node.left]
-                                                                : static_cast<size_t>(node.op));
-    }
-    m_hash = hash;
-    m_has_hash = true;
-    return m_hash;
+    const py::str plain = RequireStr(text, "text");
+    const py::object given = inputs.is_none() ? inputs : RequireInputs(inputs);
+    return ReadEquation(plain, given, RequireFlag(lsbFirst, "lsb_first"));
 }
 
 booleq::Rows RowsOf(const Equation& equation)
 {
     booleq::Rows rows;
-    if (!booleq::RowsOf(equation.Get(), rows))
+    const SharedContent content = equation.Shared();
+    if (!FreelyIf(equation.IsLarge(), [&] { return booleq::RowsOf(content->equation, rows); }))
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
     return rows;
 }
@@ -163,32 +261,46 @@ booleq::Rows RowsOf(const Equation& equation)
 kq_logic::Function FunctionOf(const Equation& equation)
 {
     kq_logic::Function function;
-    if (!function.Set(equation.Get()))
+    const SharedContent content = equation.Shared();
+    if (!FreelyIf(equation.IsLarge(), [&] { return function.Set(content->equation); }))
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
     return function;
 }
 
+bool IsBit(const py::handle& value, unsigned int& bit)
+{
+    PyObject* const object = value.ptr();
+    const bool isNumPyBool = std::strncmp(Py_TYPE(object)->tp_name, "numpy.bool", 10) == 0;
+    long number = 0;
+    if (isNumPyBool) {
+        number = PyObject_IsTrue(object);
+    } else {
+        if (!PyIndex_Check(object))
+            return false;
+        const auto index = py::reinterpret_steal<py::object>(PyNumber_Index(object));
+        if (!index)
+            throw py::error_already_set();
+        int isBeyond = 0;
+        number = PyLong_AsLongAndOverflow(index.ptr(), &isBeyond);
+        if (isBeyond != 0)
+            return false;
+    }
+    if (number == -1 && PyErr_Occurred())
+        throw py::error_already_set();
+    bit = static_cast<unsigned int>(number);
+    return number == 0 || number == 1;
+}
+
 unsigned int RequireBit(const py::handle& value, const py::handle& name)
 {
-    const auto fault = [&] {
-        return "the value of " + Shown(name) + " must be 0 or 1, not " + Shown(value);
-    };
-    py::object number = py::reinterpret_borrow<py::object>(value);
-    if (!PyLong_Check(value.ptr())) {
-        // NumPy's bool is no index.
-        if (py::isinstance(value, py::module_::import("numpy").attr("bool_")))
-            number = py::bool_(number);
-        number = py::reinterpret_steal<py::object>(PyNumber_Index(number.ptr()));
-        if (!number) {
-            PyErr_Clear();
-            throw py::type_error(fault());
-        }
-    }
-    if (number.equal(py::int_(0)))
-        return 0;
-    if (number.equal(py::int_(1)))
-        return 1;
-    throw py::value_error(fault());
+    unsigned int bit = 0;
+    if (IsBit(value, bit))
+        return bit;
+    const std::string fault =
+        "the value of " + Shown(name) + " must be 0 or 1, not " + ShownValue(value);
+    if (PyIndex_Check(value.ptr()))
+        throw py::value_error(fault);
+    throw py::type_error(fault);
 }
 
 } // namespace booleq_python

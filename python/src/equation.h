@@ -1,4 +1,6 @@
-// What Python holds: a set equation with the text and the inputs that it was made of.
+// What Python holds: a set equation that never changes, with the text and the inputs that it was
+// made of. It is the base of booleq.Equation, in a type of our own: a million of them are made at
+// once, and two hundred nanoseconds for each would count.
 #ifndef BOOLEQ_PYTHON_EQUATION_H
 #define BOOLEQ_PYTHON_EQUATION_H
 
@@ -13,6 +15,7 @@
 #include <Kq_BoolEquation.h>
 #include <kq_logic/function.h>
 
+#include "expression.h"
 #include "function.h"
 #include "listed_inputs.h"
 
@@ -20,73 +23,95 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// The names of an iterable as a tuple of plain str.
-// Fails: TypeError, and ValueError for what is no legal name or is listed twice.
-py::tuple RequireInputs(const py::object& inputs);
+// Shared with threads that work on it without the interpreter's lock.
+// Invariant: the equation is set, all values are 0.
+struct Content {
+    Kq_BoolEquation equation;
+    size_t NumInputs() const { return equation.GetVariables().size(); }
+    bool IsInit() const { return !equation.IsExpression(); }
+};
+typedef std::shared_ptr<const Content> SharedContent;
 
 // Invariants:
-// 1. The equation is set, and only values of its variables change.
-// 2. A given list of inputs is a tuple of plain str, legal names, none twice.
+// 1. A given list of inputs is a tuple of plain str, legal names, none twice; otherwise None.
+// 2. What is made on demand is made under the interpreter's lock.
 class Equation {
   public:
-    // 'inputs' is None or an iterable of names.
-    // Fails: booleq.ParseError; TypeError and ValueError for what is no text or no list of names.
-    Equation(const py::object& text, const py::object& inputs, const py::object& lsbFirst);
+    // 'text' may be null for an init value: its digits are then made on demand.
+    Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst);
 
-    Equation(const Equation& other) = default;
-    Equation& operator=(const Equation& other) = delete;
-    ~Equation() = default;
+    const Kq_BoolEquation& Get() const { return m_content->equation; }
+    const SharedContent& Shared() const { return m_content; }
+    bool IsInit() const { return m_content->IsInit(); }
+    size_t NumInputs() const { return m_content->NumInputs(); }
 
-    // The binding asks for memory here when somebody uses an object whose __init__ never ran.
-    // Others are made by MakeEquation.  Fails: TypeError, always.
-    static void* operator new(size_t size);
-    static void operator delete(void* memory) { ::operator delete(memory); }
-
-    const Kq_BoolEquation& Get() const { return m_equation; }
-    const py::str& Text() const { return m_text; }
+    const py::object& Text() const;
     const py::object& GivenInputs() const { return m_given_inputs; }
     bool IsLsbFirst() const { return m_lsb_first; }
     // How the text was read.
     booleq::Reading GetReading() const;
-
-    size_t NumInputs() const { return m_equation.GetVariables().size(); }
-    const py::tuple& Inputs() const { return m_inputs; }
+    // A tuple of str.
+    const py::object& Inputs() const;
     std::vector<std::string> InputBytes() const;
-    // The input's number.  Fails: KeyError that says which inputs there are.
-    size_t FindInput(const py::handle& name) const;
-    bool HasInput(const py::handle& name) const;
-    unsigned int GetValue(size_t input) const { return m_equation.GetVariables()[input].second; }
-    void SetValue(size_t input, unsigned int value);
+    // Whether answers take longer than a switch of threads.
+    bool IsLarge() const { return IsLargeText() || NumInputs() > 10; }
+    bool IsLargeText() const;
+    // Whether the text is so long that reading or writing it takes longer than somebody waits.
+    bool IsEndlessText() const;
 
-    // Equal for equations that the library takes for equal.  Cost: in step with the equation, once.
+    // 0 or 1 for values of the inputs in their order, each 0 or 1.
+    unsigned int Evaluate(const std::vector<unsigned int>& values) const;
+
+    // The same text but for spelling, or the same digits, over the same inputs in the same order.
+    bool IsSame(const Equation& other) const;
+    // Below, 0 or above 0, as in sorting; 0 for what is the same.
+    int Compare(const Equation& other) const;
     size_t Hash() const;
 
   private:
-    py::object FindNumber(const py::handle& name) const;
-
-    Kq_BoolEquation m_equation;
-    py::str m_text;
-    py::object m_given_inputs; // None without a list
+    SharedContent m_content;
+    mutable py::object m_text;
+    py::object m_given_inputs;
+    mutable py::object m_inputs; // null until asked for
     bool m_lsb_first;
-    py::tuple m_inputs;
-    py::dict m_numbers; // of inputs, by name
     mutable bool m_has_hash = false;
     mutable size_t m_hash = 0;
+    mutable std::unique_ptr<Kq_BoolEquation> m_scratch; // whose variables are set
 };
 
-// A new one for Python to own, of the arguments of a constructor.
-template <class... Arguments>
-std::unique_ptr<Equation> MakeEquation(const Arguments&... arguments)
-{
-    return std::unique_ptr<Equation>(::new Equation(arguments...));
-}
+// The names of an iterable as a tuple of plain str.
+// Fails: TypeError, and ValueError for what is no legal name or is listed twice.
+py::tuple RequireInputs(const py::object& inputs);
+
+// Reads a text.  Fails: booleq.ParseError.
+py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool lsbFirst);
+// Takes arguments of any type.  Fails: TypeError, ValueError.
+py::object MakeEquation(const py::object& text, const py::object& inputs,
+                        const py::object& lsbFirst);
+// A new object of booleq.Equation.
+py::object Wrap(Equation equation);
+
+bool IsEquation(const py::handle& value);
+// Requires: it is one.
+const Equation& Own(const py::handle& value);
+// Fails: TypeError that begins with 'what'.
+const Equation& RequireEquation(const py::handle& value, const char* what);
+// An equation, or a text, 0 or 1 as one.  Fails: null for another type; booleq.ParseError.
+py::object ToEquation(const py::handle& value);
 
 // Fails: ValueError for more than 30 inputs; what a signal's handler raises.
 booleq::Rows RowsOf(const Equation& equation);
 kq_logic::Function FunctionOf(const Equation& equation);
 
-// 'value' as 0 or 1.  Fails: TypeError, ValueError.
+// 'value' as 0 or 1.  Fails: TypeError, ValueError, what its __index__ raises.
 unsigned int RequireBit(const py::handle& value, const py::handle& name);
+// The same for what may be something else: false, and no exception, for that.
+bool IsBit(const py::handle& value, unsigned int& bit);
+
+// Adds the type, which booleq.Equation is derived from.
+void BindCore(py::module_& module);
+// The class of which objects are made.
+void SetEquationClass(const py::object& type);
 
 } // namespace booleq_python
 

@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "lock.h"
 #include "unicode.h"
 
 namespace booleq_python {
@@ -38,10 +39,11 @@ void RaiseParseError(const py::str& text, const booleq::RefusalReport& report)
     throw py::error_already_set();
 }
 
-void CheckSignals()
+void RaiseParseError(const py::str& text, const std::string& bytes, const booleq::Reading& reading)
 {
-    if (PyErr_CheckSignals() != 0)
-        throw py::error_already_set();
+    constexpr size_t kLongText = 100000;
+    const auto explain = [bytes, reading] { return booleq::ExplainRefusal(bytes, reading); };
+    RaiseParseError(text, bytes.size() > kLongText ? Beside(explain) : explain());
 }
 
 py::object ResultClass(const char* name)

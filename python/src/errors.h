@@ -1,6 +1,8 @@
-// Refusals as exceptions, and the way out of long calls.
+// Refusals as exceptions.
 #ifndef BOOLEQ_PYTHON_ERRORS_H
 #define BOOLEQ_PYTHON_ERRORS_H
+
+#include <string>
 
 #include <pybind11/pybind11.h>
 
@@ -10,11 +12,11 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Raises booleq.ParseError for a refused text; the report counts bytes, the exception characters.
+// Raises booleq.ParseError for a text that is refused when it is read so.
+[[noreturn]] void RaiseParseError(const py::str& text, const std::string& bytes,
+                                  const booleq::Reading& reading);
+// The report counts bytes, the exception characters.
 [[noreturn]] void RaiseParseError(const py::str& text, const booleq::RefusalReport& report);
-
-// Runs the handlers of signals that came.  Fails: what a handler raises, such as KeyboardInterrupt.
-void CheckSignals();
 
 // The class of that name among the results that are written in Python.
 py::object ResultClass(const char* name);

@@ -1,10 +1,12 @@
 // Smallest sums of products: of an equation with free rows, and of a PLA file.
+#include <memory>
 #include <string>
 
 #include "bind.h"
 #include "convert.h"
 #include "cube_table.h"
 #include "errors.h"
+#include "lock.h"
 #include "sum.h"
 #include "text.h"
 #include "unicode.h"
@@ -15,15 +17,12 @@ namespace {
 
 using namespace pybind11::literals; // "name"_a
 
-booleq::SumOptions Options(bool isExact, const py::object& seconds)
+// 'seconds' is 0 for as long as it takes.
+booleq::SumOptions Options(const py::object& isExact, double seconds)
 {
     booleq::SumOptions options;
-    options.isExact = isExact;
-    if (seconds.is_none())
-        return options;
-    options.seconds = seconds.cast<double>();
-    if (!(options.seconds > 0))
-        throw py::value_error("seconds must be above 0");
+    options.isExact = RequireFlag(isExact, "exact");
+    options.seconds = seconds;
     return options;
 }
 
@@ -37,81 +36,68 @@ booleq::Sum Minimised(const booleq::Pla& table, const booleq::SumOptions& option
     return sum;
 }
 
-py::object MinimizeEquation(const Equation& equation, const py::object& dontCare, bool isExact,
-                            const py::object& seconds)
+py::object MinimizeEquation(const py::object& self, const py::object& dontCare,
+                            const py::object& isExact, double seconds)
 {
-    booleq::TableOutput output = {"f", booleq::ToExpression(equation.Get()), false, {}};
-    if (output.on.nodes.empty())
-        throw py::value_error("the equation is not set");
+    const SharedContent content = Own(self).Shared();
+    SharedContent free;
     if (!dontCare.is_none()) {
-        if (!py::isinstance<Equation>(dontCare))
-            throw py::type_error("dont_care must be an Equation or None, not " +
-                                 std::string(Py_TYPE(dontCare.ptr())->tp_name));
-        output.hasFree = true;
-        output.free = booleq::ToExpression(dontCare.cast<const Equation&>().Get());
+        const py::object converted = ToEquation(dontCare);
+        if (!converted)
+            throw py::type_error("dont_care must be an Equation, a text, 0, 1 or None, not " +
+                                 TypeName(dontCare));
+        free = Own(converted).Shared();
     }
-    booleq::Work work;
-    const booleq::Pla table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
-    const booleq::Sum sum = Minimised(table, Options(isExact, seconds));
-    const booleq::Conversion conversion =
-        Convert(ExpressionOf(table, sum.cubes, 0, false), *booleq::FindTarget("primary"), "", {10});
+    const booleq::SumOptions options = Options(isExact, seconds);
+    booleq::Pla table;
+    std::unique_ptr<booleq::Sum> sum;
+    booleq::Conversion conversion;
+    Freely([&] {
+        booleq::TableOutput output = {"f", booleq::ToExpression(content->equation), false, {}};
+        output.hasFree = free != nullptr;
+        if (free)
+            output.free = booleq::ToExpression(free->equation);
+        booleq::Work work;
+        table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
+        sum = std::make_unique<booleq::Sum>(Minimised(table, options));
+        conversion = Convert(ExpressionOf(table, sum->cubes, 0, false),
+                             *booleq::FindTarget("primary"), "", {10});
+    });
     if (!conversion.fault.empty())
         throw py::value_error(conversion.fault);
     py::list cubes;
-    for (size_t index = 0; index < sum.cubes.Size(); ++index)
+    for (size_t index = 0; index < sum->cubes.Size(); ++index)
         cubes.append(
-            py::str(CubeText(table.space, sum.cubes.At(index)).substr(0, table.inputs.size())));
+            py::str(CubeText(table.space, sum->cubes.At(index)).substr(0, table.inputs.size())));
     return ResultClass("Minimum")("inputs"_a = DecodeAll(table.inputs),
                                   "expression"_a =
                                       Decode(conversion.text.substr(0, conversion.text.find('\n'))),
-                                  "cubes"_a = py::tuple(cubes), "terms"_a = sum.cost.numTerms,
-                                  "literals"_a = sum.cost.numLiterals,
-                                  "lower_bound"_a = sum.lowerBound, "proved"_a = sum.isProved);
+                                  "cubes"_a = py::tuple(cubes), "terms"_a = sum->cost.numTerms,
+                                  "literals"_a = sum->cost.numLiterals,
+                                  "lower_bound"_a = sum->lowerBound, "proved"_a = sum->isProved);
 }
 
-py::str MinimizePla(const py::str& text, bool isExact, const py::object& seconds)
+py::str MinimizePla(const py::object& text, const py::object& isExact, double seconds)
 {
-    booleq::Pla table;
-    booleq::PlaFault fault;
-    if (!ReadPla(Encode(text), table, fault))
-        throw py::value_error("line " + std::to_string(fault.line) + ": " + fault.message +
-                              (fault.hint.empty() ? "" : "; " + fault.hint));
-    const booleq::Sum sum = Minimised(table, Options(isExact, seconds));
-    return Decode(WritePla(table, sum.cubes));
+    const std::string bytes = Encode(RequireStr(text, "text"));
+    const booleq::SumOptions options = Options(isExact, seconds);
+    return Decode(Freely([&] {
+        booleq::Pla table;
+        booleq::PlaFault fault;
+        if (!ReadPla(bytes, table, fault))
+            throw py::value_error("line " + std::to_string(fault.line) + ": " + fault.message +
+                                  (fault.hint.empty() ? "" : "; " + fault.hint));
+        const booleq::Sum sum = Minimised(table, options);
+        return WritePla(table, sum.cubes);
+    }));
 }
 
 } // namespace
 
-void BindMinimize(py::module_& module, EquationClass& type)
+void BindMinimize(py::module_& module)
 {
-    type.def("minimize", &MinimizeEquation, py::kw_only(), py::arg("dont_care") = py::none(),
-             py::arg("exact") = false, py::arg("seconds") = py::none(),
-             R"doc(minimize($record, self, *, dont_care=None, exact=False, seconds=None)
---
-
-A smallest sum of products, proved to be the same function before it is returned. In rows in which
-dont_care is 1 it may be either. exact searches until nothing smaller can be, or for so many seconds.
-
->>> from booleq import Equation
->>> Equation("a ^ b").minimize(dont_care=Equation("a & b")).expression
-'b | a'
-)doc");
-    module.def("minimize_pla", &MinimizePla, py::arg("text"), py::kw_only(),
-               py::arg("exact") = false, py::arg("seconds") = py::none(),
-               R"doc(minimize_pla($module, text, *, exact=False, seconds=None)
---
-
-The text of a PLA file minimised, as one of type f. A fault is a ValueError that names its line.
-
->>> import booleq
->>> print(booleq.minimize_pla(".i 2\n.o 1\n01 1\n11 1\n"), end="")
-.i 2
-.o 1
-.type f
-.p 1
--1 1
-.e
-)doc");
+    module.def("minimize", &MinimizeEquation);
+    module.def("minimize_pla", &MinimizePla);
 }
 
 } // namespace booleq_python

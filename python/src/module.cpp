@@ -1,59 +1,76 @@
-// The compiled half of the package booleq. The interpreter's lock is never released: the library
-// is for one thread at a time in a process, and that is who holds the lock.
+// The compiled half of the package booleq: what booleq/*.py calls. Long work gives up the
+// interpreter's lock (lock.h); the library underneath may be used by any number of threads.
 #include <pybind11/pybind11.h>
 
 #include "bind.h"
-#include "errors.h"
-#include "watch.h"
+#include "lock.h"
+#include "text.h"
 
 namespace {
 
-constexpr char kEquationDoc[] = R"doc(Equation(text, inputs=None, lsb_first=False)
---
+namespace py = pybind11;
 
-A Boolean equation, as text or as an init value over listed inputs.
+bool IsPrintable(uint32_t character)
+{
+    return _PyUnicode_IsPrintable(character) != 0;
+}
 
-text is an expression in any accepted syntax, or with inputs also an init value, "0x8" or
-"0b1000". inputs are names, the most significant first; names that only the text has follow them.
-lsb_first takes the first input of an init value for bit 0 of the row number.
+void Fill(py::module_ module)
+{
+    using namespace booleq_python;
+    module.attr("__version__") = BOOLEQ_VERSION;
+    booleq::ShowUtf8(IsPrintable);
+    PrepareInterrupts();
+    BindCore(module);
+    BindTexts(module);
+    BindMany(module);
+    BindAlgebra(module);
+    BindQuestions(module);
+    BindArrays(module);
+    BindLuts(module);
+    BindMinimize(module);
+    BindReports(module);
+}
 
-An equation is a mapping of its inputs to their values, all 0 at first.
+// What an interpreter does that imports the module. pybind11 keeps what it knows of types once in a
+// process, so another interpreter than the main one would use what belongs to that.
+int Import(PyObject* self)
+{
+    if (PyInterpreterState_Get() != PyInterpreterState_Main()) {
+        PyErr_SetString(PyExc_ImportError, "booleq works in the main interpreter only, not in a "
+                                           "subinterpreter; use threads or processes");
+        return -1;
+    }
+    try {
+        py::detail::get_internals();
+        Fill(py::reinterpret_borrow<py::module_>(self));
+        return 0;
+    } catch (py::error_already_set& error) {
+        error.restore();
+    } catch (const std::exception& error) {
+        PyErr_SetString(PyExc_ImportError, error.what());
+    }
+    return -1;
+}
 
->>> from booleq import Equation
->>> eq = Equation("A & ~B")
->>> eq.inputs
-('A', 'B')
->>> eq(A=1, B=0)
-1
->>> Equation("0x4", ["A", "B"]).expression
-'( A & ~ B )'
+PyModuleDef_Slot slots[] = {{Py_mod_exec, reinterpret_cast<void*>(Import)}, {0, nullptr}};
 
-A text that is refused raises ParseError, which knows the place and often the hint. A name that is
-none, or is listed twice, is a ValueError.
-
->>> Equation("A && B")
-Traceback (most recent call last):
-    ...
-booleq.ParseError: refused at character 3: the operator '&' has no operand on its right; write '&' for '&&'
-)doc";
+PyModuleDef definition = {PyModuleDef_HEAD_INIT,
+                          "_booleq",
+                          "The compiled half of booleq.",
+                          0,
+                          nullptr,
+                          slots,
+                          nullptr,
+                          nullptr,
+                          nullptr};
 
 } // namespace
 
-PYBIND11_MODULE(_booleq, module)
+extern "C" PYBIND11_EXPORT PyObject* PyInit__booleq();
+
+// In two steps, so that each interpreter that imports the module runs Import.
+PyObject* PyInit__booleq()
 {
-    using namespace booleq_python;
-    py::options options;
-    options.disable_function_signatures(); // docstrings have them
-    module.attr("__version__") = BOOLEQ_VERSION;
-
-    EquationClass type(module, "Equation", py::is_final(), kEquationDoc);
-    type.attr("__module__") = "booleq"; // where it is imported from, for help() and pickles
-    booleq::SetWatch(CheckSignals);     // interrupts end long calls
-
-    BindTexts(type);
-    BindMapping(type);
-    BindArrays(module, type);
-    BindMinimize(module, type);
-    BindReports(type);
-    py::module_::import("collections.abc").attr("Mapping").attr("register")(type);
+    return PyModuleDef_Init(&definition);
 }

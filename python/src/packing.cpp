@@ -3,14 +3,19 @@
 #include <algorithm>
 #include <cstring>
 
+#ifdef __SSE2__
+#include <emmintrin.h>
+#endif
+
 namespace booleq_python {
 
 namespace {
 
 constexpr uint64_t kLowBits = 0x0101010101010101;
+constexpr size_t kWordRows = 64;
 
 // Byte k of the memory is bits 8k to 8k+7 of the word, on every machine.
-uint64_t LoadBytes(const uint8_t* bytes)
+[[maybe_unused]] uint64_t LoadBytes(const uint8_t* bytes)
 {
     uint64_t word = 0;
     for (unsigned int index = 0; index < 8; ++index)
@@ -18,164 +23,231 @@ uint64_t LoadBytes(const uint8_t* bytes)
     return word;
 }
 
-uint64_t LoadSome(const uint8_t* bytes, size_t count)
+// 64 bytes, each 0 or 1, as a word; 'seen' gets all bits that any byte has.
+#ifdef __SSE2__
+uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
 {
     uint64_t word = 0;
-    for (size_t index = 0; index < count; ++index)
-        word |= static_cast<uint64_t>(bytes[index]) << (8 * index);
+    __m128i all = _mm_setzero_si128();
+    for (unsigned int part = 0; part < 4; ++part) {
+        const __m128i values = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + 16 * part));
+        all = _mm_or_si128(all, values);
+        const auto bits = static_cast<uint32_t>(_mm_movemask_epi8(_mm_slli_epi16(values, 7)));
+        word |= static_cast<uint64_t>(bits) << (16 * part);
+    }
+    const __m128i above =
+        _mm_cmpeq_epi8(_mm_andnot_si128(_mm_set1_epi8(1), all), _mm_setzero_si128());
+    seen = static_cast<uint8_t>(seen | (_mm_movemask_epi8(above) == 0xffff ? 0 : 2));
     return word;
 }
-
-void StoreBytes(uint64_t word, uint8_t* bytes)
+#else
+uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
 {
-    for (unsigned int index = 0; index < 8; ++index)
-        bytes[index] = static_cast<uint8_t>(word >> (8 * index));
+    uint64_t word = 0;
+    uint64_t all = 0;
+    for (unsigned int part = 0; part < 8; ++part) {
+        const uint64_t values = LoadBytes(bytes + 8 * part);
+        all |= values;
+        // Byte k to bit k; the partial products do not meet, so nothing carries.
+        word |= ((values & kLowBits) * 0x0102040810204080 >> 56) << (8 * part);
+    }
+    seen = static_cast<uint8_t>(seen | ((all & ~kLowBits) != 0 ? 2 : 0));
+    return word;
+}
+#endif
+
+template <class Value>
+Value Load(const uint8_t* item)
+{
+    Value value;
+    std::memcpy(&value, item, sizeof value); // arrays need not be aligned
+    return value;
 }
 
-// Bytes 0 and 1 as bits; byte 0 the highest. The partial products do not meet, so nothing carries.
-uint8_t HighFirst(uint64_t bytes)
+// The values as bytes; 2 stands for every one that is neither 0 nor 1.
+template <class Value>
+void Narrow(const uint8_t* item, std::ptrdiff_t stride, size_t numRows, uint8_t* bytes)
 {
-    return static_cast<uint8_t>((bytes * 0x8040201008040201) >> 56);
+    const auto narrowed = [](Value value) {
+        return static_cast<uint8_t>(value == Value(0) ? 0 : (value == Value(1) ? 1 : 2));
+    };
+    if (stride == sizeof(Value)) { // which the compiler has vectors for
+        for (size_t row = 0; row < numRows; ++row)
+            bytes[row] = narrowed(Load<Value>(item + row * sizeof(Value)));
+        return;
+    }
+    for (size_t row = 0; row < numRows; ++row, item += stride)
+        bytes[row] = narrowed(Load<Value>(item));
 }
 
-// The same; byte 0 the lowest.
-uint8_t LowFirst(uint64_t bytes)
+void Narrow(const ValueColumn& column, size_t first, size_t numRows, uint8_t* bytes)
 {
-    return static_cast<uint8_t>((bytes * 0x0102040810204080) >> 56);
+    const uint8_t* const item = column.data + static_cast<std::ptrdiff_t>(first) * column.stride;
+    switch (column.kind) {
+    case ItemKind::Byte:
+        for (size_t row = 0; row < numRows; ++row)
+            bytes[row] = item[static_cast<std::ptrdiff_t>(row) * column.stride];
+        return;
+    case ItemKind::Word16:
+        return Narrow<uint16_t>(item, column.stride, numRows, bytes);
+    case ItemKind::Word32:
+        return Narrow<uint32_t>(item, column.stride, numRows, bytes);
+    case ItemKind::Word64:
+        return Narrow<uint64_t>(item, column.stride, numRows, bytes);
+    case ItemKind::Float32:
+        return Narrow<float>(item, column.stride, numRows, bytes);
+    case ItemKind::Float64:
+        return Narrow<double>(item, column.stride, numRows, bytes);
+    }
 }
 
-// Byte k is bit k.
-uint64_t Spread(uint8_t bits)
+#ifdef __SSE2__
+
+// Eight bytes of each of 16 rows, a row every 'stride' bytes, turned: pieces[k] is the 16 bits of
+// column k; at least numColumns of them are written.
+void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uint16_t* pieces,
+               __m128i& all)
 {
-    const uint64_t marked = (bits * kLowBits) & 0x8040201008040201;
-    return ((marked + 0x7f7f7f7f7f7f7f7f) >> 7) & kLowBits;
+    __m128i in[16];
+    for (std::ptrdiff_t row = 0; row < 16; ++row) {
+        in[row] = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(rows + row * stride));
+        all = _mm_or_si128(all, in[row]);
+    }
+    // Each step puts a register beside the one half as many rows on.
+    __m128i two[8];
+    for (unsigned int row = 0; row < 8; ++row)
+        two[row] = _mm_unpacklo_epi8(in[row], in[row + 8]);
+    __m128i four[8]; // columns 0 to 3, then 4 to 7
+    for (unsigned int row = 0; row < 4; ++row) {
+        four[row] = _mm_unpacklo_epi8(two[row], two[row + 4]);
+        four[row + 4] = _mm_unpackhi_epi8(two[row], two[row + 4]);
+    }
+    for (unsigned int half = 0; half < (numColumns <= 4 ? 1 : 2); ++half) {
+        const __m128i* const from = four + 4 * half;
+        const __m128i eight[4] = {
+            _mm_unpacklo_epi8(from[0], from[2]), _mm_unpackhi_epi8(from[0], from[2]),
+            _mm_unpacklo_epi8(from[1], from[3]), _mm_unpackhi_epi8(from[1], from[3])};
+        const __m128i columns[4] = {
+            _mm_unpacklo_epi8(eight[0], eight[2]), _mm_unpackhi_epi8(eight[0], eight[2]),
+            _mm_unpacklo_epi8(eight[1], eight[3]), _mm_unpackhi_epi8(eight[1], eight[3])};
+        for (unsigned int column = 0; column < 4; ++column)
+            pieces[4 * half + column] =
+                static_cast<uint16_t>(_mm_movemask_epi8(_mm_slli_epi16(columns[column], 7)));
+    }
 }
+
+// 16 rows into bits 16 * part to 16 * part + 15 of the columns' words.
+class RowTurner {
+  public:
+    RowTurner(const ByteRows& rows, uint64_t* words, size_t wordStride)
+        : m_rows(rows), m_words(words), m_word_stride(wordStride),
+          m_end(rows.data + (static_cast<std::ptrdiff_t>(rows.numRows) - 1) * rows.rowStride +
+                static_cast<std::ptrdiff_t>(rows.numColumns))
+    {
+    }
+
+    void Turn(size_t firstRow, size_t numRows, size_t word, unsigned int part)
+    {
+        const uint8_t* const from =
+            m_rows.data + static_cast<std::ptrdiff_t>(firstRow) * m_rows.rowStride;
+        for (size_t column = 0; column < m_rows.numColumns; column += 8) {
+            const size_t numColumns = std::min<size_t>(8, m_rows.numColumns - column);
+            const uint8_t* source = from + column;
+            std::ptrdiff_t stride = m_rows.rowStride;
+            uint8_t copy[16 * 8];
+            if (numRows < 16 || source + 15 * stride + 8 > m_end) {
+                std::memset(copy, 0, sizeof copy);
+                for (size_t row = 0; row < numRows; ++row)
+                    std::memcpy(copy + 8 * row, source + static_cast<std::ptrdiff_t>(row) * stride,
+                                numColumns);
+                source = copy;
+                stride = 8;
+            }
+            uint16_t pieces[8];
+            __m128i all = _mm_setzero_si128();
+            TurnBytes(source, stride, numColumns, pieces, all);
+            uint64_t seen = 0;
+            _mm_storel_epi64(reinterpret_cast<__m128i*>(&seen), all);
+            const uint64_t mask = ~uint64_t(0) >> (64 - 8 * numColumns); // x86 is little-endian
+            m_seen |= seen & mask;
+            for (size_t index = 0; index < numColumns; ++index) {
+                uint64_t& target = m_words[(column + index) * m_word_stride + word];
+                const uint64_t bits = static_cast<uint64_t>(pieces[index]) << (16 * part);
+                target = part == 0 ? bits : target | bits;
+            }
+        }
+    }
+
+    bool IsFine() const { return (m_seen & ~kLowBits) == 0; }
+
+  private:
+    const ByteRows& m_rows;
+    uint64_t* m_words;
+    size_t m_word_stride;
+    const uint8_t* m_end;
+    uint64_t m_seen = 0;
+};
+
+#endif
 
 } // namespace
 
-RowPacker::RowPacker(const Table& table)
-    : m_table(table), m_num_groups((table.numColumns + 7) / 8), m_groups(kBlockRows * m_num_groups)
+bool PackColumn(const ValueColumn& column, size_t first, size_t numRows, uint64_t* words)
 {
-}
-
-bool RowPacker::Pack(size_t firstRow)
-{
-    m_num_rows = std::min(kBlockRows, m_table.numRows - firstRow);
-    m_fault.row = firstRow;
-    const size_t numColumns = m_table.numColumns;
-    if (m_table.itemSize == 1 && m_table.columnStride == 1) {
-        const uint8_t* const rows =
-            m_table.data + static_cast<std::ptrdiff_t>(firstRow) * m_table.rowStride;
-        // What lies behind a row may only be read where another row follows.
-        const bool isDense = m_table.rowStride == static_cast<std::ptrdiff_t>(numColumns);
-        const uint8_t* const end = isDense ? m_table.data + m_table.numRows * numColumns : nullptr;
-        return PackBytes(rows, m_table.rowStride, end);
-    }
-    m_bytes.resize(kBlockRows * numColumns);
-    const uint8_t* rows = nullptr;
-    switch (m_table.itemSize) {
-    case 1:
-        rows = Narrow<uint8_t>(firstRow);
-        break;
-    case 2:
-        rows = Narrow<uint16_t>(firstRow);
-        break;
-    case 4:
-        rows = Narrow<uint32_t>(firstRow);
-        break;
-    default:
-        rows = Narrow<uint64_t>(firstRow);
-        break;
-    }
-    return PackBytes(rows, static_cast<std::ptrdiff_t>(numColumns), rows + m_bytes.size());
-}
-
-// The rows as bytes; 2 stands for every value that is neither 0 nor 1.
-template <class Integer>
-const uint8_t* RowPacker::Narrow(size_t firstRow)
-{
-    uint8_t* byte = m_bytes.data();
-    for (size_t row = firstRow; row < firstRow + m_num_rows; ++row) {
-        const uint8_t* item = m_table.data + static_cast<std::ptrdiff_t>(row) * m_table.rowStride;
-        for (size_t column = 0; column < m_table.numColumns; ++column) {
-            Integer value;
-            std::memcpy(&value, item, sizeof value); // arrays need not be aligned
-            *byte++ = static_cast<uint8_t>(value <= 1 ? value : 2);
-            item += m_table.columnStride;
+    const bool isDense = column.kind == ItemKind::Byte && column.stride == 1;
+    uint8_t seen = 0;
+    for (size_t row = 0; row < numRows; row += kWordRows) {
+        const size_t count = std::min(kWordRows, numRows - row);
+        if (isDense && count == kWordRows) {
+            *words++ = PackBytes(column.data + first + row, seen);
+            continue;
         }
+        uint8_t bytes[kWordRows];
+        if (count < kWordRows)
+            std::memset(bytes, 0, sizeof bytes);
+        Narrow(column, first + row, count, bytes);
+        *words++ = PackBytes(bytes, seen);
     }
-    return m_bytes.data();
+    return seen == 0;
 }
 
-// 'end' is where the memory ends that may be read; null: nothing beyond each row.
-bool RowPacker::PackBytes(const uint8_t* rows, std::ptrdiff_t rowStride, const uint8_t* end)
+bool IsFault(const ValueColumn& column, size_t row)
 {
-    uint64_t bad = 0; // bits that neither 0 nor 1 has, of all rows
-    for (size_t group = 0; group < m_num_groups; ++group) {
-        const size_t numLeft = std::min<size_t>(8, m_table.numColumns - 8 * group);
-        const uint64_t mask = ~uint64_t(0) >> (64 - 8 * numLeft);
-        const uint8_t* bytes = rows + 8 * group;
-        uint8_t* const packed = &m_groups[kBlockRows * group];
-        for (size_t row = 0; row < m_num_rows; ++row, bytes += rowStride) {
-            const bool isWhole = numLeft == 8 || (end && end - bytes >= 8);
-            const uint64_t word = isWhole ? LoadBytes(bytes) & mask : LoadSome(bytes, numLeft);
-            bad |= word & ~kLowBits;
-            packed[row] = HighFirst(word);
-        }
+    uint8_t byte = 0;
+    Narrow(column, row, 1, &byte);
+    return byte > 1;
+}
+
+bool PackRows(const ByteRows& rows, size_t first, size_t numRows, uint64_t* words,
+              size_t wordStride)
+{
+#ifdef __SSE2__
+    RowTurner turner(rows, words, wordStride);
+    for (size_t row = 0; row < numRows; row += 16)
+        turner.Turn(first + row, std::min<size_t>(16, numRows - row), row / kWordRows,
+                    static_cast<unsigned int>(row % kWordRows / 16));
+    return turner.IsFine();
+#else
+    bool isFine = true;
+    for (size_t column = 0; column < rows.numColumns; ++column)
+        isFine = PackColumn({rows.data + column, rows.rowStride, ItemKind::Byte}, first, numRows,
+                            words + column * wordStride) &&
+                 isFine;
+    return isFine;
+#endif
+}
+
+void UnpackBits(const uint64_t* words, size_t numBits, uint8_t* bytes)
+{
+    for (size_t done = 0; done < numBits; done += 8) {
+        const uint64_t bits = words[done / kWordRows] >> (done % kWordRows) & 0xff;
+        const uint64_t marked = (bits * kLowBits) & 0x8040201008040201;
+        const uint64_t spread = ((marked + 0x7f7f7f7f7f7f7f7f) >> 7) & kLowBits;
+        uint8_t eight[8];
+        for (unsigned int index = 0; index < 8; ++index)
+            eight[index] = static_cast<uint8_t>(spread >> (8 * index));
+        std::memcpy(bytes + done, eight, std::min<size_t>(8, numBits - done));
     }
-    if (bad != 0)
-        FindFault(rows, rowStride);
-    return bad == 0;
-}
-
-// Requires: there is one.
-void RowPacker::FindFault(const uint8_t* rows, std::ptrdiff_t rowStride)
-{
-    for (size_t row = 0; row < m_num_rows; ++row, rows += rowStride) {
-        const uint8_t* const found =
-            std::find_if(rows, rows + m_table.numColumns, [](uint8_t value) { return value > 1; });
-        if (found != rows + m_table.numColumns) {
-            m_fault = {m_fault.row + row, static_cast<size_t>(found - rows)};
-            return;
-        }
-    }
-}
-
-void RowPacker::ToWords(std::vector<uint64_t>& words) const
-{
-    words.assign(m_table.numColumns, 0);
-    for (size_t group = 0; group < m_num_groups; ++group) {
-        const size_t first = 8 * group;
-        const size_t count = std::min<size_t>(8, m_table.numColumns - first);
-        for (size_t row = 0; row < m_num_rows; row += 8) { // bytes behind the last row do not count
-            const uint64_t rows = LoadBytes(&m_groups[kBlockRows * group + row]);
-            for (size_t column = 0; column < count; ++column)
-                words[first + column] |=
-                    static_cast<uint64_t>(LowFirst((rows >> (7 - column)) & kLowBits)) << row;
-        }
-    }
-}
-
-uint64_t RowPacker::RowNumber(size_t row) const
-{
-    uint64_t number = 0;
-    for (size_t group = 0; group < m_num_groups; ++group)
-        number = number << 8 | m_groups[kBlockRows * group + row];
-    return number >> (8 * m_num_groups - m_table.numColumns);
-}
-
-bool RowPacker::At(size_t row, size_t column) const
-{
-    return (m_groups[kBlockRows * (column / 8) + row] >> (7 - column % 8) & 1u) != 0;
-}
-
-void UnpackBits(uint64_t bits, size_t numBits, uint8_t* bytes)
-{
-    size_t done = 0;
-    for (; done + 8 <= numBits; done += 8)
-        StoreBytes(Spread(static_cast<uint8_t>(bits >> done)), bytes + done);
-    for (; done < numBits; ++done)
-        bytes[done] = static_cast<uint8_t>(bits >> done & 1u);
 }
 
 } // namespace booleq_python

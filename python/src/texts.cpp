@@ -1,15 +1,25 @@
-// How equations are made, written, compared and copied.
+// How equations are written, as texts and init values, and read from other notations.
+#include <algorithm>
 #include <string>
+#include <vector>
+
+#include <kq_logic/convert.h>
+#include <kq_logic/short_form.h>
 
 #include "bind.h"
 #include "errors.h"
-#include "function.h"
+#include "foreign_text.h"
+#include "lock.h"
+#include "notation_writer.h"
 #include "text.h"
 #include "unicode.h"
+#include "watch.h"
 
 namespace booleq_python {
 
 namespace {
+
+using namespace pybind11::literals; // "name"_a
 
 typedef Port::StringBase<char> String;
 
@@ -26,34 +36,118 @@ constexpr Syntax kSyntaxes[] = {
     {"expression", &Kq_BoolEquation::GetEquationAsExpression},
 };
 
-py::str Render(const Equation& equation, const py::object& syntax, const py::object& spaces)
+py::str Render(const py::object& self, const py::object& syntax, const py::object& hasBlanks)
 {
-    const bool hasBlanks = RequireFlag(spaces, "spaces");
+    const Equation& equation = Own(self);
+    const bool spaces = RequireFlag(hasBlanks, "spaces");
     const std::string name = Encode(RequireStr(syntax, "syntax"));
-    for (const Syntax& known : kSyntaxes)
-        if (name == known.name)
-            return Decode(booleq::ToStd((equation.Get().*known.render)(hasBlanks)));
+    for (const Syntax& known : kSyntaxes) {
+        if (name != known.name)
+            continue;
+        const SharedContent content = equation.Shared();
+        const auto render = known.render;
+        const auto write = [content, render, spaces] {
+            return booleq::ToStd((content->equation.*render)(spaces));
+        };
+        const bool isLong = equation.IsLargeText() || (equation.IsInit() && equation.IsLarge());
+        return Decode(isLong ? Beside(write) : write());
+    }
     throw py::value_error("there is no syntax '" + booleq::Excerpt(name) +
                           "'; there are primary, alt1, alt2, alt3, expression");
 }
 
-template <String (Kq_BoolEquation::*render)(bool) const>
-py::str RenderWithBlanks(const Equation& equation)
+// The text, unless the equation is another one once its blanks are what the library makes them:
+// then one with the parentheses that it needs.
+std::string ReadableText(const Content& content, const std::string& text,
+                         const booleq::Reading& reading)
 {
-    return Decode(booleq::ToStd((equation.Get().*render)(true)));
+    const std::string typed = booleq::ToStd(content.equation.GetEquation(true));
+    Kq_BoolEquation again;
+    if (booleq::SetFromText(again, typed, reading) && again == content.equation)
+        return text.size() > 2 && text[0] == '0' ? "(" + text + ")"
+                                                 : text; // or it is an init value
+    return WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::AsTyped,
+                    booleq::Parentheses::Clear);
+}
+
+// Digits of the rows as a str, the highest row first, without a second copy: 30 inputs have 2^30.
+py::str Digits(const booleq::Rows& rows, const std::string& prefix, unsigned int rowsPerDigit)
+{
+    static constexpr char kDigits[] = "0123456789abcdef";
+    const size_t numRows = rows.NumRows();
+    rowsPerDigit = std::min(rowsPerDigit, static_cast<unsigned int>(numRows));
+    const size_t size = prefix.size() + numRows / rowsPerDigit;
+    auto text = py::reinterpret_steal<py::str>(PyUnicode_New(static_cast<Py_ssize_t>(size), 127));
+    if (!text)
+        throw py::error_already_set();
+    auto* digit = static_cast<uint8_t*>(PyUnicode_DATA(text.ptr()));
+    digit = std::copy(prefix.begin(), prefix.end(), digit);
+    const unsigned int mask = (1u << rowsPerDigit) - 1;
+    const uint64_t* const words = rows.Words();
+    FreelyIf(numRows > 4096, [&] { // nobody else has the str yet
+        for (size_t row = numRows; row > 0;) {
+            const size_t chunk = std::min<size_t>(row, 65536);
+            for (const size_t end = row - chunk; row > end;) {
+                row -= rowsPerDigit;
+                *digit++ = static_cast<uint8_t>(kDigits[words[row / 64] >> (row % 64) & mask]);
+            }
+            booleq::Watch();
+        }
+    });
+    return text;
+}
+
+booleq::Rows RequireRows(const Equation& equation, const py::object& isLsbFirst)
+{
+    const bool lsbFirst = RequireFlag(isLsbFirst, "lsb_first");
+    if (equation.NumInputs() == 0)
+        throw py::value_error("an equation without inputs has no init value");
+    booleq::Rows rows = RowsOf(equation);
+    if (!lsbFirst)
+        return rows;
+    std::vector<unsigned int> order(rows.NumInputs());
+    for (unsigned int input = 0; input < rows.NumInputs(); ++input)
+        order[input] = rows.NumInputs() - 1 - input;
+    return FreelyIf(equation.IsLarge(), [&] { return PermuteInputs(std::move(rows), order); });
+}
+
+py::str HexInit(const py::object& self, const py::object& lsbFirst)
+{
+    return Digits(RequireRows(Own(self), lsbFirst), "0x", 4);
+}
+
+py::str BinaryInit(const py::object& self, const py::object& lsbFirst)
+{
+    return Digits(RequireRows(Own(self), lsbFirst), "0b", 1);
+}
+
+py::str SizedInit(const py::object& self, const py::object& lsbFirst)
+{
+    const booleq::Rows rows = RequireRows(Own(self), lsbFirst);
+    return Digits(rows, std::to_string(rows.NumRows()) + "'h", 4);
+}
+
+py::str Str(const py::object& self)
+{
+    const Equation& equation = Own(self);
+    if (equation.IsInit())
+        return HexInit(self, py::bool_(false));
+    const SharedContent content = equation.Shared();
+    booleq::Reading reading = equation.GetReading();
+    const std::string text = Encode(py::reinterpret_borrow<py::str>(equation.Text()));
+    const auto write = [content, text, reading] { return ReadableText(*content, text, reading); };
+    return Decode(equation.IsLargeText() ? Beside(write) : write());
 }
 
 // An int as the binary digits of all rows.
-py::str BinaryDigits(const py::object& value, const py::tuple& inputs)
+py::str BinaryDigits(const py::object& value, size_t numInputs)
 {
-    const size_t numInputs = inputs.size();
     if (numInputs == 0)
         throw py::value_error("an equation without inputs has no init value");
     if (numInputs > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(numInputs));
     const size_t numRows = size_t(1) << numInputs;
-    const py::int_ zero(0);
-    if (value < zero || value.attr("bit_length")().cast<size_t>() > numRows)
+    if (value < py::int_(0) || value.attr("bit_length")().cast<size_t>() > numRows)
         throw py::value_error("an init value over " + booleq::Count(numInputs, "input") + " has " +
                               std::to_string(numRows) + " bits: 0 <= value < 2**" +
                               std::to_string(numRows));
@@ -61,178 +155,127 @@ py::str BinaryDigits(const py::object& value, const py::tuple& inputs)
     return py::str("0b") + py::str(format(value, "0" + std::to_string(numRows) + "b"));
 }
 
-py::object FromInit(const py::object& type, const py::object& value, const py::object& inputs,
-                    const py::object& lsbFirst)
+py::object FromInit(const py::object& value, const py::object& inputs, const py::object& lsbFirst)
 {
-    const py::tuple names = RequireNames(inputs);
-    py::object text = value;
-    if (!PyUnicode_Check(value.ptr())) {
+    const py::tuple names = RequireInputs(inputs);
+    const bool isLsbFirst = RequireFlag(lsbFirst, "lsb_first");
+    py::str text;
+    if (PyUnicode_Check(value.ptr())) {
+        text = RequireStr(value, "value");
+    } else {
+        if (!PyIndex_Check(value.ptr()))
+            throw py::type_error("value must be a str or an int, not " + TypeName(value));
         const auto number = py::reinterpret_steal<py::object>(PyNumber_Index(value.ptr()));
-        if (!number) {
-            PyErr_Clear();
-            throw py::type_error("value must be a str or an int, not " +
-                                 std::string(Py_TYPE(value.ptr())->tp_name));
-        }
-        text = BinaryDigits(number, names);
+        if (!number)
+            throw py::error_already_set();
+        text = BinaryDigits(number, names.size());
     }
-    py::object made = type(text, names, lsbFirst);
-    if (made.cast<const Equation&>().Get().IsExpression()) {
+    py::object made = ReadEquation(text, names, isLsbFirst);
+    if (!Own(made).IsInit()) {
         booleq::RefusalReport report;
         report.code = "init-digit";
         report.length = 1;
-        report.reason = "an init value begins with 0x or 0b";
-        RaiseParseError(RequireStr(text, "value"), report);
+        report.reason = "an init value begins with 0x or 0b, or is a sized literal such as 8'hca";
+        RaiseParseError(text, report);
     }
     return made;
 }
 
-kq_logic::Function FunctionWithRows(const Equation& equation)
+struct Reader {
+    const char* name;
+    const booleq::Notation& (*notation)();
+};
+
+constexpr Reader kReaders[] = {{"verilog", booleq::VerilogNotation},
+                               {"vhdl", booleq::VhdlNotation},
+                               {"python", booleq::PythonNotation},
+                               {"liberty", booleq::LibertyNotation}};
+
+// Another notation's text as one of ours over its names.
+py::str FromNotation(const std::string& notation, const py::object& given)
 {
-    if (equation.NumInputs() == 0)
-        throw py::value_error("an equation without inputs has no init value");
-    return FunctionOf(equation);
+    const py::str text = RequireStr(given, "text");
+    const std::string bytes = Encode(text);
+    for (const Reader& reader : kReaders) {
+        if (notation != reader.name)
+            continue;
+        booleq::ForeignText read;
+        const std::string own = Freely([&] {
+            read = booleq::ReadForeignText(bytes, reader.notation());
+            return read.fault.empty() ? WriteOwn(read.expression, booleq::OwnSyntax::First,
+                                                 booleq::Parentheses::Clear)
+                                      : std::string();
+        });
+        if (read.fault.empty())
+            return Decode(own);
+        booleq::RefusalReport report;
+        report.code = "notation";
+        report.reason = std::string(reader.notation().name) + " does not read it: " + read.fault;
+        RaiseParseError(text, report);
+    }
+    throw py::value_error("there is no reader for " + booleq::Excerpt(notation));
 }
 
-std::string Repr(const Equation& equation)
+// The short form in place of the equation.
+Kq_BoolEquation Shortened(const Equation& equation)
 {
-    std::string text = "Equation(" + std::string(py::repr(equation.Text()));
-    if (!equation.GivenInputs().is_none())
-        text += ", inputs=" + std::string(py::repr(py::list(equation.GivenInputs())));
-    return text + (equation.IsLsbFirst() ? ", lsb_first=True)" : ")");
+    const kq_logic::Function function = FunctionOf(equation);
+    const kq_logic::ShortForm found =
+        FreelyIf(true, [&] { return kq_logic::FindShortForm(function); });
+    if (!found.fault.empty())
+        throw py::value_error(found.fault);
+    Kq_BoolEquation shortened;
+    booleq::Reading reading;
+    reading.hasInputs = true;
+    reading.inputs = equation.InputBytes();
+    booleq::SetFromText(shortened, found.text, reading);
+    return shortened;
 }
 
-// What Equation, called again, and the values of the inputs need.
-py::tuple Reduce(const Equation& equation)
+py::object ConvertEquation(const py::object& self, const py::object& to, const py::object& unit,
+                           const py::object& hasShort, double seconds)
 {
-    py::list ones;
-    for (size_t input = 0; input < equation.NumInputs(); ++input)
-        if (equation.GetValue(input) != 0)
-            ones.append(equation.Inputs()[input]);
-    return py::make_tuple(ResultClass("restore"),
-                          py::make_tuple(equation.Text(), equation.GivenInputs(),
-                                         equation.IsLsbFirst(), py::tuple(ones)));
+    const Equation& equation = Own(self);
+    const bool isShort = RequireFlag(hasShort, "short");
+    const SharedContent content = equation.Shared();
+    const std::string target = Encode(RequireStr(to, "to"));
+    const std::string name = Encode(RequireStr(unit, "name"));
+    const Kq_BoolEquation converted = isShort ? Shortened(equation) : content->equation;
+    const auto conversion = BesideIf(equation.IsEndlessText(), [converted, target, name, seconds] {
+        kq_logic::Limits limits;
+        limits.seconds = seconds;
+        return kq_logic::Convert(converted, target, name, limits);
+    });
+    if (!conversion.fault.empty())
+        throw py::value_error(conversion.fault);
+    py::list names;
+    for (size_t input = 0; input < conversion.names.size(); ++input)
+        names.append(
+            py::make_tuple(Decode(conversion.inputs[input]), Decode(conversion.names[input])));
+    return py::make_tuple(Decode(conversion.text), Decode(conversion.unit),
+                          Decode(conversion.output), names, conversion.isProved,
+                          Decode(conversion.doubt));
 }
 
-void BindConstruction(EquationClass& type)
+py::tuple Targets()
 {
-    type.def(py::init(&MakeEquation<py::object, py::object, py::object>), py::arg("text"),
-             py::arg("inputs") = py::none(), py::arg("lsb_first") = false,
-             "__init__($record, self, text, inputs=None, lsb_first=False)\n--\n\nSee the class.");
-    const py::cpp_function fromInit(&FromInit, py::name("from_init"), py::scope(type),
-                                    py::arg("cls"), py::arg("value"), py::arg("inputs"),
-                                    py::arg("lsb_first") = false,
-                                    R"doc(from_init($record, cls, value, inputs, lsb_first=False)
---
-
-The equation of an init value: a text "0x..." or "0b...", or an int.
-
-Bit k of the value is the result of row k. A text that is no init value over so many inputs is a
-ParseError, an int that does not fit a ValueError.
-
->>> from booleq import Equation
->>> Equation.from_init(0b0100, ["A", "B"]).alt1
-'( A & ~ B )'
->>> Equation.from_init("0x2", ["A", "B"], lsb_first=True).hex_init
-'0x4'
-)doc");
-    type.attr("from_init") = py::reinterpret_steal<py::object>(PyClassMethod_New(fromInit.ptr()));
-}
-
-void BindRenderings(EquationClass& type)
-{
-    type.def_property_readonly("text", &Equation::Text, "The text as it was given.");
-    type.def_property_readonly("lsb_first", &Equation::IsLsbFirst, "The flag as it was given.");
-    type.def_property_readonly("given_inputs", &Equation::GivenInputs,
-                               "The inputs as they were listed, None without a list.");
-    type.def_property_readonly("inputs", &Equation::Inputs,
-                               "All inputs in their order, the most significant first.");
-    type.def_property_readonly("primary", &RenderWithBlanks<&Kq_BoolEquation::GetEquation>,
-                               "The equation with its operators as they were typed; an init value "
-                               "as it was given.");
-    type.def_property_readonly("alt1", &RenderWithBlanks<&Kq_BoolEquation::GetEquationAlt1>,
-                               "The equation written with & | ^ ~.");
-    type.def_property_readonly("alt2", &RenderWithBlanks<&Kq_BoolEquation::GetEquationAlt2>,
-                               "The equation written with * + @ ~.");
-    type.def_property_readonly("alt3", &RenderWithBlanks<&Kq_BoolEquation::GetEquationAlt3>,
-                               "The equation written with .AND. .OR. .XOR. ~.");
-    type.def_property_readonly("expression",
-                               &RenderWithBlanks<&Kq_BoolEquation::GetEquationAsExpression>,
-                               "primary, but alt1 for an init value: never \"0x...\".");
-    type.def("render", &Render, py::arg("syntax") = "primary", py::arg("spaces") = true,
-             R"doc(render($record, self, syntax="primary", spaces=True)
---
-
-The equation as text: "primary", "alt1", "alt2", "alt3" or "expression", as the properties.
-
-spaces=False leaves out the blanks between tokens; "~ |" may then close up to "~|", which is
-another operator.
-
->>> from booleq import Equation
->>> Equation("A & ~B").render("alt3", spaces=False)
-'A.AND.~B'
-)doc");
-    type.def_property_readonly(
-        "hex_init",
-        [](const Equation& equation) { return py::str(FunctionWithRows(equation).Hex()); },
-        "The results as one hexadecimal number, bit k being row k, leading zeros kept. ValueError\n"
-        "without inputs or with more than 30.\n\n"
-        ">>> from booleq import Equation\n>>> Equation(\"A & ~B\").hex_init\n'0x4'\n");
-    type.def_property_readonly(
-        "binary_init",
-        [](const Equation& equation) { return py::str(FunctionWithRows(equation).Binary()); },
-        "The results as one binary number, the highest row first. ValueError as for hex_init.\n\n"
-        ">>> from booleq import Equation\n>>> Equation(\"A & ~B\").binary_init\n'0b0100'\n");
-}
-
-void BindEquality(EquationClass& type)
-{
-    type.def(
-        "__eq__",
-        [](const Equation& self, const py::object& other) -> py::object {
-            if (!py::isinstance<Equation>(other))
-                return py::reinterpret_borrow<py::object>(Py_NotImplemented);
-            return py::bool_(self.Get() == other.cast<const Equation&>().Get());
-        },
-        R"doc(__eq__($record, self, other, /)
---
-
-True for the same operators, groups and names in the same places, however they are spelled. Values
-do not count. Whether two equations are one function is equivalent()'s matter.
-
->>> from booleq import Equation
->>> Equation("A & B") == Equation("A .AND. B"), Equation("A & B") == Equation("B & A")
-(True, False)
-)doc");
-    type.def("__hash__", &Equation::Hash,
-             "__hash__($record, self, /)\n--\n\nAgrees with ==; values do not count.");
-}
-
-void BindCopies(EquationClass& type)
-{
-    type.def(
-        "__copy__", &MakeEquation<Equation>,
-        "__copy__($record, self, /)\n--\n\nAn equal equation with the same values, which are its "
-        "own.");
-    type.def(
-        "__deepcopy__", [](const Equation& self, const py::object&) { return MakeEquation(self); },
-        py::arg("memo"), "__deepcopy__($record, self, memo, /)\n--\n\nThe same as a copy.");
-    type.def("__reduce__", &Reduce,
-             "__reduce__($record, self, /)\n--\n\nFor pickle: text, inputs, flag and values.");
-    type.def(
-        "__repr__", &Repr,
-        "__repr__($record, self, /)\n--\n\nA text that makes an equal equation, values apart.");
-    type.def("__str__", &RenderWithBlanks<&Kq_BoolEquation::GetEquation>,
-             "__str__($record, self, /)\n--\n\nThe same as primary.");
+    return DecodeAll(kq_logic::ConversionTargets());
 }
 
 } // namespace
 
-void BindTexts(EquationClass& type)
+void BindTexts(py::module_& module)
 {
-    BindConstruction(type);
-    BindRenderings(type);
-    BindEquality(type);
-    BindCopies(type);
+    module.def("set_equation_class", &SetEquationClass);
+    module.def("render", &Render);
+    module.def("readable", &Str);
+    module.def("hex_init", &HexInit);
+    module.def("binary_init", &BinaryInit);
+    module.def("sized_init", &SizedInit);
+    module.def("from_init", &FromInit);
+    module.def("from_notation", &FromNotation);
+    module.def("convert", &ConvertEquation);
+    module.def("conversion_targets", &Targets);
 }
 
 } // namespace booleq_python

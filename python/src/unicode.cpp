@@ -26,11 +26,6 @@ std::string EncodeWith(const py::str& text, const char* errors)
     return std::string(bytes);
 }
 
-std::string TypeName(const py::handle& value)
-{
-    return Py_TYPE(value.ptr())->tp_name;
-}
-
 } // namespace
 
 std::string Encode(const py::str& text)
@@ -40,9 +35,19 @@ std::string Encode(const py::str& text)
 
 std::string Shown(const py::handle& value)
 {
-    const py::str text =
-        PyUnicode_Check(value.ptr()) ? py::reinterpret_borrow<py::str>(value) : py::repr(value);
-    return booleq::Excerpt(EncodeWith(text, "backslashreplace"));
+    if (!PyUnicode_Check(value.ptr()))
+        return ShownValue(value);
+    return booleq::Excerpt(EncodeWith(py::reinterpret_borrow<py::str>(value), "backslashreplace"));
+}
+
+std::string ShownValue(const py::handle& value)
+{
+    return booleq::Excerpt(EncodeWith(py::repr(value), "backslashreplace"));
+}
+
+std::string TypeName(const py::handle& value)
+{
+    return Py_TYPE(value.ptr())->tp_name;
 }
 
 py::str Decode(const std::string& bytes)

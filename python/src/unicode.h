@@ -18,8 +18,11 @@ std::string Encode(const py::str& text);
 py::str Decode(const std::string& bytes);
 // What Decode makes of its bytes; null for a surrogate that stands for no byte.
 py::object SameInBytes(const py::str& text);
-// Any object for a message, in printable ASCII and not too long: a str as it is, others as repr.
+// Any object for a message, not too long, a name as it is, others as repr.
 std::string Shown(const py::handle& value);
+// The same with quotes around a str, as Python's own messages show values.
+std::string ShownValue(const py::handle& value);
+std::string TypeName(const py::handle& value);
 py::tuple DecodeAll(const std::vector<std::string>& names);
 
 // 'value' as a plain str.  Fails: TypeError that begins with 'what'.

@@ -26,7 +26,7 @@ assert booleq.__file__.startswith(sys.prefix), booleq.__file__
 assert booleq.__version__ == importlib.metadata.version("booleq") == sys.argv[1]
 assert any(word.startswith("numpy") for word in importlib.metadata.requires("booleq"))
 equation = pickle.loads(pickle.dumps(Equation("A & ~B")))
-assert equation.hex_init == "0x4" and equation.eval_many([[1, 0]]).tolist() == [1]
+assert equation.hex_init() == "0x4" and equation.eval_many([[1, 0]]).tolist() == [1]
 try:
     Equation("A &")
     sys.exit("nothing was refused")
@@ -109,9 +109,22 @@ def main() -> None:
         run(*cut_off, python, "-c", backend)
         assert hashlib.sha256(wheel.read_bytes()).digest() == first, "another wheel, other bytes"
 
+        python = new_python(folder / "editable")
+        run(*cut_off, python, "-m", "pip", "install", "--no-build-isolation", "-e", root)
+        run(python, "-P", "-c", "import booleq; assert booleq.Equation('A & ~B').hex_init() == '0x4'; "
+            f"assert booleq.__file__.startswith({str(root)!r})")
+        old = "import sys; sys.version_info = (3, 10, 12); import build_backend"
+        refused = subprocess.run([python, "-c", old], cwd=root / "python", text=True, check=False,
+                                 stderr=subprocess.PIPE)
+        assert refused.stderr == "booleq needs Python 3.11 or newer; this is Python 3.10.12\n"
+
         python = new_python(folder / "from the wheel")
         run(*cut_off, python, "-m", "pip", "install", wheel)
         run(python, "-P", "-c", PROGRAM, version)
+        with zipfile.ZipFile(wheel) as packed:
+            has_tool = "booleq/_tool" in packed.namelist()
+        if has_tool:
+            assert "0x4" in run(python, "-P", "-m", "booleq", "A & ~B")
         run(python, "-m", "pip", "uninstall", "--yes", "booleq")
         assert not list((folder / "from the wheel").rglob("booleq*"))
         print("installed from the tree and from a wheel")

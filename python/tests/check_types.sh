@@ -11,4 +11,4 @@ mkdir -p -- "$cache"
 cd -- "$cache" # stubtest keeps its cache where it stands
 MYPYPATH=$PYTHONPATH "$python" -m mypy --config-file "$configuration" --cache-dir "$cache" \
     "$tests" "$tests/../bench"
-"$python" -m mypy.stubtest booleq --mypy-config-file "$configuration"
+"$python" -m mypy.stubtest booleq._booleq --mypy-config-file "$configuration"

@@ -99,12 +99,6 @@ class TestEvalMany:
     def test_lists(self) -> None:
         assert Equation(MUX).eval_many([[1, 1, 0], [0, True, 0]]).tolist() == [1, 0]
 
-    def test_values_that_are_set_do_not_count(self) -> None:
-        for equation in [Equation(MUX), Equation("0xca", ["S", "A", "B"])]:
-            equation["A"] = 1
-            assert equation.eval_many([[1, 0, 0]]).tolist() == [0]
-            assert dict(equation) == {"S": 0, "A": 1, "B": 0}
-
     def test_without_inputs(self) -> None:
         rows = np.empty((70, 0), dtype=bool)
         assert Equation("1").eval_many(rows).tolist() == 70 * [1]
@@ -116,12 +110,12 @@ class TestEvalMany:
         with pytest.raises(ValueError, match=r"must have the shape \(rows, 3\)"):
             Equation(MUX).eval_many(np.zeros(shape, dtype=np.uint8))
 
-    @pytest.mark.parametrize("dtype", ["f4", "f8", "c8", "O", "U1", "S1", "M8[s]"])
+    @pytest.mark.parametrize("dtype", ["c8", "U1", "S1", "M8[s]"])
     def test_other_kinds(self, dtype: str) -> None:
-        with pytest.raises(TypeError, match="^assignments must be bool or integers, not "):
+        with pytest.raises(TypeError, match="^assignments must be bool, integers, or floats and objects that are 0 or 1, not "):
             Equation(MUX).eval_many(np.zeros((2, 3), dtype=dtype))
         with pytest.raises(TypeError):
-            Equation(MUX).eval_many(None)  # type: ignore[arg-type]
+            Equation(MUX).eval_many(None)
 
     @pytest.mark.parametrize("num_inputs", [3, 8, 9, 40])
     @pytest.mark.parametrize("value, dtype", [(2, "u1"), (255, "u1"), (-1, "i1"), (256, "i2"),
@@ -213,8 +207,7 @@ class TestMemory:
         try:
             for name in ["packed_column", "column", "truth_table", "hex_init"]:
                 with pytest.raises(MemoryError):
-                    value = getattr(equation, name)
-                    value()
+                    getattr(equation, name)()
         finally:
             resource.setrlimit(resource.RLIMIT_AS, old)
         assert equation.eval_many(np.ones((2, 30), dtype=bool)).tolist() == [1, 1]

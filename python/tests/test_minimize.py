@@ -32,8 +32,8 @@ class TestEquation:
         assert (minimum.terms, minimum.literals) == (2, 2)
 
     def test_wrong_arguments(self) -> None:
-        with pytest.raises(TypeError, match="dont_care must be an Equation"):
-            Equation("a").minimize(dont_care="b")  # type: ignore[arg-type]
+        with pytest.raises(TypeError, match="dont_care must be an Equation, a text, 0, 1 or None"):
+            Equation("a").minimize(dont_care=[])  # type: ignore[arg-type]
         with pytest.raises(ValueError, match="seconds must be above 0"):
             Equation("a").minimize(seconds=-1.0)
 

@@ -6,7 +6,7 @@ from typing import Any, Dict, List
 import pytest
 
 import booleq
-from booleq import (Difference, Equation, Equivalence, Explanation, Finding, LintReport, Node,
+from booleq import (Assignment, Difference, Equation, Equivalence, Explanation, Finding, LintReport, Node,
                     Reading)
 
 
@@ -33,7 +33,7 @@ class TestTree:
         assert Equation("~'\u00fc'").tree_dot() == (
             'digraph equation {\n  node [shape=box, fontname="monospace"];\n'
             '  n0 [label="NOT  ~"];\n'
-            "  n1 [label=\"'\\\\xc3\\\\xbc'\", shape=ellipse];\n  n0 -> n1;\n}\n")
+            "  n1 [label=\"'\u00fc'\", shape=ellipse];\n  n0 -> n1;\n}\n")
 
 
 class TestEquivalent:
@@ -55,7 +55,7 @@ class TestEquivalent:
 
     def test_constants(self) -> None:
         assert Equation("1").equivalent(Equation("A | ~A"))
-        assert Equation("1").equivalent(Equation("0")) == Equivalence(False, {}, (1, 0))
+        assert Equation("1").equivalent(Equation("0")) == Equivalence(False, Assignment({}), (1, 0))
 
     def test_many_inputs(self) -> None:
         first = Equation("|".join(f"x{k}" for k in range(200)))
@@ -66,8 +66,13 @@ class TestEquivalent:
         assert result.values == (1, 0)
 
     def test_of_what(self) -> None:
-        with pytest.raises(TypeError, match="^other must be an Equation, not str$"):
-            Equation("A").equivalent("A")  # type: ignore[arg-type]
+        assert Equation("A").equivalent("A") and Equation("A | ~A").equivalent(1)
+        with pytest.raises(TypeError, match="^other must be an Equation, a text, 0 or 1, not list$"):
+            Equation("A").equivalent([])  # type: ignore[arg-type]
+
+    def test_answers_are_keys(self) -> None:
+        first, second = (Equation("A").equivalent("B") for _ in range(2))
+        assert first == second and len({first, second, first.counterexample}) == 2
 
 
 class TestPermute:
@@ -77,10 +82,10 @@ class TestPermute:
         assert permuted.equivalent(Equation("0xca", ["S", "A", "B"]))
 
     def test_widens(self) -> None:
-        assert Equation("A & ~B").permute(iter(["A", "B", "D"])).hex_init == "0x30"
+        assert Equation("A & ~B").permute(iter(["A", "B", "D"])).hex_init() == "0x30"
 
     def test_one_input_and_none(self) -> None:
-        assert repr(Equation("~A").permute(["A"])) == "Equation('0b01', inputs=['A'])"
+        assert repr(Equation("~A").permute(["A"])) == "Equation('0x1', inputs=['A'])"
         assert repr(Equation("1").permute(["A", "B"])) == "Equation('0xf', inputs=['A', 'B'])"
         assert Equation("1").permute([])() == 1 and Equation("0").permute([])() == 0
 
@@ -137,7 +142,7 @@ class TestLint:
         verilog, *_, vhdl, python = report.readers
         assert verilog == Reading(
             "Verilog", True, None, False, True, "0xf8",
-            Difference({"a": 1, "b": 0, "c": 0}, 0, "(a | (b & c))",
+            Difference(Assignment({"a": 1, "b": 0, "c": 0}), 0, "(a | (b & c))",
                        '"&" binds tighter than "|" there',
                        "(a | b) & c", "a | (b & c)"))
         assert vhdl.reads is False and vhdl.same is None and vhdl.compared_all is None
@@ -158,7 +163,7 @@ class TestLint:
         found = [finding for finding in report.findings if finding.code == code]
         assert len(found) == 1 and not report.is_clean
         assert isinstance(found[0], Finding) and found[0].message
-        assert all(isinstance(text, str) for pair in found[0].details.items() for text in pair)
+        assert all(isinstance(text, str) for pair in found[0].details for text in pair)
 
     def test_many_inputs(self) -> None:
         report = Equation(" & ".join(f"x{k}" for k in range(60))).lint()

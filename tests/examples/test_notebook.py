@@ -3,7 +3,7 @@
 value in it, which must fail.
 
 usage: test_notebook.py NOTEBOOK
-Exit status 77, which counts as skipped: nbclient, ipykernel or NumPy is missing.
+Exit status 77, which counts as skipped: nbclient, ipykernel, NumPy or pandas is missing.
 """
 import json
 import os
@@ -18,8 +18,9 @@ try:
     import nbclient
     import nbformat
     import numpy  # noqa: F401
+    import pandas  # noqa: F401
 except ImportError as error:
-    print(f"skipped: {error} (Debian: python3-nbclient python3-ipykernel python3-numpy)")
+    print(f"skipped: {error} (Debian: python3-nbclient python3-ipykernel python3-numpy python3-pandas)")
     sys.exit(SKIPPED)
 
 

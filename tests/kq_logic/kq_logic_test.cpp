@@ -8,6 +8,7 @@
 #include <kq_logic/decide.h>
 #include <kq_logic/explain.h>
 #include <kq_logic/match.h>
+#include <kq_logic/netlist.h>
 #include <kq_logic/permute.h>
 #include <kq_logic/short_form.h>
 #include <kq_logic/watch.h>
@@ -168,6 +169,56 @@ TEST(LogicFunction, TellsWhichInputsMatter)
     EXPECT_TRUE(function.DependsOn(0));
     EXPECT_FALSE(function.DependsOn(1));
     EXPECT_TRUE(function.DependsOn(2));
+}
+
+std::string Blif(const std::string& cover)
+{
+    return ".model m\n.inputs a b\n.outputs y\n.names a b y\n" + cover + "\n.end\n";
+}
+
+kq_logic::Netlist ReadNetlist(const std::string& text)
+{
+    kq_logic::Netlist netlist;
+    std::string fault;
+    EXPECT_TRUE(netlist.ReadText(text, fault)) << fault;
+    return netlist;
+}
+
+TEST(KqLogicNetlist, ATableIsAPlainValue)
+{
+    const kq_logic::Netlist netlist = ReadNetlist(Blif("10 1"));
+    ASSERT_EQ(netlist.NumTables(), 1u);
+    const kq_logic::NetlistTable table = netlist.At(0);
+    EXPECT_EQ(table.path, "y");
+    EXPECT_EQ(table.output, "y");
+    EXPECT_EQ(table.inputs, (std::vector<std::string>{"b", "a"}));
+    EXPECT_EQ(table.init, "0x2");
+}
+
+TEST(KqLogicNetlist, ADifferenceHasItsCause)
+{
+    const kq_logic::NetlistComparison comparison =
+        Compare(ReadNetlist(Blif("10 1")), ReadNetlist(Blif("01 1")));
+    EXPECT_FALSE(comparison.isSame);
+    EXPECT_EQ(comparison.numSame, 0u);
+    ASSERT_EQ(comparison.differences.size(), 1u);
+    const kq_logic::TableDifference& difference = comparison.differences[0];
+    ASSERT_FALSE(difference.causes.empty());
+    EXPECT_EQ(difference.causes[0].first, "pins-swapped");
+    EXPECT_EQ(difference.shouldBe, "0x2");
+    EXPECT_NE(difference.left, difference.right);
+    EXPECT_EQ(difference.assignment.size(), 2u);
+}
+
+TEST(KqLogicNetlist, ARefusedTextLeavesTheNetlistAsItWas)
+{
+    kq_logic::Netlist netlist = ReadNetlist(Blif("11 1"));
+    std::string fault;
+    EXPECT_FALSE(netlist.ReadText("nonsense", fault));
+    EXPECT_NE(fault, "");
+    EXPECT_EQ(netlist.NumTables(), 1u);
+    EXPECT_TRUE(Compare(netlist, ReadNetlist(Blif("11 1"))).isSame);
+    EXPECT_EQ(kq_logic::Netlist().NumTables(), 0u);
 }
 
 } // namespace

@@ -50,12 +50,15 @@ def check_commands(readme, tool):
     environment.pop("MAV_KQ_BOOL_EQUATION_DEBUG", None)
     environment["PATH"] = os.path.dirname(tool) + os.pathsep + environment["PATH"]
     failures = count = 0
-    for block in blocks(readme, "console"):
-        for example in re.split(r"^\$ ", block, flags=re.M)[1:]:
-            command, expected = example.split("\n", 1)
-            count += 1
-            failures += compare(command, expected,
-                                run(["sh", "-c", command], env=environment)[1])
+    # One directory for all commands of a page: what one writes, a later one reads.
+    with tempfile.TemporaryDirectory() as directory:
+        for block in blocks(readme, "console"):
+            for example in re.split(r"^\$ ", block, flags=re.M)[1:]:
+                command, expected = example.split("\n", 1)
+                count += 1
+                failures += compare(command, expected,
+                                    run(["sh", "-c", command], env=environment,
+                                        cwd=directory)[1])
     print(f"{count} commands run, {failures} differ")
     return 1 if failures or not count else 0
 

@@ -19,6 +19,16 @@ WORDS = {
     "convert": (["--to", "verilog"], []), "lint": ([], []), "sat": ([], []),
     "minimize": ([], []),
 }
+NETLIST_WORDS = {"stats": [], "list": [], "check": [], "diff": ["good.blif"]}
+GOOD_NETLIST = b".model x\n.inputs a b\n.outputs y\n.names a b y\n11 1\n.end\n"
+BAD_NETLISTS = {
+    "empty": b"", "blank": b" \n\t", "binary": bytes(range(256)), "words": b"A & B\n",
+    "half of JSON": b'{"modules": {"top": {"cells": {"a": {"type": "$lut", ', "a list": b"[1, 2]\n",
+    "deep": b'{"modules": ' + b"[" * 100000, "no modules": b'{"creator": "x"}',
+    "wrong types": b'{"modules": {"top": {"cells": 3, "netnames": []}}}',
+    "half of BLIF": b".model x\n.names a b y\n11", "half of EDIF": b"(edif x (edifVersion 2 0 0",
+    "cut gzip": b"\x1f\x8b\x08\0\0\0\0\0\0\x03\x01\x02",
+}
 NAMES31 = ["v%d" % number for number in range(31)]
 COLUMNS = {"table", "init", "kmap", "explain", "match"}  # no more than 30 inputs
 OWN_INPUTS = {"permute"}  # always lists A and B, by an option of its own
@@ -137,12 +147,40 @@ def listed_commands(tool):
     return re.findall(r"^  (\w+) ", block, re.M)
 
 
+def check_netlists(checker, command):
+    """Files that are no netlists: a message with the file's name, or one object."""
+    with tempfile.TemporaryDirectory() as directory:
+        with open(os.path.join(directory, "good.blif"), "wb") as file:
+            file.write(GOOD_NETLIST)
+        for what, content in BAD_NETLISTS.items():
+            with open(os.path.join(directory, "bad"), "wb") as file:
+                file.write(content)
+            words = [command, "bad", *NETLIST_WORDS[command]]
+            done = checker.run("netlist", words, f"{command} of {what}", cwd=directory)
+            checker.complains(done, REFUSED)
+            checker.expect(b"bad" in done.stderr, done, "no file is named")
+            done = checker.run("netlist", [*words, "--json"], f"{command} of {what} as JSON",
+                               cwd=directory)
+            checker.expect(done.returncode == REFUSED, done, "status 3 expected")
+            answer = json.loads(done.stdout)
+            checker.expect(answer["status"] == "refused" and answer["refusal"]["reason"], done,
+                           "no refusal")
+        for name in ("nowhere", directory):
+            done = checker.run("netlist", [command, name, *NETLIST_WORDS[command]], "no file",
+                               cwd=directory)
+            checker.expect(done.returncode in (WRONG_USAGE, REFUSED), done, "a status expected")
+            checker.expect(done.stderr.startswith(b"booleq: "), done, "there is no message")
+
+
 def main():
     parser = argparse.ArgumentParser()
     parser.add_argument("--tool", required=True)
     tool = os.path.abspath(parser.parse_args().tool)
     checker = Checker(tool)
-    commands = [name for name in listed_commands(tool) if name != "batch"]  # it reads no equation
+    # These read no equation.
+    commands = [name for name in listed_commands(tool) if name not in ("batch", "netlist")]
+    for command in NETLIST_WORDS:
+        check_netlists(checker, command)
     missing = [name for name in commands if name not in WORDS]
     for command in commands:
         if command in missing:

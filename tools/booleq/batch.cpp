@@ -4,12 +4,14 @@
 
 #include <algorithm>
 #include <memory>
+#include <optional>
 #include <thread>
 #include <utility>
 
 #include "answer.h"
 #include "commands.h"
 #include "lines.h"
+#include "messages.h"
 #include "progress.h"
 #include "table_format.h"
 #include "text.h"
@@ -222,6 +224,9 @@ void RunAlone(const Request& request, TableReader& reader, Answers& answers)
 Answered AnswerLines(const std::vector<Line>& lines, const Request& request,
                      const TableFormat& header)
 {
+    std::optional<NoMessages> silence; // of the thread that answers
+    if (!request.debug)
+        silence.emplace();
     Answering answering(request, header);
     Answered answered;
     for (const Line& line : lines)

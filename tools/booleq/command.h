@@ -48,7 +48,7 @@ struct Request {
 };
 
 struct Command {
-    const char* name;
+    const char* name;     // of a group two words: "netlist diff"
     const char* operands; // "EQUATION NAME=VALUE..."
     size_t minOperands;   // the text included
     size_t maxOperands;
@@ -59,19 +59,22 @@ struct Command {
     // Answers on 'output', complaints on standard error; the exit status out.
     // Fails: UsageError; IoError.
     int (*run)(const Request& request, Output& output);
+    bool takesFiles = false; // the operands are files, "-" among them, and no equation is read
 };
 
 constexpr size_t kAnyNumber = static_cast<size_t>(-1);
 
 // In the order of the help; the first one is meant where no command is named.
 const std::vector<Command>& Commands();
-// Null for a word that is no command.
-const Command* FindCommand(const std::string& word);
+// The command that the words begin with, and how many of them are its name; null for none.
+const Command* FindCommand(const std::vector<std::string>& words, size_t& numWords);
+// The commands of a group, by its word ("netlist"); empty for a word that is none.
+std::vector<const Command*> CommandsOfGroup(const std::string& word);
 // The command whose name is most like the word, a letter or two apart; null when none is. A word
 // that must be a command may be a short one, or a name's beginning.
 const Command* NearestCommand(const std::string& word, bool isCommand);
-// Options that every command takes.
-const std::vector<Option>& CommonOptions();
+// Options that every command takes, or every one that takes files.
+const std::vector<Option>& CommonOptions(bool takesFiles);
 
 } // namespace booleq
 

@@ -5,7 +5,7 @@
 
 namespace booleq {
 
-const std::vector<Option>& CommonOptions()
+const std::vector<Option>& CommonOptions(bool takesFiles)
 {
     static const std::vector<Option> options = {
         {"--inputs", "A,B,C", "The inputs, most significant first; 'a,b' in quotes is one name"},
@@ -16,27 +16,44 @@ const std::vector<Option>& CommonOptions()
         {"--json", nullptr, "Answer with one JSON object on a line for each equation"},
         {"--debug", nullptr, "Let the library's diagnostics go to standard error"},
     };
-    return options;
+    static const std::vector<Option> fileOptions = {
+        {"--json", nullptr, "Answer with JSON, an object on a line"},
+        {"--debug", nullptr, "Let the library's diagnostics go to standard error"},
+    };
+    return takesFiles ? fileOptions : options;
 }
 
 const std::vector<Command>& Commands()
 {
     static const std::vector<Command> commands = {
-        ShowCommand(),    CheckCommand(), EvalCommand(),    TableCommand(),
-        InitCommand(),    EqualCommand(), SatCommand(),     ExplainCommand(),
-        PermuteCommand(), MatchCommand(), ConvertCommand(), LintCommand(),
-        TreeCommand(),    KmapCommand(),  BatchCommand(),   MinimizeCommand(),
+        ShowCommand(),         CheckCommand(),       EvalCommand(),         TableCommand(),
+        InitCommand(),         EqualCommand(),       SatCommand(),          ExplainCommand(),
+        PermuteCommand(),      MatchCommand(),       ConvertCommand(),      LintCommand(),
+        TreeCommand(),         KmapCommand(),        BatchCommand(),        MinimizeCommand(),
+        NetlistStatsCommand(), NetlistListCommand(), NetlistCheckCommand(), NetlistDiffCommand(),
     };
     return commands;
 }
 
-const Command* FindCommand(const std::string& word)
+const Command* FindCommand(const std::vector<std::string>& words, size_t& numWords)
 {
-    const std::vector<Command>& commands = Commands();
-    const auto found =
-        std::find_if(commands.begin(), commands.end(),
-                     [&word](const Command& command) { return word == command.name; });
-    return found == commands.end() ? nullptr : &*found;
+    for (numWords = 1; numWords <= 2 && numWords <= words.size(); ++numWords) {
+        const std::string name = numWords == 1 ? words[0] : words[0] + " " + words[1];
+        for (const Command& command : Commands())
+            if (name == command.name)
+                return &command;
+    }
+    numWords = 0;
+    return nullptr;
+}
+
+std::vector<const Command*> CommandsOfGroup(const std::string& word)
+{
+    std::vector<const Command*> group;
+    for (const Command& command : Commands())
+        if (std::string(command.name).rfind(word + " ", 0) == 0)
+            group.push_back(&command);
+    return group;
 }
 
 // The number of letters to put in, take out, change or swap with the next one, after Damerau.

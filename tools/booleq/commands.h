@@ -22,6 +22,10 @@ Command BatchCommand();
 Command ConvertCommand();
 Command LintCommand();
 Command MinimizeCommand();
+Command NetlistStatsCommand();
+Command NetlistListCommand();
+Command NetlistCheckCommand();
+Command NetlistDiffCommand();
 
 } // namespace booleq
 

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "text.h"
+
 namespace booleq {
 
 namespace {
@@ -157,7 +159,7 @@ std::string ToolHelp()
     text += "Usage: booleq [COMMAND] [OPTION...] EQUATION...\n\nCommands:\n";
     for (const Command& command : Commands())
         text += Aligned(command.name, command.summary);
-    text += "\nOptions of every command:\n" + Lines(CommonOptions());
+    text += "\nOptions of every command:\n" + Lines(CommonOptions(false));
     text += "\nOptions instead of a command:\n" + Lines(ToolOptions());
     text += std::string("\n") + kSyntax;
     text += "\n'booleq COMMAND --help' says more. Without a command, 'show' is meant; 'booleq show "
@@ -173,11 +175,21 @@ std::string CommandHelp(const Command& command)
     text += std::string("\n") + command.text;
     if (!command.options.empty())
         text += "\nOptions:\n" + Lines(command.options);
-    text += "\nOptions of every command:\n" + Lines(CommonOptions());
+    text += std::string("\nOptions of every command") +
+            (command.takesFiles ? " that reads a netlist" : "") + ":\n" +
+            Lines(CommonOptions(command.takesFiles));
     text += "\nExamples:\n";
     for (const char* example : command.examples)
         text += std::string("  ") + example + "\n";
     return text + "\n" + kStatuses;
+}
+
+std::string GroupHelp(const std::string& word)
+{
+    std::string text;
+    for (const Command* const command : CommandsOfGroup(word))
+        text += Aligned(command->name, command->summary);
+    return "Commands:\n" + text + "\n'booleq " + word + " ... --help' says more.\n";
 }
 
 std::string ManPage()
@@ -186,7 +198,7 @@ std::string ManPage()
     roff += ".SH NAME\nbooleq \\- " + Roff(kSummary) + "\n";
     roff += ".SH SYNOPSIS\n.B booleq\n[\\fICOMMAND\\fR] [\\fIOPTION\\fR...] \\fIEQUATION\\fR...\n";
     roff += ".SH DESCRIPTION\n" + RoffVerbatim(kSyntax);
-    roff += ".SH OPTIONS\nEvery command takes:\n" + RoffOptions(CommonOptions());
+    roff += ".SH OPTIONS\nEvery command takes:\n" + RoffOptions(CommonOptions(false));
     roff += ".PP\nInstead of a command:\n" + RoffOptions(ToolOptions());
     roff += ".SH COMMANDS\nWithout a command, the first one is meant.\n";
     for (const Command& command : Commands())
@@ -194,40 +206,102 @@ std::string ManPage()
     return roff + ".SH EXIT STATUS\n" + RoffVerbatim(kStatuses);
 }
 
-std::string BashCompletion()
+// The words of 'words' that are in no other place before, with blanks between them.
+std::string Once(const std::vector<std::string>& words)
 {
-    std::string commands;
-    std::string cases;
-    std::string choices;
+    std::vector<std::string> once;
+    for (const std::string& word : words)
+        if (std::find(once.begin(), once.end(), word) == once.end())
+            once.push_back(word);
+    return Join(once, " ");
+}
+
+// What the completion knows of the commands: patterns of a case with what to do.
+struct CompletionCases {
+    std::vector<std::string> firstWords;
+    std::string groups;      // a group and the words that follow it
+    std::string options;     // of each command
+    std::string choices;     // of options with fixed values
+    std::string fileReaders; // commands whose operands are files
+};
+
+CompletionCases CasesOfCommands()
+{
+    CompletionCases cases;
     for (const Command& command : Commands()) {
-        commands += (commands.empty() ? "" : " ") + std::string(command.name);
-        cases += std::string("    ") + command.name + ") options+=\" " + Names(command.options) +
-                 "\" ;;\n";
+        const std::string name = command.name;
+        const size_t blank = name.find(' ');
+        cases.firstWords.push_back(name.substr(0, blank));
+        if (blank != std::string::npos)
+            cases.groups += "    " + name.substr(0, blank) + ") second+=\" " +
+                            name.substr(blank + 1) + "\" ;;&\n";
+        cases.options += "    '" + name + "') options+=\" " +
+                         Names(CommonOptions(command.takesFiles)) + " " + Names(command.options) +
+                         "\" ;;\n";
+        if (command.takesFiles || name == "batch")
+            cases.fileReaders += (cases.fileReaders.empty() ? "'" : "|'") + name + "'";
         for (const Option& option : command.options)
             if (!Choices(option).empty())
-                choices += std::string("    ") + command.name + "," + option.name + ") words=\"" +
-                           Choices(option) + "\" ;;\n";
+                cases.choices += "    '" + name + "," + option.name + "') words=\"" +
+                                 Choices(option) + "\" ;;\n";
     }
+    return cases;
+}
+
+// Options whose value is a file.
+std::string FileOptions()
+{
+    std::vector<std::string> names = {"--file"};
+    for (const Command& command : Commands())
+        for (const Option& option : command.options)
+            if (option.value && std::string(option.value) == "FILE")
+                names.push_back(option.name);
+    std::string pattern = Once(names);
+    std::replace(pattern.begin(), pattern.end(), ' ', '|');
+    return pattern;
+}
+
+std::string BashCompletion()
+{
+    const CompletionCases cases = CasesOfCommands();
     return "# bash completion for booleq; made by booleq --completion\n"
            "_booleq() {\n"
            "    local word=${COMP_WORDS[COMP_CWORD]} before=${COMP_WORDS[COMP_CWORD-1]}\n"
-           "    local command=${COMP_WORDS[1]} words=\n"
-           "    local options=\"--help " +
-           Names(CommonOptions()) +
-           "\"\n"
+           "    local command=${COMP_WORDS[1]} second= words= isFile=\n"
+           "    local options=--help\n"
            "    case $command in\n" +
-           cases +
+           cases.groups +
            "    esac\n"
-           "    if [ \"$before\" = --file ] || [[ $command = batch && $word != -* && $before != "
-           "--* ]]; "
-           "then\n"
+           "    local place=1\n"
+           "    [ -z \"$second\" ] || { command+=\" ${COMP_WORDS[2]}\"; place=2; }\n"
+           "    case $command in\n" +
+           cases.options + "    *) options+=\" " + Names(CommonOptions(false)) +
+           "\" ;;\n"
+           "    esac\n"
+           "    case $before in\n"
+           "    " +
+           FileOptions() +
+           ") isFile=yes ;;\n"
+           "    --*) ;;\n"
+           "    *) if [[ $word != -* && $COMP_CWORD -gt $place ]]; then\n"
+           "           case $command in " +
+           cases.fileReaders +
+           ") isFile=yes ;; esac\n"
+           "       fi ;;\n"
+           "    esac\n"
+           "    if [ -n \"$isFile\" ]; then\n"
            "        mapfile -t COMPREPLY < <(compgen -f -- \"$word\")\n"
            "        return\n"
            "    fi\n"
            "    case $command,$before in\n" +
-           choices + "    *) [ \"$COMP_CWORD\" -gt 1 ] || words=\"" + commands + " " +
-           Names(ToolOptions()) +
+           cases.choices +
+           "    *) if [ \"$COMP_CWORD\" -eq 1 ]; then\n"
+           "           words=\"" +
+           Once(cases.firstWords) + " " + Names(ToolOptions()) +
            "\"\n"
+           "       elif [ \"$COMP_CWORD\" -eq \"$place\" ]; then\n"
+           "           words=$second\n"
+           "       fi\n"
            "       [[ $word != -* ]] || words+=\" $options\" ;;\n"
            "    esac\n"
            "    mapfile -t COMPREPLY < <(compgen -W \"$words\" -- \"$word\")\n"

@@ -15,6 +15,8 @@ bool AnswerForTool(const std::vector<std::string>& arguments, std::string& answe
 
 std::string ToolHelp();
 std::string CommandHelp(const Command& command);
+// What commands a group has.  Requires: there is one with this word.
+std::string GroupHelp(const std::string& word);
 std::string ManPage(); // roff, for section 1
 std::string BashCompletion();
 

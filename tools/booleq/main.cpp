@@ -15,6 +15,7 @@ int _dowildcard = 0; // an argument is an equation: its * names no files
 #else
 #include <clocale>
 #include <cstring>
+#include <cwctype>
 
 #include <langinfo.h>
 #endif
@@ -70,7 +71,10 @@ void PrepareProcess()
 #else
     std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
     std::setlocale(LC_CTYPE, "");
-    ShowUtf8(std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0);
+    if (std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0)
+        ShowUtf8([](uint32_t character) {
+            return std::iswprint(static_cast<std::wint_t>(character)) != 0;
+        });
 #endif
     HandleInterrupts();
 }

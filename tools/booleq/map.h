@@ -1,63 +1,15 @@
-// How a Karnaugh map lays out the rows of a function, as text and as a picture: rows and columns
-// stand in Gray code, so neighbours differ in one input. What stands in a cell is the caller's.
+// A Karnaugh map (karnaugh_map.h) as text and as a picture. What stands in a cell is the caller's.
 #ifndef BOOLEQ_MAP_H
 #define BOOLEQ_MAP_H
 
 #include <cstddef>
-#include <cstdint>
 #include <functional>
 #include <string>
-#include <vector>
 
+#include "karnaugh_map.h"
 #include "output.h"
-#include "text.h"
 
 namespace booleq {
-
-inline size_t GrayCode(size_t place)
-{
-    return place ^ (place >> 1);
-}
-
-inline std::string GrayBits(size_t value, size_t width)
-{
-    std::string bits;
-    for (size_t bit = width; bit-- > 0;)
-        bits += (value >> bit & 1u) ? '1' : '0';
-    return bits;
-}
-
-// The first half of the inputs, rounded down, numbers the rows, the others the columns.
-struct Map {
-    explicit Map(const std::vector<std::string>& names)
-        : inputs(names), numRowInputs(names.size() / 2),
-          numColumnInputs(names.size() - numRowInputs)
-    {
-    }
-
-    size_t NumRows() const { return size_t(1) << numRowInputs; }
-    size_t NumColumns() const { return size_t(1) << numColumnInputs; }
-    std::string RowLabel(size_t row) const { return GrayBits(GrayCode(row), numRowInputs); }
-    std::string ColumnLabel(size_t column) const
-    {
-        return GrayBits(GrayCode(column), numColumnInputs);
-    }
-    uint64_t RowAt(size_t row, size_t column) const
-    {
-        return GrayCode(row) << numColumnInputs | GrayCode(column);
-    }
-    std::string RowNames() const { return Names(0, numRowInputs); }
-    std::string ColumnNames() const { return Names(numRowInputs, inputs.size()); }
-    std::string Names(size_t from, size_t to) const
-    {
-        const auto begin = inputs.begin();
-        return Visible(Join({begin + static_cast<long>(from), begin + static_cast<long>(to)}, " "));
-    }
-
-    std::vector<std::string> inputs;
-    size_t numRowInputs;
-    size_t numColumnInputs;
-};
 
 // What stands in a cell of text, and how many columns of a terminal it takes.
 struct MapCell {

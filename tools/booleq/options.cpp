@@ -63,6 +63,8 @@ void CheckOperands(Request& request, bool hasFile)
         request.hasLines = true;
         return;
     }
+    if (command.takesFiles)
+        return;
     // In any place; a second one is a text like others.
     const auto dash = std::find(operands.begin(), operands.end(), "-");
     if (dash == operands.end())
@@ -133,17 +135,47 @@ void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
 
 } // namespace
 
+// Which words of a group there are: "stats, list, check or diff".
+std::string GroupWords(const std::string& group)
+{
+    std::vector<std::string> words;
+    for (const Command* const command : CommandsOfGroup(group))
+        words.push_back(std::string(command->name).substr(group.size() + 1));
+    const std::string last = words.back();
+    words.pop_back();
+    return Join(words, ", ") + " or " + last;
+}
+
 // 'booleq help' and 'booleq help COMMAND'.
 std::string HelpFor(const std::vector<std::string>& arguments)
 {
     if (arguments.size() == 1)
         return ToolHelp();
-    const Command* command = FindCommand(arguments[1]);
-    if (command && arguments.size() == 2)
+    const std::vector<std::string> words(arguments.begin() + 1, arguments.end());
+    size_t numWords = 0;
+    const Command* command = FindCommand(words, numWords);
+    if (command && numWords == words.size())
         return CommandHelp(*command);
+    if (words.size() == 1 && !CommandsOfGroup(words[0]).empty())
+        return GroupHelp(words[0]);
     const Command* nearest = NearestCommand(arguments[1], true);
-    throw UsageError("there is no command '" + Excerpt(arguments[1]) + "' to help with" +
+    throw UsageError("there is no command '" + Excerpt(Join(words, " ")) + "' to help with" +
                      (nearest ? std::string("; the nearest is '") + nearest->name + "'" : ""));
+}
+
+// A word that begins commands without being one: which of them is not said.
+bool AnswerForGroup(const std::vector<std::string>& arguments, std::string& answer)
+{
+    if (arguments.empty() || CommandsOfGroup(arguments.front()).empty())
+        return false;
+    const bool wantsHelp =
+        arguments.size() == 2 && (arguments[1] == "--help" || arguments[1] == "-h");
+    if (!wantsHelp)
+        throw UsageError("'" + arguments.front() + "' is followed by " +
+                         GroupWords(arguments.front()) +
+                         (arguments.size() > 1 ? ", not by '" + Excerpt(arguments[1]) + "'" : ""));
+    answer = GroupHelp(arguments.front());
+    return true;
 }
 
 CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
@@ -154,17 +186,19 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
         return line;
     }
     Request& request = line.request;
-    // The first word only, so that a variable called like a command stays an equation elsewhere.
-    const Command* named = arguments.empty() ? nullptr : FindCommand(arguments.front());
+    // The first words only, so that a variable called like a command stays an equation elsewhere.
+    size_t numNamed = 0;
+    const Command* named = FindCommand(arguments, numNamed);
     request.command = named ? named : &Commands().front();
-    if (!named && AnswerForTool(arguments, line.answer))
+    if (!named && (AnswerForTool(arguments, line.answer) || AnswerForGroup(arguments, line.answer)))
         return line;
 
-    std::vector<ParsedOption> entries(request.command->options.size() + CommonOptions().size());
+    const std::vector<Option>& common = CommonOptions(request.command->takesFiles);
+    std::vector<ParsedOption> entries(request.command->options.size() + common.size());
     for (size_t index = 0; index < entries.size(); ++index) {
         const size_t numOwn = request.command->options.size();
         entries[index].option =
-            index < numOwn ? &request.command->options[index] : &CommonOptions()[index - numOwn];
+            index < numOwn ? &request.command->options[index] : &common[index - numOwn];
     }
     CLI::App app;
     app.allow_extras();
@@ -175,7 +209,8 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
         AddOption(app, entry);
 
     // The parser takes its words from the back.
-    std::vector<std::string> words(arguments.rbegin(), arguments.rend() - (named ? 1 : 0));
+    std::vector<std::string> words(arguments.rbegin(),
+                                   arguments.rend() - static_cast<std::ptrdiff_t>(numNamed));
     try {
         app.parse(std::move(words));
     } catch (const CLI::ParseError& error) {

@@ -10,13 +10,6 @@ namespace {
 
 constexpr size_t kBlockBytes = 65536;
 
-[[noreturn]] void Fail()
-{
-    if (errno == EPIPE)
-        throw ReaderGone(errno);
-    throw IoError("cannot write standard output", errno);
-}
-
 } // namespace
 
 IoError::IoError(const std::string& what, int errorNumber)
@@ -24,7 +17,14 @@ IoError::IoError(const std::string& what, int errorNumber)
 {
 }
 
-Output::Output(std::FILE* stream) : m_stream(stream) {}
+Output::Output(std::FILE* stream, std::string name) : m_stream(stream), m_name(std::move(name)) {}
+
+void Output::Fail() const
+{
+    if (errno == EPIPE)
+        throw ReaderGone(errno);
+    throw IoError("cannot write " + m_name, errno);
+}
 
 void Output::Put(const std::string& text)
 {

@@ -22,7 +22,8 @@ class ReaderGone : public IoError {
 
 class Output {
   public:
-    explicit Output(std::FILE* stream);
+    // 'name' is what a complaint calls it.
+    explicit Output(std::FILE* stream, std::string name = "standard output");
     // Fails: IoError or ReaderGone, here or at the next call, when the stream takes no more.
     void Put(const std::string& text);
     void Put(const char* text, size_t length);
@@ -32,8 +33,10 @@ class Output {
   private:
     void WriteBlock();
     void Write(const char* text, size_t length);
+    [[noreturn]] void Fail() const;
 
     std::FILE* m_stream;
+    std::string m_name;
     std::string m_block;
 };
 

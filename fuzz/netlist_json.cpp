@@ -1,0 +1,17 @@
+// The input is a netlist in the form Yosys JSON: read or refused with a reason, and every invariant
+// holds.
+#include "fuzz/netlist.h"
+
+namespace fuzz {
+
+std::string Describe(const std::string& input)
+{
+    return DescribeNetlist(input, "Yosys JSON");
+}
+
+std::string Check(const std::string& input)
+{
+    return CheckNetlist(input, "Yosys JSON");
+}
+
+} // namespace fuzz

@@ -1,0 +1,45 @@
+// Equations of look-up tables in a notation, and their names among engineers: worked out once for
+// each different function, then written over the nets of each table that has it.
+// In: rows over pins, names of nets. Out: text, proved before the first use.  Fails: no text, for a
+// function without an expression of bearable length.
+#ifndef BOOLEQ_INSPECT_EQUATION_TEXT_H
+#define BOOLEQ_INSPECT_EQUATION_TEXT_H
+
+#include <string>
+#include <vector>
+
+#include "design.h"
+#include "rows.h"
+#include "target.h"
+
+namespace booleq {
+
+// A text with inputs in it: pieces[0], input inputs[0], pieces[1] and so on.
+struct TextWithInputs {
+    std::vector<std::string> pieces; // one more than inputs
+    std::vector<unsigned int> inputs;
+
+    bool IsEmpty() const { return inputs.empty() && (pieces.empty() || pieces[0].empty()); }
+};
+std::string Fill(const TextWithInputs& text, const std::vector<std::string>& names);
+
+struct FunctionTexts {
+    std::string kind;        // "multiplexer"; empty for a function without a name
+    TextWithInputs meaning;  // "multiplexer, select S: A for S=1; B for S=0"
+    TextWithInputs equation; // empty where there is none
+};
+
+// The texts of a function whose inputs all matter.  Cost: a microsecond to some milliseconds.
+// Threads: any.
+FunctionTexts MakeTexts(const Rows& rows, const Target& target);
+
+// Whether a target writes expressions; others write files.
+bool WritesExpressions(const Target& target);
+
+// A name of a net as the target takes it. One that it cannot spell is changed, so that no other net
+// has it.
+std::string SpellNet(const Design& design, NetId net, const Target& target);
+
+} // namespace booleq
+
+#endif

@@ -1,0 +1,28 @@
+// Bars with a label and a number each, as a picture (SVG).
+#ifndef BOOLEQ_HISTOGRAM_H
+#define BOOLEQ_HISTOGRAM_H
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "output.h"
+
+namespace booleq {
+
+struct Bar {
+    std::string label;
+    uint64_t number;
+};
+
+struct Histogram {
+    std::string title;
+    std::vector<Bar> bars;
+};
+
+// One below the other. The longest bar of each is as long as there is room.
+void PutHistograms(const std::vector<Histogram>& histograms, Output& output);
+
+} // namespace booleq
+
+#endif

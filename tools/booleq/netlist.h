@@ -1,0 +1,38 @@
+// What the commands 'netlist ...' share: their options, reading a file as the request says, and the
+// tables' names for people.
+#ifndef BOOLEQ_NETLIST_H
+#define BOOLEQ_NETLIST_H
+
+#include <string>
+#include <vector>
+
+#include "answer.h"
+#include "cell_types.h"
+#include "command.h"
+#include "design.h"
+#include "output.h"
+
+namespace booleq {
+
+// --cells and --top.
+std::vector<Option> NetlistOptions();
+
+// The cell types that are known, with those of --cells.
+// Fails: UsageError for a file that cannot be read or is no such table.
+CellTypes CellTypesOf(const Request& request);
+
+// Reads a netlist; shows how far it is, on a terminal.
+// Fails: false, and the refusal has been said or answered: return kRefused. IoError, when the file
+// cannot be opened.
+bool ReadNetlist(const std::string& file, const Request& request, const CellTypes& cellTypes,
+                 const std::string& keyAttribute, Output& output, Design& design);
+// Two of them, at once where there are two processors.
+bool ReadNetlists(const Request& request, const CellTypes& cellTypes,
+                  const std::string& keyAttribute, Output& output, Design& left, Design& right);
+
+// A table as the file calls it: the path, of a cell with several outputs with the pin.
+std::string TableName(const Design& design, uint32_t table);
+
+} // namespace booleq
+
+#endif

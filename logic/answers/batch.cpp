@@ -170,6 +170,16 @@ BatchResult CheckNames(const std::vector<std::string>& inputs)
     return {};
 }
 
+Listed ListedOf(const std::vector<std::string>& inputs)
+{
+    Listed listed;
+    listed.reading.inputs = inputs;
+    listed.reading.hasInputs = !inputs.empty();
+    listed.terms = TermsOf(listed.reading);
+    listed.fault = CheckNames(inputs);
+    return listed;
+}
+
 } // namespace
 
 const char* OutcomeName(BatchOutcome outcome)
@@ -191,14 +201,9 @@ const char* OutcomeName(BatchOutcome outcome)
 
 BatchResult RowCompleter::Complete(BatchRow& row)
 {
-    if (row.inputs != m_listed.reading.inputs) {
-        m_listed.reading.inputs = row.inputs;
-        m_listed.reading.hasInputs = !row.inputs.empty();
-        m_listed.terms = TermsOf(m_listed.reading);
-        m_fault = CheckNames(row.inputs);
-    }
-    if (m_fault.outcome != BatchOutcome::kOk)
-        return m_fault;
+    const Listed& listed = m_listed.Get(row.inputs, ListedOf);
+    if (listed.fault.outcome != BatchOutcome::kOk)
+        return listed.fault;
     if (IsBlank(row.equation)) {
         if (IsBlank(row.init))
             return Fail(BatchOutcome::kIncomplete,
@@ -206,11 +211,11 @@ BatchResult RowCompleter::Complete(BatchRow& row)
         if (row.inputs.empty())
             return Fail(BatchOutcome::kIncomplete,
                         "an init value without an equation needs its inputs");
-        return WriteEquation(row, m_listed);
+        return WriteEquation(row, listed);
     }
     Kq_BoolEquation equation;
     Rows rows;
-    BatchResult result = ReadEquation(row, m_listed, equation, rows);
+    BatchResult result = ReadEquation(row, listed, equation, rows);
     if (result.outcome != BatchOutcome::kOk)
         return result;
     if (rows.NumInputs() == 0)
@@ -219,14 +224,10 @@ BatchResult RowCompleter::Complete(BatchRow& row)
                     "always " +
                         std::string(rows.At(0) ? "1" : "0"));
     const bool hasInit = !IsBlank(row.init);
-    if (hasInit && m_listed.reading.hasInputs) {
-        result = CompareInit(row, m_listed, rows);
+    if (hasInit && listed.reading.hasInputs) {
+        result = CompareInit(row, listed, rows);
     } else if (hasInit) {
-        Listed own;
-        own.reading.hasInputs = true;
-        own.reading.inputs = InputNames(equation);
-        own.terms = TermsOf(own.reading);
-        result = CompareInit(row, own, rows);
+        result = CompareInit(row, m_listed.Get(InputNames(equation), ListedOf), rows);
     }
     if (result.outcome != BatchOutcome::kOk)
         return result;

@@ -9,6 +9,7 @@
 #include <port/Port_StringBase.h>
 
 #include "listed_inputs.h"
+#include "recent.h"
 
 namespace booleq {
 
@@ -35,8 +36,8 @@ struct BatchResult {
     std::string message; // for kDiffers, kIncomplete and kTextRefused; one sentence
 };
 
-// Completes rows one after the other. It remembers the inputs of the last one, as those of the next
-// are often the same.
+// Completes rows one after the other. It remembers the lists of inputs that it met lately, as most
+// rows of a table share a few.
 // Threads: any, each with rows and a completer of its own.
 class RowCompleter {
   public:
@@ -52,11 +53,11 @@ class RowCompleter {
     struct Listed {
         Reading reading;
         std::vector<Port::StringBase<char>> terms;
+        BatchResult fault; // of these inputs; kOk for none
     };
 
   private:
-    Listed m_listed;
-    BatchResult m_fault; // of these inputs; kOk for none
+    Recent<std::vector<std::string>, Listed> m_listed;
 };
 
 } // namespace booleq

@@ -36,33 +36,6 @@ Meaning ConstantOf(const ForeignTree& tree, Meaning narrow, Meaning wide)
     return isWide ? wide : narrow;
 }
 
-Meaning PlainMeaning(Operator op)
-{
-    switch (op) {
-    case Operator::Zero:
-        return Meaning::Zero;
-    case Operator::One:
-        return Meaning::One;
-    case Operator::Input:
-        return Meaning::Input;
-    case Operator::Not:
-        return Meaning::BitNot;
-    case Operator::And:
-        return Meaning::And;
-    case Operator::Or:
-        return Meaning::Or;
-    case Operator::Xor:
-        return Meaning::Xor;
-    case Operator::Nand:
-        return Meaning::Nand;
-    case Operator::Nor:
-        return Meaning::Nor;
-    case Operator::Nxor:
-        return Meaning::Nxor;
-    }
-    return Meaning::Foreign;
-}
-
 // This library's grouping of the text with what the notation means by its operators. An operator
 // that is two there ("^~", an exclusive or and an inversion here) keeps this library's meaning.
 ForeignTree Regrouped(const Expression& expression, const ForeignTree& tree)
@@ -72,7 +45,7 @@ ForeignTree Regrouped(const Expression& expression, const ForeignTree& tree)
     regrouped.notation = &notation;
     regrouped.names = tree.names;
     for (const Expression::Node& node : expression.nodes) {
-        Meaning meaning = PlainMeaning(node.op);
+        Meaning meaning = MeaningOf(node.op);
         if (node.op == Operator::Zero)
             meaning = ConstantOf(tree, Meaning::Zero, Meaning::WideZero);
         if (node.op == Operator::One)

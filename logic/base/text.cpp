@@ -16,6 +16,14 @@ bool IsPrintableByte(char byte)
     return byte >= ' ' && byte <= '~';
 }
 
+// Signs without a picture of their own, some of which turn the direction of the text around them:
+// locales call them printable.
+bool IsUnseen(uint32_t code)
+{
+    return (code >= 0x200b && code <= 0x200f) || (code >= 0x2028 && code <= 0x202e) ||
+           (code >= 0x2060 && code <= 0x206f) || code == 0xfeff;
+}
+
 // Bytes of the character of UTF-8 that begins there, and which it is; 0 for none.
 size_t ReadCharacter(const std::string& text, size_t position, uint32_t& character)
 {
@@ -46,7 +54,7 @@ size_t PrintableLength(const std::string& text, size_t position)
         return 1;
     uint32_t character = 0;
     const size_t length = isShown ? ReadCharacter(text, position, character) : 0;
-    return length > 0 && isShown(character) ? length : 0;
+    return length > 0 && !IsUnseen(character) && isShown(character) ? length : 0;
 }
 
 } // namespace

@@ -517,6 +517,33 @@ const Notation kEqn = {
 
 } // namespace
 
+Meaning MeaningOf(Operator op)
+{
+    switch (op) {
+    case Operator::Zero:
+        return Meaning::Zero;
+    case Operator::One:
+        return Meaning::One;
+    case Operator::Input:
+        return Meaning::Input;
+    case Operator::Not:
+        return Meaning::BitNot;
+    case Operator::And:
+        return Meaning::And;
+    case Operator::Or:
+        return Meaning::Or;
+    case Operator::Xor:
+        return Meaning::Xor;
+    case Operator::Nand:
+        return Meaning::Nand;
+    case Operator::Nor:
+        return Meaning::Nor;
+    case Operator::Nxor:
+        return Meaning::Nxor;
+    }
+    return Meaning::Foreign;
+}
+
 const Notation& VerilogNotation()
 {
     return kVerilog;

@@ -31,6 +31,9 @@ enum class Meaning : uint8_t {
     Foreign // the notation has the token, but the tool does not read it
 };
 
+// What this library means by an operator.
+Meaning MeaningOf(Operator op);
+
 // What values are, and so what the whole text says.
 enum class Values : uint8_t {
     Bits,   // one bit each

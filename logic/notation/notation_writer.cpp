@@ -30,30 +30,6 @@ class Syntax {
     virtual bool IsWhole() const { return false; }
 };
 
-Meaning MeaningOf(Operator op)
-{
-    switch (op) {
-    case Operator::And:
-        return Meaning::And;
-    case Operator::Or:
-        return Meaning::Or;
-    case Operator::Xor:
-        return Meaning::Xor;
-    case Operator::Nand:
-        return Meaning::Nand;
-    case Operator::Nor:
-        return Meaning::Nor;
-    case Operator::Nxor:
-        return Meaning::Nxor;
-    case Operator::Zero:
-    case Operator::One:
-    case Operator::Input:
-    case Operator::Not:
-        break;
-    }
-    return Meaning::Foreign;
-}
-
 class ForeignSyntax : public Syntax {
   public:
     ForeignSyntax(const Notation& notation, const std::vector<std::string>& names)

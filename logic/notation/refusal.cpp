@@ -97,6 +97,9 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
     else if (!hasLetter && IsPrintable(name))
         report.hint = "the operators are & | ^ ~ and ~& ~| ~^; a name with such a character needs "
                       "single quotes";
+    else if (name.size() > 2 && name.front() == '"' && name.back() == '"' && IsPrintable(name))
+        report.hint = "names are quoted with single quotes: '" +
+                      Excerpt(name.substr(1, name.size() - 2)) + "'";
     else if (name.size() > 1 && IsPrintable(name))
         report.hint = "if " + Excerpt(name) + " is a name, write '" + Excerpt(name) + "'";
     else

@@ -103,17 +103,15 @@ class Answering {
 
     void Answer(const Line& line, Answered& answered)
     {
-        BatchRow row;
-        BatchResult result = m_format->ReadRow(line.text, row);
+        BatchResult result = m_format->ReadRow(line.text, m_row);
         if (result.outcome == BatchOutcome::kOk)
-            result = m_completer.Complete(row);
+            result = m_completer.Complete(m_row);
         ++answered.counts[static_cast<size_t>(result.outcome)];
         if (m_request.json) {
-            answered.text += Envelope(line, m_request, row, result);
+            answered.text += Envelope(line, m_request, m_row, result);
             return;
         }
-        answered.text += m_format->WriteRow(line.text, row, result);
-        answered.text += '\n';
+        m_format->WriteRow(line.text, m_row, result, answered.text);
         if (!result.message.empty())
             answered.complaints.push_back(
                 {answered.text.size(), "line " + std::to_string(line.number) + ": " +
@@ -124,6 +122,7 @@ class Answering {
     const Request& m_request;
     std::unique_ptr<TableFormat> m_format;
     RowCompleter m_completer;
+    BatchRow m_row; // of the line answered last
 };
 
 // The lines of a table, read one after the other; empty ones and the header are no rows.

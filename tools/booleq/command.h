@@ -70,8 +70,9 @@ const std::vector<Command>& Commands();
 const Command* FindCommand(const std::vector<std::string>& words, size_t& numWords);
 // The commands of a group, by its word ("netlist"); empty for a word that is none.
 std::vector<const Command*> CommandsOfGroup(const std::string& word);
-// The command whose name is most like the word, a letter or two apart; null when none is.
-const Command* NearestCommand(const std::string& word);
+// The command whose name is most like the word, a letter or two apart; null when none is. A word
+// that must be a command may be a short one, or a name's beginning.
+const Command* NearestCommand(const std::string& word, bool isCommand);
 // Options that every command takes, or every one that takes files.
 const std::vector<Option>& CommonOptions(bool takesFiles);
 

@@ -78,14 +78,17 @@ size_t EditDistance(const std::string& left, const std::string& right)
     return distance[left.size()][right.size()];
 }
 
-const Command* NearestCommand(const std::string& word)
+const Command* NearestCommand(const std::string& word, bool isCommand)
 {
-    constexpr size_t kMinLength = 4; // shorter ones are names of inputs
+    const size_t minLength = isCommand ? 3 : 4; // shorter ones are names of inputs
+    constexpr size_t kMaxLength = 8;
     const Command* nearest = nullptr;
     size_t least = 3;
-    if (word.size() < kMinLength || word.size() > 2 * kMinLength)
+    if (word.size() < minLength || word.size() > kMaxLength)
         return nullptr;
     for (const Command& command : Commands()) {
+        if (isCommand && std::string(command.name).compare(0, word.size(), word) == 0)
+            return &command;
         const size_t distance = EditDistance(word, command.name);
         if (distance < least && distance * 3 <= word.size()) {
             least = distance;

@@ -4,6 +4,11 @@
 #include <cstring>
 
 #include <sys/stat.h>
+#ifdef _WIN32
+#include <io.h>
+#else
+#include <unistd.h>
+#endif
 
 #include "output.h"
 #include "text.h"
@@ -13,6 +18,21 @@ namespace booleq {
 namespace {
 
 constexpr size_t kBufferBytes = 65536;
+
+// What is there, one byte at least; fread would wait until the buffer is full.
+// Fails: 0 at the end, -1.
+long ReadSome(int file, std::vector<char>& buffer)
+{
+#ifdef _WIN32
+    return _read(file, buffer.data(), static_cast<unsigned int>(buffer.size()));
+#else
+    ssize_t length;
+    do
+        length = read(file, buffer.data(), buffer.size());
+    while (length < 0 && errno == EINTR);
+    return length;
+#endif
+}
 
 } // namespace
 
@@ -69,9 +89,11 @@ bool LineReader::Next(std::string& line)
 bool LineReader::Fill()
 {
     m_position = 0;
-    m_end = std::fread(m_buffer.data(), 1, m_buffer.size(), m_stream);
-    if (m_end == 0 && std::ferror(m_stream))
+    m_end = 0;
+    const long length = ReadSome(fileno(m_stream), m_buffer);
+    if (length < 0)
         throw IoError("cannot read " + m_name, errno);
+    m_end = static_cast<size_t>(length);
     m_num_read += m_end;
     return m_end > 0;
 }

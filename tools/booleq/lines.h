@@ -24,8 +24,8 @@ class LineReader {
     LineReader& operator=(const LineReader&) = delete;
 
     // The next line without its line feed; a last line needs none. NUL bytes and carriage returns
-    // are handed on.
-    // Fails: false behind the last line; IoError when the stream cannot be read.
+    // are handed on. It waits for the end of this line only, not for what follows in a pipe.
+    // Fails: false after the last line; IoError when the stream cannot be read.
     bool Next(std::string& line);
 
     // Bytes read so far, and in all; 0 in all when nobody knows (a pipe).

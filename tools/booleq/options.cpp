@@ -48,7 +48,7 @@ void CheckOperands(Request& request, bool hasFile)
         throw UsageError("--file stands in place of the equation, so '" +
                          Excerpt(operands[command.maxOperands - 1]) + "' is one word too many");
     const Command* nearest =
-        numGiven > command.maxOperands && isPlain ? NearestCommand(operands[0]) : nullptr;
+        numGiven > command.maxOperands && isPlain ? NearestCommand(operands[0], true) : nullptr;
     if (nearest)
         throw UsageError("there is no command '" + Excerpt(operands[0]) + "'; the nearest is '" +
                          nearest->name + "'");
@@ -158,7 +158,7 @@ std::string HelpFor(const std::vector<std::string>& arguments)
         return CommandHelp(*command);
     if (words.size() == 1 && !CommandsOfGroup(words[0]).empty())
         return GroupHelp(words[0]);
-    const Command* nearest = NearestCommand(arguments[1]);
+    const Command* nearest = NearestCommand(arguments[1], true);
     throw UsageError("there is no command '" + Excerpt(Join(words, " ")) + "' to help with" +
                      (nearest ? std::string("; the nearest is '") + nearest->name + "'" : ""));
 }
@@ -223,7 +223,7 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
     request.operands = TakeOperands(app.remaining());
     FillRequest(request, entries);
     const Command* nearest = !named && !request.hasLines && !request.operands.empty()
-                                 ? NearestCommand(request.operands.front())
+                                 ? NearestCommand(request.operands.front(), false)
                                  : nullptr;
     if (nearest)
         line.note = "note: '" + Excerpt(request.operands.front()) +

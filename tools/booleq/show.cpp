@@ -153,7 +153,8 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
 
 void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Notes& notes)
 {
-    if (!IsPrintable(ToStd(equation.GetInitValueTermEquation())))
+    const std::string names = ToStd(equation.GetInitValueTermEquation());
+    if (Visible(names) != names)
         notes.push_back("bytes that are not printable ASCII are shown as \\xNN");
     if (hasTable && HasNumberedColumn(InputNames(equation)))
         notes.push_back("column #k of the table is the k-th input");

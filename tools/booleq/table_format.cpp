@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "answer.h"
+#include "recent.h"
 #include "table_rows.h"
 #include "text.h"
 
@@ -16,8 +17,10 @@ constexpr size_t kNoColumn = static_cast<size_t>(-1);
 
 // Fields of one line of CSV. A line end inside a field is not accepted: one stray quote would
 // swallow the rest of the file.  Fails: false when a quote is not closed or has text behind it.
+// Many programs end lines with a carriage return too.
 bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
 {
+    const size_t length = line.size() - (!line.empty() && line.back() == '\r' ? 1 : 0);
     size_t numFields = 0;
     // The texts of the line before are written over, so that their memory serves again.
     const auto next = [&]() -> std::string& {
@@ -28,26 +31,25 @@ bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
     };
     std::string* field = &next();
     bool isSplit = true;
-    for (size_t position = 0; isSplit && position < line.size(); ++position) {
+    for (size_t position = 0; isSplit && position < length; ++position) {
         if (line[position] == ',') {
             field = &next();
             continue;
         }
         if (line[position] != '"') {
-            const size_t end = std::min(line.find(',', position), line.size());
+            const size_t end = std::min(line.find(',', position), length);
             field->assign(line, position, end - position);
             position = end - 1;
             continue;
         }
-        for (++position; position < line.size(); ++position) {
+        for (++position; position < length; ++position) {
             const bool isQuote = line[position] == '"';
-            if (isQuote && (position + 1 == line.size() || line[position + 1] != '"'))
+            if (isQuote && (position + 1 == length || line[position + 1] != '"'))
                 break;
             position += isQuote ? 1u : 0u;
             *field += line[position];
         }
-        isSplit =
-            position < line.size() && (position + 1 == line.size() || line[position + 1] == ',');
+        isSplit = position < length && (position + 1 == length || line[position + 1] == ',');
     }
     fields.resize(numFields);
     return isSplit;
@@ -65,7 +67,7 @@ class CsvFormat : public TableFormat {
         if (m_num_columns != 0)
             return false;
         std::vector<std::string> fields;
-        if (!SplitCsv(WithoutLineEnd(line), fields))
+        if (!SplitCsv(line, fields))
             throw UsageError("the header of the table has a quote that is not closed");
         m_num_columns = fields.size();
         size_t* const columns[] = {&m_inputs, &m_equation, &m_init};
@@ -88,14 +90,17 @@ class CsvFormat : public TableFormat {
         if (result == fields.end())
             fields.emplace_back("result");
         m_num_written = fields.size();
-        answer = CsvLine(fields);
+        AppendCsvLine(fields, answer);
         return true;
     }
 
     BatchResult ReadRow(const std::string& line, BatchRow& row) override
     {
-        const bool isSplit = SplitCsv(WithoutLineEnd(line), m_fields);
+        const bool isSplit = SplitCsv(line, m_fields);
         const size_t numFields = m_fields.size();
+        row.inputs.clear();
+        row.equation.clear();
+        row.init.clear();
         m_fields.resize(m_num_columns); // what a bad row has stays in its columns
         m_fields.resize(m_num_written);
         if (!isSplit)
@@ -108,31 +113,26 @@ class CsvFormat : public TableFormat {
                            std::to_string(m_num_columns));
         row.equation = m_fields[m_equation];
         row.init = m_fields[m_init];
-        if (IsBlank(m_fields[m_inputs]))
-            return {};
-        if (m_fields[m_inputs] != m_list) { // often it is that of the line before
-            m_list = m_fields[m_inputs];
-            m_listed.clear();
-            m_is_listed = SplitInputs(m_list, m_listed);
-        }
-        if (!m_is_listed)
+        const InputList& list = m_lists.Get(m_fields[m_inputs], Split);
+        if (!list.isClosed)
             return Refused("a single quote is not closed among the inputs");
-        row.inputs = m_listed;
+        row.inputs = list.inputs;
         return {};
     }
 
-    std::string WriteRow(const std::string&, const BatchRow& row,
-                         const BatchResult& result) override
+    void WriteRow(const std::string&, const BatchRow& row, const BatchResult& result,
+                  std::string& written) override
     {
         if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
-            m_fields[m_inputs] = Join(row.inputs, ",");
+            JoinInputs(row.inputs, m_fields[m_inputs]);
             if (result.outcome == BatchOutcome::kFilled) {
                 m_fields[m_equation] = row.equation;
                 m_fields[m_init] = row.init;
             }
         }
         m_fields[m_result] = OutcomeName(result.outcome);
-        return CsvLine(m_fields);
+        AppendCsvLine(m_fields, written);
+        written += '\n';
     }
 
     std::unique_ptr<TableFormat> Clone() const override
@@ -141,21 +141,38 @@ class CsvFormat : public TableFormat {
     }
 
   private:
-    // Many programs end lines of CSV with a carriage return too.
-    static std::string WithoutLineEnd(const std::string& line)
+    // The names of a field.
+    struct InputList {
+        std::vector<std::string> inputs;
+        bool isClosed = true; // false: a quote is not
+    };
+
+    static InputList Split(const std::string& field)
     {
-        return !line.empty() && line.back() == '\r' ? line.substr(0, line.size() - 1) : line;
+        InputList list;
+        if (!IsBlank(field))
+            list.isClosed = SplitInputs(field, list.inputs);
+        return list;
     }
 
-    static std::string CsvLine(const std::vector<std::string>& fields)
+    static void JoinInputs(const std::vector<std::string>& inputs, std::string& field)
     {
-        std::string line;
+        field.clear();
+        for (const std::string& input : inputs) {
+            field += input;
+            field += ',';
+        }
+        if (!inputs.empty())
+            field.pop_back();
+    }
+
+    static void AppendCsvLine(const std::vector<std::string>& fields, std::string& line)
+    {
         for (const std::string& field : fields) {
             AppendCsvField(field, line);
             line += ',';
         }
         line.pop_back(); // a header has a field at least
-        return line;
     }
 
     size_t m_num_columns = 0; // of the file
@@ -165,9 +182,7 @@ class CsvFormat : public TableFormat {
     size_t m_result = kNoColumn;
     size_t m_num_written = 0;          // columns of what is written
     std::vector<std::string> m_fields; // of the line read last
-    std::string m_list;                // the inputs that were split last, and into what
-    std::vector<std::string> m_listed;
-    bool m_is_listed = true; // false: a quote is not closed
+    Recent<std::string, InputList> m_lists;
 };
 
 class JsonFormat : public TableFormat {
@@ -184,6 +199,7 @@ class JsonFormat : public TableFormat {
             isDeep = isDeep || depth > kMaxJsonDepth;
             return depth <= kMaxJsonDepth;
         };
+        row = BatchRow();
         m_json = Json::parse(line, keep, false);
         if (isDeep)
             m_json = Json();
@@ -210,8 +226,8 @@ class JsonFormat : public TableFormat {
         return {};
     }
 
-    std::string WriteRow(const std::string& line, const BatchRow& row,
-                         const BatchResult& result) override
+    void WriteRow(const std::string& line, const BatchRow& row, const BatchResult& result,
+                  std::string& written) override
     {
         if (!m_json.is_object()) {
             m_json = Json::object();
@@ -222,7 +238,8 @@ class JsonFormat : public TableFormat {
             m_json["init"] = row.init;
         }
         m_json["result"] = OutcomeName(result.outcome);
-        return JsonLine(m_json);
+        written += JsonLine(m_json);
+        written += '\n';
     }
 
     std::unique_ptr<TableFormat> Clone() const override { return std::make_unique<JsonFormat>(); }

@@ -19,10 +19,11 @@ class TableFormat {
     // True for a line that is no row (a header); 'answer' is what to write for it.
     // Fails: UsageError for a header without any of the columns.
     virtual bool IsHeader(const std::string& line, std::string& answer) = 0;
+    // Sets all of the row; its texts' memory serves again.
     virtual BatchResult ReadRow(const std::string& line, BatchRow& row) = 0;
-    // The line read last with the row's members and the outcome.
-    virtual std::string WriteRow(const std::string& line, const BatchRow& row,
-                                 const BatchResult& result) = 0;
+    // Appends the line read last with the row's members and the outcome, and a line end.
+    virtual void WriteRow(const std::string& line, const BatchRow& row, const BatchResult& result,
+                          std::string& written) = 0;
     // Another one that knows the header.
     virtual std::unique_ptr<TableFormat> Clone() const = 0;
 

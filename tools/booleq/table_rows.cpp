@@ -20,7 +20,7 @@ std::string RightAligned(const std::string& text, size_t width)
 std::string ShownName(const std::vector<std::string>& names, size_t index)
 {
     const std::string& name = names[index];
-    const bool fits = name.size() <= kMaxHeaderName && IsPrintable(name);
+    const bool fits = Width(name) <= kMaxHeaderName && Visible(name) == name;
     return fits ? name : "#" + std::to_string(index + 1);
 }
 
@@ -62,7 +62,7 @@ RowShape ShapeOf(const std::vector<std::string>& names, uint64_t numPrinted, Row
         for (size_t index = 0; index < names.size(); ++index) {
             const std::string name = ShownName(names, index);
             shape.header += " " + name;
-            shape.row.append(name.size(), ' ');
+            shape.row.append(Width(name), ' ');
             addDigit();
         }
         shape.header += " | result\n";
@@ -180,7 +180,11 @@ std::string CsvField(const std::string& text)
 
 void AppendCsvField(const std::string& text, std::string& line)
 {
-    if (text.find_first_of(",\"\r\n") == std::string::npos) {
+    // find_first_of looks through its four characters for each one of the text.
+    const auto isSpecial = [](char character) {
+        return character == ',' || character == '"' || character == '\r' || character == '\n';
+    };
+    if (std::none_of(text.begin(), text.end(), isSpecial)) {
         line += text;
         return;
     }

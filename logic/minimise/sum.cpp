@@ -35,13 +35,27 @@ bool DoCoverAll(const CubeSpace& space, const CubeList& cubes, CubeIndex& first,
     return true;
 }
 
+// What is on lies in the sum; the free cubes, which may be many, are asked where it does not.
+bool IsOnCovered(const Pla& table, CubeIndex& sum, CubeIndex& free, Work& work)
+{
+    const CubeList none(table.space.NumWords());
+    CubeIndex noIndex(table.space, none);
+    Cofactors ofSum(table.space, sum, noIndex, work);
+    Cofactors ofBoth(table.space, sum, free, work);
+    for (size_t index = 0; index < table.on.Size(); ++index)
+        if (!ofSum.Cover(table.on.At(index), SIZE_MAX) &&
+            !ofBoth.Cover(table.on.At(index), SIZE_MAX))
+            return false;
+    return true;
+}
+
 bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
 {
     const CubeSpace& space = table.space;
     CubeIndex sumIndex(space, sum);
     CubeIndex onIndex(space, table.on);
     CubeIndex freeIndex(space, table.free);
-    if (!DoCoverAll(space, table.on, sumIndex, freeIndex, work))
+    if (!IsOnCovered(table, sumIndex, freeIndex, work))
         return false;
     if (table.type == PlaType::Fr || table.type == PlaType::Fdr) {
         size_t left = 0;

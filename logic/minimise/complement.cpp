@@ -1,7 +1,6 @@
 // Complement by unate recursion. What both halves of a split have is merged again; parts of up to
 // six inputs are covered as a word of rows.
 #include <algorithm>
-#include <numeric>
 
 #include "cofactors.h"
 #include "small_cover.h"
@@ -14,7 +13,7 @@ namespace {
 
 constexpr size_t kMaxPairsToLift = size_t(1) << 16; // beyond that only equal cubes are merged
 // A complement that takes more work for each cube it may have is as good as too large.
-constexpr uint64_t kMaxUnitsForCube = 1u << 11;
+constexpr uint64_t kMaxUnitsForCube = 1u << 9;
 
 class ComplementSearch {
   public:
@@ -173,27 +172,25 @@ class ComplementSearch {
 
     void FindEqual(const CubeList& cubes, const CubeList& holders, std::vector<uint8_t>& isIn)
     {
-        const size_t numPlaces = cubes.Size() + holders.Size();
-        m_work.Spend(16 * numPlaces); // about what sorting takes
-        const auto at = [&](uint32_t place) {
-            return place < cubes.Size() ? cubes.At(place) : holders.At(place - cubes.Size());
+        size_t numSlots = 2;
+        while (numSlots < 2 * holders.Size())
+            numSlots *= 2;
+        std::vector<uint32_t> slots(numSlots, UINT32_MAX); // a holder, or none; half are free
+        const auto slotOf = [&](const uint64_t* cube) {
+            uint64_t hash = 0;
+            for (size_t word = 0; word < m_num_words; ++word)
+                hash = ((hash ^ cube[word]) + 0x9e3779b97f4a7c15u) * 0xbf58476d1ce4e5b9u;
+            size_t slot = static_cast<size_t>(hash >> 32) & (numSlots - 1);
+            while (slots[slot] != UINT32_MAX &&
+                   !IsSameCube(holders.At(slots[slot]), cube, m_num_words))
+                slot = (slot + 1) & (numSlots - 1);
+            return slot;
         };
-        std::vector<uint32_t> order(numPlaces);
-        std::iota(order.begin(), order.end(), 0u);
-        std::sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
-            return std::lexicographical_compare(at(left), at(left) + m_num_words, at(right),
-                                                at(right) + m_num_words);
-        });
-        for (size_t first = 0, end = 0; first < numPlaces; first = end) {
-            bool isHeld = false;
-            for (end = first;
-                 end < numPlaces && IsSameCube(at(order[first]), at(order[end]), m_num_words);
-                 ++end)
-                isHeld = isHeld || order[end] >= cubes.Size();
-            for (size_t place = first; place < end && isHeld; ++place)
-                if (order[place] < cubes.Size())
-                    isIn[order[place]] = 1;
-        }
+        m_work.Spend(8 * (cubes.Size() + holders.Size()));
+        for (size_t index = 0; index < holders.Size(); ++index)
+            slots[slotOf(holders.At(index))] = static_cast<uint32_t>(index);
+        for (size_t index = 0; index < cubes.Size(); ++index)
+            isIn[index] = slots[slotOf(cubes.At(index))] != UINT32_MAX ? 1 : 0;
     }
 
     void Merge(const CubeList& zero, const CubeList& one, size_t bit, CubeList& result)
@@ -211,6 +208,7 @@ class ComplementSearch {
                 lifted.Append(one.At(index));
             else
                 AppendWithout(one.At(index), bit, result);
+        assert(lifted.Size() <= zero.Size() + one.Size());
         lifted.SortAndUnite(); // equal cubes of both halves are one
         result.Append(lifted);
     }
@@ -268,6 +266,7 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes)
         for (size_t word = 0; word < numWords; ++word)
             united.At(united.Size() - 1)[word] |= cubes.At(order[place])[word];
     }
+    assert(united.Size() <= cubes.Size());
     cubes = united;
 }
 
@@ -284,6 +283,8 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
 bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     size_t maxCubes, Work& work, CubeList& result)
 {
+    assert(&result != &first);
+    assert(&result != &second);
     result.Resize(0);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         CubeList cubes(space.NumInputWords());

@@ -68,6 +68,7 @@ class ChoiceSearch {
             universal.push_back(m_labels[index]);
         }
         if (numBinate == 0) {
+            assert(!universal.empty()); // nothing else covers this place
             std::sort(universal.begin(), universal.end());
             m_rows.push_back(std::move(universal));
             return;
@@ -173,8 +174,10 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
         const uint64_t costOfCube = CountLiterals(space, choices) + 1;
         for (size_t index = 0; index < choices.Size(); ++index)
             problem.costs.push_back(costOfCube + CountCubeLiterals(space, choices.At(index)));
-        for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns)
+        for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns) {
+            assert(isKept[places[choice]] == 0);
             isKept[places[choice]] = 1;
+        }
     }
     KeepInCover(cover, isKept);
 }

@@ -117,6 +117,7 @@ void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work&
     primes.cubes.Keep(isEssential);
     ShedOutputs(problem, sum.cubes, work);
     sum.cost = CostOf(space, sum.cubes);
+    assert(primes.cubes.Size() <= sum.cost.numTerms); // a cover has them all
     const bool areAllEssential = primes.cubes.Size() == sum.cost.numTerms;
     if (goal == Goal::Terms) {
         sum.lowerBound = primes.cubes.Size();
@@ -144,6 +145,8 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
     sum.lowerBound = exact.lowerBound;
     sum.isProved = exact.isProved;
     sum.isSecondProved = exact.isSecondProved;
+    assert(sum.lowerBound <=
+           (options.goal == Goal::Terms ? sum.cost.numTerms : sum.cost.numLiterals));
 }
 
 } // namespace

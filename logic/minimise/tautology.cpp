@@ -21,6 +21,7 @@ class TautologyCheck {
     {
         if (!Reduce(part))
             return m_is_tautology;
+        assert(part.count > 1); // an input is fixed both ways
         const size_t bit = ChooseInput(m_space, m_stack, part, m_binate.data(), m_counts);
         for (const bool value : {false, true}) {
             const StackPart half = PushCofactor(m_stack, part, bit, value);

@@ -116,6 +116,7 @@ bool UncoveredRows::Next(uint64_t* row)
                 ClearBit(row, 2 * input + 1);
         SetBit(row, m_space.OutputBit(m_output));
         assert(Contains(m_cube.data(), row, m_space.NumWords()));
+        assert(CountCubeLiterals(m_space, row) == m_space.NumInputs());
         return true;
     }
     return false;

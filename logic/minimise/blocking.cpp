@@ -251,6 +251,8 @@ class HittingSearch {
         uint64_t* prime = m_primes.At(m_primes.Size() - 1);
         for (size_t word = 0; word < m_space.NumWords(); ++word)
             prime[word] = m_parts[word] & ~m_chosen[word];
+        assert(HasCommonInputs(m_space, prime, prime));
+        assert(HasCommonOutput(m_space, prime, prime));
         return true;
     }
 

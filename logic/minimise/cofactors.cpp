@@ -51,6 +51,7 @@ void Cofactors::Take(const uint64_t* cube, size_t left)
 CubeList& Cofactors::OfOutput(size_t output)
 {
     m_work.Spend(m_meeting.Size());
+    assert(output < m_space.NumOutputs());
     m_of_output.Resize(0);
     AppendOfOutput(m_space, m_meeting, output, m_of_output);
     return m_of_output;

@@ -11,12 +11,17 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxPairsToLift = size_t(1) << 20;
+constexpr size_t kMaxPairsToLift = size_t(1) << 16; // beyond that only equal cubes are merged
+// A complement that takes more work for each cube it may have is as good as too large.
+constexpr uint64_t kMaxUnitsForCube = 1u << 9;
 
 class ComplementSearch {
   public:
     ComplementSearch(const CubeSpace& space, CubeList& stack, size_t maxCubes, Work& work)
         : m_space(space), m_stack(stack), m_max_cubes(maxCubes), m_work(work),
+          m_max_spent(maxCubes > SIZE_MAX / kMaxUnitsForCube
+                          ? UINT64_MAX
+                          : work.Spent() + maxCubes * kMaxUnitsForCube),
           m_num_words(space.NumInputWords()), m_zeros(m_num_words), m_ones(m_num_words),
           m_candidates(m_num_words), m_full(m_num_words, ~uint64_t(0))
     {
@@ -29,26 +34,19 @@ class ComplementSearch {
         m_work.Spend(2 * part.count * m_num_words + 1);
         if (part.count == 0)
             result.Append(m_full.data());
-        if (part.count == 0 || HasUniversal(part))
+        if (part.count == 0 || HasUniversal(m_stack, part))
             return result;
         const std::vector<uint64_t> common = TakeOutCommon(part, result);
-        if (!HasUniversal(part))
+        if (!HasUniversal(m_stack, part))
             AppendRest(part, common, result);
-        m_is_too_large = m_is_too_large || result.Size() > m_max_cubes;
+        m_is_too_large =
+            m_is_too_large || result.Size() > m_max_cubes || m_work.Spent() > m_max_spent;
         return result;
     }
 
     bool IsTooLarge() const { return m_is_too_large; }
 
   private:
-    bool HasUniversal(StackPart part) const
-    {
-        for (size_t index = part.first; index < part.first + part.count; ++index)
-            if (IsUniversal(m_stack.At(index), m_num_words))
-                return true;
-        return false;
-    }
-
     // Literals that all cubes have: the opposite of each is a cube of the complement, and the cubes
     // lose them. Returns the cube of these literals.
     std::vector<uint64_t> TakeOutCommon(StackPart part, CubeList& result)
@@ -95,31 +93,20 @@ class ComplementSearch {
 
     void CoverRows(StackPart part, CubeList& result)
     {
-        size_t bits[kWordInputs] = {};
-        size_t numActive = 0;
+        std::vector<uint64_t>& inputs = m_candidates; // no split follows
         for (size_t word = 0; word < m_num_words; ++word)
-            for (uint64_t rest = m_zeros[word] | m_ones[word]; rest != 0; rest &= rest - 1)
-                bits[numActive++] = 64 * word + LowestBit(rest);
-        uint64_t covered = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            uint64_t rows = ~uint64_t(0);
-            for (size_t place = 0; place < numActive; ++place) {
-                if (!GetBit(m_stack.At(index), bits[place]))
-                    rows &= BitPattern(place);
-                if (!GetBit(m_stack.At(index), bits[place] + 1))
-                    rows &= ~BitPattern(place);
-            }
-            covered |= rows;
-        }
+            inputs[word] = m_zeros[word] | m_ones[word];
+        WordRows rows;
+        rows.SetInputs(inputs);
         m_small.clear();
-        FindSmallCover(~covered, numActive, m_small);
+        FindSmallCover(~rows.Covered(m_stack, part), rows.NumInputs(), m_small);
         for (const SmallCube& cube : m_small) {
             result.Append(m_full.data());
-            for (size_t place = 0; place < numActive; ++place) {
+            for (size_t place = 0; place < rows.NumInputs(); ++place) {
                 if ((cube.zeros >> place & 1) != 0)
-                    ClearBit(result.At(result.Size() - 1), bits[place] + 1);
+                    ClearBit(result.At(result.Size() - 1), rows.LowBit(place) + 1);
                 if ((cube.ones >> place & 1) != 0)
-                    ClearBit(result.At(result.Size() - 1), bits[place]);
+                    ClearBit(result.At(result.Size() - 1), rows.LowBit(place));
             }
         }
     }
@@ -152,52 +139,77 @@ class ComplementSearch {
     // 'both' for either value; those of 'one' that do not lie in it for one value only.
     void Unite(const CubeList& both, const CubeList& one, size_t bitToClear, CubeList& result)
     {
+        const std::vector<uint8_t> isIn = FindContained(one, both);
         result.Append(both);
-        const bool doCompare = both.Size() * one.Size() <= kMaxPairsToLift;
-        if (doCompare)
-            m_work.Spend(both.Size() * one.Size());
-        for (size_t index = 0; index < one.Size(); ++index) {
-            if (doCompare && IsInOne(both, one.At(index)))
-                continue;
-            result.Append(one.At(index));
-            ClearBit(result.At(result.Size() - 1), bitToClear);
-        }
+        for (size_t index = 0; index < one.Size(); ++index)
+            if (isIn[index] == 0)
+                AppendWithout(one.At(index), bitToClear, result);
     }
 
-    bool IsInOne(const CubeList& list, const uint64_t* cube) const
+    // Which of 'cubes' lie in a cube of 'holders'; where there are many, which are equal to one.
+    std::vector<uint8_t> FindContained(const CubeList& cubes, const CubeList& holders)
     {
-        for (size_t index = 0; index < list.Size(); ++index)
-            if (Contains(list.At(index), cube, m_num_words))
+        std::vector<uint8_t> isIn(cubes.Size(), 0);
+        if (cubes.Size() * holders.Size() > kMaxPairsToLift) {
+            FindEqual(cubes, holders, isIn);
+            return isIn;
+        }
+        m_work.Spend(cubes.Size() * holders.Size());
+        for (size_t index = 0; index < cubes.Size(); ++index)
+            isIn[index] = IsInOne(holders, cubes.At(index)) ? 1 : 0;
+        return isIn;
+    }
+
+    bool IsInOne(const CubeList& holders, const uint64_t* cube) const
+    {
+        const uint64_t first = cube[0]; // tells most of them apart
+        for (size_t index = 0; index < holders.Size(); ++index)
+            if ((first & ~holders.At(index)[0]) == 0 &&
+                Contains(holders.At(index), cube, m_num_words))
                 return true;
         return false;
     }
 
-    void Merge(CubeList& zero, CubeList& one, size_t bit, CubeList& result)
+    void FindEqual(const CubeList& cubes, const CubeList& holders, std::vector<uint8_t>& isIn)
     {
-        std::vector<uint8_t> isLifted[2];
-        isLifted[0].resize(zero.Size());
-        isLifted[1].resize(one.Size());
-        if (zero.Size() * one.Size() <= kMaxPairsToLift) {
-            m_work.Spend(2 * zero.Size() * one.Size());
-            for (size_t index = 0; index < zero.Size(); ++index)
-                isLifted[0][index] = IsInOne(one, zero.At(index)) ? 1 : 0;
-            for (size_t index = 0; index < one.Size(); ++index)
-                isLifted[1][index] = IsInOne(zero, one.At(index)) ? 1 : 0;
-        }
+        size_t numSlots = 2;
+        while (numSlots < 2 * holders.Size())
+            numSlots *= 2;
+        std::vector<uint32_t> slots(numSlots, UINT32_MAX); // a holder, or none; half are free
+        const auto slotOf = [&](const uint64_t* cube) {
+            uint64_t hash = 0;
+            for (size_t word = 0; word < m_num_words; ++word)
+                hash = ((hash ^ cube[word]) + 0x9e3779b97f4a7c15u) * 0xbf58476d1ce4e5b9u;
+            size_t slot = static_cast<size_t>(hash >> 32) & (numSlots - 1);
+            while (slots[slot] != UINT32_MAX &&
+                   !IsSameCube(holders.At(slots[slot]), cube, m_num_words))
+                slot = (slot + 1) & (numSlots - 1);
+            return slot;
+        };
+        m_work.Spend(8 * (cubes.Size() + holders.Size()));
+        for (size_t index = 0; index < holders.Size(); ++index)
+            slots[slotOf(holders.At(index))] = static_cast<uint32_t>(index);
+        for (size_t index = 0; index < cubes.Size(); ++index)
+            isIn[index] = slots[slotOf(cubes.At(index))] != UINT32_MAX ? 1 : 0;
+    }
+
+    void Merge(const CubeList& zero, const CubeList& one, size_t bit, CubeList& result)
+    {
+        const std::vector<uint8_t> isLiftedZero = FindContained(zero, one);
+        const std::vector<uint8_t> isLiftedOne = FindContained(one, zero);
         CubeList lifted(m_num_words);
         for (size_t index = 0; index < zero.Size(); ++index)
-            if (isLifted[0][index] != 0)
+            if (isLiftedZero[index] != 0)
                 lifted.Append(zero.At(index));
-        for (size_t index = 0; index < one.Size(); ++index)
-            if (isLifted[1][index] != 0)
-                lifted.Append(one.At(index));
-        lifted.SortAndUnite(); // equal cubes of both halves are one
-        for (size_t index = 0; index < zero.Size(); ++index)
-            if (isLifted[0][index] == 0)
+            else
                 AppendWithout(zero.At(index), bit + 1, result);
         for (size_t index = 0; index < one.Size(); ++index)
-            if (isLifted[1][index] == 0)
+            if (isLiftedOne[index] != 0)
+                lifted.Append(one.At(index));
+            else
                 AppendWithout(one.At(index), bit, result);
+        assert(lifted.Size() <= zero.Size() + one.Size());
+        lifted.SortAndUnite(); // equal cubes of both halves are one
         result.Append(lifted);
     }
 
@@ -212,6 +224,7 @@ class ComplementSearch {
     size_t m_max_cubes;
     bool m_is_too_large = false;
     Work& m_work;
+    uint64_t m_max_spent;
     size_t m_num_words;
     std::vector<uint64_t> m_zeros;
     std::vector<uint64_t> m_ones;
@@ -253,6 +266,7 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes)
         for (size_t word = 0; word < numWords; ++word)
             united.At(united.Size() - 1)[word] |= cubes.At(order[place])[word];
     }
+    assert(united.Size() <= cubes.Size());
     cubes = united;
 }
 
@@ -269,6 +283,8 @@ CubeList Complement(const CubeSpace& space, const CubeList& first, const CubeLis
 bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeList& second,
                     size_t maxCubes, Work& work, CubeList& result)
 {
+    assert(&result != &first);
+    assert(&result != &second);
     result.Resize(0);
     for (size_t output = 0; output < space.NumOutputs(); ++output) {
         CubeList cubes(space.NumInputWords());

@@ -190,6 +190,7 @@ void KeepInTable(CoveringTable& table, const std::vector<uint8_t>& isRowKept,
     table.rows.resize(numRows);
     table.multipliers.resize(numRows);
     FillColumns(table);
+    assert(table.columns.size() == table.costs.size());
 }
 
 std::vector<CoveringTable> SplitTable(const CoveringTable& table)
@@ -226,6 +227,7 @@ std::vector<CoveringTable> SplitTable(const CoveringTable& table)
             part.multipliers.push_back(table.multipliers[row]);
         }
         FillColumns(part);
+        assert(part.columns.size() == part.ids.size());
         parts.push_back(std::move(part));
     }
     return parts;

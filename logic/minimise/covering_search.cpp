@@ -382,6 +382,11 @@ CoveringResult SolveCovering(const CoveringProblem& problem, uint64_t maxUnits, 
     work.SetLimit(outerLimit);
     std::sort(result.columns.begin(), result.columns.end());
     assert(result.lowerBound <= result.cost);
+    assert(std::all_of(problem.rows.begin(), problem.rows.end(), [&](const auto& row) {
+        return std::any_of(row.begin(), row.end(), [&](uint32_t column) {
+            return std::binary_search(result.columns.begin(), result.columns.end(), column);
+        });
+    }));
     return result;
 }
 

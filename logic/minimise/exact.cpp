@@ -60,6 +60,7 @@ class ExactSearch {
             isEssential[index] ^= 1;
         }
         m_start.Keep(isEssential);
+        assert(m_start.Size() + m_essential.Size() == m_result.sum.Size());
         m_result.lowerBound = BaseCost();
         m_are_essential_known = true;
     }
@@ -169,6 +170,8 @@ class ExactSearch {
                 m_blocking[numKept - 1] = std::move(m_blocking[row]);
         m_blocking.resize(numKept, CubeList(m_space.NumWords()));
         m_rows.Keep(isKept);
+        assert(m_rows.Size() == numKept);
+        assert(m_blocking.size() == numKept);
         m_signatures.Keep(isKept);
     }
 
@@ -211,6 +214,7 @@ class ExactSearch {
         problem.costs.assign(columns.Size(), 1);
         Solve(problem, columns);
         m_result.lowerBound = m_essential.Size() + m_bound;
+        assert(m_result.lowerBound <= m_result.sum.Size());
         m_result.isProved = m_result.lowerBound == m_result.sum.Size();
     }
 
@@ -238,6 +242,7 @@ class ExactSearch {
         if (firstBound > m_result.lowerBound)
             m_result.lowerBound = firstBound;
         m_result.isProved = m_result.isProved || m_result.lowerBound == FirstCount();
+        assert(m_bound <= cost);
         m_result.isSecondProved = m_bound == cost;
     }
 
@@ -258,6 +263,7 @@ class ExactSearch {
                     problem.rows[row].push_back(static_cast<uint32_t>(column));
         }
         const CoveringResult result = SolveCovering(problem, UINT64_MAX, m_work);
+        assert(result.lowerBound <= result.cost);
         m_bound = result.lowerBound;
         CubeList sum = m_essential;
         for (const uint32_t column : result.columns) {
@@ -296,6 +302,7 @@ class ExactSearch {
                 isOut[other] = 1;
         }
         m_result.lowerBound = std::max(m_result.lowerBound, m_essential.Size() + numStrangers);
+        assert(m_result.lowerBound <= m_result.sum.Size());
         m_result.isProved = m_result.lowerBound == m_result.sum.Size();
     }
 

@@ -12,6 +12,7 @@ namespace {
 
 // Candidates at a time, times blocks of off cubes, each of which is asked of them.
 constexpr size_t kMaxAskedBlocks = size_t(1) << 18;
+constexpr size_t kManyCandidates = 16384; // so many are asked with an eighth of that
 
 } // namespace
 
@@ -109,8 +110,8 @@ size_t Expander::FilterCandidates(const CubeList& others)
             m_candidates[numKept++] = candidate;
     }
     m_candidates.resize(numKept);
-    const size_t numAsked =
-        std::min(numKept, kMaxAskedBlocks / (m_problem.off.Size() / 64 + 1) + 16);
+    const size_t maxBlocks = numKept > kManyCandidates ? kMaxAskedBlocks / 8 : kMaxAskedBlocks;
+    const size_t numAsked = std::min(numKept, maxBlocks / (m_problem.off.Size() / 64 + 1) + 16);
     if (numKept > numAsked) { // the nearest are asked now, others when the cube has grown
         const auto isNearer = [&](uint32_t left, uint32_t right) {
             const size_t leftCount = CountRaised(others.At(left));

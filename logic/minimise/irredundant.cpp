@@ -54,7 +54,9 @@ class ChoiceSearch {
                 break;
             // Where an input that is unate has its worse value, fewer cubes are left: the rows
             // found there imply those elsewhere.
-            DropUnate(part);
+            DropUnate(m_stack, part, m_binate, &m_labels);
+            m_stack.Resize(part.first + part.count);
+            m_labels.resize(m_stack.Size());
         }
         assert(part.count > 0); // the cubes cover this place
         std::vector<uint32_t> universal;
@@ -66,6 +68,7 @@ class ChoiceSearch {
             universal.push_back(m_labels[index]);
         }
         if (numBinate == 0) {
+            assert(!universal.empty()); // nothing else covers this place
             std::sort(universal.begin(), universal.end());
             m_rows.push_back(std::move(universal));
             return;
@@ -76,24 +79,6 @@ class ChoiceSearch {
             m_stack.Resize(part.first + part.count);
             m_labels.resize(part.first + part.count);
         }
-    }
-
-    void DropUnate(StackPart& part)
-    {
-        size_t count = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            const uint64_t* cube = m_stack.At(index);
-            uint64_t fixed = 0;
-            for (size_t word = 0; word < m_num_words; ++word)
-                fixed |= ~cube[word] & ~(m_binate[word] * 3);
-            if (fixed != 0)
-                continue;
-            m_labels[part.first + count] = m_labels[index];
-            CopyCube(m_stack.At(part.first + count++), cube, m_num_words);
-        }
-        part.count = count;
-        m_stack.Resize(part.first + count);
-        m_labels.resize(part.first + count);
     }
 
     StackPart PushLabelled(StackPart part, size_t bit, bool value)
@@ -189,8 +174,10 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
         const uint64_t costOfCube = CountLiterals(space, choices) + 1;
         for (size_t index = 0; index < choices.Size(); ++index)
             problem.costs.push_back(costOfCube + CountCubeLiterals(space, choices.At(index)));
-        for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns)
+        for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns) {
+            assert(isKept[places[choice]] == 0);
             isKept[places[choice]] = 1;
+        }
     }
     KeepInCover(cover, isKept);
 }

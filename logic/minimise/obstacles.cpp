@@ -142,6 +142,7 @@ bool Obstacles::LowerAndDrop(uint64_t* free)
         if (m_active[block] != 0)
             m_live[numLive++] = block;
     }
+    assert(numLive <= m_live.size());
     m_live.resize(numLive);
     const bool isLowered =
         m_lowered_inputs.size() > numBefore || m_num_lowered_outputs > numOutputsBefore;
@@ -206,6 +207,7 @@ void Obstacles::RaiseUnblocked(uint64_t* raised, uint64_t* free)
     }
     for (const Parts* parts : {&m_inputs, &m_outputs}) {
         for (const uint32_t part : *parts) {
+            assert(GetBit(free, part));
             SetBit(raised, part);
             ClearBit(free, part);
         }

@@ -176,6 +176,7 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
     size_t onIndex = 0;
     size_t offIndex = 0;
     if (FindMeeting(pla.space, pla.on, pla.off, work, onIndex, offIndex)) {
+        assert(!IsDisjoint(pla.space, pla.on.At(onIndex), pla.off.At(offIndex)));
         const size_t first = std::min(pla.onLines[onIndex], pla.offLines[offIndex]);
         const size_t second = std::max(pla.onLines[onIndex], pla.offLines[offIndex]);
         size_t output = 0;
@@ -192,9 +193,7 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
     problem.off = pla.off;
     // Free is what is neither on nor off, and what is said to be free as long as it is not off.
     if (!FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free)) {
-        fault = {0,
-                 "the rows that nothing is said of need over " + std::to_string(kMaxCubes) +
-                     " cubes for an output",
+        fault = {0, "the rows that nothing is said of need too many cubes",
                  "write them with '-' and leave the rows that are 0 out (.type fd)"};
         return false;
     }

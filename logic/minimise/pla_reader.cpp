@@ -257,6 +257,7 @@ class PlaReader {
     bool TakeDigit(char digit)
     {
         const size_t numWords = m_pla.space.NumWords();
+        assert(m_row.size() == 3 * numWords);
         if (m_num_digits < m_num_inputs) {
             const size_t bit = 2 * m_num_digits;
             const bool isEither = digit == '-' || digit == '2' || digit == 'x' || digit == 'X';
@@ -303,6 +304,7 @@ class PlaReader {
     void EndRow()
     {
         const size_t numWords = m_pla.space.NumWords();
+        assert(m_num_digits == m_num_inputs + m_num_outputs);
         if (m_has_set[0]) {
             m_pla.on.Append(m_row.data());
             m_pla.onLines.push_back(static_cast<uint32_t>(m_row_line));
@@ -317,6 +319,8 @@ class PlaReader {
         m_has_set[0] = m_has_set[1] = m_has_set[2] = false;
         m_num_digits = 0;
         ++m_pla.numRows;
+        assert(m_pla.on.Size() == m_pla.onLines.size());
+        assert(m_pla.off.Size() == m_pla.offLines.size());
     }
 
     bool Finish()

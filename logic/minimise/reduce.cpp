@@ -92,6 +92,7 @@ void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, boo
         ReduceCube(space, cubes, index, cofactors, work, reduced.data());
         if (IsSameCube(reduced.data(), cubes.At(index), space.NumWords()))
             continue;
+        assert(Contains(cubes.At(index), reduced.data(), space.NumWords()));
         CopyCube(cubes.At(index), reduced.data(), space.NumWords());
         cubeIndex.Update(index);
         cover.isPrime[index] = 0;
@@ -156,6 +157,7 @@ void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const 
             if (IsTautology(space, cofactors.OfOutput(output), work))
                 ClearBit(cubes.At(index), bit);
         }
+        assert(CountOutputs(space, cubes.At(index)) >= 1);
         cubeIndex.Update(index);
     }
     const CubeList noCubes(space.NumWords());

@@ -35,13 +35,27 @@ bool DoCoverAll(const CubeSpace& space, const CubeList& cubes, CubeIndex& first,
     return true;
 }
 
+// What is on lies in the sum; the free cubes, which may be many, are asked where it does not.
+bool IsOnCovered(const Pla& table, CubeIndex& sum, CubeIndex& free, Work& work)
+{
+    const CubeList none(table.space.NumWords());
+    CubeIndex noIndex(table.space, none);
+    Cofactors ofSum(table.space, sum, noIndex, work);
+    Cofactors ofBoth(table.space, sum, free, work);
+    for (size_t index = 0; index < table.on.Size(); ++index)
+        if (!ofSum.Cover(table.on.At(index), SIZE_MAX) &&
+            !ofBoth.Cover(table.on.At(index), SIZE_MAX))
+            return false;
+    return true;
+}
+
 bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
 {
     const CubeSpace& space = table.space;
     CubeIndex sumIndex(space, sum);
     CubeIndex onIndex(space, table.on);
     CubeIndex freeIndex(space, table.free);
-    if (!DoCoverAll(space, table.on, sumIndex, freeIndex, work))
+    if (!IsOnCovered(table, sumIndex, freeIndex, work))
         return false;
     if (table.type == PlaType::Fr || table.type == PlaType::Fdr) {
         size_t left = 0;
@@ -103,6 +117,7 @@ void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work&
     primes.cubes.Keep(isEssential);
     ShedOutputs(problem, sum.cubes, work);
     sum.cost = CostOf(space, sum.cubes);
+    assert(primes.cubes.Size() <= sum.cost.numTerms); // a cover has them all
     const bool areAllEssential = primes.cubes.Size() == sum.cost.numTerms;
     if (goal == Goal::Terms) {
         sum.lowerBound = primes.cubes.Size();
@@ -130,6 +145,8 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
     sum.lowerBound = exact.lowerBound;
     sum.isProved = exact.isProved;
     sum.isSecondProved = exact.isSecondProved;
+    assert(sum.lowerBound <=
+           (options.goal == Goal::Terms ? sum.cost.numTerms : sum.cost.numLiterals));
 }
 
 } // namespace

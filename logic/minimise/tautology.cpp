@@ -21,6 +21,7 @@ class TautologyCheck {
     {
         if (!Reduce(part))
             return m_is_tautology;
+        assert(part.count > 1); // an input is fixed both ways
         const size_t bit = ChooseInput(m_space, m_stack, part, m_binate.data(), m_counts);
         for (const bool value : {false, true}) {
             const StackPart half = PushCofactor(m_stack, part, bit, value);
@@ -56,24 +57,8 @@ class TautologyCheck {
             }
             if (anyUnate == 0)
                 return !Settle(part, numBinate);
-            DropUnate(part);
+            DropUnate(m_stack, part, m_binate, nullptr);
         }
-    }
-
-    // Drops the cubes that fix an input that is not binate.
-    void DropUnate(StackPart& part)
-    {
-        size_t count = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            const uint64_t* cube = m_stack.At(index);
-            uint64_t fixed = 0;
-            for (size_t word = 0; word < m_num_words; ++word)
-                fixed |= ~cube[word] & ~(m_binate[word] * 3);
-            if (fixed == 0)
-                CopyCube(m_stack.At(part.first + count++), cube, m_num_words);
-        }
-        assert(count < part.count);
-        part.count = count;
     }
 
     // True when the answer is known: a cube without literals, too few rows, or few inputs.
@@ -95,27 +80,10 @@ class TautologyCheck {
             return true;
         if (numBinate > kWordInputs)
             return false;
-        m_is_tautology = CountRows(part);
+        WordRows rows;
+        rows.SetInputs(m_binate);
+        m_is_tautology = rows.Covered(m_stack, part) == ~uint64_t(0);
         return true;
-    }
-
-    bool CountRows(StackPart part) const
-    {
-        uint64_t covered = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            uint64_t rows = ~uint64_t(0);
-            size_t place = 0;
-            for (size_t word = 0; word < m_num_words; ++word) {
-                for (uint64_t rest = m_binate[word]; rest != 0; rest &= rest - 1, ++place) {
-                    const uint64_t pair = m_stack.At(index)[word] >> LowestBit(rest) & 3;
-                    assert(pair != 0);
-                    if (pair != 3)
-                        rows &= pair == 2 ? BitPattern(place) : ~BitPattern(place);
-                }
-            }
-            covered |= rows;
-        }
-        return covered == ~uint64_t(0);
     }
 
     const CubeSpace& m_space;

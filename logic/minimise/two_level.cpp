@@ -59,9 +59,11 @@ class SmallSumSearch {
             // what was under way is lost
         }
         m_cover = m_best;
+        assert(m_cover.cubes.Size() == m_cover.isPrime.size());
         work.SetDeadline(Work::Clock::time_point::max());
         m_cover.cubes.Append(m_essential);
         m_cover.isPrime.resize(m_cover.cubes.Size(), 1);
+        assert(m_free.Size() == m_num_given_free + m_essential.Size());
         m_free.Resize(m_num_given_free);
         MakeSparse(m_space, m_expander, m_cover, m_free, m_work);
         work.SetDeadline(deadline);
@@ -81,6 +83,7 @@ class SmallSumSearch {
             isEssential[index] ^= 1;
         }
         m_cover.cubes.Keep(isEssential);
+        assert(m_cover.cubes.Size() + m_essential.Size() == isEssential.size());
         m_cover.isPrime.assign(m_cover.cubes.Size(), 1);
     }
 
@@ -239,6 +242,7 @@ void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)
     cover.cubes = cubes;
     cover.isPrime.assign(cubes.Size(), 0);
     MakeSparse(problem.space, expander, cover, problem.free, work);
+    assert(cover.cubes.Size() == cubes.Size()); // an irredundant cover needs each
     cubes = cover.cubes;
 }
 

@@ -5,19 +5,51 @@
 
 namespace booleq {
 
+namespace {
+
+// Adds two words to a plane of counts; returns what they carry to the next plane.
+inline uint64_t AddTwo(uint64_t& plane, uint64_t left, uint64_t right)
+{
+    const uint64_t different = plane ^ left;
+    const uint64_t carry = (plane & left) | (different & right);
+    plane = different ^ right;
+    return carry;
+}
+
+// How many cubes lack each bit of 'asked', four cubes at a time. The counts of a word grow side by
+// side: bit k of planes[p] is bit p of the count of bit k.
+void CountAbsent(const CubeList& stack, StackPart part, size_t word, uint64_t asked,
+                 uint32_t* counts)
+{
+    assert(part.count <= UINT32_MAX);
+    uint64_t planes[33] = {};
+    const auto absent = [&](size_t place) {
+        return place < part.count ? ~stack.At(part.first + place)[word] & asked : 0;
+    };
+    for (size_t place = 0; place < part.count; place += 4) {
+        const uint64_t first = AddTwo(planes[0], absent(place), absent(place + 1));
+        const uint64_t second = AddTwo(planes[0], absent(place + 2), absent(place + 3));
+        uint64_t carry = AddTwo(planes[1], first, second);
+        for (size_t plane = 2; carry != 0; ++plane) {
+            const uint64_t both = planes[plane] & carry;
+            planes[plane] ^= carry;
+            carry = both;
+        }
+    }
+    for (size_t plane = 0; plane < 32 && part.count >> plane != 0; ++plane)
+        for (uint64_t rest = planes[plane]; rest != 0; rest &= rest - 1)
+            counts[LowestBit(rest)] += uint32_t(1) << plane;
+}
+
+} // namespace
+
 size_t ChooseInput(const CubeSpace& space, const CubeList& stack, StackPart part,
                    const uint64_t* candidates, std::vector<uint32_t>& counts)
 {
     const size_t numWords = space.NumInputWords();
     counts.assign(64 * numWords, 0);
-    for (size_t index = part.first; index < part.first + part.count; ++index) {
-        const uint64_t* cube = stack.At(index);
-        for (size_t word = 0; word < numWords; ++word) {
-            uint64_t absent = ~cube[word] & candidates[word] * 3;
-            for (; absent != 0; absent &= absent - 1)
-                ++counts[64 * word + LowestBit(absent)];
-        }
-    }
+    for (size_t word = 0; word < numWords; ++word)
+        CountAbsent(stack, part, word, candidates[word] * 3, counts.data() + 64 * word);
     size_t best = SIZE_MAX;
     uint32_t bestSum = 0;
     uint32_t bestSmaller = 0;
@@ -35,6 +67,64 @@ size_t ChooseInput(const CubeSpace& space, const CubeList& stack, StackPart part
     }
     assert(best != SIZE_MAX);
     return best;
+}
+
+bool HasUniversal(const CubeList& stack, StackPart part)
+{
+    for (size_t index = part.first; index < part.first + part.count; ++index)
+        if (IsUniversal(stack.At(index), stack.NumWords()))
+            return true;
+    return false;
+}
+
+void DropUnate(CubeList& stack, StackPart& part, const std::vector<uint64_t>& binate,
+               std::vector<uint32_t>* labels)
+{
+    assert(!labels || labels->size() == stack.Size());
+    const size_t numWords = stack.NumWords();
+    size_t count = 0;
+    for (size_t index = part.first; index < part.first + part.count; ++index) {
+        const uint64_t* cube = stack.At(index);
+        uint64_t fixed = 0;
+        for (size_t word = 0; word < numWords; ++word)
+            fixed |= ~cube[word] & ~(binate[word] * 3);
+        if (fixed != 0)
+            continue;
+        if (labels)
+            (*labels)[part.first + count] = (*labels)[index];
+        CopyCube(stack.At(part.first + count++), cube, numWords);
+    }
+    assert(count < part.count); // an input that is not binate occurs
+    part.count = count;
+}
+
+void WordRows::SetInputs(const std::vector<uint64_t>& inputs)
+{
+    m_num_inputs = 0;
+    for (size_t word = 0; word < inputs.size(); ++word) {
+        for (uint64_t rest = inputs[word]; rest != 0; rest &= rest - 1) {
+            assert(m_num_inputs < kWordInputs);
+            m_low_bits[m_num_inputs++] = 64 * word + LowestBit(rest);
+        }
+    }
+}
+
+uint64_t WordRows::Covered(const CubeList& stack, StackPart part) const
+{
+    uint64_t covered = 0;
+    for (size_t index = part.first; index < part.first + part.count; ++index) {
+        const uint64_t* cube = stack.At(index);
+        uint64_t rows = ~uint64_t(0);
+        for (size_t place = 0; place < m_num_inputs; ++place) {
+            const size_t bit = m_low_bits[place];
+            const uint64_t pair = cube[bit / 64] >> (bit % 64) & 3;
+            assert(pair != 0);
+            if (pair != 3)
+                rows &= pair == 2 ? BitPattern(place) : ~BitPattern(place);
+        }
+        covered |= rows;
+    }
+    return covered;
 }
 
 StackPart PushCofactor(CubeList& stack, StackPart part, size_t lowBit, bool value)

@@ -1,10 +1,11 @@
 // What recursions over the inputs of a cover share: a stack of cubes, and what a step has to know
-// of the cubes on top of it. Of use to the functions of unate.h and to the search for a minimal
-// part of a cover.
+// of the cubes on top of it, and the rows of the last few inputs as a word. Of use to the functions
+// of unate.h and to the search for a minimal part of a cover.
 #ifndef BOOLEQ_MINIMISE_UNATE_WALK_H
 #define BOOLEQ_MINIMISE_UNATE_WALK_H
 
 #include "cube.h"
+#include "small_cover.h"
 
 namespace booleq {
 
@@ -40,9 +41,35 @@ inline bool IsUniversal(const uint64_t* inputs, size_t numWords)
 
 // The input, as the number of its pair's low bit, that most cubes fix, and among those that the
 // most evenly; only inputs of 'candidates' (low bits, one word each) count.
-// Requires: a candidate. 'zeros' and 'ones' are scratch space of 64 * NumInputWords() counts.
+// Requires: a candidate. 'counts' is scratch space.
 size_t ChooseInput(const CubeSpace& space, const CubeList& stack, StackPart part,
                    const uint64_t* candidates, std::vector<uint32_t>& counts);
+
+// Whether a cube of the part covers all rows.
+bool HasUniversal(const CubeList& stack, StackPart part);
+
+// Moves the cubes of the part that fix inputs of 'binate' (low bits) only to its front, and leaves
+// the others out. 'labels', null or one for each cube of the stack, move with them.
+void DropUnate(CubeList& stack, StackPart& part, const std::vector<uint64_t>& binate,
+               std::vector<uint32_t>* labels);
+
+// Up to kWordInputs inputs, and the rows over them as bits of a word: input 'place' of the list
+// has the value 1 in the rows of BitPattern(place).
+class WordRows {
+  public:
+    // Requires: no more than kWordInputs low bits in the words.
+    void SetInputs(const std::vector<uint64_t>& inputs);
+    size_t NumInputs() const { return m_num_inputs; }
+    // The low bit of the pair of input 'place'.
+    size_t LowBit(size_t place) const { return m_low_bits[place]; }
+    // The rows that the cubes of the part cover.
+    // Requires: they fix no other inputs.
+    uint64_t Covered(const CubeList& stack, StackPart part) const;
+
+  private:
+    size_t m_low_bits[kWordInputs] = {};
+    size_t m_num_inputs = 0;
+};
 
 // Pushes the cofactor of the part with respect to one value of the input whose low bit is given;
 // returns where it lies.

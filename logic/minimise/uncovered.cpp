@@ -28,9 +28,8 @@ class UncoveredSearch {
                 m_found[word] |= m_path[word];
             return;
         }
-        for (size_t index = part.first; index < part.first + part.count; ++index)
-            if (IsUniversal(m_stack.At(index), m_num_words))
-                return;
+        if (HasUniversal(m_stack, part))
+            return;
         size_t numActive = 0;
         size_t unateBit = SIZE_MAX;
         bool isUnateOne = false;
@@ -96,31 +95,21 @@ class UncoveredSearch {
 
     void AddRows(StackPart part)
     {
-        size_t bits[kWordInputs] = {};
-        size_t numActive = 0;
+        std::vector<uint64_t>& inputs = m_binate; // not needed any more
         for (size_t word = 0; word < m_num_words; ++word)
-            for (uint64_t rest = m_binate[word] | m_unate[word]; rest != 0; rest &= rest - 1)
-                bits[numActive++] = 64 * word + LowestBit(rest);
-        uint64_t covered = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            uint64_t rows = ~uint64_t(0);
-            for (size_t place = 0; place < numActive; ++place) {
-                if (!GetBit(m_stack.At(index), bits[place]))
-                    rows &= BitPattern(place);
-                if (!GetBit(m_stack.At(index), bits[place] + 1))
-                    rows &= ~BitPattern(place);
-            }
-            covered |= rows;
-        }
+            inputs[word] |= m_unate[word];
+        WordRows rows;
+        rows.SetInputs(inputs);
+        const uint64_t covered = rows.Covered(m_stack, part);
         if (covered == ~uint64_t(0))
             return;
-        std::vector<uint64_t>& parts = m_binate; // not needed any more
+        std::vector<uint64_t>& parts = m_unate; // nor this
         parts = m_path;
-        for (size_t place = 0; place < numActive; ++place) {
+        for (size_t place = 0; place < rows.NumInputs(); ++place) {
             if ((~covered & BitPattern(place)) == 0)
-                ClearBit(parts.data(), bits[place] + 1);
+                ClearBit(parts.data(), rows.LowBit(place) + 1);
             if ((~covered & ~BitPattern(place)) == 0)
-                ClearBit(parts.data(), bits[place]);
+                ClearBit(parts.data(), rows.LowBit(place));
         }
         for (size_t word = 0; word < m_num_words; ++word)
             m_found[word] |= parts[word];

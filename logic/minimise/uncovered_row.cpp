@@ -35,13 +35,13 @@ class RowSearch {
                 m_row[word] &= ~onlyZeros & ~(onlyOnes << 1); // the value that covers less
                 anyUnate |= onlyZeros | onlyOnes;
             }
-            if (HasUniversal(part) || (anyUnate == 0 && numBinate == 0)) {
+            if (HasUniversal(m_stack, part) || (anyUnate == 0 && numBinate == 0)) {
                 CopyCube(m_row, before.data(), m_num_words);
                 return false;
             }
             if (anyUnate == 0)
                 break;
-            DropUnate(part);
+            DropUnate(m_stack, part, m_binate, nullptr);
         }
         const size_t bit = ChooseInput(m_space, m_stack, part, m_binate.data(), m_counts);
         for (const bool value : {false, true}) {
@@ -58,28 +58,6 @@ class RowSearch {
     }
 
   private:
-    bool HasUniversal(StackPart part) const
-    {
-        for (size_t index = part.first; index < part.first + part.count; ++index)
-            if (IsUniversal(m_stack.At(index), m_num_words))
-                return true;
-        return false;
-    }
-
-    void DropUnate(StackPart& part)
-    {
-        size_t count = 0;
-        for (size_t index = part.first; index < part.first + part.count; ++index) {
-            const uint64_t* cube = m_stack.At(index);
-            uint64_t fixed = 0;
-            for (size_t word = 0; word < m_num_words; ++word)
-                fixed |= ~cube[word] & ~(m_binate[word] * 3);
-            if (fixed == 0)
-                CopyCube(m_stack.At(part.first + count++), cube, m_num_words);
-        }
-        part.count = count;
-    }
-
     const CubeSpace& m_space;
     CubeList& m_stack;
     Work& m_work;
@@ -138,6 +116,7 @@ bool UncoveredRows::Next(uint64_t* row)
                 ClearBit(row, 2 * input + 1);
         SetBit(row, m_space.OutputBit(m_output));
         assert(Contains(m_cube.data(), row, m_space.NumWords()));
+        assert(CountCubeLiterals(m_space, row) == m_space.NumInputs());
         return true;
     }
     return false;

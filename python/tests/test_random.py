@@ -265,9 +265,11 @@ def test_eval_many_takes_every_array(kind: str, num_inputs: int) -> None:
     for equation in equations:
         for num_rows in (0, 1, 63, 64, 65, 300):
             rows = rng.integers(0, 2, (num_rows, num_inputs), dtype=np.uint8)
-            expected = np.array([evaluate(equation, row) for row in rows[:70]], dtype=np.uint8)
+            # A single value of an init value of 16 inputs takes milliseconds.
+            some = rows[:70] if equation is equations[0] else rows[:2]
+            expected = np.array([evaluate(equation, row) for row in some], dtype=np.uint8)
             whole = equation.eval_many(rows)
-            assert whole.shape == (num_rows,) and same(whole[:70], expected)
+            assert whole.shape == (num_rows,) and same(whole[:len(some)], expected)
             for array in arrays_of(rows, kind):
                 assert same(equation.eval_many(array), whole)
             broadcast = np.broadcast_to(rows[:1].astype(kind), (5, num_inputs)) if num_rows else rows

@@ -223,8 +223,6 @@ def compare_members(group, comparison):
             continue
         names, column = group.names(index), group.column(index)
         comparison.expect(tuple(names), equation.inputs, *where)
-        comparison.expect(names, list(equation), "iter", *where)
-        comparison.expect(len(names), len(equation), "len", *where)
         comparison.expect(names, list(equation.explain().inputs), "explain", *where)
         comparison.expect(tuple(names), equation.minimize().inputs, "minimize", *where)
         if not any("'" in name.rstrip("'")[1:] for name in names): # an init value over such is none
@@ -238,8 +236,8 @@ def compare_members(group, comparison):
             continue
         value = int(column, 16)
         bits = [value >> row & 1 for row in range(1 << len(names))]
-        comparison.expect(column, equation.hex_init, "hex_init", *where)
-        comparison.expect(value, int(equation.binary_init, 2), "binary_init", *where)
+        comparison.expect(column, equation.hex_init(), "hex_init", *where)
+        comparison.expect(value, int(equation.binary_init(), 2), "binary_init", *where)
         comparison.expect(bits, equation.column().tolist(), "column", *where)
         comparison.expect(bits, equation.truth_table()[:, -1].tolist(), "truth_table", *where)
         comparison.expect(bits, equation.eval_many(equation.truth_table()[:, :-1]).tolist(),

@@ -53,8 +53,9 @@ class BitWriter {
             m_digits.isLong |= value || isUnknown;
             return;
         }
-        m_digits.words[place / 64] |= uint64_t(value && !isUnknown) << (place % 64);
-        m_digits.unknown[place / 64] |= uint64_t(isUnknown) << (place % 64);
+        const auto word = static_cast<size_t>(place / 64);
+        m_digits.words[word] |= uint64_t(value && !isUnknown) << (place % 64);
+        m_digits.unknown[word] |= uint64_t(isUnknown) << (place % 64);
         m_digits.hasUnknown |= isUnknown;
     }
 

@@ -32,8 +32,8 @@ class NameArena {
     // Valid until the next Add.  Requires: name < Size().
     std::string_view Text(NameId name) const
     {
-        const uint64_t start = name == 0 ? 0 : m_ends[name - 1];
-        return std::string_view(m_bytes.data() + start, m_ends[name] - start);
+        const auto start = static_cast<size_t>(name == 0 ? 0 : m_ends[name - 1]);
+        return std::string_view(m_bytes.data() + start, static_cast<size_t>(m_ends[name]) - start);
     }
     size_t Size() const { return m_ends.size(); }
     size_t NumBytes() const;

@@ -180,7 +180,8 @@ class Canonicaliser {
         do {
             --block;
             function = candidate.word >> (kBlockRows * block) & kBlockMask;
-            bound |= uint64_t(m_tables.least[function]) << (kBlockRows * block);
+            bound |= uint64_t(m_tables.least[static_cast<size_t>(function)])
+                     << (kBlockRows * block);
         } while (block > 0 && (function == 0 || function == kBlockMask));
         if (bound > m_bound)
             return;
@@ -263,13 +264,14 @@ class Canonicaliser {
 };
 
 // Up to four inputs: the tables say it.
-CanonicalLut FindSmall(uint64_t table, unsigned int numInputs, CanonicalScope scope)
+CanonicalLut FindSmall(uint64_t wanted, unsigned int numInputs, CanonicalScope scope)
 {
     const BlockTables& tables = BlockTablesOf(numInputs, scope);
-    const uint64_t inverse = ~table & RowMask(numInputs);
+    const auto table = static_cast<size_t>(wanted); // of at most 2^16
+    const auto inverse = static_cast<size_t>(~wanted & RowMask(numInputs));
     const bool isInverted =
         scope != CanonicalScope::Order && tables.least[inverse] < tables.least[table];
-    const uint64_t chosen = isInverted ? inverse : table;
+    const size_t chosen = isInverted ? inverse : table;
     CanonicalLut found;
     found.form = tables.least[chosen];
     found.transformation = tables.transformations[tables.toLeast[chosen]].meaning;

@@ -100,7 +100,7 @@ DistinctLuts FindDistinct(const Word* tables, size_t count, bool isTwo, uint64_t
     }
     if (distinctPlaces != nullptr)
         std::transform(distinctPlaces, distinctPlaces + count, distinctPlaces,
-                       [&](uint64_t distinct) { return placeOf[distinct]; });
+                       [&](uint64_t distinct) { return placeOf[static_cast<size_t>(distinct)]; });
     assert(std::accumulate(result.counts.begin(), result.counts.end(), uint64_t(0)) == count);
     return result;
 }

@@ -213,7 +213,7 @@ class ExactSearch {
         CoveringProblem problem;
         problem.costs.assign(columns.Size(), 1);
         Solve(problem, columns);
-        m_result.lowerBound = m_essential.Size() + m_bound;
+        m_result.lowerBound = m_essential.Size() + static_cast<size_t>(m_bound);
         assert(m_result.lowerBound <= m_result.sum.Size());
         m_result.isProved = m_result.lowerBound == m_result.sum.Size();
     }

@@ -67,10 +67,10 @@ std::vector<uint32_t> OrderToReduce(const CubeSpace& space, const CubeList& cube
         if (sizes[index] > sizes[largest])
             largest = index;
     }
-    std::vector<size_t> keys(cubes.Size());
+    std::vector<uint64_t> keys(cubes.Size());
     for (size_t index = 0; index < cubes.Size(); ++index)
-        keys[index] =
-            ((Distance(space, cubes.At(largest), cubes.At(index)) + 1) << 32) - sizes[index];
+        keys[index] = (uint64_t(Distance(space, cubes.At(largest), cubes.At(index)) + 1) << 32) -
+                      sizes[index];
     std::iota(order.begin(), order.end(), 0u);
     std::stable_sort(order.begin(), order.end(),
                      [&](uint32_t left, uint32_t right) { return keys[left] < keys[right]; });

@@ -85,7 +85,9 @@ class CoverSearch {
             return allowed;
         }
         if (numInputs == kNumLastInputs && m_last_covers != nullptr)
-            return AddLast((*m_last_covers)[needed][allowed], prefix);
+            return AddLast(
+                (*m_last_covers)[static_cast<size_t>(needed)][static_cast<size_t>(allowed)],
+                prefix);
         const uint32_t input = InputOf(numInputs);
         const unsigned int numRows = 1u << (numInputs - 1); // of a half
         const uint64_t half = RowMask(numInputs - 1);

@@ -1,7 +1,7 @@
 """What Doxygen reads in place of a header or a page; the files themselves stay plain.
 
 Headers: a comment stands for the declarations below it, up to a blank line or the next comment; a
-declaration with a comment behind it has that one alone. "As in CLASS." stands for the comment of the
+declaration with a comment after it has that one alone. "As in CLASS." stands for the comment of the
 member of the same name there. The comment that opens the file is the file's. Lines keep their numbers, so that warnings name the right ones.
 Pages: headings, links between pages and pictures, as Doxygen wants them.
 """

@@ -110,7 +110,7 @@ uint32_t PlainEquation::FindVariable(const char* name, size_t length)
 
 unsigned int PlainEquation::Eval() const
 {
-    // An operator stands behind its operands, and the root is last.
+    // An operator stands after its operands, and the root is last.
     std::vector<unsigned int> values;
     values.reserve(m_nodes.size());
     for (const PlainNode& node : m_nodes) {

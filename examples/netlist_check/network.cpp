@@ -76,7 +76,7 @@ void SortTables(Network& network)
 
 Evaluator::Evaluator(const Network& network, const std::string& output)
 {
-    // What is needed, from the output backwards; a table stands behind those that it reads.
+    // What is needed, from the output backwards; a table stands after those that it reads.
     std::set<std::string> needed = {output};
     std::vector<const Table*> tables;
     for (auto table = network.tables.rbegin(); table != network.tables.rend(); ++table) {

@@ -59,7 +59,7 @@ class Evaluator {
         std::vector<size_t> inputs; // places in m_values
     };
     std::vector<std::string> m_inputs;
-    std::vector<Step> m_steps; // each puts its result behind the values there are
+    std::vector<Step> m_steps; // each puts its result after the values there are
     std::vector<unsigned char> m_values;
     size_t m_output = 0;
 };

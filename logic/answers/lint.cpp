@@ -227,8 +227,8 @@ class Linter {
             return;
         const std::vector<std::string> unlisted(
             m_expression.names.begin() + static_cast<long>(numListed), m_expression.names.end());
-        Add("unlisted-input", "inputs that are not listed widen the table behind the others: " +
-                                  Join(unlisted, ", "));
+        Add("unlisted-input",
+            "inputs that are not listed widen the table after the others: " + Join(unlisted, ", "));
     }
 
     // Every input at 1 is the last row, which has no digit where some have none.

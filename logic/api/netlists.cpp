@@ -1,4 +1,4 @@
-// Netlists behind the public header: designs of the rooms, made into plain values.
+// Netlists for the public header: designs of the rooms, made into plain values.
 #include <algorithm>
 #include <cassert>
 

@@ -70,7 +70,7 @@ const char* BlifRows(Operator op)
 
 // Writes an expression as equations of AND, OR and NOT.
 //
-// Invariant: m_nodes holds the operands that wait for their operator, one behind the other, each in
+// Invariant: m_nodes holds the operands that wait for their operator, one after the other, each in
 // post-order and starting at its element of m_starts. Links are not set.
 class EqnWriter {
   public:

@@ -21,7 +21,7 @@ class TargetNamer {
     // escaped, or its other characters become "_". Plain names of other inputs come first, so
     // that A stays A and 'A' becomes A_1.
     std::vector<std::string> NameInputs(const std::vector<std::string>& inputs);
-    // 'wanted', or with a number behind it.
+    // 'wanted', or with a number after it.
     std::string NameOther(const std::string& wanted);
 
   private:
@@ -31,7 +31,7 @@ class TargetNamer {
 
     const Notation* m_notation;
     std::set<std::string> m_used;                 // as the target tells names apart
-    std::map<std::string, size_t> m_last_numbers; // put behind a wanted name
+    std::map<std::string, size_t> m_last_numbers; // put after a wanted name
 };
 
 } // namespace booleq

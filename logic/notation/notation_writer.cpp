@@ -9,7 +9,7 @@ namespace {
 
 constexpr int kLeafLevel = 100;
 
-// How one node is written: before, between and behind its operands.
+// How one node is written: before, between and after its operands.
 struct Form {
     std::string text;
     int level = kLeafLevel;

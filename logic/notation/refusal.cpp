@@ -39,7 +39,7 @@ class Context {
     Context(const std::string& text, const Refusal& refusal) : m_text(text), m_refusal(refusal) {}
 
     std::string Token() const { return m_text.substr(m_refusal.offset, m_refusal.length); }
-    // The character so far behind the token's first one, NUL outside the text.
+    // The character so far after the token's first one, NUL outside the text.
     char At(size_t distance) const
     {
         const size_t position = m_refusal.offset + distance;
@@ -54,7 +54,7 @@ class Context {
             --start;
         return m_text.substr(start, m_refusal.offset - start);
     }
-    // The operator character behind a lone negation and blanks, NUL when there is none.
+    // The operator character after a lone negation and blanks, NUL when there is none.
     char OperatorBehindNegation() const
     {
         const size_t next = m_text.find_first_not_of(" \t\n", m_refusal.offset + 1);

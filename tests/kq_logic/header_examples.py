@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
 """Compiles and runs the example that each public header opens with; what it prints must be what the
-comments behind its lines say.
+comments after its lines say.
 
 usage: header_examples.py COMPILER INCLUDE SCRATCH HEADER... -- LINK_OPTION...
 

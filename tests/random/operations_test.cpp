@@ -109,7 +109,7 @@ bool FailAt(const Operation& operation, size_t failing, bool debugMode)
 }
 
 // How often the operation failed before it succeeded. In debug mode there may be thousands of
-// messages, each with an allocation: there, behind the 200th, one in sixteen fails.
+// messages, each with an allocation: there, after the 200th, one in sixteen fails.
 size_t FailEach(const Operation& operation, bool debugMode)
 {
     size_t numFailures = 0;

@@ -40,7 +40,7 @@ const Texts kSpellings = {"&",  "*",  ".AND.", "|",     "+",  ".OR.", "^",      
                           "(",  ")",  "0",     "1",     "A",  "_b2",  "'c d'"};
 
 // One spelling of each type of token; two names with two binary operators; all spellings, in fours,
-// so that each stands before and behind every other in many places.
+// so that each stands before and after every other in many places.
 const std::vector<Set> kSets = {
     {"types", {"A", "0", "1", "~", "(", ")", "&", "|", "^", "~&", "~|", "~^"}, " ", 8, 334273},
     {"names", {"A", "B", "~", "(", ")", "&", "|"}, " ", 8, 10961},

@@ -160,7 +160,7 @@ TEST(Large, ThirtyInputsHaveAnInitValueAndThirtyOneHaveNone)
     const String value = engine.GetEquationAsHexInitValue(false);
     ASSERT_EQ(2 + (size_t(1) << 28), value.length());
     EXPECT_EQ("0x8", std::string(value.c_str(), 3));
-    EXPECT_EQ(2u, std::string_view(value.c_str()).find_last_not_of('0')); // zeros behind it
+    EXPECT_EQ(2u, std::string_view(value.c_str()).find_last_not_of('0')); // zeros after it
     engine.DefineVariable("v30", 0);
     EXPECT_EQ("0x0", Std(engine.GetEquationAsHexInitValue(false)));
     EXPECT_EQ("0b", Std(engine.GetEquationAsBinaryInitValue()));

@@ -97,7 +97,7 @@ TEST(Refusal, AskingSetsAndDumpsNothing)
     EXPECT_EQ("", messages.Text());
 }
 
-// The tokens of the exhaustive test, as single characters with a blank behind each.
+// The tokens of the exhaustive test, as single characters with a blank after each.
 bool IsOperand(char token)
 {
     return token == 'A' || token == '1';

@@ -316,7 +316,7 @@ TEST(TruthTable, ColumnStopsWhenItIsTold)
         EXPECT_EQ(-1, left);
     }
     std::vector<uint64_t> words;
-    EXPECT_TRUE(engine.GetColumn(words)); // nothing is left behind
+    EXPECT_TRUE(engine.GetColumn(words)); // nothing is left over
     EXPECT_EQ(size_t(1) << 14, words.size());
 }
 

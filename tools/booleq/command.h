@@ -29,7 +29,7 @@ struct Command;
 
 struct Request {
     const Command* command = nullptr;
-    // With lines, the operands behind the text; otherwise the text is the first.
+    // With lines, the operands after the text; otherwise the text is the first.
     std::vector<std::string> operands;
     bool hasLines = false; // "-" or --file: texts are the lines of 'file'
     std::string file;      // "-" is standard input

@@ -28,7 +28,7 @@ constexpr char kStatuses[] = "Exit status; of many lines the highest counts:\n"
 const std::vector<Option>& ToolOptions()
 {
     static const std::vector<Option> options = {
-        {"--help", nullptr, "Print this help; behind a command, the command's"},
+        {"--help", nullptr, "Print this help; after a command, the command's"},
         {"--version", nullptr, "Print the version"},
         {"--man-page", nullptr, "Print the man page (roff)"},
         {"--completion", nullptr, "Print the completion for bash"},

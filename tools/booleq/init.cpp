@@ -155,7 +155,7 @@ constexpr size_t kResultWidth = 64;
 constexpr size_t kDigitWidth = 24;
 constexpr size_t kTableTop = 110;
 
-// Where the column of each input begins, and behind them that of the result.
+// Where the column of each input begins, and after them that of the result.
 std::vector<size_t> ColumnPlaces(const kq_logic::Function& function)
 {
     std::vector<size_t> places = {kMargin + kRowNumberWidth};

@@ -21,7 +21,7 @@ bool IsOptionWord(const std::string& word)
 // the parser because that would take "[A]" and "%%" for lists.
 std::vector<std::string> TakeOperands(std::vector<std::string> extras)
 {
-    // Behind "--" every word is an operand, whatever it begins with.
+    // After "--" every word is an operand, whatever it begins with.
     const auto separator = std::find(extras.begin(), extras.end(), "--");
     const auto option = std::find_if(extras.begin(), separator, IsOptionWord);
     if (option != separator)

@@ -40,7 +40,7 @@ class Output {
     std::string m_block;
 };
 
-// One line on standard error behind "booleq: "; what was put before it is flushed first, so that
+// One line on standard error after "booleq: "; what was put before it is flushed first, so that
 // the two streams keep their order on a terminal.
 void Complain(Output& output, const std::string& message);
 

@@ -16,7 +16,7 @@ constexpr int kMaxJsonDepth = 100;
 constexpr size_t kNoColumn = static_cast<size_t>(-1);
 
 // Fields of one line of CSV. A line end inside a field is not accepted: one stray quote would
-// swallow the rest of the file.  Fails: false when a quote is not closed or has text behind it.
+// swallow the rest of the file.  Fails: false when a quote is not closed or has text after it.
 // Many programs end lines with a carriage return too.
 bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
 {

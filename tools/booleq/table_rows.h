@@ -24,7 +24,7 @@ bool HasNumberedColumn(const std::vector<std::string>& names);
 // Requires: at most kMaxFunctionInputs names.
 void PrintRows(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format,
                const std::function<bool(uint64_t)>& valueAt, Output& output);
-// What PrintRows writes, about; the rows behind maxRows left out.
+// What PrintRows writes, about; the rows after maxRows left out.
 uint64_t EstimateBytes(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format);
 
 // The table of 'show': the equation's rows as text.

@@ -474,7 +474,7 @@ std::string Check(const std::string& input)
     const Case given = Read(input);
     const bool isInitValue =
         !reference::ReadInitValue(given.text, DefinedNames(given), FirstIsLowest(given)).empty();
-    // What is no init value, or one over no names, only the model can tell.
+    // What is not an init value, or one over no names, only the model can tell.
     if (!isInitValue || given.names.size() <= kMaxModelNames) {
         const std::string difference = CompareWithModel(given);
         if (!difference.empty())

@@ -67,7 +67,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // The text ends at its first NUL byte.
     void TokenizeNodes(const char* text);
     // Links the listed nodes into a tree, checks it and records its root. Does nothing when there
-    // is a root or no node. A list that is no equation clears the object.
+    // is a root or no node. A list that is not an equation clears the object.
     void BuildTree();
 
     // As in Kq_BoolEquation.

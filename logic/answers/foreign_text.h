@@ -17,7 +17,7 @@ struct ForeignText {
     Expression expression;
 };
 
-// Names that are no words here, such as "a[0]", get single quotes.
+// Names that are not words here, such as "a[0]", get single quotes.
 ForeignText ReadForeignText(const std::string& text, const Notation& notation);
 
 // What the tree says as operators on bits, over its names. Where values are wider than a bit and

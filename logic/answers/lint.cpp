@@ -219,7 +219,7 @@ class Linter {
             return;
         const InputCheck check = CheckInputs(m_reading.inputs);
         for (const std::string& name : check.illegal)
-            Add("skipped-input", "the listed input " + name + " is no name and is skipped");
+            Add("skipped-input", "the listed input " + name + " is not a name and is skipped");
         for (const std::string& name : check.repeated)
             Add("skipped-input", "the input " + name + " is listed again and counts once");
         const size_t numListed = check.usable.size();

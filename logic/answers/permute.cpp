@@ -11,7 +11,7 @@ std::string OrderFault(const std::vector<std::string>& names)
 {
     const InputCheck check = CheckInputs(names);
     if (!check.illegal.empty())
-        return "'" + Excerpt(check.illegal.front()) + "' is no name";
+        return "'" + Excerpt(check.illegal.front()) + "' is not a name";
     if (!check.repeated.empty())
         return Excerpt(check.repeated.front()) + " is listed twice";
     return std::string();

@@ -32,7 +32,7 @@ class CellIntake {
     // Cells are of this module from now on.
     void EnterModule(ModuleContent& module) { m_module = &module; }
 
-    // 0 is no name.
+    // 0 is not a name.
     void Begin(NameId name, uint32_t line);
     void SetType(std::string_view type) { m_type = type; }
     void SetName(NameId name) { m_name = name; }

@@ -12,7 +12,8 @@ namespace booleq {
 void AppendCofactor(const CubeSpace& space, const uint64_t* cube, const uint64_t* by,
                     CubeList& target);
 
-// Appends the inputs of each cube that has the output to 'target', bits that are no input's all 1.
+// Appends the inputs of each cube that has the output to 'target', bits that belong to no input
+// all 1.
 void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output, CubeList& target);
 
 // Two lists of cubes, as seen from within one cube after the other.

@@ -110,7 +110,7 @@ void Obstacles::Settle(uint64_t* raised, uint64_t* free)
 }
 
 // The cubes of a block that are one step away from what is raised.
-// Requires: none is no step away.
+// Requires: each is a step away or more.
 uint64_t Obstacles::FindNear(const uint64_t* columns, uint64_t common) const
 {
     uint64_t one = ~common;

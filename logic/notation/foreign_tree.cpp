@@ -226,7 +226,7 @@ bool Reader::ReadName()
         return Refuse(Here() + " is no operand there");
     const std::string name = m_text.substr(start, m_position - start);
     if (!IsPlain(m_notation, name))
-        return Refuse(InQuotes(name) + " is no name there");
+        return Refuse(InQuotes(name) + " is not a name there");
     return AddName(name);
 }
 

@@ -81,7 +81,7 @@ def _check_names(equation: Equation, names: Sequence[Any], what: str) -> None:
         raise ValueError(f"{what} has no column for {', '.join(missing[:20])}")
     others = [name for name in names if name not in inputs]
     if others:
-        raise ValueError(f"{what} has a column {others[0]!r}, which is no input; the inputs are "
+        raise ValueError(f"{what} has a column {others[0]!r}, which is not an input; the inputs are "
                          f"{', '.join(inputs[:20])}: write table[list(eq.inputs)]")
     if len(names) != len(inputs):
         raise ValueError(f"{what} has two columns of one name")

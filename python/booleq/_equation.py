@@ -94,7 +94,7 @@ class Equation(_booleq.Core):
                   lsb_first: bool = False) -> Equation:
         """The equation of an init value: "0x...", "0b...", a sized literal "8'hca", or an int.
 
-        Bit k of the value is the result of row k. A text that is no init value over so many inputs
+        Bit k of the value is the result of row k. A text that is not an init value over so many inputs
         is a ParseError, an int that does not fit a ValueError.
 
         >>> from booleq import Equation
@@ -122,7 +122,7 @@ class Equation(_booleq.Core):
     def from_verilog(cls, text: str, inputs: Optional[Iterable[str]] = None) -> Equation:
         """The equation of an expression of Verilog, with Verilog's precedences and vectors of bits.
 
-        Names that are no words here get quotes. ParseError for what is not read.
+        Names that are not words here get quotes. ParseError for what is not read.
 
         >>> from booleq import Equation
         >>> Equation.from_verilog(r"a | \\b[0] & ~c")

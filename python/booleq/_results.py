@@ -79,7 +79,7 @@ class Assignment(Mapping[str, int]):
 
 
 class ParseError(ValueError):
-    """A text that is no equation: where it was refused, why, and what to write instead.
+    """A text that is not an equation: where it was refused, why, and what to write instead.
 
     >>> from booleq import Equation, ParseError
     >>> try:

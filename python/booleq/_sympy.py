@@ -50,7 +50,7 @@ def _join(operator: str, operands: List[str], empty: str) -> str:
 
 
 def to_text(expression: sympy.Basic) -> str:
-    """A text for Equation. TypeError for what is no Boolean expression."""
+    """A text for Equation. TypeError for what is not a Boolean expression."""
     import sympy
     from sympy.logic import boolalg
     texts: Dict[Any, str] = {}
@@ -76,5 +76,5 @@ def to_text(expression: sympy.Basic) -> str:
             condition, then, otherwise = operands
             texts[part] = f"(({condition} & {then}) | (~{condition} & {otherwise}))"
         else:
-            raise TypeError(f"{type(part).__name__} is no Boolean operator: {part}")
+            raise TypeError(f"{type(part).__name__} is not a Boolean operator: {part}")
     return texts[expression]

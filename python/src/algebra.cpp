@@ -136,7 +136,7 @@ booleq::Operator OperatorOf(char name)
     return name == '|' ? booleq::Operator::Or : booleq::Operator::Xor;
 }
 
-// NotImplemented for what is no equation, text, 0 or 1.
+// NotImplemented for what is not an equation, text, 0 or 1.
 py::object JoinObjects(const py::object& left, char op, const py::object& right)
 {
     const py::object own = ToEquation(left);

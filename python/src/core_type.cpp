@@ -152,7 +152,7 @@ class Values {
     }
 
     // Names that are not the inputs' own objects' equals: other strs of the same bytes (escaped
-    // bytes that together are UTF-8 are listed as the character), and what is no input.
+    // bytes that together are UTF-8 are listed as the character), and what is not an input.
     void TakeOthers(PyObject* values)
     {
         PyObject* name = nullptr;

@@ -215,7 +215,7 @@ py::tuple RequireInputs(const py::object& inputs)
     // The library would read such a name up to the NUL.
     for (const std::string& name : encoded)
         if (name.find('\0') != std::string::npos)
-            throw py::value_error("inputs: '" + booleq::Excerpt(name) + "' is no name");
+            throw py::value_error("inputs: '" + booleq::Excerpt(name) + "' is not a name");
     const std::string fault = booleq::OrderFault(encoded);
     if (!fault.empty())
         throw py::value_error("inputs: " + fault);

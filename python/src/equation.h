@@ -80,7 +80,7 @@ class Equation {
 };
 
 // The names of an iterable as a tuple of plain str.
-// Fails: TypeError, and ValueError for what is no legal name or is listed twice.
+// Fails: TypeError, and ValueError for what is not a legal name or is listed twice.
 py::tuple RequireInputs(const py::object& inputs);
 
 // Reads a text.  Fails: booleq.ParseError.

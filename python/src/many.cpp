@@ -189,7 +189,7 @@ py::list FromWords(const py::buffer& words, const py::object& inputs)
         return equation.SetEquationWithExplicitTerms(terms.names, text.c_str(), false, false);
     });
     if (refused != size)
-        throw py::value_error("values[" + std::to_string(refused) + "] is no init value");
+        throw py::value_error("values[" + std::to_string(refused) + "] is not an init value");
     return Give(contents, nullptr, given, false);
 }
 

@@ -24,7 +24,7 @@ eq < 3  # type: ignore[operator]
 eq.render("verilog")  # type: ignore[arg-type]
 eq.convert("html")  # type: ignore[arg-type]
 eq.convert()  # type: ignore[call-arg]
-eq.hex_init  # a method without a call is no error of types
+eq.hex_init  # a method without a call is not an error of types
 int(eq.hex_init)  # type: ignore[call-overload]
 eq.cofactor(A="0")  # type: ignore[arg-type]
 eq.compose(A=None)  # type: ignore[arg-type]

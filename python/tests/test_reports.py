@@ -91,7 +91,7 @@ class TestPermute:
 
     @pytest.mark.parametrize("inputs, message", [
         (["A"], "inputs does not list B"), (["A", "B", "A"], "inputs: A is listed twice"),
-        (["A", "B", "3"], "inputs: '3' is no name"),
+        (["A", "B", "3"], "inputs: '3' is not a name"),
         (["A", "B"] + [f"x{k}" for k in range(23)], "inputs has 25 inputs: at most 24")])
     def test_faults(self, inputs: List[str], message: str) -> None:
         with pytest.raises(ValueError) as caught:
@@ -103,7 +103,7 @@ class TestPermute:
             Equation("A & B").permute("BA")
 
     def test_a_nul_ends_no_name(self) -> None:
-        with pytest.raises(ValueError, match=r"^inputs: 'A\\x00' is no name$"):
+        with pytest.raises(ValueError, match=r"^inputs: 'A\\x00' is not a name$"):
             Equation("A").permute(["A\0"])
 
 

@@ -39,7 +39,7 @@ def test_other_tables_with_names() -> None:
 
 @pytest.mark.parametrize("table, message", [
     (frame().drop(columns="A"), "the DataFrame has no column for A"),
-    (frame().assign(x=1), "has a column 'x', which is no input; the inputs are S, A, B: write"),
+    (frame().assign(x=1), "has a column 'x', which is not an input; the inputs are S, A, B: write"),
     ({"S": [0], "A": [0]}, "the mapping has no column for B"),
     ({"S": [0], "A": [0, 1], "B": [0]}, "must be of one length, not 1, 2"),
     ({"S": 0, "A": 1, "B": 0}, "single values"),

@@ -82,7 +82,7 @@ class TestConstruction:
     def test_an_illegal_name_is_named(self, name: str, shown: str) -> None:
         with pytest.raises(ValueError) as caught:
             Equation("A", ["A", name])
-        assert str(caught.value) == f"inputs: {shown} is no name"
+        assert str(caught.value) == f"inputs: {shown} is not a name"
 
     def test_a_repeated_name_is_named(self) -> None:
         with pytest.raises(ValueError, match="^inputs: B is listed twice$"):

@@ -152,7 +152,7 @@ TEST(Reader, RefusesWhatTheNotationHasNot)
     EXPECT_EQ(Seen(CNotation(), "a)"), "a \")\" too many");
     EXPECT_EQ(Seen(CNotation(), "a &"), "the text ends where an operand must follow");
     EXPECT_EQ(Seen(CNotation(), ""), "the text ends where an operand must follow");
-    EXPECT_EQ(Seen(CNotation(), "int & a"), "\"int\" is no name there");
+    EXPECT_EQ(Seen(CNotation(), "int & a"), "\"int\" is not a name there");
     EXPECT_EQ(Seen(PythonNotation(), "a @ b"), "\"@\" is for other values there");
     EXPECT_EQ(Seen(VhdlNotation(), "a and b or c"), "\"and\" and \"or\" need parentheses there");
     EXPECT_EQ(Seen(VhdlNotation(), "a nand b nand c"),

@@ -61,7 +61,7 @@ size_t CountFixed(const std::vector<uint64_t>& tables)
 
 TEST(CanonicalOfFiveInputs, HasTheKnownNumberOfClasses)
 {
-    // The rows where input 0 is 1 are the upper half of a number: one that can be made less is no
+    // The rows where input 0 is 1 are the upper half of a number: one that can be made less is not
     // form.
     const std::vector<uint32_t> uppers = LeastUppers();
     ASSERT_EQ(uppers.size(), kNumUpperClasses);

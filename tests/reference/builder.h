@@ -9,7 +9,7 @@
 namespace reference {
 
 // Links 'nodes', which stand in text order and are not empty, and returns the root; kNone when the
-// list is no equation. Traces each step in debug mode, and dumps the node that breaks the tree.
+// list is not an equation. Traces each step in debug mode, and dumps the node that breaks the tree.
 int BuildTree(std::vector<Node>& nodes);
 
 } // namespace reference

@@ -135,7 +135,7 @@ def check_streams(checker, command):
     done = checker.run(command, words, "a closed pipe", stdout=writer)
     os.close(writer)
     checker.expect(done.returncode == DONE and not done.stderr, done,
-                   "a reader that left is no error")
+                   "a reader that left is not an error")
     good = checker.run(command, words, "a good text")
     checker.expect(good.returncode in (DONE, 1) and good.stdout and not good.stderr, good,
                    "an answer")
@@ -148,7 +148,7 @@ def listed_commands(tool):
 
 
 def check_netlists(checker, command):
-    """Files that are no netlists: a message with the file's name, or one object."""
+    """Files that are not netlists: a message with the file's name, or one object."""
     with tempfile.TemporaryDirectory() as directory:
         with open(os.path.join(directory, "good.blif"), "wb") as file:
             file.write(GOOD_NETLIST)

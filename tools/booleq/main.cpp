@@ -35,7 +35,7 @@ void WarnAboutInputs(const Reading& reading, Output& output)
 {
     const InputCheck check = CheckInputs(reading.inputs);
     for (const std::string& name : check.illegal)
-        Complain(output, "warning: --inputs: '" + Excerpt(name) + "' is no name: skipped");
+        Complain(output, "warning: --inputs: '" + Excerpt(name) + "' is not a name: skipped");
     for (const std::string& name : check.repeated)
         Complain(output, "warning: --inputs: " + Excerpt(name) + " is listed again: counts once");
 }

@@ -84,7 +84,7 @@ void CheckInputOptions(Request& request)
         throw UsageError("--lsb-first and --reverse say how --inputs is read: give --inputs");
     if (!reading.hasInputs)
         return;
-    // A word that begins with '-' is no name; it is the option that follows a forgotten list.
+    // A word that begins with '-' is not a name; it is the option that follows a forgotten list.
     if (IsBlank(list) || list[0] == '-')
         throw UsageError("--inputs needs names: --inputs A,B");
     if (!SplitInputs(list, reading.inputs))

@@ -100,6 +100,18 @@ SharedContent Read(const std::string& bytes, const booleq::Reading& reading)
     return content;
 }
 
+// How a text is read that Python gives with these inputs, a tuple or None.
+booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst)
+{
+    booleq::Reading reading;
+    reading.inputsName = "inputs=";
+    reading.lsbFirst = lsbFirst;
+    reading.hasInputs = !givenInputs.is_none();
+    if (reading.hasInputs)
+        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(givenInputs));
+    return reading;
+}
+
 } // namespace
 
 Equation::Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst)
@@ -118,13 +130,7 @@ const py::object& Equation::Text() const
 
 booleq::Reading Equation::GetReading() const
 {
-    booleq::Reading reading;
-    reading.inputsName = "inputs=";
-    reading.lsbFirst = m_lsb_first;
-    reading.hasInputs = !m_given_inputs.is_none();
-    if (reading.hasInputs)
-        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(m_given_inputs));
-    return reading;
+    return ReadingOf(m_given_inputs, m_lsb_first);
 }
 
 const py::object& Equation::Inputs() const
@@ -225,12 +231,7 @@ py::tuple RequireInputs(const py::object& inputs)
 py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool lsbFirst)
 {
     const std::string bytes = Encode(text);
-    booleq::Reading reading;
-    reading.inputsName = "inputs=";
-    reading.lsbFirst = lsbFirst;
-    reading.hasInputs = !givenInputs.is_none();
-    if (reading.hasInputs)
-        reading.inputs = EncodeAll(py::reinterpret_borrow<py::tuple>(givenInputs));
+    const booleq::Reading reading = ReadingOf(givenInputs, lsbFirst);
     SharedContent content;
     if (bytes.size() > kEndlessText)
         content = Beside([bytes, reading] { return Read(bytes, reading); });

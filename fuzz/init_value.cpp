@@ -71,7 +71,7 @@ size_t NumRows(size_t numNames)
     return size_t(1) << numNames;
 }
 
-// As many digits as the names ask for; now and then another number, or a sign that is no digit.
+// As many digits as the names ask for; now and then another number, or a sign that is not a digit.
 std::string Digits(Bytes& bytes, bool isHex, size_t numRows)
 {
     const std::string alphabet = isHex ? "0123456789abcdefABCDEF" : "01";

@@ -5,7 +5,9 @@ usage: bench_compare.py OLD NEW [--rounds N] [--filter REGEX] [NAME...]
 
 OLD and NEW are build directories with a bench folder in them; NAME is bench_set and the like, all
 executables that both have when there is none. A case counts as changed only when the slowest run of
-one build is faster than the fastest run of the other. Times are processor time.
+one build is faster than the fastest run of the other. Times are processor time. The compare.py of
+libbenchmark-tools runs all rounds of one executable and then all of the other, so that a machine
+that grows warm or busy looks like a change; that is why this script is here.
 Exit status: 1 when something became slower.
 """
 import argparse

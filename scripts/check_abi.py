@@ -7,7 +7,8 @@ LIBRARY carries debug information, HEADERS is the folder of the public headers, 
 that --update writes. What programs built before rely on must stay: functions, their arguments and
 results, sizes and layouts of public classes. Private member functions and types that are only
 declared in HEADERS do not count: no inline function of the headers calls them. Additions are
-printed and allowed.
+printed and allowed. abidw and abidiff of libabigail do the work; this script leaves out private members
+and paths, which they would compare too.
 Exit status: 1 when something was removed or changed.
 """
 import argparse
@@ -47,7 +48,7 @@ def read_interface(library, headers):
                    (function.tag == "elf-symbol" and function.get("name") in internal)
                    for function in functions):
                 parent.remove(child)
-    # Where the sources lie is no part of the interface.
+    # Where the sources lie is not part of the interface.
     for unit in root.iter("abi-instr"):
         unit.set("path", unit.get("path").rpartition("/")[2])
     return ElementTree.tostring(root, encoding="unicode") + "\n"

@@ -1,6 +1,7 @@
 #!/usr/bin/env python3
 """Mutation check: changes one operator, constant or condition in s/ at a time and runs the quick
-tests, which should fail; reports the changes that no test notices.
+tests, which should fail; reports the changes that no test notices. Debian 12 has no program that
+does this for C++.
 
 usage: mutate.py ROOT WORK [--count N] [--seed N] [--jobs N] [--only TEXT] [--survivors] [--list]
 

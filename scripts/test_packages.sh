@@ -2,8 +2,9 @@
 # Debian packages and a fresh clone in clean Debian 12 roots, as people meet them:
 #   user       nothing but the packages, installed by apt
 #   developer  programs built against them; when they are purged, no file is left behind
-#   newcomer   the two commands of README in a fresh clone, on Debian's minimal system, as a user
-#              whose sudo asks for a password
+#   newcomer   the two commands of README and its lines for pip in a fresh clone, on Debian's minimal
+#              system, as a user whose sudo asks for a password
+# piuparts would check purging alone, in one more root; here that is a list of files before and after.
 # The same commit packed elsewhere gives the same bytes. All of it runs in a namespace of its own:
 # when this script ends, however it does, nothing stays mounted or running.
 # usage: test_packages.sh REPOSITORY PACKAGES DIRECTORY   as root; roots and logs go to DIRECTORY
@@ -260,18 +261,41 @@ newcomer_is_refused() {
     grep -F 'could not install' "$logs/refused.txt"
 }
 
+# Arguments: seconds, a verb of ./dev and its arguments. Prints what the two figures of README are.
+newcomer_dev() {
+    local seconds=$1 before start=$SECONDS
+    shift
+    before=$(du -smx -- "$directory/newcomer" | cut -f 1)
+    as_newcomer "$seconds" /home/newcomer/repository/dev "$@"
+    printf './dev %s: %d s, %d MB\n' "$1" $((SECONDS - start)) \
+        $(($(du -smx -- "$directory/newcomer" | cut -f 1) - before)) >>"$logs/newcomer-cost.txt"
+}
+
 newcomer_runs() {
+    rm -f -- "$logs/newcomer-cost.txt"
     as_newcomer 60 sudo -K
-    as_newcomer 1200 /home/newcomer/repository/dev run 'A & ~B' | tee "$logs/newcomer-run.txt"
+    newcomer_dev 1200 run 'A & ~B' | tee "$logs/newcomer-run.txt"
     grep -x 'init value hex  0x4' "$logs/newcomer-run.txt"
     grep -x 'type_password: prompts answered: 1' "$logs/newcomer-run.txt"
 }
 
 newcomer_tests() {
-    as_newcomer 3600 /home/newcomer/repository/dev test >"$logs/newcomer.all"
+    newcomer_dev 3600 test >"$logs/newcomer.all"
     cat -- "$logs/newcomer.all"
     grep -v '^type_password: ' "$logs/newcomer.all" >"$logs/newcomer.txt"
     tail -n 1 -- "$logs/newcomer.txt" | grep -E '^[0-9]+ passed, 0 failed'
+}
+
+# README's lines for pip as they stand, in a virtual environment; apt's question is answered.
+newcomer_uses_pip() {
+    local lines
+    # shellcheck disable=SC2016 # these are the marks of README
+    lines=$(sed -n '/^```sh pip$/,/^```$/p' "$repository/README.md" | sed '1d; $d')
+    [ -n "$lines" ]
+    as_newcomer 1800 /bin/bash -ec "cd ~/repository; ${lines/apt install/apt install -y}
+        ~/venv/bin/python -c 'import booleq; print(booleq.Equation(\"A & ~B\").hex_init())'" |
+        tee "$logs/newcomer-pip.txt"
+    grep '^0x4' "$logs/newcomer-pip.txt"
 }
 
 test_user() {
@@ -327,6 +351,8 @@ test_newcomer() {
     try "without a terminal ./dev says what is missing" newcomer_is_refused
     try "a newcomer's ./dev run asks for sudo's password" newcomer_runs
     try "a newcomer's ./dev test" newcomer_tests
+    try "README's lines for pip" newcomer_uses_pip
+    cat -- "$logs/newcomer-cost.txt"
 }
 
 mkdir -p -- "$logs"

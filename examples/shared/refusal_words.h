@@ -19,10 +19,10 @@ inline std::string Words(const Kq_BoolEquation::Refusal& refusal, const std::str
         return "there is no equation";
     case Refusal::CHARACTER:
         return "'" + part +
-               "' is no part of the syntax; a name with other characters than "
+               "' is not part of the syntax; a name with other characters than "
                "letters, digits and '_' is written between single quotes";
     case Refusal::WORD:
-        return part == "." ? "this '.' has no second one" : "'" + part + "' is no operator";
+        return part == "." ? "this '.' has no second one" : "'" + part + "' is not an operator";
     case Refusal::QUOTE:
         return "this quote has no second one";
     case Refusal::PAREN:
@@ -38,7 +38,7 @@ inline std::string Words(const Kq_BoolEquation::Refusal& refusal, const std::str
     case Refusal::NEGATED_OPERATOR:
         return "negation '" + part + "' stands apart from its operator, and there is no operand";
     case Refusal::INIT_DIGIT:
-        return "'" + part + "' is no digit of an init value";
+        return "'" + part + "' is not a digit of an init value";
     case Refusal::INIT_WIDTH:
         return "the init value has digits for another number of inputs";
     case Refusal::INIT_NAME:

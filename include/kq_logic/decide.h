@@ -1,4 +1,4 @@
-// Whether two equations are one function, and whether one ever has a value.
+// Whether two equations are the same function, and whether one is ever 0 or 1.
 //
 //     const Kq_BoolEquation left("~(A & B)");
 //     const Kq_BoolEquation right("~A | ~B");
@@ -24,27 +24,27 @@ enum class Verdict {
     Undecided  // neither was found
 };
 
-// A verdict and what supports it.
+// A verdict and its evidence.
 struct Decision {
     Verdict verdict = Verdict::Undecided; // only Equal and Different are answers
-    std::string reason;                   // not empty: why it is undecided
-    bool isTimeOver = false;              // which is that a limit ended it
-    std::vector<std::string> inputs;      // those of the left one, then what only the right one has
-    std::vector<bool> assignment;         // where they differ, a value for each of the inputs
-    bool isFirstRow = false;              // no row before that assignment differs
-    bool left = false;                    // the left one's value there
-    bool right = false;                   // the right one's
+    std::string reason;                   // why it is undecided; empty if it is decided
+    bool isTimeOver = false;              // undecided because of the time limit
+    std::vector<std::string> inputs;      // of the left equation, then those only the right one has
+    std::vector<bool> assignment;         // where they differ: a value for each input
+    bool isFirstRow = false;              // no earlier row differs
+    bool left = false;                    // the left equation's value there
+    bool right = false;                   // the right equation's value there
 };
 
-// Inputs are the same when their names are; there may be any number. Nothing is guessed: Equal is
-// proved, and for a difference both were evaluated. It is the first row up to kMaxFunctionInputs.
-// Fails: Undecided, without an equation, where a limit ends it, and, in a library built without a
-// solver, where only that could tell.  Cost: exponential at worst.
+// Inputs with the same name are the same input; there may be any number. Equal is always proved,
+// and a difference was evaluated on both sides. Up to kMaxFunctionInputs it is the first row that
+// differs. Fails: Undecided if an equation is empty, if the limit ends the search, or if only a
+// solver could tell and the library was built without one.  Cost: exponential in the worst case.
 KQ_EXPORT Decision DecideEqual(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
                                const Limits& limits = Limits());
 
-// Whether the equation always has 'value'. Different: the assignment is one where it has the other,
-// so an equation is satisfiable when it is Different from 0.
+// Whether the equation always has 'value'. If not (Different), the assignment is one where it has
+// the other value; so an equation is satisfiable exactly if it is Different from 0.
 KQ_EXPORT Decision DecideConstant(const Kq_BoolEquation& equation, bool value,
                                   const Limits& limits = Limits());
 

@@ -1,4 +1,4 @@
-// What a function is, in words that engineers use.
+// What a function is, by the name engineers have for it.
 //
 //     kq_logic::Function function;
 //     function.Set(Kq_BoolEquation("S & A | (~S & B) & (C | ~C)"));
@@ -20,14 +20,14 @@ constexpr size_t kMaxExplainedInputs = 16; // more are refused
 
 // What was found.
 struct Explanation {
-    std::string fault;                  // not empty: too many inputs, and nothing else is said
-    std::vector<std::string> mattering; // inputs that change something
-    std::vector<std::string> idle;      // inputs that change nothing
-    std::string kind;                   // "multiplexer", "AND", ...; empty for one without a name
-    std::string text;                   // the kind with its inputs, an inverted one as "~A"
+    std::string fault;                  // too many inputs: all else is empty
+    std::vector<std::string> mattering; // inputs with an effect
+    std::vector<std::string> idle;      // inputs without effect
+    std::string kind;                   // "multiplexer", "AND", ...; empty: no common name
+    std::string text;                   // the kind with its inputs, inverted ones as "~A"
 };
 
-// Fails: fault, for more than kMaxExplainedInputs inputs.
+// Fails: fault, with more than kMaxExplainedInputs inputs.
 KQ_EXPORT Explanation Explain(const Function& function);
 
 } // namespace kq_logic

@@ -1,4 +1,4 @@
-// A Boolean function over named inputs: what is explained, matched, permuted and shortened.
+// A Boolean function over named inputs, to be explained, matched, permuted or shortened.
 //
 //     kq_logic::Function function;
 //     if (!function.Set(Kq_BoolEquation("A & ~B")))
@@ -21,23 +21,24 @@
 
 namespace kq_logic {
 
-constexpr size_t kMaxFunctionInputs = 30; // 128 MB; an equation has no column above
+constexpr size_t kMaxFunctionInputs = 30; // 128 MB
 
-// A value: copies share what nobody changes.
-// Fails: std::bad_alloc, and what a watcher throws (watch.h); otherwise as the members say.
-// Threads: one at a time for all calls of this library: searches share a table, work its watcher.
+// A value; copies share their unchanging data.
+// Fails: std::bad_alloc, whatever a watcher throws (watch.h), and as the members say.
+// Threads: as with the standard containers, here and in all headers of this library: different
+// objects are independent, and const members of one object may run at once.
 class KQ_EXPORT Function {
   public:
     // The constant 0 over no inputs.
     Function();
 
-    // Becomes the function of a set equation over its variables.
-    // Fails: false without an equation or with more than kMaxFunctionInputs variables; the function
-    // is as it was.  Cost: that of the column.
+    // Takes the function of an equation over its variables.
+    // Fails: false, if the equation is empty or has more than kMaxFunctionInputs variables; the
+    // function does not change.  Cost: that of the column.
     bool Set(const Kq_BoolEquation& equation);
-    // Becomes the function whose row k is bit k % 64 of word k / 64.
-    // Fails: false, unless the inputs are all different and the words are as many as their rows
-    // need, one at least, without a bit beyond the last row.
+    // Takes the function whose row k is bit k % 64 of word k / 64.
+    // Fails: false, unless the inputs are all different and there are exactly as many words as the
+    // rows need (at least one), with no bit set beyond the last row.
     bool Set(const std::vector<std::string>& inputs, const std::vector<uint64_t>& words);
 
     // The first one is the most significant bit of a row's number.
@@ -53,11 +54,12 @@ class KQ_EXPORT Function {
     }
     // Whether the input changes any value.  Requires: input < NumInputs().
     bool DependsOn(size_t input) const;
-    // The packed rows, 64 to a word, zeros beyond the last one; as long as this function lives.
+    // The packed rows, 64 to a word, zeros beyond the last row; valid while this function lives.
     const uint64_t* Words() const;
-    size_t NumWords() const; // one at least
+    size_t NumWords() const; // at least one
 
-    // "0x..." and "0b...", the highest row first, zeros kept: init values over these inputs.
+    // Init values over these inputs, "0x..." and "0b...": the highest row first, leading zeros
+    // kept.
     std::string Hex() const;
     std::string Binary() const;
 

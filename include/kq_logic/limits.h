@@ -1,4 +1,4 @@
-// How long a question may take.
+// How long a call may take.
 //
 //     kq_logic::Limits limits;
 //     limits.seconds = 0.5;
@@ -8,7 +8,7 @@
 
 namespace kq_logic {
 
-// Where work ends that is not done.
+// When unfinished work ends.
 struct Limits {
     double seconds = 0; // 0: as long as it takes
 };

@@ -1,4 +1,4 @@
-// Whether two functions are one up to the order of inputs, or up to inversions.
+// Whether two functions are the same up to the order of their inputs, or also up to inversions.
 //
 //     kq_logic::Function first;
 //     kq_logic::Function second;
@@ -19,12 +19,12 @@
 
 namespace kq_logic {
 
-constexpr size_t kMaxMatchedInputs = 16; // that have an effect; more are refused
+constexpr size_t kMaxMatchedInputs = 16; // inputs with an effect; more are refused
 
 // What may differ.
 enum class MatchScope {
-    Order,             // the order of inputs alone
-    OrderAndInversions // and inversions of inputs and of the output
+    Order,             // only the order of the inputs
+    OrderAndInversions // also inversions of inputs and of the output
 };
 
 // second(x) = first(y), inverted if isInverted, where y[sources[k]] is x[k], inverted if
@@ -33,24 +33,22 @@ struct Matching {
     static constexpr unsigned int kIdle = static_cast<unsigned int>(-1); // instead of a source
 
     std::string fault;                 // not empty: too many inputs
-    bool isFound = false;              // what follows says how
-    bool isDecided = true;             // false: the time was up first, and nothing is found
-    std::vector<unsigned int> sources; // of the first function's inputs, one for each of the second
-    std::vector<bool> inverted;        // an input of the second function is taken inverted
-    bool isInverted = false;           // the result is
+    bool isFound = false;              // if so, the other members hold the mapping
+    bool isDecided = true;             // false: time ran out before anything was found
+    std::vector<unsigned int> sources; // for each input of the second function, one of the first
+    std::vector<bool> inverted;        // whether that input is inverted
+    bool isInverted = false;           // whether the output is inverted
 };
 
-// What is found was applied and compared, row by row. A match without inversions is looked for
-// first.
-// Fails: fault, for more than kMaxMatchedInputs inputs with an effect; not decided, where a limit
-// ends it.  Cost: some milliseconds as a rule; functions that are all but alike, without being
-// symmetric, can take as many tries as there are orders.
+// A mapping is applied and compared row by row before it is returned. Matches without inversions
+// are tried first. Fails: fault, with more than kMaxMatchedInputs inputs with an effect; undecided,
+// if the limit ends the search.  Cost: usually some milliseconds; functions that are nearly alike
+// without being symmetric can take as many tries as there are orders.
 KQ_EXPORT Matching Match(const Function& first, const Function& second, MatchScope scope,
                          const Limits& limits = Limits());
 
-// What a matching makes of the first function, over 'inputs'.
-// Requires: it was found for this function and one of as many inputs as there are names, which are
-// all different.
+// The first function after the mapping, over 'inputs'.
+// Requires: a mapping found for this function and one of inputs.size() inputs; different names.
 KQ_EXPORT Function Apply(const Matching& matching, const Function& first,
                          const std::vector<std::string>& inputs);
 

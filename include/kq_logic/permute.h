@@ -1,4 +1,4 @@
-// A function over another order of its inputs, or over more.
+// A function over another order of its inputs, or over additional ones.
 //
 //     kq_logic::Function function;
 //     kq_logic::Function permuted;
@@ -17,10 +17,10 @@
 
 namespace kq_logic {
 
-// 'permuted' becomes the same function over 'inputs', the first the most significant; names that
-// the function does not have become inputs without effect.
-// Fails: not empty, and 'permuted' is as it was, when an input is not listed, stands twice or is
-// not a name, or more than kMaxFunctionInputs are.  Cost: O(inputs * rows / 64).
+// Sets 'permuted' to the same function over 'inputs', the first the most significant; names that
+// the function does not have become inputs without effect. Returns the empty text. Fails: returns
+// what is wrong and leaves 'permuted' alone if an input is not listed, is listed twice or is not a
+// name, or if there are more than kMaxFunctionInputs.  Cost: O(inputs * rows / 64).
 KQ_EXPORT std::string Permute(const Function& function, const std::vector<std::string>& inputs,
                               Function& permuted);
 

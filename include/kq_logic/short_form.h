@@ -18,14 +18,14 @@ constexpr size_t kMaxShortFormInputs = 16; // more are refused
 
 // What was found.
 struct ShortForm {
-    std::string fault;      // not empty: none was found, and why
-    std::string text;       // a text for Kq_BoolEquation, compared with the function row by row
-    size_t numOperands = 0; // how often it mentions inputs
+    std::string fault;      // why none was found; empty if one was
+    std::string text;       // for Kq_BoolEquation; compared with the function row by row
+    size_t numOperands = 0; // how many times it mentions an input
     bool isMinimal = false; // proved: no expression of & | ^ ~ and their negated forms has fewer
 };
 
-// Up to four inputs that matter the shortest there is; with more a search that may miss it.
-// Fails: fault, for more than kMaxShortFormInputs inputs or where no bearable length was found.
+// Up to four inputs with an effect, the shortest expression; with more, the search may miss it.
+// Fails: fault, with more than kMaxShortFormInputs inputs, or if every form found was too long.
 KQ_EXPORT ShortForm FindShortForm(const Function& function);
 
 } // namespace kq_logic

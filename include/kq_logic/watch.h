@@ -1,4 +1,4 @@
-// A way out of long work for whoever embeds it: an interrupt, a deadline.
+// A way to end long work: an interrupt, a deadline.
 //
 //     struct Late {
 //     };
@@ -17,11 +17,11 @@
 
 namespace kq_logic {
 
-// Called every few milliseconds by whatever takes long, for equations of over 100,000 operators
-// less often. It may throw, which ends the work; nothing is left half done.
+// Called every few milliseconds by long work, on the thread that does it (less often for equations
+// of over 100,000 operators). If it throws, the work ends and no object is left half changed.
 typedef void (*Watcher)();
 
-// Null: nobody watches, as at first.
+// Null, as at first: nobody watches.  Threads: at any time; work under way takes the new watcher.
 KQ_EXPORT void SetWatch(Watcher watcher);
 
 } // namespace kq_logic

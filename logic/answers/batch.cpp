@@ -166,7 +166,7 @@ BatchResult CheckNames(const std::vector<std::string>& inputs)
                     "'" + Excerpt(check.illegal.front()) + "' is not a name of an input");
     if (!check.repeated.empty())
         return Fail(BatchOutcome::kTextRefused,
-                    Excerpt(check.repeated.front()) + " stands twice among the inputs");
+                    Excerpt(check.repeated.front()) + " is listed twice among the inputs");
     return {};
 }
 
@@ -207,10 +207,9 @@ BatchResult RowCompleter::Complete(BatchRow& row)
     if (IsBlank(row.equation)) {
         if (IsBlank(row.init))
             return Fail(BatchOutcome::kIncomplete,
-                        "there is neither an equation nor an init value");
+                        "neither an equation nor an init value is given");
         if (row.inputs.empty())
-            return Fail(BatchOutcome::kIncomplete,
-                        "an init value without an equation needs its inputs");
+            return Fail(BatchOutcome::kIncomplete, "an init value needs its inputs");
         return WriteEquation(row, listed);
     }
     Kq_BoolEquation equation;

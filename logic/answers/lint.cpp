@@ -221,14 +221,15 @@ class Linter {
         for (const std::string& name : check.illegal)
             Add("skipped-input", "the listed input " + name + " is not a name and is skipped");
         for (const std::string& name : check.repeated)
-            Add("skipped-input", "the input " + name + " is listed again and counts once");
+            Add("skipped-input", "the input " + name + " is listed twice and counts once");
         const size_t numListed = check.usable.size();
         if (m_expression.names.size() <= numListed)
             return;
         const std::vector<std::string> unlisted(
             m_expression.names.begin() + static_cast<long>(numListed), m_expression.names.end());
         Add("unlisted-input",
-            "inputs that are not listed widen the table after the others: " + Join(unlisted, ", "));
+            "inputs not in --inputs follow the listed ones and widen the table: " +
+                Join(unlisted, ", "));
     }
 
     // Every input at 1 is the last row, which has no digit where some have none.

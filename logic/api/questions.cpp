@@ -72,7 +72,7 @@ ShortForm FindShortForm(const Function& function)
         return result;
     const booleq::ShortForm found = booleq::FindShortForm(FunctionAccess::Of(function));
     if (!found.isFound) {
-        result.fault = "no expression of bearable length was found";
+        result.fault = "no expression short enough was found";
         return result;
     }
     result.text =

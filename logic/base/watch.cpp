@@ -1,11 +1,13 @@
 // Who watches long work.
 #include "watch.h"
 
+#include <atomic>
+
 namespace booleq {
 
 namespace {
 
-Watcher current = nullptr;
+std::atomic<Watcher> current = nullptr;
 thread_local unsigned int numPauses = 0;
 
 } // namespace
@@ -17,8 +19,9 @@ void SetWatch(Watcher watcher)
 
 void Watch()
 {
-    if (current && numPauses == 0)
-        current();
+    const Watcher watcher = current;
+    if (watcher && numPauses == 0)
+        watcher();
 }
 
 WatchPause::WatchPause()

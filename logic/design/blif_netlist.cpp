@@ -118,7 +118,7 @@ class BlifNetlistReader {
             if (m_words.size() < directive.minWords)
                 Refuse(std::string(m_words[0]) + " needs more words");
             if (m_module == nullptr && directive.read != &BlifNetlistReader::ReadModel)
-                Refuse(std::string(m_words[0]) + " stands before the first .model");
+                Refuse(std::string(m_words[0]) + " comes before the first .model");
             (this->*directive.read)();
             return;
         }
@@ -155,7 +155,7 @@ class BlifNetlistReader {
     void ReadModel()
     {
         if (m_module != nullptr)
-            Refuse("the model before has no .end");
+            Refuse("the previous model has no .end");
         m_job.modules.emplace_back();
         m_module = &m_job.modules.back();
         m_intake.EnterModule(*m_module);
@@ -269,7 +269,7 @@ class BlifNetlistReader {
         if (value != "0" && value != "1")
             Refuse("the value of a row is 0 or 1, not " + Quoted(value));
         if (pattern.find_first_not_of("01-") != std::string_view::npos)
-            Refuse("a row has 0, 1 and -, not " + Quoted(pattern));
+            Refuse("expected 0, 1 or -, not " + Quoted(pattern));
         ++m_num_rows;
         m_is_wire = pattern == "1" && value == "1";
         const Rows01 kind = value == "1" ? Rows01::Ones : Rows01::Zeros;
@@ -373,7 +373,7 @@ class BlifNetlistReader {
     void RequireOpen() const
     {
         if (m_open == Open::Nothing)
-            Refuse(std::string(m_words[0]) + " stands before the first cell");
+            Refuse(std::string(m_words[0]) + " comes before the first cell");
     }
 
     void ReadCellName()

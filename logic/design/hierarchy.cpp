@@ -108,8 +108,7 @@ class Layout {
         if (candidates.size() == 1)
             return candidates[0];
         if (candidates.empty())
-            throw ReadFault{
-                "no module can be the top: each one is used by another, or has no cells"};
+            throw ReadFault{"no module can be the top: each is used by another or has no cells"};
         throw ReadFault{"several modules can be the top, " + NameOf(candidates[0]) + " and " +
                         NameOf(candidates[1]) + " among " + std::to_string(candidates.size()) +
                         "; say which one"};
@@ -157,7 +156,7 @@ class Layout {
             throw ReadFault{"module " + NameOf(module) + " contains itself"};
         m_num_items += content.netNames.size() + content.tables.size() + 1;
         if (m_num_items > m_options.maxItems)
-            throw ReadFault{"with its hierarchy laid out the design has more than " +
+            throw ReadFault{"with its hierarchy flattened the design has more than " +
                             std::to_string(m_options.maxItems) + " nets and cells"};
         m_is_on_path[module] = true;
         m_is_reached[module] = true;

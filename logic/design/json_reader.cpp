@@ -33,7 +33,7 @@ class JsonReader {
                 if (key != "modules")
                     continue;
                 if (hasModules)
-                    Refuse("'modules' stands twice");
+                    Refuse("'modules' is given twice");
                 hasModules = true;
                 ReadModules(field.value());
             }
@@ -97,7 +97,7 @@ class JsonReader {
         if (id >= m_section_of.size())
             m_section_of.resize(id + id / 2 + size_t(64), 0);
         if (m_section_of[id] == m_section)
-            Refuse("the name stands twice");
+            Refuse("the name is given twice");
         m_section_of[id] = m_section;
         const std::string_view own = WithoutMark(name);
         return own.size() == name.size() ? id : m_job.design.names.Add(own);
@@ -113,7 +113,7 @@ class JsonReader {
             m_module = &m_job.modules.back();
             m_module->name = m_job.design.names.Add(m_place.module);
             if (!names.emplace(m_module->name, true).second)
-                Refuse("the name stands twice");
+                Refuse("the name is given twice");
             ReadModule(field.value());
         }
         m_place = Place();
@@ -129,7 +129,7 @@ class JsonReader {
         const auto once = [this](bool& isThere, const char* section) {
             EnterSection(section);
             if (isThere)
-                Refuse("the section stands twice");
+                Refuse("the section is given twice");
             isThere = true;
         };
         for (auto field : module.get_object()) {

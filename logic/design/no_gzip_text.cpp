@@ -7,7 +7,7 @@ namespace booleq {
 
 void SourceText::Inflate()
 {
-    throw ReadFault{"it is compressed, and this build has no zlib; uncompress it first (gunzip)"};
+    throw ReadFault{"it is compressed, and this build was made without zlib; run gunzip first"};
 }
 
 } // namespace booleq

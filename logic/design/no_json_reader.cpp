@@ -7,7 +7,7 @@ namespace booleq {
 void ReadYosysJson(const ReadJob&)
 {
     throw ReadFault{
-        "this build cannot read JSON, because simdjson was missing; write BLIF or EDIF"};
+        "this build was made without simdjson and cannot read JSON; write BLIF or EDIF"};
 }
 
 } // namespace booleq

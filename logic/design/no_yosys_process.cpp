@@ -7,7 +7,8 @@ namespace booleq {
 
 void ConvertVerilog(SourceText&, double, SourceText&)
 {
-    throw ReadFault{"Verilog is not read on this system; write the netlist as JSON, BLIF or EDIF"};
+    throw ReadFault{
+        "Verilog cannot be read on this system; write the netlist as JSON, BLIF or EDIF"};
 }
 
 } // namespace booleq

@@ -37,7 +37,7 @@ class WorkFolder {
         const char* place = std::getenv("TMPDIR");
         m_path = std::string(place != nullptr && *place != 0 ? place : "/tmp") + "/booleq.XXXXXX";
         if (mkdtemp(m_path.data()) == nullptr)
-            throw ReadFault{"cannot make a folder for yosys, " + m_path + ": " +
+            throw ReadFault{"cannot make a folder for yosys: " + m_path + ": " +
                             std::strerror(errno)};
     }
     ~WorkFolder()
@@ -151,7 +151,7 @@ void Await(Child& child, double seconds, const WorkFolder& folder)
         Watch();
         const std::chrono::duration<double> passed = std::chrono::steady_clock::now() - start;
         if (passed.count() > seconds)
-            throw ReadFault{"yosys has not read the Verilog text within " +
+            throw ReadFault{"yosys did not read the Verilog text within " +
                             std::to_string(static_cast<uint64_t>(seconds)) + " seconds"};
         const timespec pause = {0, 10000000}; // a hundredth of a second
         nanosleep(&pause, nullptr);

@@ -1,5 +1,7 @@
 #include "expression.h"
 
+#include <cassert>
+
 #include <Kq_BoolEquationImpNode.h>
 
 #include "text.h"
@@ -49,7 +51,7 @@ Operator OperatorOf(LibraryNode::TYPE type)
     return Operator::Zero;
 }
 
-// The first node at or below 'node' that is no group and no init value; null for an empty group.
+// The first node at or below 'node' that is not a group and no init value; null for an empty group.
 const LibraryNode* Inside(const LibraryNode* node)
 {
     while (node && (node->IsLp() || node->GetType() == LibraryNode::TRUTH_TABLE))
@@ -59,6 +61,8 @@ const LibraryNode* Inside(const LibraryNode* node)
 
 uint32_t Add(Expression& expression, Operator op, uint32_t left, uint32_t right)
 {
+    assert(op == Operator::Input || left <= expression.nodes.size());
+    assert(right <= expression.nodes.size()); // post-order: operands come first
     expression.nodes.push_back({op, 0, left, right});
     return static_cast<uint32_t>(expression.nodes.size() - 1);
 }
@@ -72,6 +76,7 @@ void Append(Expression& expression, const LibraryNode* node, std::vector<uint32_
     uint32_t right = 0;
     if (op == Operator::Input)
         left = node->GetValue();
+    assert(operands.size() >= (IsBinary(op) ? 2u : op == Operator::Not ? 1u : 0u));
     if (IsBinary(op)) {
         right = operands.back();
         operands.pop_back();
@@ -135,6 +140,8 @@ Expression ToExpression(const Kq_BoolEquation& equation)
             pending.push_back({Inside(visit.node->GetRightChild()), false});
         pending.push_back({Inside(visit.node->GetLeftChild()), false});
     }
+    assert(operands.size() == 1);
+    assert(operands.back() + 1 == expression.nodes.size());
     return expression;
 }
 
@@ -142,6 +149,7 @@ std::string SpellOperator(Operator op, uint8_t style)
 {
     if (op == Operator::Not)
         return (style & 3u) == 2 ? ".NOT." : (style & kBang ? "!" : "~");
+    assert(IsBinary(op));
     const auto row = static_cast<size_t>(op) - static_cast<size_t>(Operator::And);
     std::string text = kBinarySpellings[row][style & 3u];
     if (style & kBang && text[0] == '~')
@@ -184,6 +192,7 @@ uint64_t EvaluateWord(const Expression& expression, const std::vector<uint64_t>&
         if (node.op >= Operator::Nand)
             value = ~value;
     }
+    assert(stack.size() == 1);
     return stack.back();
 }
 

@@ -193,7 +193,7 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
     problem.off = pla.off;
     // Free is what is neither on nor off, and what is said to be free as long as it is not off.
     if (!FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free)) {
-        fault = {0, "the rows that nothing is said of need too many cubes",
+        fault = {0, "the rows that the table leaves out need too many cubes",
                  "write them with '-' and leave the rows that are 0 out (.type fd)"};
         return false;
     }

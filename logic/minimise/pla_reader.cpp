@@ -191,7 +191,7 @@ class PlaReader {
             if (!seen.insert(name).second)
                 return Fail(m_line,
                             "the " + std::string(what) + " " + Shown(name) + " is named twice",
-                            "give each a name of its own");
+                            "give each its own name");
         return true;
     }
 

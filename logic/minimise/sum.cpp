@@ -157,7 +157,7 @@ bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& f
     if (!ToProblem(table, problem, fault, work))
         return false;
     if (options.isInverted && !problem.hasOff) {
-        fault = {0, "a product of sums needs the rows that are 0 as cubes, and these are too many",
+        fault = {0, "a product of sums needs cubes of the rows that are 0, and there are too many",
                  "ask for a sum of products"};
         return false;
     }

@@ -1,6 +1,7 @@
 #include "foreign_spelling.h"
 
 #include <algorithm>
+#include <cassert>
 #include <cstdint>
 #include <cstring>
 
@@ -44,7 +45,10 @@ std::string Quoted(const std::string& text)
 // The text around the place of a refusal.
 class Place {
   public:
-    Place(const std::string& text, size_t offset) : m_text(text), m_offset(offset) {}
+    Place(const std::string& text, size_t offset) : m_text(text), m_offset(offset)
+    {
+        assert(offset <= text.size());
+    }
 
     bool HasAt(size_t position, const char* wanted) const
     {
@@ -109,7 +113,7 @@ std::string Place::OperatorHint() const
     for (const Spelling& spelling : kOperators)
         for (const size_t back : {size_t(0), size_t(1)})
             if (m_offset >= back && HasAt(m_offset - back, spelling.foreign))
-                return std::string("write '") + spelling.own + "' for '" +
+                return std::string("write '") + spelling.own + "' instead of '" +
                        Visible(spelling.foreign) + "'";
     return std::string();
 }
@@ -135,7 +139,7 @@ std::string Place::WordHint() const
     for (const std::string& word :
          {startsName ? WordAt(m_offset) : "", startsOperand ? WordBefore() : ""})
         if (const Spelling* spelling = FindWord(word))
-            return std::string("write '") + spelling->own + "' for '" + word + "'";
+            return std::string("write '") + spelling->own + "' instead of '" + word + "'";
     return std::string();
 }
 
@@ -145,9 +149,9 @@ std::string Place::ImplicationHint() const
     const std::string left = WordBefore();
     const std::string right = WordAfter(2);
     if (isArrow && !left.empty() && !right.empty())
-        return Excerpt(left + " implies " + right) + " is written (~" + Excerpt(left) + " | " +
-               Excerpt(right) + ")";
-    return isArrow ? "x implies y is written (~x | y)" : "";
+        return "write (~" + Excerpt(left) + " | " + Excerpt(right) + ") for " +
+               Excerpt(left + " implies " + right);
+    return isArrow ? "write (~x | y) for x implies y" : "";
 }
 
 // "6 " for a size of 64 rows, nothing for one that is not a number of rows.
@@ -169,14 +173,14 @@ std::string Place::SizedHint(size_t start, size_t end, const Reading& reading) c
     const bool isBit =
         literal == "1'b0" || literal == "1'b1" || literal == "1'h0" || literal == "1'h1";
     if (isBit)
-        return std::string("write ") + literal.back() + " for " + literal;
+        return std::string("write ") + literal.back() + " instead of " + literal;
     const char base = static_cast<char>(literal[literal.find('\'') + 1] | 0x20);
     if (isWhole && (base == 'd' || base == 'o'))
-        return "an init value is written in hexadecimal ('h) or binary ('b)";
+        return "write an init value in hexadecimal ('h) or binary ('b)";
     if (isWhole && !reading.hasInputs)
-        return "for an init value name its " + NumInputsOf(literal) + "inputs with " +
+        return "to give an init value, list its " + NumInputsOf(literal) + "inputs with " +
                reading.inputsName + ", the most significant first";
-    return "of constants there are 0 and 1 only, without a size";
+    return "the only constants are 0 and 1, without a size";
 }
 
 // "16hcaca", the quote forgotten.
@@ -196,10 +200,9 @@ std::string Place::UnquotedHint(size_t start, size_t end, const Reading& reading
         return std::string();
     const std::string sized =
         m_text.substr(start, base - start) + "'" + m_text.substr(base, end - base);
-    return "an init value with a size has a quote, " + Excerpt(sized) +
-           (reading.hasInputs
-                ? ""
-                : std::string(", and its inputs are named with ") + reading.inputsName);
+    return "write " + Excerpt(sized) +
+           (reading.hasInputs ? ""
+                              : std::string(", and list its inputs with ") + reading.inputsName);
 }
 
 std::string Place::LiteralHint(const Reading& reading) const
@@ -217,7 +220,7 @@ std::string Place::LiteralHint(const Reading& reading) const
         return SizedHint(start, NameEnd(quote + 1), reading);
     if (quote > start + 1 && std::all_of(m_text.begin() + static_cast<long>(start),
                                          m_text.begin() + static_cast<long>(quote), IsDigit))
-        return "of constants there are 0 and 1 only; a name of digits needs single quotes";
+        return "the only constants are 0 and 1; a name made of digits needs single quotes";
     return UnquotedHint(start, end, reading);
 }
 
@@ -242,12 +245,12 @@ std::string Place::DottedHint() const
 std::string Place::OtherHint() const
 {
     if (HasAt(m_offset, ";"))
-        return EndsAfter(1) ? "leave out the ';'"
-                            : "one equation at a time: leave out the ';' and what follows";
+        return EndsAfter(1) ? "remove the ';'"
+                            : "one equation at a time: remove the ';' and what follows";
     if (HasAt(m_offset, "?"))
-        return "'S ? A : B' is written (S & A) | (~S & B)";
+        return "write (S & A) | (~S & B) for S ? A : B";
     if (HasAt(m_offset, "=") || HasAt(m_offset, "<=") || HasAt(m_offset, ":="))
-        return "leave out what is assigned to, up to the '" +
+        return "remove the target of the assignment, up to the '" +
                m_text.substr(m_offset, HasAt(m_offset, "=") ? 1 : 2) + "'";
     return std::string();
 }

@@ -3,6 +3,7 @@
 #include "foreign_tree.h"
 
 #include <algorithm>
+#include <cassert>
 #include <cstring>
 #include <unordered_map>
 
@@ -48,6 +49,8 @@ class Reader {
                 return Refuse("a parenthesis is not closed");
             Release();
         }
+        assert(m_operands.size() == 1);
+        assert(m_operands.back() == m_tree.nodes.size() - 1); // post-order: the root is the last
         return true;
     }
 
@@ -101,12 +104,15 @@ class Reader {
 
     void Add(Meaning meaning, uint32_t left, uint32_t right, const char* text)
     {
+        assert(meaning == Meaning::Input || left <= m_tree.nodes.size());
+        assert(right <= m_tree.nodes.size());
         m_tree.nodes.push_back({meaning, left, right, text});
         m_operands.push_back(static_cast<uint32_t>(m_tree.nodes.size() - 1));
     }
 
     uint32_t TakeOperand()
     {
+        assert(!m_operands.empty());
         const uint32_t operand = m_operands.back();
         m_operands.pop_back();
         return operand;
@@ -114,7 +120,9 @@ class Reader {
 
     void Release()
     {
+        assert(!m_waiting.empty());
         const Waiting waiting = m_waiting.back();
+        assert(waiting.form); // an open parenthesis has nothing to release
         m_waiting.pop_back();
         const uint32_t right = TakeOperand();
         if (waiting.isPrefix)
@@ -163,12 +171,12 @@ bool Reader::ReadOperand()
 bool Reader::ReadPrefix(const OperatorForm& form)
 {
     if (form.meaning == Meaning::Foreign)
-        return Refuse(InQuotes(form.text) + " in front of an operand works on a vector there");
+        return Refuse(InQuotes(form.text) + " before an operand is a reduction of a vector there");
     const OperatorForm* before = m_waiting.empty() ? nullptr : m_waiting.back().form;
     if (before && before->level > form.level)
         return Refuse(InQuotes(form.text) + " may not follow " + InQuotes(before->text) + " there");
     if (before && m_waiting.back().isPrefix && !m_notation.prefixesNest)
-        return Refuse(InQuotes(form.text) + " may not stand twice there without parentheses");
+        return Refuse(InQuotes(form.text) + " cannot be repeated there without parentheses");
     m_waiting.push_back({&form, true});
     m_position += std::strlen(form.text);
     return true;
@@ -196,7 +204,7 @@ bool Reader::ReadConstant(bool& isThere)
         (!IsNameCharacter(m_text[m_position + 1]) && m_text[m_position + 1] != '\'');
     if (m_notation.values != Values::Vector || character > '1' || !isLone)
         return Refuse("the number at character " + std::to_string(m_position + 1) +
-                      " is no bit there");
+                      " is not a bit there");
     Add(character == '0' ? Meaning::WideZero : Meaning::WideOne, 0, 0, nullptr);
     isThere = true;
     ++m_position;
@@ -223,7 +231,7 @@ bool Reader::ReadName()
     while (m_position < m_text.size() && IsNameCharacter(m_text[m_position]))
         ++m_position;
     if (m_position == start)
-        return Refuse(Here() + " is no operand there");
+        return Refuse(Here() + " is not an operand there");
     const std::string name = m_text.substr(start, m_position - start);
     if (!IsPlain(m_notation, name))
         return Refuse(InQuotes(name) + " is not a name there");
@@ -287,6 +295,7 @@ bool Reader::ReadBinary(const OperatorForm& form)
 
 bool Reader::ReadClosing()
 {
+    assert(!m_wants_operand);
     while (!m_waiting.empty() && m_waiting.back().form)
         Release();
     if (m_waiting.empty())
@@ -334,6 +343,8 @@ std::string WriteWhole(const ForeignTree& tree, const std::vector<std::string>& 
         const char* text;
         uint32_t node;
     };
+    assert(!tree.nodes.empty());
+    assert(names.size() >= tree.names.size());
     std::string text;
     std::vector<Piece> pending = {{nullptr, static_cast<uint32_t>(tree.nodes.size() - 1)}};
     while (!pending.empty()) {

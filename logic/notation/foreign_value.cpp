@@ -100,6 +100,7 @@ std::vector<uint64_t> MasksOf(const ForeignTree& tree)
         return std::vector<uint64_t>(tree.nodes.size(), kIntMask);
     const std::vector<bool> isWide = FindWide(tree);
     const auto maskOf = [](bool wide) { return wide ? kNumberMask : kBitMask; };
+    assert(!tree.nodes.empty());
     std::vector<uint64_t> masks(tree.nodes.size());
     masks.back() = maskOf(isWide.back());
     for (size_t node = masks.size(); node-- > 0;) {
@@ -205,6 +206,7 @@ class GateMachine {
                 value = Binary(node.meaning, values.back(), value);
                 values.pop_back();
             }
+            assert(value.size() <= width);
             value.resize(width, kFalseEdge);
             if (node.meaning == Meaning::BitNot || IsNegatedBinary(node.meaning))
                 for (Edge& bit : value)
@@ -303,6 +305,7 @@ bool ToExpression(const ForeignTree& tree, Expression& expression)
     expression.names = tree.names;
     for (const ForeignTree::Node& node : tree.nodes)
         expression.nodes.push_back({OperatorOf(node.meaning), 0, node.left, node.right});
+    assert(!expression.nodes.empty());
     return true;
 }
 

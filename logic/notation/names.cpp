@@ -1,5 +1,8 @@
 #include "names.h"
 
+#include <algorithm>
+#include <cassert>
+
 #include "foreign_tree.h"
 
 namespace booleq {
@@ -79,6 +82,8 @@ std::vector<std::string> TargetNamer::NameInputs(const std::vector<std::string>&
     for (size_t input = 0; input < inputs.size(); ++input)
         if (names[input].empty())
             names[input] = Spell(Content(inputs[input]));
+    assert(std::none_of(names.begin(), names.end(),
+                        [](const std::string& name) { return name.empty(); }));
     return names;
 }
 

@@ -1,6 +1,7 @@
 #include "notation_writer.h"
 
 #include <algorithm>
+#include <cassert>
 #include <iterator>
 
 namespace booleq {
@@ -50,6 +51,7 @@ class ForeignSyntax : public Syntax {
             return {text.size() > 1 ? text + " " : text, form.level, form.chain};
         }
         const OperatorForm* form = Find(node.op);
+        assert(form);
         if (m_notation.mixesInParentheses)
             return {std::string(" ") + form->text + " ", 1, Chain::Same};
         return {std::string(" ") + form->text + " ", form->level, form->chain};
@@ -121,6 +123,7 @@ Operator Inner(Operator op)
         return Operator::And;
     if (op == Operator::Nor)
         return Operator::Or;
+    assert(op == Operator::Nxor);
     return Operator::Xor;
 }
 
@@ -144,6 +147,7 @@ class Writer {
             else
                 m_text += piece.text;
         }
+        assert(!m_text.empty());
         return m_text;
     }
 
@@ -207,6 +211,7 @@ class Writer {
     // Pieces are pushed from the last to the first.
     void Expand(const Expression::Node& node)
     {
+        assert(!IsBinary(node.op) || (node.left < m_nodes.size() && node.right < m_nodes.size()));
         const Form form = FormOf(node);
         if (IsInversion(node)) {
             Expression::Node operand = node;

@@ -1,6 +1,7 @@
 #include "refusal.h"
 
 #include <algorithm>
+#include <cassert>
 #include <cstring>
 
 #include "foreign_spelling.h"
@@ -36,7 +37,11 @@ std::string Quoted(const std::string& text)
 // The refused text around its place.
 class Context {
   public:
-    Context(const std::string& text, const Refusal& refusal) : m_text(text), m_refusal(refusal) {}
+    Context(const std::string& text, const Refusal& refusal) : m_text(text), m_refusal(refusal)
+    {
+        assert(refusal.offset <= text.size());
+        assert(refusal.length <= text.size() - refusal.offset);
+    }
 
     std::string Token() const { return m_text.substr(m_refusal.offset, m_refusal.length); }
     // The character so far after the token's first one, NUL outside the text.
@@ -87,13 +92,13 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
     }
     report.reason = Quoted(context.Token()) + " is not part of the syntax";
     if (character >= '2' && character <= '9')
-        report.reason =
-            Quoted(context.Token()) + " is not a constant, 0 and 1 are, and no name begins with it";
+        report.reason = Quoted(context.Token()) +
+                        " is not a constant (0 and 1 are), and no name begins with a digit";
     const std::string name = context.WholeName();
     const bool hasLetter = std::any_of(name.begin(), name.end(), IsNamePart);
     const bool isNumber = name.find_first_not_of("0123456789") == std::string::npos;
     if (isNumber && !name.empty())
-        report.hint = "of constants there are 0 and 1 only; a name of digits needs single quotes";
+        report.hint = "the only constants are 0 and 1; a name made of digits needs single quotes";
     else if (!hasLetter && IsPrintable(name))
         report.hint = "the operators are & | ^ ~ and ~& ~| ~^; a name with such a character needs "
                       "single quotes";
@@ -110,7 +115,7 @@ void ExplainWord(const Context& context, RefusalReport& report)
 {
     const std::string word = context.Token();
     if (word.size() == 1) {
-        report.reason = std::string("the '.' has no second '.'; ") + kWords;
+        report.reason = std::string("nothing closes this '.'; ") + kWords;
         report.hint = "a name with a '.' needs single quotes";
         return;
     }
@@ -129,17 +134,17 @@ void ExplainOperand(const Context& context, const std::string& text, const Readi
                     RefusalReport& report)
 {
     const std::string token = context.Token();
-    report.reason = Quoted(token) + " stands where an operator must: it follows an operand";
+    report.reason = "expected an operator before " + Quoted(token);
     const bool looksLikeInit = text.size() > 2 && text[0] == '0' && IsOneOf("xXbB", text[1]) &&
                                report.offset == 1 && !reading.hasInputs;
     const char behindNegation = context.OperatorBehindNegation();
     if (looksLikeInit)
-        report.hint = std::string("for an init value name its inputs with ") + reading.inputsName +
-                      ", the most significant first";
+        report.hint = std::string("to give an init value, list its inputs with ") +
+                      reading.inputsName + ", the most significant first";
     else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
         report.hint = "write '" + token + behindNegation + "' without a blank in it";
     else if (token[0] == '\'' && !context.NameBefore().empty())
-        report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+        report.hint = "write ~" + context.NameBefore() + " for not " + context.NameBefore();
     else
         report.hint = "put an operator before it, & or |";
 }
@@ -149,7 +154,7 @@ void ExplainOperator(const Context& context, const char* side, RefusalReport& re
     const std::string token = context.Token();
     report.reason = "the operator " + Quoted(token) + " has no operand on its " + side;
     if (token.size() == 1 && context.At(1) == token[0])
-        report.hint = "write '" + token + "' for '" + token + token + "'";
+        report.hint = "write '" + token + "' instead of '" + token + token + "'";
 }
 
 void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalReport& report)
@@ -157,7 +162,7 @@ void ExplainInitWidth(const std::string& text, const Reading& reading, RefusalRe
     const InitWidth width = WidthOfInit(text);
     const size_t numGiven = CheckInputs(reading.inputs).usable.size();
     report.reason = std::to_string(text.size() - 2) + (width.isHex ? " hexadecimal" : " binary") +
-                    (text.size() == 3 ? " digit is" : " digits are") + " read over exactly " +
+                    (text.size() == 3 ? " digit needs" : " digits need") + " exactly " +
                     std::to_string(width.numInputs) +
                     (width.numInputs == 1 ? " input" : " inputs") + ", and " +
                     std::to_string(numGiven) + (numGiven == 1 ? " is listed" : " are listed");
@@ -171,10 +176,10 @@ void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& rep
     case Refusal::PAREN:
         if (context.At(0) == '(') {
             report.reason = "nothing closes this '('";
-            report.hint = "add a ')' after the group, or leave it out";
+            report.hint = "add a ')' after the group, or remove this '('";
         } else {
-            report.reason = "this ')' closes no '('";
-            report.hint = "leave it out, or add a '(' before the group";
+            report.reason = "no '(' matches this ')'";
+            report.hint = "remove it, or add a '(' before the group";
         }
         return;
     case Refusal::NO_OPERAND:
@@ -182,7 +187,7 @@ void ExplainBuild(const Context& context, Refusal::CODE code, RefusalReport& rep
         return;
     case Refusal::NEGATED_OPERATOR:
         report.reason = "the negation " + Quoted(context.Token()) +
-                        " stands before an operator and has no single operand before it to take";
+                        " comes before an operator and has no single operand before it";
         return;
     default:
         return;
@@ -234,9 +239,9 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
     case Refusal::QUOTE:
         report.reason = "nothing closes this quote";
         if (!context.NameBefore().empty())
-            report.hint = "not-" + context.NameBefore() + " is written ~" + context.NameBefore();
+            report.hint = "write ~" + context.NameBefore() + " for not " + context.NameBefore();
         else if (context.Before() == ')')
-            report.hint = "the negation of a group stands before it: ~( )";
+            report.hint = "write the negation of a group before it: ~( )";
         return;
     case Refusal::OPERAND:
         return ExplainOperand(context, text, reading, report);
@@ -252,7 +257,7 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
         if (refusal.offset == 1) {
             report.reason = "with listed inputs a text that begins with 0 is an init value, 0x... "
                             "or 0b...";
-            report.hint = "put an expression that begins so in parentheses";
+            report.hint = "put parentheses around an expression that begins with 0";
             return;
         }
         report.reason = Quoted(context.Token()) + " is not a " +
@@ -261,8 +266,8 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
     case Refusal::INIT_WIDTH:
         return ExplainInitWidth(text, reading, report);
     case Refusal::INIT_NAME:
-        report.reason = "an input's name has more after its second quote, and no init value can be "
-                        "read over it";
+        report.reason = "an input's name goes on after its second quote; no init value can be "
+                        "read over such a name";
         return;
     }
 }
@@ -321,6 +326,7 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
     report.offset = refusal.offset;
     report.length = refusal.length;
     ExplainCode(text, reading, refusal, report);
+    assert((refusal.code == Refusal::NONE) == report.reason.empty());
     if (MayBeForeign(refusal.code)) {
         const std::string hint = HintForForeign(text, refusal.offset, reading);
         // A word between dots that this library has in capital letters is not part of a name.
@@ -333,6 +339,7 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
 std::string MarkPlace(const std::string& text, size_t offset, size_t length,
                       const std::string& indent)
 {
+    assert(offset <= text.size());
     constexpr size_t kBefore = 40;
     constexpr size_t kShown = 60;
     const size_t lineFeed = offset == 0 ? std::string::npos : text.rfind('\n', offset - 1);

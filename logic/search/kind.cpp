@@ -51,7 +51,7 @@ class Explainer {
         return result;
     }
 
-    // Fails: false for a function that is no single literal.
+    // Fails: false for a function that is not a single literal.
     bool AsLiteral(const Rows& rows, unsigned int& input, std::string& literal) const
     {
         const std::vector<unsigned int> support = Support(rows);

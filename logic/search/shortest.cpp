@@ -104,7 +104,7 @@ class ShortestTable {
     {
         if (rightWeight < leftWeight || rightWeight >= m_by_weight.size())
             return;
-        // The last list grows, but it is no operand's: operands weigh less.
+        // The last list grows, but it is not an operand's: operands weigh less.
         for (const Column left : m_by_weight[leftWeight]) {
             Watch();
             for (const Column right : m_by_weight[rightWeight]) {

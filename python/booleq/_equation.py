@@ -63,7 +63,7 @@ class Equation(_booleq.Core):
     >>> Equation("A && B")
     Traceback (most recent call last):
         ...
-    booleq.ParseError: refused at character 3: the operator '&' has no operand on its right; write '&' for '&&'
+    booleq.ParseError: refused at character 3: the operator '&' has no operand on its right; write '&' instead of '&&'
 
     Equations are equal when their texts are, however operators are spelled, over the same inputs in
     the same order; so equal ones have equal init values. Whether two are one function is

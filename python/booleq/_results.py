@@ -86,7 +86,7 @@ class ParseError(ValueError):
     ...     Equation("A && B")
     ... except ParseError as error:
     ...     print(error.offset, error.length, error.code, error.hint, sep="; ")
-    2; 1; no-right-operand; write '&' for '&&'
+    2; 1; no-right-operand; write '&' instead of '&&'
     """
 
     def __init__(self, message: str, text: str, offset: int, length: int, code: str, reason: str,

@@ -30,7 +30,7 @@ py::str RequireStr(const py::handle& value, const char* what);
 // Fails: TypeError that begins with 'what'.
 bool RequireFlag(const py::handle& value, const char* what);
 // The names of an iterable.  Fails: TypeError for a str, which would be taken letter by letter, for
-// what is no iterable, and for an element that is no str.
+// what is not an iterable, and for an element that is not a str.
 py::tuple RequireNames(const py::object& names);
 std::vector<std::string> EncodeAll(const py::tuple& names);
 

@@ -150,7 +150,7 @@ class TestTables:
         bits = [int(packed[row // 64]) >> row % 64 & 1 for row in range(2 ** num_inputs)]
         assert bits == results.tolist()
 
-    def test_rows_behind_the_last_are_0(self) -> None:
+    def test_rows_after_the_last_are_0(self) -> None:
         assert Equation("A | ~A").packed_column().tolist() == [3]
 
     def test_without_inputs_there_is_one_row(self) -> None:

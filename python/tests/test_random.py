@@ -241,7 +241,7 @@ def arrays_of(rows: npt.NDArray[np.uint8], kind: str) -> List[npt.NDArray[Any]]:
     backwards = np.ascontiguousarray(array[::-1, ::-1])[::-1, ::-1]
     item = array.dtype.itemsize
     shifted: npt.NDArray[Any] = np.ndarray(array.shape, kind, bytearray(array.nbytes + item + 1), offset=1)
-    shifted[...] = array  # at an address that is no multiple of anything
+    shifted[...] = array  # at an address that is not a multiple of anything
     frozen = array.copy()
     frozen.flags.writeable = False
     record = np.zeros(num_rows, dtype=[("a", "u1"), ("row", kind, (num_columns,))])

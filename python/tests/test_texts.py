@@ -131,9 +131,9 @@ class TestRefusals:
         assert (error.offset, error.length) == (2, 1)
         assert error.code == "no-right-operand"
         assert error.reason == "the operator '&' has no operand on its right"
-        assert error.hint == "write '&' for '&&'"
+        assert error.hint == "write '&' instead of '&&'"
         assert str(error) == ("refused at character 3: the operator '&' has no operand on its "
-                              "right; write '&' for '&&'")
+                              "right; write '&' instead of '&&'")
 
     @pytest.mark.parametrize("text, inputs, code, offset, length", [
         ("", None, "empty", 0, 0),

@@ -48,7 +48,7 @@ class Binary(NamedTuple):
 
 
 class Behind(NamedTuple):
-    """X ~ op Y op2 Z, with a blank behind the negation: the negation of ((X op Y) op2 Z)."""
+    """X ~ op Y op2 Z, with a blank after the negation: the negation of ((X op Y) op2 Z)."""
 
     first: Name
     rest: Tuple[Tuple[str, Any], ...]

@@ -101,7 +101,7 @@ TEST(JsonReader, WhatIsWrongIsSaidWithItsPlace)
     EXPECT_EQ(FaultOf(Replaced(kJson, "[5, 3]", "[5, 3.5]")).substr(0, 13), "test: line 14");
     EXPECT_NE(FaultOf(Replaced(kJson, "[5, 3]", "[5, \"2\"]")).find("module 'top', cell 's0', 'p'"),
               std::string::npos);
-    EXPECT_NE(FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name stands twice"),
+    EXPECT_NE(FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name is given twice"),
               std::string::npos);
     EXPECT_NE(FaultOf(Replaced(kJson, "\"sub\": {\"attr", "\"top\": {\"attr")).find("twice"),
               std::string::npos);
@@ -320,18 +320,18 @@ TEST(BlifReader, WhatIsWrongIsSaidWithItsLine)
     EXPECT_EQ(FaultOf(Replaced(kBlif, "--1 1", "-1 1")),
               "test: line 11: a row of this table has 3 inputs and a value");
     EXPECT_EQ(FaultOf(Replaced(kBlif, "--1 1", "-a1 1")),
-              "test: line 11: a row has 0, 1 and -, not '-a1'");
+              "test: line 11: expected 0, 1 or -, not '-a1'");
     EXPECT_EQ(FaultOf(Replaced(kBlif, ".latch", ".what")), "test: line 22: '.what' is not known");
     EXPECT_EQ(FaultOf(Replaced(kBlif, "I0=a", "a")),
               "test: line 18: expected PIN=NET instead of 'a'");
     EXPECT_EQ(FaultOf(Replaced(kBlif, ".model sub", ".model top")),
               "test: line 24: there are two models 'top'");
     EXPECT_EQ(FaultOf(Replaced(kBlif, "q re c 2\n.end", "q re c 2")),
-              "test: line 23: the model before has no .end");
+              "test: line 23: the previous model has no .end");
     EXPECT_EQ(FaultOf(".model m\n.inputs a\n"),
               "test: line 2: the text ends within model 'm', without .end");
     EXPECT_EQ(FaultOf(".names a b\n1 1\n.end\n"),
-              "test: line 1: .names stands before the first .model");
+              "test: line 1: .names comes before the first .model");
 }
 
 TEST(BlifReader, MixedAndWideTablesAreNotRead)

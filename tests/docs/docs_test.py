@@ -43,7 +43,7 @@ class Documentation(unittest.TestCase):
             stream.write(text)
 
     def add_members(self, text):
-        """Puts members in front of Dbg of the facade, behind a blank line."""
+        """Puts members in front of Dbg of the facade, after a blank line."""
         path = self.copy / HEADER
         header = path.read_text(encoding="utf-8")
         comment = header.index("    // Writes everything about the equation")

@@ -33,7 +33,7 @@ library   LEFT:
 library   NODE: TOP.L parent=TOP. type=AND token=& val=0
 library   LEFT:
 library     NODE: TOP.LL parent=TOP.L type=ID token=door_closed val=0
-error   press.rules:7: column 28: '[' is no part of the syntax; a name with other characters than \
+error   press.rules:7: column 28: '[' is not part of the syntax; a name with other characters than \
 letters, digits and '_' is written between single quotes
           door_closed & oil[0]
                            ^

@@ -182,7 +182,7 @@ class Example:
 
 
 FRAME = ".model m\n.inputs a b\n.outputs y\n%s.end\n"
-# A netlist, and what is said about it behind "bad.blif"; equations are "y = a & b".
+# A netlist, and what is said about it after "bad.blif"; equations are "y = a & b".
 MALFORMED = [
     ("", ":1: there is no .model; is this a BLIF file?"),
     (FRAME % ".names a b y\n11 1\n0 1\n",
@@ -219,12 +219,12 @@ MALFORMED = [
     (FRAME % (".names " + " ".join(f"i{number}" for number in range(17)) + " y\n"),
      ":4: y has 17 inputs, more than 16; map the design to look-up tables first"),
 ]
-# Lines of equations for a netlist of y = a & b, and what is said behind "bad.eqn".
+# Lines of equations for a netlist of y = a & b, and what is said after "bad.eqn".
 MALFORMED_EQUATIONS = [
     ("y a & b\n", ":1: there is no '='; write NAME = EQUATION"),
     ("\n# c\n = a & b\n", ":3: there is no name before '='; write NAME = EQUATION"),
     ("y = a && b\n", ":1:7: operator '&' has nothing on its right"),
-    ("y = a[0]\n", ":1:6: '[' is no part of the syntax; a name with other characters than letters,"
+    ("y = a[0]\n", ":1:6: '[' is not part of the syntax; a name with other characters than letters,"
      " digits and '_' is written between single quotes"),
     ("y = (a & b\n", ":1:5: '(' has no partner"),
     ("y =\n", ":1:4: there is no equation"),

@@ -215,25 +215,6 @@ void Kq_BoolEquation::Use() { HostCall(); }
         self.assertIn("run-time initialiser", output)
 
 
-class Headers(InCopy):
-    def check(self, text):
-        header = self.copy / "header.h"
-        header.write_text(text)
-        return run(sys.executable, ROOT / "scripts/check_headers.py", "--compiler", COMPILER, "--",
-                   header)
-
-    def test_good_header(self):
-        self.assertEqual(self.check("#ifndef A\n#define A\n#include <vector>\n"
-                                    "inline std::vector<int> F() { return {}; }\n#endif\n"),
-                         (0, "1 of 1 headers compile alone\n"))
-
-    def test_missing_include(self):
-        self.assertEqual(self.check("#ifndef A\n#define A\nstd::vector<int> F();\n#endif\n")[0], 1)
-
-    def test_missing_guard(self):
-        self.assertEqual(self.check("struct Twice {};\n")[0], 1)
-
-
 class Version(InCopy):
     CHANGELOG = "## [Unreleased]\n\n## [1.2.3] - 2026-01-31\n\n## [1.2.2] - 2026-01-30\n"
     PROJECT = "project(Example VERSION 1.2.3 LANGUAGES CXX)\n"

@@ -158,7 +158,7 @@ TEST(Reader, RefusesWhatTheNotationHasNot)
     EXPECT_EQ(Seen(VhdlNotation(), "a nand b nand c"),
               "\"nand\" and \"nand\" need parentheses there");
     EXPECT_EQ(Seen(VerilogNotation(), "~~a"),
-              "\"~\" may not stand twice there without parentheses");
+              "\"~\" cannot be repeated there without parentheses");
     EXPECT_EQ(Seen(PythonNotation(), "a == not b"), "\"not\" may not follow \"==\" there");
 }
 

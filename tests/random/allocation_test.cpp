@@ -40,7 +40,7 @@ void Use(Objects& objects)
         equation->GetEquation(true);
         equation->GetEquationAlt2(false);
         equation->GetVariable("B");
-        // A failure may leave variables behind; a table of many of them is no test of safety.
+        // A failure may leave variables behind; a table of many of them is not a test of safety.
         if (equation->GetNumVariables() <= 6) {
             equation->GetEquationAsHexInitValue(false);
             equation->GetTruthTable().GetRows();

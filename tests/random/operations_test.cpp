@@ -30,7 +30,7 @@ void UseEquation(Kq_BoolEquation& equation, const char* newName)
     equation.Eval();
     equation.GetEquation(true);
     equation.GetVariableHandle("B");
-    // A failure may leave variables behind; a table of many of them is no test of safety.
+    // A failure may leave variables behind; a table of many of them is not a test of safety.
     if (equation.GetNumVariables() <= 8) {
         equation.GetEquationAsBinaryInitValue();
         EXPECT_EQ(equation.GetTruthTable().GetRows().size(),

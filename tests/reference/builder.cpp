@@ -119,7 +119,7 @@ void Builder::TakePlaceOf(int node, int highest)
     HangUnder(highest, node);
 }
 
-// 'ancestor' is no operator: an open group, or in a doomed text some operand with children.
+// 'ancestor' is not an operator: an open group, or in a doomed text some operand with children.
 bool Builder::InsertBelow(int node, int ancestor)
 {
     if (At(ancestor).left == m_cursor) {

@@ -11,7 +11,7 @@ std::string HexDigit(unsigned int digit, bool upperCase)
     return std::string(1, (upperCase ? "0123456789ABCDEF" : "0123456789abcdef")[digit]);
 }
 
-// "0x8" to "0b1000"; empty for a character that is no digit.
+// "0x8" to "0b1000"; empty for a character that is not a digit.
 std::string HexToBinary(const std::string& text)
 {
     const std::string lower = "0123456789abcdef";

@@ -156,7 +156,7 @@ TEST(Column, MissingTreeIsZeroAndForeignVariablesAreZero)
     EXPECT_EQ(0u, word);
     const Engine engine = MakeEngine("x0 | x3", 4);
     KqColumn(engine.GetRoot(), 2).Fill(0, 1, &word);
-    EXPECT_EQ(0xccccccccccccccccu, word) << "x3 is no variable of two";
+    EXPECT_EQ(0xccccccccccccccccu, word) << "x3 is not a variable of two";
 }
 
 TEST(Column, PiecesInAnyOrderAreThoseOfTheWhole)

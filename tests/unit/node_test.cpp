@@ -163,7 +163,7 @@ TEST(Node, TopParentEndsInACircle)
         nodes.back().SetParent(&nodes[target]);
         EXPECT_EQ(&nodes.back(), nodes[0].GetTopParent()) << target;
     }
-    // A circle of true links is no tree; the walk ends all the same.
+    // A circle of true links is not a tree; the walk ends all the same.
     nodes.back().SetParent(&nodes[0]);
     nodes[0].SetRightChild(&nodes.back());
     EXPECT_NE(nullptr, nodes[0].GetTopParent());

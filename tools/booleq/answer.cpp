@@ -114,7 +114,7 @@ bool SetFunction(const Text& text, const Request& request, Output& output,
 void RefuseTwoFormats(const Request& request, const std::string& option)
 {
     if (request.json && request.Has(option))
-        throw UsageError("--json and " + option + " are two formats: give one");
+        throw UsageError("--json and " + option + " are two formats; give only one");
 }
 
 void Refuse(const Text& text, const Request& request, Output& output, const std::string& reason)

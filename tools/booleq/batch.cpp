@@ -195,7 +195,7 @@ class Answers {
     int Finish(bool hasTable)
     {
         if (!hasTable)
-            Complain(m_output, "warning: there is no table: no line but empty ones");
+            Complain(m_output, "warning: the table is empty");
         Complain(m_output, Summary(m_counts));
         return m_status;
     }
@@ -259,7 +259,7 @@ void RunTogether(const Request& request, unsigned int numJobs, TableReader& read
 int RunBatch(const Request& request, Output& output)
 {
     if (request.reading.hasInputs)
-        throw UsageError("--inputs has no meaning here: the table's column inputs gives them");
+        throw UsageError("--inputs does not apply: the table has a column inputs");
     const unsigned int numJobs = ParseJobs(request);
     TableReader reader(request, output);
     Answers answers(request, output);
@@ -280,14 +280,14 @@ Command BatchCommand()
         1,
         1,
         "Fill in and verify a table of functions",
-        "FILE is CSV, whose first line names the columns inputs, equation and init in any order\n"
-        "among others, or JSON lines with these members; - is standard input. What is missing is\n"
-        "filled in, what is given compared, and each row comes out again, in order, with a column\n"
-        "result: ok, filled, differs, incomplete or refused. The reasons go to standard error\n"
-        "with their lines. A row of CSV is one line. Status: 0 all rows agree, 1 some differ or\n"
-        "are incomplete, 3 some were refused.\n",
-        {{"--format", "csv|jsonl", "What FILE is (by its first character, { is JSON lines)"},
-         {"--jobs", "N", "Work on N rows at once (as many as there are processors)"}},
+        "FILE is a CSV table whose first line names the columns (inputs, equation and init, in\n"
+        "any order, among others), or JSON lines with these members; - is standard input. Missing\n"
+        "values are filled in, given ones are compared, and every row is written out again, in\n"
+        "order, with a column result: ok, filled, differs, incomplete or refused. Standard error\n"
+        "gives the reasons, by line. A quoted CSV field may not contain a line break. Status 0:\n"
+        "all rows agree, 1: some differ or are incomplete, 3: some were refused.\n",
+        {{"--format", "csv|jsonl", "Format of FILE (guessed: JSON lines begin with {)"},
+         {"--jobs", "N", "Use N threads (one per processor)"}},
         {"booleq batch functions.csv > complete.csv", "booleq batch - < functions.jsonl"},
         RunBatch};
 }

@@ -42,9 +42,9 @@ Command CheckCommand()
         "EQUATION",
         1,
         1,
-        "Tell whether a text is accepted, and where and why not",
-        "A refusal, here and in all commands, marks the place, gives the reason and, where the\n"
-        "text shows what was meant, the hint. Status 0: accepted, 3: refused.\n",
+        "Tell whether a text is accepted; if not, where and why",
+        "Every command refuses a text in the same way: it marks the place, gives the reason and,\n"
+        "if the text shows what was meant, a hint. Status 0: accepted, 3: refused.\n",
         {},
         {"booleq check 'A && B'", "booleq check \"A'\"", "booleq check --file equations.txt"},
         RunCheck};

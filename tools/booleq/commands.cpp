@@ -8,17 +8,17 @@ namespace booleq {
 const std::vector<Option>& CommonOptions(bool takesFiles)
 {
     static const std::vector<Option> options = {
-        {"--inputs", "A,B,C", "The inputs, most significant first; 'a,b' in quotes is one name"},
-        {"--lsb-first", nullptr, "Init value: its first input is bit 0 of the row number"},
-        {"--reverse", nullptr, "Init value: take --inputs from the last to the first"},
-        {"--file", "FILE", "Take each line of FILE for the equation; - is standard input"},
-        {"--line-buffered", nullptr, "Let each answer out at once, not in blocks"},
-        {"--json", nullptr, "Answer with one JSON object on a line for each equation"},
-        {"--debug", nullptr, "Let the library's diagnostics go to standard error"},
+        {"--inputs", "A,B,C", "The inputs, most significant first; a quoted 'a,b' is one name"},
+        {"--lsb-first", nullptr, "Read an init value with its first input as bit 0 of the row"},
+        {"--reverse", nullptr, "Read an init value with --inputs from last to first"},
+        {"--file", "FILE", "Answer each line of FILE; - is standard input"},
+        {"--line-buffered", nullptr, "Write each answer at once, not in blocks"},
+        {"--json", nullptr, "Answer each equation with one line of JSON"},
+        {"--debug", nullptr, "Print the library's diagnostics on standard error"},
     };
     static const std::vector<Option> fileOptions = {
-        {"--json", nullptr, "Answer with JSON, an object on a line"},
-        {"--debug", nullptr, "Let the library's diagnostics go to standard error"},
+        {"--json", nullptr, "Answer with one line of JSON"},
+        {"--debug", nullptr, "Print the library's diagnostics on standard error"},
     };
     return takesFiles ? fileOptions : options;
 }

@@ -35,7 +35,7 @@ std::string ParseUnit(const Request& request, const Target& target)
     if (!request.Has("--unit") && !request.Has("--name"))
         return std::string();
     if (target.wrapping == Wrapping::Never)
-        throw UsageError("--unit and --name are for other targets: --to " + request.Get("--to") +
+        throw UsageError("--unit and --name do not apply: --to " + request.Get("--to") +
                          " has no modules");
     const bool isWord = !name.empty() && name.find_first_not_of("abcdefghijklmnopqrstuvwxyz"
                                                                 "ABCDEFGHIJKLMNOPQRSTUVWXYZ"
@@ -44,8 +44,9 @@ std::string ParseUnit(const Request& request, const Target& target)
     const bool isVhdlName =
         name.find("__") == std::string::npos && (name.empty() || name.back() != '_');
     if (request.Has("--name") && !(isWord && startsWell && isVhdlName))
-        throw UsageError("--name takes letters, digits and single '_', a letter first, not '" +
-                         Visible(name) + "'");
+        throw UsageError(
+            "--name takes letters, digits and single '_', beginning with a letter, not '" +
+            Visible(name) + "'");
     return name.empty() ? "f" : name;
 }
 
@@ -139,15 +140,16 @@ Command ConvertCommand()
         1,
         "Write an equation in another notation, with the parentheses it needs there",
         "Targets: primary (each operator as typed), alt1 (& | ^), alt2 (* + @), alt3 (.AND.),\n"
-        "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the\n"
-        "files blif, pla and eqn. Names that a target cannot spell are escaped or changed, and\n"
-        "the answer says how. Before it is printed the text is read again and compared; where\n"
-        "that takes over 10 seconds, or what --seconds says, a warning says so, and the status is\n"
-        "4. Of lines, each module gets its line's number after its name.\n",
+        "paren (every operation in parentheses), verilog, vhdl, c, python, liberty, and the file\n"
+        "formats blif, pla and eqn. Names that the target cannot spell are escaped or changed,\n"
+        "and a note says how. Before it is printed, the text is read back and proved to be the\n"
+        "same function; if that takes longer than 10 seconds, or --seconds, a warning says so and\n"
+        "the status is 4. When several lines are converted, each module's name ends with its line\n"
+        "number.\n",
         {{"--to", "TARGET", "What to write"},
-         {"--short", nullptr, "Write a short expression of the function, not the one given"},
+         {"--short", nullptr, "Write a short expression instead of the one given"},
          {"--unit", nullptr, "Put a module, entity, function or cell around the expression"},
-         {"--name", "NAME", "The name of that, or of the model of a blif file (f)"},
+         {"--name", "NAME", "Name of that unit, or of the model of a BLIF file (f)"},
          SecondsOption()},
         {"booleq convert 'a | b & c' --to verilog",
          "booleq convert \"'A[0]' ~& B\" --to vhdl --unit --name gate",

@@ -44,7 +44,7 @@ void WriteFile(const std::string& path, const std::string& text)
 
 Option SecondsOption()
 {
-    return {"--seconds", "N", "Give up deciding after so many seconds, and say so"};
+    return {"--seconds", "N", "Give up after N seconds: not decided, status 4"};
 }
 
 std::vector<Option> ClauseOptions()
@@ -92,7 +92,7 @@ void CheckClauseOptions(const Request& request)
         throw UsageError("--cnf and --proof write one file for one question: give one equation, "
                          "not lines");
     if (request.Has("--proof") && !Solver::IsThere())
-        throw UsageError("--proof: this build has no solver to prove anything");
+        throw UsageError("--proof needs a solver, and this build has none");
 }
 
 int WriteClauses(const Request& request, Output& output, const Cnf& cnf, kq_logic::Verdict verdict,
@@ -104,7 +104,7 @@ int WriteClauses(const Request& request, Output& output, const Cnf& cnf, kq_logi
         return kDone;
     const std::string path = request.Get("--proof");
     if (verdict == kq_logic::Verdict::Different) {
-        Complain(output, "note: an assignment satisfies the clauses, so there is no proof: " +
+        Complain(output, "note: the clauses are satisfiable, so there is no proof: " +
                              Visible(path) + " was not written");
         return kDone;
     }

@@ -99,14 +99,13 @@ Command EqualCommand()
         "EQUATION EQUATION",
         2,
         2,
-        "Tell whether two equations are one function",
-        "The answer is for every assignment of the inputs of both, however many they are. Up to "
-        "30\n"
-        "inputs the first assignment that differs is printed, above that one that differs. Status\n"
-        "0: equal, 1: not, 4: not decided, when --seconds came first. With '-' or --file each "
-        "line\n"
-        "is compared with the one equation that is given. The clauses of --cnf can be satisfied\n"
-        "when the equations differ; any solver reads them, and any checker the proof.\n",
+        "Tell whether two equations are the same function",
+        "Compares the two for every assignment of their inputs, however many there are. If they\n"
+        "differ, it prints the first assignment where they do (above 30 inputs, one such\n"
+        "assignment). Status 0: equal, 1: not equal, 4: not decided within --seconds. With '-' or\n"
+        "--file, each line is compared with the one equation given. The clauses that --cnf writes\n"
+        "are satisfiable exactly when the equations differ; any solver reads them, and any\n"
+        "checker the proof.\n",
         Options(),
         {"booleq equal '~(A & B)' '~A | ~B'", "booleq equal --inputs A,B 0x8 'A & B'",
          "booleq equal --file equations.txt 'A & B'"},

@@ -103,19 +103,18 @@ int RunEval(const Request& request, Output& output)
 
 Command EvalCommand()
 {
-    return {
-        "eval",
-        "EQUATION [NAME=VALUE...]",
-        1,
-        kAnyNumber,
-        "Print the value for one assignment",
-        "Every input needs a value, 0 or 1. The answer is the status 0 and the value printed,\n"
-        "0 or 1; a missing value or an unknown name is wrong usage. Of many lines each takes the\n"
-        "values of the inputs that it has.\n",
-        {},
-        {"booleq eval 'A & ~B' A=1 B=0", "booleq eval --inputs A,B 0x6 A=1 B=1",
-         "booleq eval --file equations.txt A=1 B=0"},
-        RunEval};
+    return {"eval",
+            "EQUATION [NAME=VALUE...]",
+            1,
+            kAnyNumber,
+            "Print the value for one assignment",
+            "Every input needs a value, 0 or 1; a missing value or an unknown name is an error\n"
+            "(status 2). The value is printed; the status is 0 either way. When several lines are\n"
+            "evaluated, each uses the values of the inputs it has.\n",
+            {},
+            {"booleq eval 'A & ~B' A=1 B=0", "booleq eval --inputs A,B 0x6 A=1 B=1",
+             "booleq eval --file equations.txt A=1 B=0"},
+            RunEval};
 }
 
 } // namespace booleq

@@ -43,12 +43,12 @@ void PutText(const kq_logic::Function& function, const kq_logic::Explanation& ex
         PutBitOrders(function, Reversed(function), output);
     PutField(output, "without effect", Listed(explanation.idle));
     PutField(output, "function",
-             explanation.kind.empty() ? "none with a common name" : Visible(explanation.text));
+             explanation.kind.empty() ? "no common name" : Visible(explanation.text));
     if (shortForm.fault.empty()) {
         PutField(output, "expression", Visible(shortForm.text));
         PutField(output, "", ShortNote(shortForm));
     } else {
-        PutField(output, "expression", "none of bearable length was found");
+        PutField(output, "expression", "none short enough was found");
     }
     PrintRows(
         inputs, maxRows, RowFormat::kText, [&function](uint64_t row) { return function.At(row); },
@@ -105,11 +105,11 @@ Command ExplainCommand()
         "INIT|EQUATION",
         1,
         1,
-        "Say what a function is: its name, idle inputs, a short expression",
-        "Says which inputs have no effect, whether it is a gate, a multiplexer, a majority, an\n"
-        "and-or-invert form or the like, and writes the shortest expression that was found; the\n"
-        "answer says whether it is proved that none is shorter, which it is up to four inputs.\n"
-        "At most 16 inputs.\n",
+        "Explain a function: its name, idle inputs, a short expression",
+        "Says which inputs have no effect and whether the function has a common name (a gate, a\n"
+        "multiplexer, a majority, an and-or-invert form), and writes the shortest expression\n"
+        "found. Up to four inputs that is proved to be the shortest; the answer says whether it\n"
+        "is. At most 16 inputs.\n",
         {{"--rows", "N|all", "Truth-table rows to print (64)"}},
         {"booleq explain 0xca --inputs S,A,B", "booleq explain 0x07 --inputs A,B,C",
          "booleq explain '(a | b) & (a | c)'"},

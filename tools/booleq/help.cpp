@@ -17,18 +17,19 @@ constexpr char kSyntax[] =
     "Init values: 0x... or 0b..., row k is bit k; the first input is the most significant bit of "
     "k.\n";
 
-constexpr char kStatuses[] = "Exit status; of many lines the highest counts:\n"
-                             "  0  done, or yes\n"
-                             "  1  no, or there are findings\n"
-                             "  2  wrong usage; or reading or writing failed, or memory ran out\n"
-                             "  3  a text was refused; the others were answered\n"
-                             "  4  not decided in the time of --seconds\n";
+constexpr char kStatuses[] =
+    "Exit status (for several lines, the highest):\n"
+    "  0  done, or yes\n"
+    "  1  no, or there are findings\n"
+    "  2  wrong usage, a file that cannot be read or written, or out of memory\n"
+    "  3  a text was refused; any others were answered\n"
+    "  4  not decided within --seconds\n";
 
 // Options of the tool itself.
 const std::vector<Option>& ToolOptions()
 {
     static const std::vector<Option> options = {
-        {"--help", nullptr, "Print this help; after a command, the command's"},
+        {"--help", nullptr, "Print this help, or after a command its own"},
         {"--version", nullptr, "Print the version"},
         {"--man-page", nullptr, "Print the man page (roff)"},
         {"--completion", nullptr, "Print the completion for bash"},
@@ -162,8 +163,9 @@ std::string ToolHelp()
     text += "\nOptions of every command:\n" + Lines(CommonOptions(false));
     text += "\nOptions instead of a command:\n" + Lines(ToolOptions());
     text += std::string("\n") + kSyntax;
-    text += "\n'booleq COMMAND --help' says more. Without a command, 'show' is meant; 'booleq show "
-            "table' shows\nthe equation that is a variable called table.\n";
+    text +=
+        "\n'booleq COMMAND --help' says more. Without a command, booleq means 'show'. To show an "
+        "equation\nthat is just a variable called table, write 'booleq show table'.\n";
     return text + "\n" + kStatuses;
 }
 
@@ -200,7 +202,7 @@ std::string ManPage()
     roff += ".SH DESCRIPTION\n" + RoffVerbatim(kSyntax);
     roff += ".SH OPTIONS\nEvery command takes:\n" + RoffOptions(CommonOptions(false));
     roff += ".PP\nInstead of a command:\n" + RoffOptions(ToolOptions());
-    roff += ".SH COMMANDS\nWithout a command, the first one is meant.\n";
+    roff += ".SH COMMANDS\nWithout a command, booleq means the first one.\n";
     for (const Command& command : Commands())
         roff += RoffCommand(command);
     return roff + ".SH EXIT STATUS\n" + RoffVerbatim(kStatuses);

@@ -282,8 +282,8 @@ Command InitCommand()
         1,
         1,
         "Print init values in both bit orders, and what reads back",
-        "The digits are printed in full, up to 30 inputs. 'reads back' was tried: the call of the\n"
-        "library shown gives the same function again.\n",
+        "Prints all digits, up to 30 inputs. Each call listed under 'reads back' was tried: it\n"
+        "gives the same function again.\n",
         {{"--svg", nullptr, "Print a picture of which row is which bit, up to six inputs"}},
         {"booleq init 'A & ~B'", "booleq init --inputs A,B,C 'A & B'",
          "booleq init --inputs A,B --lsb-first 0x2", "booleq init --svg 'A & ~B' > bits.svg"},

@@ -80,16 +80,17 @@ int RunMap(const Request& request, Output& output)
 
 Command KmapCommand()
 {
-    return {"kmap",
-            "EQUATION",
-            1,
-            1,
-            "Print the Karnaugh map of up to six inputs",
-            "The first half of the inputs numbers the rows, the others the columns, both in Gray\n"
-            "code: neighbours differ in one input, the first and the last one too.\n",
-            {{"--svg", nullptr, "Print a picture"}},
-            {"booleq kmap 'A & B | ~C & D'", "booleq kmap --svg 'A ^ B ^ C' > map.svg"},
-            RunMap};
+    return {
+        "kmap",
+        "EQUATION",
+        1,
+        1,
+        "Print the Karnaugh map of up to six inputs",
+        "The first half of the inputs numbers the rows, the second half the columns, both in Gray\n"
+        "code: neighbours, and the first and the last, differ in one input.\n",
+        {{"--svg", nullptr, "Print a picture"}},
+        {"booleq kmap 'A & B | ~C & D'", "booleq kmap --svg 'A ^ B ^ C' > map.svg"},
+        RunMap};
 }
 
 } // namespace booleq

@@ -28,7 +28,7 @@ std::string DifferenceText(const LintReport& report, const ForeignReading& readi
     text += line("because", reading.reason);
     text += line("write there", reading.textThere);
     if (!reading.textHere.empty())
-        text += line("or here", reading.textHere + ", if the other is meant");
+        text += line("or here", reading.textHere + ", if that is meant");
     return text;
 }
 
@@ -156,16 +156,14 @@ Command LintCommand()
         "EQUATION",
         1,
         1,
-        "Find what others read differently, and what surprises here",
-        "Reads the text as Verilog, C, Liberty, VHDL and Python would, inputs being single bits, "
-        "or\n"
-        "0 and 1, and compares the functions. For each that differs: the first assignment, both\n"
-        "groupings, and the text to write there instead, or here if the other was meant. Also:\n"
-        "blanks inside negated operators, renderings that do not read back, a text that begins\n"
-        "with 0, listed inputs that are skipped or missing, init values that are too short.\n"
-        "A comparison that takes over 10 seconds, or what --seconds says, is a finding too. "
-        "Status\n"
-        "0: no findings, 1: findings.\n",
+        "Find what other readers take differently, and other surprises",
+        "Reads the text as Verilog, C, Liberty, VHDL and Python would, with inputs that are\n"
+        "single bits (0 or 1), and compares the functions. For each reader that differs it prints\n"
+        "the first assignment, both groupings, and the text to write there, or here if the other\n"
+        "reading was meant. It also finds blanks inside negated operators, renderings that do not\n"
+        "read back, a text that begins with 0, listed inputs that are skipped or missing, and\n"
+        "init values that are too short. A comparison that takes longer than 10 seconds, or\n"
+        "--seconds, is a finding too. Status 0: no findings, 1: findings.\n",
         {SecondsOption()},
         {"booleq lint 'a | b & c'", "booleq lint 'P & X ~ | Y'",
          "booleq lint --inputs A,B 'A & C'"},

@@ -35,9 +35,10 @@ void WarnAboutInputs(const Reading& reading, Output& output)
 {
     const InputCheck check = CheckInputs(reading.inputs);
     for (const std::string& name : check.illegal)
-        Complain(output, "warning: --inputs: '" + Excerpt(name) + "' is not a name: skipped");
+        Complain(output, "warning: --inputs: '" + Excerpt(name) + "' is not a name and is skipped");
     for (const std::string& name : check.repeated)
-        Complain(output, "warning: --inputs: " + Excerpt(name) + " is listed again: counts once");
+        Complain(output,
+                 "warning: --inputs: " + Excerpt(name) + " is listed twice and counts once");
 }
 
 int Run(const std::vector<std::string>& arguments, Output& output)

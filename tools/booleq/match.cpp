@@ -226,16 +226,16 @@ Command MatchCommand()
         "INIT|EQUATION INIT|EQUATION",
         2,
         2,
-        "Tell whether two functions are one but for order and inversions of inputs",
-        "First by the order of inputs alone, then also with inversions of inputs and output; the\n"
-        "mapping is printed. Inputs without effect have no counterpart and need none. Status 0:\n"
-        "they match, 1: they do not, 4: not decided in time. The inputs of an init value are\n"
-        "called A, B, C, ... unless --inputs, or --second-inputs for the second, names as many as\n"
-        "it has. At most 16 inputs with an effect.\n"
-        "With '-' or --file each line is matched with the one that is given.\n",
-        {{"--order-only", nullptr, "Inversions do not count as a match"},
-         {"--second-inputs", "A,B,C", "The inputs of the second, if they are not --inputs"},
-         {"--seconds", "N", "End after N seconds: not decided, status 4"}},
+        "Tell whether two functions differ only by input order and inversions",
+        "Tries orders of the inputs alone first, then inversions of inputs and output too, and\n"
+        "prints the mapping. Inputs without effect are left out. At most 16 inputs with an\n"
+        "effect. The inputs of an init value are called A, B, C, ... unless --inputs\n"
+        "(--second-inputs for the second) lists as many as it has. With '-' or --file, each line\n"
+        "is matched with the one given. Status 0: they match, 1: they do not, 4: not decided\n"
+        "within --seconds.\n",
+        {{"--order-only", nullptr, "Do not try inversions"},
+         {"--second-inputs", "A,B,C", "The inputs of the second, if they differ"},
+         {"--seconds", "N", "Give up after N seconds: not decided, status 4"}},
         {"booleq match 0xca 0xe2", "booleq match 'a & b' 'x ~| y'", "booleq match 0xca 0xcaca"},
         RunMatch};
 }

@@ -34,7 +34,7 @@ Format ParseFormat(const Request& request, bool isPlaIn)
     Format format;
     const std::string word = request.Get("--to");
     if (!word.empty() && request.json)
-        throw UsageError("--json and --to ask for different formats; give one");
+        throw UsageError("--json and --to are two formats; give only one");
     format.isPla = word == "pla" || (word.empty() && isPlaIn);
     format.isMap = word == "map";
     format.isPicture = word == "svg";
@@ -56,7 +56,7 @@ SumOptions ParseOptions(const Request& request)
     options.isExact = request.Has("--exact");
     options.isInverted = request.Has("--products");
     if (request.Has("--terms") && request.Has("--literals"))
-        throw UsageError("--terms and --literals: one of them counts first");
+        throw UsageError("give only one of --terms and --literals");
     options.goal = request.Has("--literals") ? Goal::Literals : Goal::Terms;
     options.seconds = ParseSeconds(request, 0);
     return options;
@@ -225,23 +225,21 @@ Command MinimizeCommand()
         "FILE|EQUATION...",
         1,
         kAnyNumber,
-        "Find a smallest sum of products, for several outputs and with free rows",
-        "A FILE is a PLA file, a truth table of comma-separated values with the names in the "
-        "first\n"
-        "line, or lines NAME = EQUATION; NAME.dc = EQUATION says which rows of NAME are free. A\n"
-        "digit x of an init value (0b1x0x) is a free row. Every answer is proved to be 1 where "
-        "the\n"
-        "table is 1 and 0 where it is 0 before it is printed. A PLA file is answered with one.\n",
-        {{"--dc", "EQUATION", "Rows in which this is 1 may be either, for every output"},
+        "Find a small sum of products, with several outputs and don't-cares",
+        "A FILE is a PLA file, a truth table of comma-separated values with names in its first\n"
+        "line, or lines NAME = EQUATION, where NAME.dc = EQUATION gives the free rows\n"
+        "(don't-cares) of NAME. A digit x of an init value (0b1x0x) is a free row. Before an\n"
+        "answer is printed it is proved to be 1 wherever the table is 1, and 0 wherever it is 0.\n"
+        "A PLA file is answered with a PLA file.\n",
+        {{"--dc", "EQUATION", "Free rows of every output: where this is 1"},
          {"--exact", nullptr,
           "Prove that no sum has fewer terms, then that none has fewer literals"},
-         {"--seconds", "N", "Stop searching then; the answer says what is proved"},
-         {"--terms", nullptr,
-          "Fewest terms first, then fewest literals; this is what is done anyway"},
-         {"--literals", nullptr, "Fewest literals first, then fewest terms"},
+         {"--seconds", "N", "Stop after N seconds; the answer says what is proved"},
+         {"--terms", nullptr, "Count terms first, then literals (the default)"},
+         {"--literals", nullptr, "Count literals first, then terms"},
          {"--products", nullptr, "Write a product of sums"},
-         {"--outputs", "N", "Of a table of comma-separated values: the last N columns (1)"},
-         {"--to", "TARGET", "pla, map, svg, or what convert takes (primary)"}},
+         {"--outputs", "N", "Outputs of a CSV table: its last N columns (1)"},
+         {"--to", "TARGET", "pla, map, svg, or a target of convert (primary)"}},
         {"booleq minimize --dc 'a & b' 'a ^ b' 'a | c'",
          "booleq minimize --inputs a,b 0b1x0x --to map", "booleq minimize --exact table.pla"},
         RunMinimize};

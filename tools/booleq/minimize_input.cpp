@@ -75,7 +75,8 @@ class EquationReader {
             equation.text = text.text.substr(equals + 1);
             name = Trimmed(text.text.substr(0, equals));
             if (name.empty()) {
-                Refuse(text, m_request, m_output, "no name before '=': write NAME = EQUATION");
+                Refuse(text, m_request, m_output,
+                       "expected a name before '=': write NAME = EQUATION");
                 return false;
             }
         }
@@ -174,7 +175,7 @@ bool ReadText(const std::string& text, const Request& request, Output& output, W
     input.isPla = !isCsv && (HasDirective(text) || IsOnlyPlaDigits(first));
     if (isCsv || input.isPla) {
         if (request.Has("--dc"))
-            throw UsageError("--dc goes with equations; a table has its own free rows");
+            throw UsageError("--dc is for equations; a table has its own free rows");
         const bool isRead = isCsv ? ReadCsv(text, ParseOutputs(request), input.table, fault)
                                   : ReadPla(text, input.table, fault);
         if (!isRead)
@@ -194,7 +195,7 @@ bool ReadText(const std::string& text, const Request& request, Output& output, W
             return false;
     }
     if (reader.IsEmpty()) {
-        Refuse(input.text, request, output, "nothing to minimise in the file");
+        Refuse(input.text, request, output, "the file has nothing to minimise");
         return false;
     }
     if (request.Has("--dc") && !reader.AddFreeForAll(request.Get("--dc")))
@@ -209,7 +210,7 @@ bool ReadInit(const Request& request, Output& output, MinimizeInput& input)
         throw UsageError("an init value needs --inputs: --inputs A,B");
     std::vector<std::string> inputs = request.reading.inputs;
     if (CheckInputs(inputs).usable != inputs)
-        throw UsageError("--inputs has a name twice, or what is not a name");
+        throw UsageError("--inputs lists a name twice, or something that is not a name");
     if (request.reading.reverse)
         std::reverse(inputs.begin(), inputs.end());
     std::string reason;
@@ -233,7 +234,7 @@ bool ReadMinimizeInput(const Request& request, Output& output, Work& work, Minim
     input.text.text = request.operands[0];
     if (request.operands.size() == 1 && IsInitWithFree(request.operands[0])) {
         if (request.Has("--dc"))
-            throw UsageError("--dc beside an init value with x: say it in one of them");
+            throw UsageError("give free rows either by --dc or by x digits, not by both");
         return ReadInit(request, output, input);
     }
     EquationReader reader(request, output);

@@ -58,10 +58,8 @@ void RefuseFile(const std::string& file, const Request& request, Output& output,
 
 std::vector<Option> NetlistOptions()
 {
-    return {{"--cells", "FILE",
-             "More types of cells that are look-up tables, as docs/netlists.md "
-             "says"},
-            {"--top", "MODULE", "The module that is the design, where the file does not say so"}};
+    return {{"--cells", "FILE", "Further types of look-up-table cells (see docs/netlists.md)"},
+            {"--top", "MODULE", "The top module, if the file does not say"}};
 }
 
 CellTypes CellTypesOf(const Request& request)

@@ -18,7 +18,7 @@ namespace booleq {
 std::vector<Option> NetlistOptions();
 
 // The cell types that are known, with those of --cells.
-// Fails: UsageError for a file that cannot be read or is no such table.
+// Fails: UsageError for a file that cannot be read or is not such a table.
 CellTypes CellTypesOf(const Request& request);
 
 // Reads a netlist; shows how far it is, on a terminal.

@@ -126,7 +126,7 @@ int RunNetlistCheck(const Request& request, Output& output)
 Command NetlistCheckCommand()
 {
     std::vector<Option> options = {
-        {"--sarif", "FILE", "Write the findings to FILE too, as SARIF 2.1.0"}};
+        {"--sarif", "FILE", "Also write the findings to FILE, as SARIF 2.1.0"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
     return {
@@ -134,11 +134,12 @@ Command NetlistCheckCommand()
         "FILE",
         1,
         1,
-        "Find what is odd about the look-up tables of a netlist",
-        "Init values whose digits are not as many as the rows, or are x; inputs without effect\n"
-        "or connection; tables that are constant, only pass or invert a net, or are the same\n"
-        "function of the same nets as another one. One finding a line: file, line where the\n"
-        "format has one, severity, code, path, sentence. Status 0: no findings, 1: findings.\n",
+        "Find faulty and suspicious look-up tables of a netlist",
+        "Finds init values with too few, too many or x digits; inputs that have no effect or are\n"
+        "not connected; tables that are constant, only pass or invert a net, or repeat another\n"
+        "table's function of the same nets. Each finding is one line: file, line number if the\n"
+        "format has lines, severity, code, path, explanation. Status 0: no findings, 1: "
+        "findings.\n",
         options,
         {"booleq netlist check design.json",
          "booleq netlist check design.blif --sarif findings.sarif"},

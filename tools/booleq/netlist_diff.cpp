@@ -36,10 +36,11 @@ Renames ReadRenames(const std::string& file)
         if (words.empty() || words[0][0] == '#')
             continue;
         if (words.size() != 2)
-            throw UsageError("--rename: " + Visible(file) + ":" + std::to_string(number) +
-                             ": a line is two names, of the left netlist and of the right one, "
-                             "not " +
-                             Count(words.size(), "word"));
+            throw UsageError(
+                "--rename: " + Visible(file) + ":" + std::to_string(number) +
+                ": a line has two names, one of the left netlist and one of the right, "
+                "not " +
+                Count(words.size(), "word"));
         renames.emplace_back(words[0], words[1]);
     }
     return renames;
@@ -103,7 +104,7 @@ class DiffAnswer {
         for (const auto& rename : m_comparison.UnusedRenames())
             Complain(m_output, "warning: --rename: " + Visible(rename.first) + " or " +
                                    Visible(rename.second) +
-                                   " is not there, or is known by its name already");
+                                   " does not exist, or has the same name in both");
         if (m_comparison.Pairs().numKeysTwice > 0)
             Complain(m_output, "warning: " + Count(m_comparison.Pairs().numKeysTwice, "cell") +
                                    " of the right netlist with the key of another one");
@@ -143,7 +144,7 @@ class DiffAnswer {
         for (const NetId number : function.nets)
             names.push_back(SpellNumber(number));
         const std::string equation = Fill(known->second.equation, names);
-        return equation.empty() ? "(no expression of bearable length)" : equation;
+        return equation.empty() ? "(no expression short enough)" : equation;
     }
 
     std::string SpellNumber(NetId number) const
@@ -362,17 +363,16 @@ int RunDiff(const Request& request, Output& output)
 Command NetlistDiffCommand()
 {
     std::vector<Option> options = {
-        {"--key", "ATTRIBUTE",
-         "Match tables by this attribute, a place such as a bel, where path "
-         "and net do not"},
-        {"--rename", "FILE", "Lines of two names: a net of LEFT, and what RIGHT calls it"},
+        {"--key", "ATTRIBUTE", "Match by this attribute, such as a bel, where path and net do not"},
+        {"--rename", "FILE",
+         "Pairs of names, one pair a line: a net of LEFT and its name in RIGHT"},
         {"--names", "auto|kept|gone",
-         "Whether nets of one name are one; gone: --key alone counts "
-         "(auto: as the pairs show)"},
-        {"--open", "0|1", "What an input reads that nothing is connected to"},
+         "Whether equal net names mean the same net; gone: match by --key "
+         "only (auto: decided from the pairs)"},
+        {"--open", "0|1", "What an unconnected input reads"},
         {"--allow-wires", nullptr,
-         "Tables that only pass a net or a constant may be in one "
-         "netlist only; nets are followed through them"},
+         "Accept tables that only pass a net or a constant and are in one netlist "
+         "only; nets are followed through them"},
         {"--rows", "N|all", "Differences to describe (20; with --json all)"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
@@ -382,12 +382,12 @@ Command NetlistDiffCommand()
         2,
         2,
         "Compare two netlists table by table: is each still the function it was?",
-        "Tables are matched by path, else by output net, else by --key, and compared as\n"
-        "functions of nets, whatever the order of pins, width, cell type or format. Of one that\n"
-        "differs: the first row by net names, both equations, and every cause that explains the\n"
-        "whole difference, such as pins that were swapped without the init value, exchanged\n"
-        "halves or shifted digits, with the init value that would have been right. Where names\n"
-        "are gone on one side, nets are matched by the tables around them. Status 0: the same,\n"
+        "Tables are matched by path, else by output net, else by --key, and compared as functions\n"
+        "of nets, whatever their pin order, width, cell type or format. For a table that differs\n"
+        "it prints the first differing row by net names, both equations, and every cause that\n"
+        "explains the whole difference, such as swapped pins with an unchanged init value,\n"
+        "exchanged halves or shifted digits, with the init value that would have been right. If\n"
+        "one side has lost its names, nets are matched by the tables around them. Status 0: same,\n"
         "1: different.\n",
         options,
         {"booleq netlist diff before.json after.json",

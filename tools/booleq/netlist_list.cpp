@@ -25,7 +25,8 @@ ListFormat ParseFormat(const Request& request)
 {
     const std::string format = request.Get("--format");
     if (request.json && request.Has("--format"))
-        throw UsageError("--json and --format " + Visible(format) + " are two formats: give one");
+        throw UsageError("--json and --format " + Visible(format) +
+                         " are two formats; give only one");
     if (request.json || format == "jsonl")
         return ListFormat::JsonLines;
     if (format == "csv")
@@ -214,13 +215,13 @@ class Lister {
 
     void PutText(const ListedTable& table)
     {
-        m_output.Put(Visible(table.path) + "  " + Visible(table.type) + "\n    " +
-                     Visible(table.output) + " = " +
-                     (table.equation.empty() ? "(no expression of bearable length)"
-                                             : Visible(table.equation)) +
-                     "\n    " + (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") +
-                     "init " + table.init + ", " + table.lsbInit + " least first; pins " +
-                     (table.pins.empty() ? "none" : Visible(Join(table.pins, ", "))) + "\n");
+        m_output.Put(
+            Visible(table.path) + "  " + Visible(table.type) + "\n    " + Visible(table.output) +
+            " = " +
+            (table.equation.empty() ? "(no expression short enough)" : Visible(table.equation)) +
+            "\n    " + (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") + "init " +
+            table.init + ", " + table.lsbInit + " least first; pins " +
+            (table.pins.empty() ? "none" : Visible(Join(table.pins, ", "))) + "\n");
     }
 
     void PutCsv(const ListedTable& table)
@@ -291,11 +292,11 @@ Command NetlistListCommand()
         1,
         1,
         "List the look-up tables of a netlist with their equations over nets",
-        "Of each table: path, type, output net, a short equation over its nets, the name of its\n"
-        "function, and its init value with the first pin listed most and least significant.\n"
-        "Equations leave out idle inputs and fold constant ones; each different function is\n"
-        "shortened once and proved equal. Where a notation cannot spell a net's name, the\n"
-        "equation has a changed one; pins and output are always the names of the file.\n",
+        "Prints for each table: path, type, output net, a short equation over its nets, the name\n"
+        "of its function, and its init value with the first pin most and least significant.\n"
+        "Equations leave out idle inputs and fold constant ones; each distinct function is\n"
+        "shortened once and proved equal. If a notation cannot spell a net's name, the equation\n"
+        "uses a changed name; the pins and the output keep the file's names.\n",
         options,
         {"booleq netlist list design.json --cell 'u1.*'",
          "booleq netlist list design.blif --net carry --to verilog",

@@ -245,23 +245,24 @@ int RunStats(const Request& request, Output& output)
 Command NetlistStatsCommand()
 {
     std::vector<Option> options = {
-        {"--svg", nullptr, "A picture: how many tables there are of each width and function"}};
+        {"--svg", nullptr, "Print a picture: tables by width and by function"}};
     for (const Option& option : NetlistOptions())
         options.push_back(option);
-    return {"netlist stats",
-            "FILE...",
-            1,
-            kAnyNumber,
-            "Count the look-up tables of a netlist, their functions and what is odd about them",
-            "A FILE is Yosys JSON, BLIF, EDIF 2.0.0 or structural Verilog, as it is or compressed\n"
-            "by gzip; - is standard input. Verilog is read by the program yosys. Functions are\n"
-            "counted after constant and repeated inputs are folded and idle ones left out; those\n"
-            "of one class are alike up to the order of inputs and inversions. Cells that hold\n"
-            "tables and more, as shift registers do, are counted and not read.\n",
-            options,
-            {"booleq netlist stats design.json", "booleq netlist stats --svg design.blif"},
-            RunStats,
-            true};
+    return {
+        "netlist stats",
+        "FILE...",
+        1,
+        kAnyNumber,
+        "Count the look-up tables of a netlist, their functions and oddities",
+        "A FILE is Yosys JSON, BLIF, EDIF 2.0.0 or structural Verilog, plain or gzip-compressed;\n"
+        "- is standard input. Verilog is read by the program yosys. Functions are counted after\n"
+        "constant and repeated inputs are folded and idle ones left out; functions of one class\n"
+        "are the same up to the order of inputs and inversions. Cells that are more than a\n"
+        "look-up table, such as shift registers, are counted but not read.\n",
+        options,
+        {"booleq netlist stats design.json", "booleq netlist stats --svg design.blif"},
+        RunStats,
+        true};
 }
 
 } // namespace booleq

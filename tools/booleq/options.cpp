@@ -45,7 +45,7 @@ void CheckOperands(Request& request, bool hasFile)
     if (numGiven < command.minOperands)
         throw UsageError("too few words: " + usage);
     if (numGiven > command.maxOperands && hasFile)
-        throw UsageError("--file stands in place of the equation, so '" +
+        throw UsageError("--file replaces the equation, so '" +
                          Excerpt(operands[command.maxOperands - 1]) + "' is one word too many");
     const Command* nearest =
         numGiven > command.maxOperands && isPlain ? NearestCommand(operands[0], true) : nullptr;

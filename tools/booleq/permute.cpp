@@ -87,8 +87,8 @@ Command PermuteCommand()
         "INIT|EQUATION",
         1,
         1,
-        "Write an init value for another order of its inputs",
-        "Both lists begin with the most significant input. Names that only --to lists widen the\n"
+        "Rewrite an init value for another order of its inputs",
+        "Both lists begin with the most significant input. A name that only --to lists widens the\n"
         "table by an input without effect. At most 24 inputs.\n",
         {{"--from", "A,B,C", "The inputs of the given value, most significant first"},
          {"--to", "C,A,B", "The inputs of the value to print"}},

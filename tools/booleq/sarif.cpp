@@ -21,7 +21,7 @@ std::FILE* OpenToWrite(const std::string& name)
     return stream;
 }
 
-// A path as a URI reference: what is no letter, digit or "-._~/" stands as %XX.
+// A path as a URI reference: what is not a letter, digit or "-._~/" stands as %XX.
 std::string UriOf(const std::string& path)
 {
     static constexpr char kDigits[] = "0123456789ABCDEF";

@@ -99,12 +99,11 @@ Command SatCommand()
         "EQUATION",
         1,
         1,
-        "Find an assignment for which an equation is 1, or tell that none is",
-        "Up to 30 inputs the first such assignment is printed, above that one of them. With\n"
-        "--always the question is whether the equation is 1 for all of them, and an assignment "
-        "for\n"
-        "which it is 0 is looked for. Status 0: yes, 1: no, 4: not decided, when --seconds came\n"
-        "first. The clauses of --cnf are satisfied by the assignments that are looked for.\n",
+        "Find an assignment that makes an equation 1, or prove there is none",
+        "Prints the first such assignment, or above 30 inputs one of them. With --always it asks\n"
+        "whether the equation is 1 for every assignment, and looks for one for which it is 0.\n"
+        "Status 0: yes, 1: no, 4: not decided within --seconds. The clauses that --cnf writes are\n"
+        "satisfied by exactly the assignments that it looks for.\n",
         Options(),
         {"booleq sat '(A | B) & ~A'", "booleq sat 'A & ~A'", "booleq sat --always 'A | ~A'",
          "booleq sat --cnf a.cnf --proof a.drat 'A & (B ^ A) & B'"},

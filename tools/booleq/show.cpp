@@ -122,9 +122,8 @@ void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& not
                         " rows, the table more: the others read as " +
                         std::to_string(HighestRow(equation)));
     if (reading.lsbFirst && numInputs > 1)
-        notes.push_back(
-            "what is printed takes the first input as the most significant; that init value "
-            "reads back without --lsb-first");
+        notes.push_back("the output has the first input most significant; that init value "
+                        "reads back without --lsb-first");
 }
 
 // Renderings write no parentheses of their own, so some trees cannot be read back from them.
@@ -144,11 +143,10 @@ void NoteExpression(const Kq_BoolEquation& equation, const Reading& reading, Not
         const std::vector<std::string> names = InputNames(equation);
         const std::vector<std::string> others(names.begin() + static_cast<long>(numListed),
                                               names.end());
-        notes.push_back("not in --inputs, so after them: " + Visible(Join(others, ", ")));
+        notes.push_back("not in --inputs, so they follow: " + Visible(Join(others, ", ")));
     }
     if (!ReadsBack(equation, reading))
-        notes.push_back(
-            "read again, the texts above do not give this equation: keep the one you have");
+        notes.push_back("the texts above do not read back as this equation; keep the original");
 }
 
 void NoteNames(const Kq_BoolEquation& equation, bool hasTable, Notes& notes)
@@ -244,8 +242,8 @@ Command ShowCommand()
         1,
         1,
         "Show renderings, inputs, init values and truth table",
-        "Everything the library answers about one equation or init value. Of a line the answer\n"
-        "begins with its number and ends with an empty line.\n",
+        "Prints everything the library answers about one equation or init value. When several\n"
+        "lines are read, each answer begins with its line number and ends with an empty line.\n",
         {{"--rows", "N|all", "Truth-table rows to print (64)"},
          {"--whole", nullptr, "Print init values whole, also over 10 inputs"}},
         {"booleq 'A & ~B'", "booleq --inputs A,B,D 'A & B'", "booleq --inputs A,B 0x8",

@@ -16,7 +16,8 @@ RowFormat ParseFormat(const Request& request)
 {
     const std::string format = request.Get("--format");
     if (request.json && format != "json" && request.Has("--format"))
-        throw UsageError("--json and --format " + Visible(format) + " are two formats: give one");
+        throw UsageError("--json and --format " + Visible(format) +
+                         " are two formats; give only one");
     if (format == "markdown")
         return RowFormat::kMarkdown;
     if (format == "csv")
@@ -91,9 +92,10 @@ Command TableCommand()
         1,
         1,
         "Print the truth table as text, Markdown, CSV or JSON",
-        "Row k assigns the binary digits of k to the inputs, the first input most significant.\n"
-        "Up to 30 inputs; rows are written as they are made, and how much it will be is said\n"
-        "before more than 10 MB. Of a line the table begins with '# line N'.\n",
+        "Row k assigns the binary digits of k to the inputs, the first input most significant. Up\n"
+        "to 30 inputs. Rows are written as they are computed; a table of more than 10 MB is\n"
+        "announced with its size first. When several lines are read, each table begins with '#\n"
+        "line N'.\n",
         {{"--format", "text|markdown|csv|json", "How to print it (text)"},
          {"--rows", "N|all", "Rows to print (all)"}},
         {"booleq table 'A & ~B'", "booleq table --format csv 'A ^ B ^ C'",

@@ -16,7 +16,7 @@ class TableFormat {
     TableFormat() = default;
     virtual ~TableFormat() = default;
 
-    // True for a line that is no row (a header); 'answer' is what to write for it.
+    // True for a line that is not a row (a header); 'answer' is what to write for it.
     // Fails: UsageError for a header without any of the columns.
     virtual bool IsHeader(const std::string& line, std::string& answer) = 0;
     // Sets all of the row; its texts' memory serves again.

@@ -78,8 +78,8 @@ Command TreeCommand()
         1,
         1,
         "Print the expression tree",
-        "Children stand below their operator, the left one first; an init value is shown as the\n"
-        "expression that it stands for. Below 40 levels the depth is written as a number.\n",
+        "Children are printed below their operator, the left one first; an init value is shown as\n"
+        "the expression it stands for. Below 40 levels the depth is written as a number.\n",
         {{"--dot", nullptr, "Print a graph for Graphviz"}},
         {"booleq tree 'a | b & ~c'", "booleq tree --dot 'a | b & ~c' > tree.dot"},
         RunTree};

@@ -239,12 +239,6 @@ bool KqDigits::HasSymmetricTerms() const
     return areSymmetric;
 }
 
-unsigned int KqDigits::CountNegations(uint64_t row, size_t numNames) const
-{
-    const size_t numOnes = KqCountBits(row >> (m_names.size() - numNames));
-    return static_cast<unsigned int>(m_is_sum ? numNames - numOnes : numOnes);
-}
-
 // Appends one term: every name, those with a "~" negated.
 void KqDigits::AppendTerm(uint64_t row, std::string& text) const
 {

@@ -7,6 +7,8 @@
 #include <cassert>
 #include <cstring>
 
+#include <port/Port_Env.h>
+
 #include "JoinKernel.h"
 #include "Kernel.h"
 #include "ProgramWriter.h"
@@ -86,22 +88,6 @@ const KqNamedKernel kKernels[] = {{"plain", RunPlain, JoinPlain, IsAlwaysSupport
 #endif
 };
 
-const KqNamedKernel& ChooseKernel()
-{
-    const KqNamedKernel* best = kKernels;
-    for (const KqNamedKernel& kernel : kKernels) {
-        if (kernel.isSupported())
-            best = &kernel;
-    }
-    return *best;
-}
-
-const KqNamedKernel& GetKernel()
-{
-    static const KqNamedKernel& kernel = ChooseKernel();
-    return kernel;
-}
-
 } // namespace
 
 const KqNamedKernel* KqGetKernels(size_t* numKernels)
@@ -110,9 +96,30 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels)
     return kKernels;
 }
 
+const KqNamedKernel& KqChooseKernel(const char* name)
+{
+    const KqNamedKernel* best = kKernels;
+    for (const KqNamedKernel& kernel : kKernels) {
+        if (!kernel.isSupported())
+            continue;
+        if (name && std::strcmp(kernel.name, name) == 0)
+            return kernel;
+        best = &kernel;
+    }
+    assert(best->isSupported());
+    return *best;
+}
+
+const KqNamedKernel& KqGetKernel()
+{
+    static const KqNamedKernel& kernel =
+        KqChooseKernel(Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_KERNEL"));
+    return kernel;
+}
+
 KqColumn::KqColumn(const Node* root, unsigned int numVariables)
     : m_num_words(numVariables > 6 ? size_t(1) << (numVariables - 6) : 1),
-      m_kernel(GetKernel().run), m_joiner(GetKernel().join)
+      m_kernel(KqGetKernel().run), m_joiner(KqGetKernel().join)
 {
     assert(numVariables <= kKqMaxColumnVariables);
     KqProgram program = KqCompile(root, numVariables, true);

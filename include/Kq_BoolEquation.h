@@ -84,7 +84,7 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
     // row without variables; never traced. goOn(context), unless null, is asked every few
-    // milliseconds, less often of over 100,000 operators; it may throw, not change the equation.
+    // milliseconds, less often of over 100,000 operators; it may throw, change or destroy this.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;

@@ -141,4 +141,16 @@ class KqStore {
     std::atomic<Watcher*> m_watchers{nullptr}; // owned by none
 };
 
+// One more holder, while somebody is called who may set, clear or destroy all the others.
+class KqStoreHold {
+  public:
+    explicit KqStoreHold(KqStore& store) : m_store(store) { m_store.Hold(); }
+    ~KqStoreHold() { KqStore::Release(&m_store); }
+    KqStoreHold(const KqStoreHold&) = delete;
+    KqStoreHold& operator=(const KqStoreHold&) = delete;
+
+  private:
+    KqStore& m_store;
+};
+
 #endif

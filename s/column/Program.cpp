@@ -222,16 +222,20 @@ KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
     CompilerAsItStands asItStands(compiler);
     asItStands.Compile(root);
     KqValue value = asItStands.value;
+    assert(asItStands.numStacked == 0);
     program.numCodes = compiler.GetEnd();
     if (asItStands.maxStacked >= kKqMaxStack) {
         Compiler again(numVariables, isReversed, program.codes);
         const std::vector<Item> items = ListItems(root);
+        assert(items[0].need <= kKqMaxStack);
         CompilerByNeed byNeed{again, items, KqValue()};
         KqWalk(CompilerByNeed::Place{&items[0], KqValue()}, byNeed);
         value = byNeed.value;
         program.numCodes = again.GetEnd();
     }
     program.isInverted = value.GetInversion() != 0;
+    assert(value.GetStart() == 0);
+    assert(value.IsConstant() == (program.numCodes == 0));
     return program;
 }
 
@@ -251,7 +255,9 @@ KqRunProgram(const KqProgram& program,
             stack >>= 1;
             continue;
         }
+        assert(KqVariableOf(*next) < variables.size());
         const unsigned int operand = variables[KqVariableOf(*next)].second;
+        assert(operand <= 1);
         if (action >= kKqCombine) {
             value = table >> (2 * operand) >> value & 1u;
         } else {

@@ -36,6 +36,7 @@ void AppendColumn(KqResults results, KqDigitsText& digits)
     digits.Reserve(results.GetNumWords());
     for (size_t end = results.GetNumWords(); end > 0; end -= words.size()) {
         results.Fill(end - words.size(), words.size(), words.data());
+        assert(end % words.size() == 0);
         digits.AppendWords(words.data(), words.size());
     }
 }
@@ -137,6 +138,7 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(vo
     KqResults results(store, numVariables);
     std::vector<uint64_t> filled(results.GetNumWords());
     const size_t numPieceWords = goOn ? results.GetNumPieceWords() : filled.size();
+    assert(filled.size() % numPieceWords == 0);
     for (size_t first = 0; first < filled.size(); first += numPieceWords) {
         if (goOn && !goOn(context))
             return false;

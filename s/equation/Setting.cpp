@@ -5,6 +5,7 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
+#include <cassert>
 #include <cstring>
 #include <string>
 
@@ -65,6 +66,8 @@ void DefineNames(const KqTokens& tokens, const std::vector<Node*>& nodes,
             variables.push_back(Variable(token.word->text, 0u));
             index.Add(token.word->hash);
         }
+        assert(idNode->IsId());
+        assert(KqIsSameText(idNode->GetToken(), variables[variableIndex].first));
         idNode->SetValue(static_cast<unsigned int>(variableIndex));
     }
 }

@@ -4,6 +4,7 @@
 #define KQ_STORE_H
 
 #include <atomic>
+#include <cassert>
 #include <memory>
 
 #include "Digits.h"
@@ -36,10 +37,15 @@ class KqStore {
     KqStore(const KqStore&) = delete;
     KqStore& operator=(const KqStore&) = delete;
 
-    void Hold() { m_count.fetch_add(1, std::memory_order_relaxed); }
+    void Hold()
+    {
+        assert(m_count.load(std::memory_order_relaxed) > 0);
+        m_count.fetch_add(1, std::memory_order_relaxed);
+    }
     // Takes one holder away.
     static void Release(KqStore* store) noexcept
     {
+        assert(store->m_count.load(std::memory_order_relaxed) > 0);
         // Nobody can join the only holder, so it need not count.
         if (!store->IsShared() || store->m_count.fetch_sub(1, std::memory_order_acq_rel) == 1)
             delete store;

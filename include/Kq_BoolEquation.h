@@ -1,4 +1,9 @@
 // Boolean equations: text in, tree, values, truth table and look-up-table init values out.
+//     Kq_BoolEquation equation("A & ~B");
+//     if (!equation) return 1; // refused
+//     equation.SetVariable("A", 1); // every variable starts at 0
+//     std::cout << equation.Eval() << '\n'; // 1
+//     std::cout << equation.GetEquationAsHexInitValue(false).c_str() << '\n'; // 0x4
 
 // A comment stands for the declarations below it, up to a blank line or the next comment.
 
@@ -19,20 +24,18 @@
 class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
-// One equation with its variables, each 0 or 1. It owns one engine object and forwards to it.
+// One equation with its variables, each 0 or 1. Copies share parsed nodes, never variable values.
 // Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
 // Threads: different objects at once; const members of one at once; changing one wants it alone.
-// Invariants: 1. m_imp is owned by this object alone and comes from the engine class's own operator
-// new.  2. Copies share parsed nodes inside the engine, never variable values.
+// Invariant: m_imp is the engine object, of its class's own operator new, and nobody else owns it.
 class KQ_EXPORT Kq_BoolEquation {
   public:
     class Handle;
     class TruthTable;
     struct Refusal;
 
-    Kq_BoolEquation(); // no equation, no variables
-    // Sets 'equation'; a text that is refused leaves the object empty, which operator! tells.
-    Kq_BoolEquation(const Port::StringBase<char>& equation);
+    Kq_BoolEquation();                                       // no equation, no variables
+    Kq_BoolEquation(const Port::StringBase<char>& equation); // sets it; empty when it is refused
     Kq_BoolEquation(const Kq_BoolEquation& other); // the same equation, variables and values
     ~Kq_BoolEquation(); // frees the engine object; nodes go with the last copy that shares them
 
@@ -84,7 +87,7 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
     // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
     // row without variables; never traced. goOn(context), unless null, is asked every few
-    // milliseconds, less often of over 100,000 operators; it may throw, not change the equation.
+    // milliseconds, less often of over 100,000 operators; it may throw, change or destroy this.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
@@ -97,9 +100,8 @@ class KQ_EXPORT Kq_BoolEquation {
 
     // The result, 0 or 1, for the current variable values; 0 without an equation.
     unsigned int Eval() const;
-    // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits
-    // and '_', not starting with a digit, or anything that starts with ' and has a second '.
-    // Fails: false for a name already there (its value stays) or not legal.
+    // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits and
+    // '_', no digit first, or starts with ' and has a second '.  Fails: false unless new and legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
     // Is there a variable of this name; one with the index that the handle holds.
     bool IsVariableDefined(const Port::StringBase<char>& name) const;
@@ -110,17 +112,15 @@ class KQ_EXPORT Kq_BoolEquation {
     // The value, 0 or 1; 0 when there is no such variable.
     unsigned int GetVariable(const Port::StringBase<char>& name) const;
     unsigned int GetVariable(const Handle& handle) const;
-    // The name's index as a handle, which saves searching all names; empty without such a variable.
-    Handle GetVariableHandle(const Port::StringBase<char>& name) const;
-    unsigned int GetNumVariables() const; // how many; indices count from 0
-    // Names and values in order of indices; any later definition invalidates the reference.
+    Handle GetVariableHandle(const Port::StringBase<char>& name) const; // empty: no such variable
+    unsigned int GetNumVariables() const;                               // how many
+    // Names and values in order of indices, from 0; a later definition invalidates the reference.
     const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& GetVariables() const;
 
     // All results, 2^n rows of n values; empty without an equation, for n = 0 and for n > 30.
     TruthTable GetTruthTable() const;
     const Kq_BoolEquationImp* GetImp() const; // the engine object, owned by this one
-    // Writes everything about the equation, its truth table too, to the message manager.
-    void Dbg() const;
+    void Dbg() const; // writes all of it, the truth table too, to the message manager
 
   private:
     Kq_BoolEquationImp* m_imp;

@@ -1,6 +1,10 @@
-// The engine behind Kq_BoolEquation: a shared tree of nodes and a variable table of its own.
-
-// A comment stands for the declarations below it, up to a blank line or the next comment.
+// The engine of Kq_BoolEquation. Use Kq_BoolEquation.h unless you read tables without copying them,
+// build a tree step by step, or turn the debug mode on and off.
+//     Kq_BoolEquationImp engine;
+//     if (!engine.SetEquation("A & ~B")) return 1; // refused
+//     const Kq_BoolEquationImp::TruthTable table = engine.GetTruthTable();
+//     std::cout << table.GetVariableNames()[1].c_str() << '\n'; // B
+//     std::cout << table.GetRows()[2].GetResultValue() << '\n'; // 1
 
 #ifndef KQ_BOOLEQUATIONIMP_H
 #define KQ_BOOLEQUATIONIMP_H
@@ -37,8 +41,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // Shares the other's nodes, copies its variables.
     Kq_BoolEquationImp(const Kq_BoolEquationImp& other);
     ~Kq_BoolEquationImp(); // the last object that shares the nodes frees them
-    // Two names for the same: shares the other's nodes, copies its variables.
-    // Fails: std::bad_alloc, and this object is as it was.
+    // Two names for the same.  Fails: std::bad_alloc, and this object is as it was.
     Kq_BoolEquationImp& operator=(const Kq_BoolEquationImp& other);
     void Copy(const Kq_BoolEquationImp& other);
 

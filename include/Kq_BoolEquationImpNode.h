@@ -1,7 +1,11 @@
-// The nodes of an equation. The accessors stand in the header because every step of the library
-// goes through them.
-
-// A comment stands for the declarations below it, up to a blank line or the next comment.
+// The nodes of an equation. Use Kq_BoolEquation.h unless you read the tree itself.
+//     const Kq_BoolEquation equation("A & ~B");
+//     if (!equation) return 1; // refused
+//     const Kq_BoolEquationImp::Node* const root = equation.GetImp()->GetRoot();
+//     std::cout << root->GetTypeName().c_str() << '\n'; // AND
+//     std::cout << root->GetLeftChild()->GetToken().c_str() << '\n'; // A
+//     std::cout << root->GetRightChild()->GetTypeName().c_str() << '\n'; // NOT
+// The accessors stand in the header because every step of the library goes through them.
 
 #ifndef KQ_BOOLEQUATIONIMPNODE_H
 #define KQ_BOOLEQUATIONIMPNODE_H

@@ -10,6 +10,7 @@
 #include <port/Port_Init.h>
 #include <port/mav_malloc.h>
 
+#include "Column.h"
 #include "Messages.h"
 #include "NamePool.h"
 #include "Render.h"
@@ -40,6 +41,9 @@ NamePool s_namePool;
 
 // Any value counts, an empty one too; read at load and never again.
 std::atomic<bool> KqDebugMode::s_isOn{Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr};
+
+// Chosen now, so that the environment is read at load and never again.
+[[maybe_unused]] static const KqNamedKernel& s_kernel = KqGetKernel();
 
 std::allocator<Kq_BoolEquationImp> Kq_BoolEquationImp::m_kq_boolequationimp_mem;
 

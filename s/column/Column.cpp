@@ -7,6 +7,8 @@
 #include <cassert>
 #include <cstring>
 
+#include <port/Port_Env.h>
+
 #include "JoinKernel.h"
 #include "Kernel.h"
 #include "ProgramWriter.h"
@@ -26,12 +28,14 @@ constexpr uint64_t kPieceOperations = uint64_t(1) << 24;
 
 size_t NumWords(unsigned int level)
 {
+    assert(level >= 6);
     return size_t(1) << (level - 6);
 }
 
 // The highest variable in a set that is not empty.
 unsigned int HighestVariable(uint32_t variables)
 {
+    assert(variables != 0);
     unsigned int highest = 0;
     while (variables >>= 1)
         ++highest;
@@ -41,6 +45,7 @@ unsigned int HighestVariable(uint32_t variables)
 // Repeats the first 'numWords' words until there are 'totalWords', a multiple of them.
 void Repeat(size_t numWords, size_t totalWords, uint64_t* words)
 {
+    assert(totalWords % numWords == 0);
     // Short pieces are doubled, long ones copied from the first, which is still in the cache.
     constexpr size_t kLongPiece = 2048;
     while (numWords < totalWords && numWords < kLongPiece) {
@@ -86,22 +91,6 @@ const KqNamedKernel kKernels[] = {{"plain", RunPlain, JoinPlain, IsAlwaysSupport
 #endif
 };
 
-const KqNamedKernel& ChooseKernel()
-{
-    const KqNamedKernel* best = kKernels;
-    for (const KqNamedKernel& kernel : kKernels) {
-        if (kernel.isSupported())
-            best = &kernel;
-    }
-    return *best;
-}
-
-const KqNamedKernel& GetKernel()
-{
-    static const KqNamedKernel& kernel = ChooseKernel();
-    return kernel;
-}
-
 } // namespace
 
 const KqNamedKernel* KqGetKernels(size_t* numKernels)
@@ -110,15 +99,37 @@ const KqNamedKernel* KqGetKernels(size_t* numKernels)
     return kKernels;
 }
 
+const KqNamedKernel& KqChooseKernel(const char* name)
+{
+    const KqNamedKernel* best = kKernels;
+    for (const KqNamedKernel& kernel : kKernels) {
+        if (!kernel.isSupported())
+            continue;
+        if (name && std::strcmp(kernel.name, name) == 0)
+            return kernel;
+        best = &kernel;
+    }
+    assert(best->isSupported());
+    return *best;
+}
+
+const KqNamedKernel& KqGetKernel()
+{
+    static const KqNamedKernel& kernel =
+        KqChooseKernel(Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_KERNEL"));
+    return kernel;
+}
+
 KqColumn::KqColumn(const Node* root, unsigned int numVariables)
     : m_num_words(numVariables > 6 ? size_t(1) << (numVariables - 6) : 1),
-      m_kernel(GetKernel().run), m_joiner(GetKernel().join)
+      m_kernel(KqGetKernel().run), m_joiner(KqGetKernel().join)
 {
     assert(numVariables <= kKqMaxColumnVariables);
     KqProgram program = KqCompile(root, numVariables, true);
     m_codes.swap(program.codes);
     m_num_codes = program.numCodes;
     m_whole = Describe(0, m_num_codes, program.isInverted);
+    assert(m_whole.variables >> numVariables == 0);
 }
 
 size_t KqColumn::GetNumPieceWords() const
@@ -164,6 +175,7 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
         m_path[depth++] = Fixed{variable, value, rest};
         m_path_length = depth;
     }
+    assert(depth <= sizeof m_path / sizeof m_path[0]);
     // What the piece before had fixed below this depth is overwritten now.
     m_path_length = depth;
     m_num_codes = rest.first + rest.numCodes;
@@ -177,6 +189,7 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
         std::memset(words, rest.isInverted ? 0xff : 0, NumWords(level) * sizeof(uint64_t));
         return;
     }
+    assert(rest.variables >> level == 0);
     // The block repeats from the highest variable on that it has.
     const unsigned int ownLevel = std::max(HighestVariable(rest.variables) + 1, 6u);
     if (ownLevel <= kKernelLevel) {
@@ -194,6 +207,7 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
 
 void KqColumn::ExpandHalves(const Rest& rest, unsigned int level, uint64_t* words)
 {
+    assert(level > kKernelLevel);
     // What is left stays in m_codes while it may be met again, up to a few times the program.
     const size_t limit = rest.first + rest.numCodes + 4 * m_whole.numCodes + 16384;
     for (const bool value : {false, true}) {
@@ -243,13 +257,20 @@ KqColumn::Rest KqColumn::Fix(const Rest& rest, unsigned int variable, bool value
             hand = isFixed ? writer.PutConstant(value) : writer.PutVariable(KqVariableOf(*next));
         }
     }
+    assert(top == stack + 1); // the first value at hand, which nothing takes
+    assert(writer.GetEnd() <= m_num_codes + rest.numCodes);
     const size_t first = m_num_codes;
     m_num_codes = writer.GetEnd();
-    return Describe(first, m_num_codes - first, (hand.GetInversion() != 0) != rest.isInverted);
+    const Rest left =
+        Describe(first, m_num_codes - first, (hand.GetInversion() != 0) != rest.isInverted);
+    assert((left.variables & ~rest.variables) == 0);
+    assert((left.variables >> variable & 1u) == 0);
+    return left;
 }
 
 KqColumn::Rest KqColumn::Describe(size_t first, size_t numCodes, bool isInverted) const
 {
+    assert(first + numCodes <= m_codes.size());
     Rest rest = {first, numCodes, 0, 0, isInverted};
     uint64_t sum = 0;
     const KqCode* codes = m_codes.data() + first;
@@ -273,6 +294,8 @@ bool KqColumn::CopyWritten(const Rest& rest, unsigned int level, uint64_t* words
         std::memcmp(m_codes.data() + written.rest.first, m_codes.data() + rest.first,
                     rest.numCodes * sizeof(KqCode)) != 0)
         return false;
+    assert(written.words);
+    assert(written.rest.variables == rest.variables);
     if (written.rest.isInverted == rest.isInverted) {
         std::memcpy(words, written.words, NumWords(level) * sizeof(uint64_t));
     } else {

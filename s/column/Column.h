@@ -34,6 +34,15 @@ struct KqNamedKernel {
 // All kernels of this build, the plain one first, each faster than those before it.
 const KqNamedKernel* KqGetKernels(size_t* numKernels);
 
+// The kernel of this name, or the fastest one when 'name' is null, is not in the table, or names
+// one that this processor lacks.
+const KqNamedKernel& KqChooseKernel(const char* name);
+
+// The kernel of all columns: that of the name in the environment variable
+// MAV_KQ_BOOL_EQUATION_KERNEL, so that a fault seen on one processor can be repeated on another.
+// Chosen once, when the library is loaded.
+const KqNamedKernel& KqGetKernel();
+
 // Bit k of the column, bit k % 64 of word k / 64, is the value of row k. The first variable is bit
 // numVariables-1 of k, the last is bit 0. With fewer than six variables the one word repeats the
 // column's 2^numVariables bits up to its end.

@@ -80,6 +80,8 @@ bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int l
 void KqJoiner::Join(KqCode kind, const Value& lower, const Value& upper, uint32_t variables,
                     bool isInverted, uint64_t* words) const
 {
+    assert((lower.variables & ~variables) == 0);
+    assert((upper.variables & ~variables) == 0);
     const bool isXor = kind == kKqXor;
     KqJoin join;
     join.isXor = isXor;
@@ -126,9 +128,12 @@ bool KqJoiner::Fill(const KqCode* codes, size_t numCodes, bool isInverted, unsig
             break;
         }
         const uint32_t variables = hand.variables | upper.variables;
+        assert(free + (kKqGranuleWords << KqCountBits(variables)) <= m_words.get() + numWords);
         Join(KqKindOf(action), hand, upper, variables, false, free);
         hand = {variables, free, kKqGranuleWords};
         free += kKqGranuleWords << KqCountBits(variables);
     }
+    assert(top == stack + 1); // the first value at hand, which nothing takes
+    assert(free == m_words.get() + numWords);
     return true;
 }

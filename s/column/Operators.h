@@ -6,26 +6,24 @@
 #include "Operands.h"
 #include "Program.h"
 
-// An operator or leaf, null counting as 0, and 1 when its value is complemented.
+// An operator or leaf, null counting as 0.
 struct KqOperand {
     const Kq_BoolEquationImp::Node* node;
-    uint32_t inversion;
+    uint32_t inversion; // 1 when its value is complemented
+    bool isOperator;
 };
 
 // The operand at or below 'node': groups and init values hand theirs on, a NOT inverts it.
 inline KqOperand KqFindOperand(const Kq_BoolEquationImp::Node* node)
 {
     uint32_t inversion = 0;
-    while (node && KqNumOperands(node->GetType()) == 1) {
+    for (; node; node = node->GetLeftChild()) {
+        const unsigned int numOperands = KqNumOperands(node->GetType());
+        if (numOperands != 1)
+            return {node, inversion, numOperands == 2};
         inversion ^= node->IsNot() ? 1u : 0u;
-        node = node->GetLeftChild();
     }
-    return {node, inversion};
-}
-
-inline bool KqIsOperator(const KqOperand& operand)
-{
-    return operand.node && KqNumOperands(operand.node->GetType()) == 2;
+    return {nullptr, inversion, false};
 }
 
 // A binary operator as a kind, and 1 when the result is complemented: OR is an AND of complements.

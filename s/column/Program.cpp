@@ -79,7 +79,7 @@ struct CompilerAsItStands {
     void Compile(const Node* root)
     {
         const KqOperand operand = KqFindOperand(root);
-        if (KqIsOperator(operand))
+        if (operand.isOperator)
             KqWalk(PlaceOf(operand), *this);
         else
             value = compiler.PutLeaf(operand);
@@ -95,11 +95,11 @@ struct CompilerAsItStands {
         place.last = place.node->GetRightChild();
         KqOperand operand = KqFindOperand(place.node->GetLeftChild());
         // The right child may be far away in memory: it is looked at when it is needed.
-        if (!KqIsOperator(operand)) {
+        if (!operand.isOperator) {
             place.last = place.node->GetLeftChild();
             operand = KqFindOperand(place.node->GetRightChild());
         }
-        if (KqIsOperator(operand)) {
+        if (operand.isOperator) {
             first = PlaceOf(operand);
             return KQ_BOTH | KQ_RETURN;
         }
@@ -115,7 +115,7 @@ struct CompilerAsItStands {
         ++numStacked;
         maxStacked = std::max(maxStacked, numStacked);
         const KqOperand operand = KqFindOperand(place.last);
-        if (KqIsOperator(operand)) {
+        if (operand.isOperator) {
             second = PlaceOf(operand);
             return true;
         }
@@ -125,7 +125,7 @@ struct CompilerAsItStands {
 
     void Leave(const Place& place)
     {
-        value = compiler.PutOperator({place.node, place.inversion}, value, place.before);
+        value = compiler.PutOperator({place.node, place.inversion, true}, value, place.before);
         --numStacked;
     }
 
@@ -151,7 +151,7 @@ std::vector<Item> ListItems(const Node* root)
     items.push_back({KqFindOperand(root), 0, 0, 1});
     for (size_t position = 0; position < items.size(); ++position) {
         const KqOperand operand = items[position].operand;
-        if (!KqIsOperator(operand))
+        if (!operand.isOperator)
             continue;
         assert(items.size() < UINT32_MAX - 1);
         items[position].left = static_cast<uint32_t>(items.size());
@@ -222,16 +222,20 @@ KqProgram KqCompile(const Node* root, uint32_t numVariables, bool isReversed)
     CompilerAsItStands asItStands(compiler);
     asItStands.Compile(root);
     KqValue value = asItStands.value;
+    assert(asItStands.numStacked == 0);
     program.numCodes = compiler.GetEnd();
     if (asItStands.maxStacked >= kKqMaxStack) {
         Compiler again(numVariables, isReversed, program.codes);
         const std::vector<Item> items = ListItems(root);
+        assert(items[0].need <= kKqMaxStack);
         CompilerByNeed byNeed{again, items, KqValue()};
         KqWalk(CompilerByNeed::Place{&items[0], KqValue()}, byNeed);
         value = byNeed.value;
         program.numCodes = again.GetEnd();
     }
     program.isInverted = value.GetInversion() != 0;
+    assert(value.GetStart() == 0);
+    assert(value.IsConstant() == (program.numCodes == 0));
     return program;
 }
 
@@ -251,7 +255,9 @@ KqRunProgram(const KqProgram& program,
             stack >>= 1;
             continue;
         }
+        assert(KqVariableOf(*next) < variables.size());
         const unsigned int operand = variables[KqVariableOf(*next)].second;
+        assert(operand <= 1);
         if (action >= kKqCombine) {
             value = table >> (2 * operand) >> value & 1u;
         } else {

@@ -2,6 +2,8 @@
 #ifndef KQ_PROGRAMWRITER_H
 #define KQ_PROGRAMWRITER_H
 
+#include <cassert>
+
 #include "Program.h"
 
 // A value that the machine holds: a constant, or what the steps from a start on compute;
@@ -86,6 +88,7 @@ class KqWriter {
     // The value at hand with the one that was put right before it as the upper value.
     KqValue PutUnstack(KqCode kind, KqValue lower, KqValue upper)
     {
+        assert(upper.GetStart() <= lower.GetStart());
         const uint32_t isAnd = kind >> 2;
         lower = lower.Invert(isAnd & kind);
         upper = upper.Invert(isAnd & kind >> 1);
@@ -118,6 +121,7 @@ class KqWriter {
 
     KqValue Drop(KqValue value, bool isOne)
     {
+        assert(value.GetStart() <= m_end);
         m_end = value.GetStart();
         return KqValue::Constant(m_end, isOne);
     }

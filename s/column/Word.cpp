@@ -60,7 +60,7 @@ struct WordOfTree {
         const KqOperand operand = KqFindOperand(place.node);
         place.node = operand.node;
         place.inversion ^= operand.inversion;
-        if (KqIsOperator(operand))
+        if (operand.isOperator)
             return true;
         word = LeafWord(operand.node) ^ AllBits(operand.inversion);
         return false;

@@ -4,6 +4,8 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
+#include <cassert>
+#include <optional>
 
 #include "Digits.h"
 #include "DigitsText.h"
@@ -34,6 +36,7 @@ void AppendColumn(KqResults results, KqDigitsText& digits)
     digits.Reserve(results.GetNumWords());
     for (size_t end = results.GetNumWords(); end > 0; end -= words.size()) {
         results.Fill(end - words.size(), words.size(), words.data());
+        assert(end % words.size() == 0);
         digits.AppendWords(words.data(), words.size());
     }
 }
@@ -119,17 +122,23 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(vo
     const unsigned int numVariables = GetNumVariables();
     if (!m_store->HasEquation() || numVariables > kKqMaxColumnVariables)
         return false;
+    // What is called may set, clear or destroy this object.
+    KqStore& store = *m_store;
+    std::optional<KqStoreHold> hold;
+    if (goOn)
+        hold.emplace(store);
     if (numVariables <= 6) {
         if (goOn && !goOn(context))
             return false;
         // The one word repeats the rows.
         const uint64_t rows = numVariables == 6 ? 0 : uint64_t(1) << (1u << numVariables);
-        words.assign(1, m_store->GetWord(numVariables) & (rows - 1));
+        words.assign(1, store.GetWord(numVariables) & (rows - 1));
         return true;
     }
-    KqResults results(*m_store, numVariables);
+    KqResults results(store, numVariables);
     std::vector<uint64_t> filled(results.GetNumWords());
     const size_t numPieceWords = goOn ? results.GetNumPieceWords() : filled.size();
+    assert(filled.size() % numPieceWords == 0);
     for (size_t first = 0; first < filled.size(); first += numPieceWords) {
         if (goOn && !goOn(context))
             return false;

@@ -3,6 +3,7 @@
 #include "Evaluation.h"
 
 #include <algorithm>
+#include <cassert>
 #include <memory>
 
 #include "NodeEval.h"
@@ -20,6 +21,7 @@ unsigned int RowOf(const KqEvaluation::Variables& variables, size_t numVariables
     unsigned int row = 0;
     for (size_t index = 0; index < numVariables; ++index)
         row = row << 1 | variables[index].second;
+    assert(row < 1u << numVariables); // values are 0 or 1
     return row;
 }
 
@@ -74,6 +76,7 @@ uint64_t KqEvaluation::GetWord(const Node& root, unsigned int numVariables)
 // Keeps the word of the first that asks.
 void KqEvaluation::PublishWord(uint64_t word, unsigned int numVariables)
 {
+    assert(numVariables <= kMaxWordVariables);
     size_t state = kNoWord;
     if (!m_num_word_variables.compare_exchange_strong(state, kPublishing,
                                                       std::memory_order_relaxed))

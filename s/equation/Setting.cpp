@@ -5,6 +5,7 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
+#include <cassert>
 #include <cstring>
 #include <string>
 
@@ -28,25 +29,22 @@ constexpr size_t kFirstVariables = 8;
 // message's receiver may have set, cleared or destroyed it.
 class Watch {
   public:
-    Watch(const void* object, KqStore* store) : m_watcher{object, nullptr}, m_store(store)
+    Watch(const void* object, KqStore& store)
+        : m_watcher{object, nullptr}, m_store(store), m_hold(store)
     {
-        m_store->Hold(); // so that clearing the object gives it another store
-        m_store->AddWatcher(m_watcher);
+        m_store.AddWatcher(m_watcher);
     }
-    ~Watch()
-    {
-        m_store->RemoveWatcher(m_watcher);
-        KqStore::Release(m_store);
-    }
+    ~Watch() { m_store.RemoveWatcher(m_watcher); }
     Watch(const Watch&) = delete;
     Watch& operator=(const Watch&) = delete;
 
-    bool IsUntouched() const { return m_store->HasHolder(m_watcher); }
-    KqStore& GetStore() const { return *m_store; }
+    bool IsUntouched() const { return m_store.HasHolder(m_watcher); }
+    KqStore& GetStore() const { return m_store; }
 
   private:
     KqStore::Watcher m_watcher;
-    KqStore* m_store;
+    KqStore& m_store;
+    KqStoreHold m_hold; // so that clearing the object gives it another store
 };
 
 // Defines the name of every ID node that is not a variable yet, with value 0 and in text order, and
@@ -68,6 +66,8 @@ void DefineNames(const KqTokens& tokens, const std::vector<Node*>& nodes,
             variables.push_back(Variable(token.word->text, 0u));
             index.Add(token.word->hash);
         }
+        assert(idNode->IsId());
+        assert(KqIsSameText(idNode->GetToken(), variables[variableIndex].first));
         idNode->SetValue(static_cast<unsigned int>(variableIndex));
     }
 }
@@ -169,7 +169,7 @@ bool Kq_BoolEquationImp::BuildTraced(const KqTokens& tokens, std::vector<Variabl
     TakeVariables(inputs);
     KqBuildResult result;
     {
-        Watch watch(this, m_store);
+        Watch watch(this, *m_store);
         try {
             result = KqBuildTree(tree.list, true);
         } catch (...) {
@@ -268,7 +268,7 @@ void Kq_BoolEquationImp::BuildTree()
     m_store->CopyTokens(copy);
     if (copy.list.empty())
         return;
-    Watch watch(this, m_store);
+    Watch watch(this, *m_store);
     const KqBuildResult result = KqBuildTree(copy.list, true);
     if (result.root) {
         copy.root = result.root;

@@ -3,6 +3,7 @@
 #include "Store.h"
 
 #include <algorithm>
+#include <cassert>
 #include <mutex>
 #include <unordered_map>
 
@@ -45,7 +46,10 @@ size_t KqStore::CountNodes() const
 
 void KqStore::TakeTree(KqTree& tree) noexcept
 {
-    assert(!HasEquation() && m_list.empty());
+    assert(!HasEquation());
+    assert(m_list.empty());
+    assert(tree.root);
+    assert(tree.list[0] == tree.root); // in pre-order
     m_list.swap(tree.list);
     m_block.Swap(tree.block);
     m_root.store(tree.root, std::memory_order_release);
@@ -53,7 +57,8 @@ void KqStore::TakeTree(KqTree& tree) noexcept
 
 void KqStore::TakeDigits(std::unique_ptr<KqDigits> digits) noexcept
 {
-    assert(!HasEquation() && m_list.empty());
+    assert(!HasEquation());
+    assert(m_list.empty());
     assert(digits->IsExact());
     const unsigned int numNames = static_cast<unsigned int>(digits->GetNumNames());
     if (numNames <= 6) {
@@ -75,6 +80,7 @@ void KqStore::Clear() noexcept
         std::vector<Node*>().swap(m_list);
     m_evaluation.Drop();
     m_digits.reset();
+    assert(IsEmpty());
 }
 
 // The tree that the digits owe, for all holders. Whoever comes second throws its own away.
@@ -85,6 +91,7 @@ const Node* KqStore::PayTree() const
     // After 'made', so that what is thrown away is freed without the lock.
     const std::lock_guard<std::mutex> paying(s_sharedStores);
     if (!m_root.load(std::memory_order_relaxed)) {
+        assert(m_list.empty()); // invariant 5
         m_list.swap(made.list);
         m_block.Swap(made.block);
         m_root.store(made.root, std::memory_order_release);
@@ -244,8 +251,10 @@ void KqStore::RemoveWatcher(const Watcher& watcher) noexcept
         return;
     }
     Watcher* before = first;
-    while (before->next != &watcher)
+    while (before->next != &watcher) {
         before = before->next;
+        assert(before); // a watcher that was never added
+    }
     before->next = watcher.next;
 }
 

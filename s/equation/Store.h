@@ -4,6 +4,7 @@
 #define KQ_STORE_H
 
 #include <atomic>
+#include <cassert>
 #include <memory>
 
 #include "Digits.h"
@@ -36,10 +37,15 @@ class KqStore {
     KqStore(const KqStore&) = delete;
     KqStore& operator=(const KqStore&) = delete;
 
-    void Hold() { m_count.fetch_add(1, std::memory_order_relaxed); }
+    void Hold()
+    {
+        assert(m_count.load(std::memory_order_relaxed) > 0);
+        m_count.fetch_add(1, std::memory_order_relaxed);
+    }
     // Takes one holder away.
     static void Release(KqStore* store) noexcept
     {
+        assert(store->m_count.load(std::memory_order_relaxed) > 0);
         // Nobody can join the only holder, so it need not count.
         if (!store->IsShared() || store->m_count.fetch_sub(1, std::memory_order_acq_rel) == 1)
             delete store;
@@ -139,6 +145,18 @@ class KqStore {
     mutable KqEvaluation m_evaluation;
     std::unique_ptr<const KqDigits> m_digits;
     std::atomic<Watcher*> m_watchers{nullptr}; // owned by none
+};
+
+// One more holder, while somebody is called who may set, clear or destroy all the others.
+class KqStoreHold {
+  public:
+    explicit KqStoreHold(KqStore& store) : m_store(store) { m_store.Hold(); }
+    ~KqStoreHold() { KqStore::Release(&m_store); }
+    KqStoreHold(const KqStoreHold&) = delete;
+    KqStoreHold& operator=(const KqStoreHold&) = delete;
+
+  private:
+    KqStore& m_store;
 };
 
 #endif

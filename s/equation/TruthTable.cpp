@@ -4,6 +4,7 @@
 #include <Kq_BoolEquationImp.h>
 
 #include <algorithm>
+#include <cassert>
 
 #include "Messages.h"
 #include "Name.h"
@@ -20,6 +21,7 @@ void SetRowValues(uint32_t rowIndex, std::vector<unsigned int>& values)
 {
     for (size_t column = values.size(); column-- > 0; rowIndex >>= 1)
         values[column] = rowIndex & 1u;
+    assert(rowIndex == 0);
 }
 
 // Appends all rows of the column, each with one allocation.

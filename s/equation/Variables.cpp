@@ -4,6 +4,8 @@
 // Cost: a look-up walks the table.
 #include <Kq_BoolEquationImp.h>
 
+#include <cassert>
+
 #include "NameIndex.h"
 #include "Store.h"
 #include "Tokens.h"
@@ -35,6 +37,7 @@ bool Kq_BoolEquationImp::DefineVariable(const String& name, unsigned int value)
     const unsigned int variableIndex = GetNumVariables();
     m_variables.push_back(Variable(name, value ? 1u : 0u));
     m_store->LinkVariable(name, variableIndex);
+    assert(FindVariable(name) == variableIndex); // invariant 2
     return true;
 }
 

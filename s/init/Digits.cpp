@@ -90,6 +90,7 @@ unsigned int RequiredVariables(uint64_t numRows)
 // Exchanges two bits of all row numbers.  Requires: low < high.
 void SwapRowBits(unsigned int low, unsigned int high, std::vector<uint64_t>& words)
 {
+    assert(low < high);
     if (high < 6) {
         // A row with the low bit alone changes places with the one with the high bit alone.
         const unsigned int distance = (1u << high) - (1u << low);
@@ -101,6 +102,7 @@ void SwapRowBits(unsigned int low, unsigned int high, std::vector<uint64_t>& wor
         return;
     }
     const size_t highStep = size_t(1) << (high - 6);
+    assert(words.size() % (2 * highStep) == 0);
     for (size_t word = 0; word < words.size(); ++word) {
         if ((word & highStep) != 0)
             continue;
@@ -174,6 +176,7 @@ std::unique_ptr<KqDigits> KqDigits::Read(const String& text, const Variables& in
         value->ReverseRows();
     if (inputs.size() < 6)
         value->m_words[0] = RepeatRows(value->m_words[0], inputs.size());
+    assert(value->m_num_terms > 0); // invariant 2
     return value;
 }
 
@@ -239,12 +242,6 @@ bool KqDigits::HasSymmetricTerms() const
     return areSymmetric;
 }
 
-unsigned int KqDigits::CountNegations(uint64_t row, size_t numNames) const
-{
-    const size_t numOnes = KqCountBits(row >> (m_names.size() - numNames));
-    return static_cast<unsigned int>(m_is_sum ? numNames - numOnes : numOnes);
-}
-
 // Appends one term: every name, those with a "~" negated.
 void KqDigits::AppendTerm(uint64_t row, std::string& text) const
 {
@@ -276,6 +273,7 @@ unsigned int KqDigits::Eval(const Variables& variables) const
     uint64_t row = 0;
     for (size_t index = 0; index < m_names.size(); ++index)
         row = row << 1 | variables[index].second;
+    assert(row >> m_names.size() == 0);
     return m_words[WordOf(row)] >> (row % 64) & 1u;
 }
 
@@ -286,6 +284,7 @@ void KqDigits::Fill(unsigned int numVariables, uint64_t firstWord, size_t numWor
     // Variables after the names are the lowest bits of a row: each result stands so many times.
     const unsigned int level = numVariables - static_cast<unsigned int>(m_names.size());
     if (level == 0) {
+        assert(firstWord + numWords <= m_words.size());
         std::memcpy(words, m_words.data() + firstWord, numWords * sizeof(uint64_t));
         return;
     }

@@ -3,6 +3,7 @@
 #ifndef KQ_DIGITS_H
 #define KQ_DIGITS_H
 
+#include <cassert>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
@@ -11,6 +12,8 @@
 #include <vector>
 
 #include <port/Port_StringBase.h>
+
+#include "Word.h"
 
 // An init value as read: its text, the names it is read over, and the results of all rows, packed.
 //
@@ -90,7 +93,13 @@ class KqDigits {
     bool HasSymmetricTerms() const;
 
     // How many of the first 'numNames' names have a "~" in the term of 'row'.
-    unsigned int CountNegations(uint64_t row, size_t numNames) const;
+    // Requires: so many names.
+    unsigned int CountNegations(uint64_t row, size_t numNames) const
+    {
+        assert(numNames <= m_names.size());
+        const unsigned int numOnes = KqCountBits(row >> (m_names.size() - numNames));
+        return m_is_sum ? static_cast<unsigned int>(numNames) - numOnes : numOnes;
+    }
 
     // Whether the name has a "~" in the term of 'row'.
     bool IsNegated(uint64_t row, size_t nameIndex) const

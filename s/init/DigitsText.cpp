@@ -8,9 +8,6 @@
 
 namespace {
 
-constexpr char kLowerDigits[] = "0123456789abcdef";
-constexpr char kUpperDigits[] = "0123456789ABCDEF";
-
 // Words whose digits go to the string at a time, from a buffer in the processor's cache.
 constexpr size_t kPieceWords = 256;
 
@@ -63,35 +60,41 @@ void WriteBinary(const unsigned char* bytes, size_t numBytes, char* text)
 
 } // namespace
 
+// Writes the digits of up to kPieceWords words and a 0 after them.
+inline void KqDigitsText::WriteWords(const uint64_t* words, size_t numWords, char* text) const
+{
+    constexpr unsigned char kLower = 'a' - '9' - 1;
+    constexpr unsigned char kUpper = 'A' - '9' - 1;
+    assert(numWords <= kPieceWords);
+    unsigned char bytes[kPieceWords * 8];
+    ReverseBytes(words, numWords, bytes);
+    if (m_base == KQ_HEXADECIMAL)
+        WriteHex(bytes, 8 * numWords, m_upper_case ? kUpper : kLower, text);
+    else
+        WriteBinary(bytes, 8 * numWords, text);
+    text[numWords * 64 / m_base] = '\0';
+}
+
 void KqDigitsText::AppendFewRows(uint64_t word, unsigned int numVariables)
 {
-    assert(numVariables >= 1 && numVariables <= 6);
+    assert(numVariables >= 1);
+    assert(numVariables <= 6);
     const unsigned int numRows = 1u << numVariables;
-    const unsigned int digitBits = std::min<unsigned int>(m_base, numRows);
-    const char* const digits = m_upper_case ? kUpperDigits : kLowerDigits;
-    char buffer[64 + 1];
-    char* end = buffer;
-    for (unsigned int bit = numRows; bit > 0; bit -= digitBits)
-        *end++ = digits[word >> (bit - digitBits) & ((1u << digitBits) - 1)];
-    *end = '\0';
-    m_text += buffer;
+    if (m_base > numRows)
+        word &= (1u << numRows) - 1;
+    // All 64 rows are written, as that needs no loop of its own, and the last ones taken.
+    char text[64 + 1];
+    WriteWords(&word, 1, text);
+    m_text += text + (64 - std::max<unsigned int>(m_base, numRows)) / m_base;
 }
 
 void KqDigitsText::AppendWords(const uint64_t* words, size_t numWords)
 {
-    constexpr unsigned char kLower = 'a' - '9' - 1;
-    constexpr unsigned char kUpper = 'A' - '9' - 1;
-    unsigned char bytes[kPieceWords * 8];
     char text[kPieceWords * 64 + 1];
     while (numWords > 0) {
         const size_t size = std::min(numWords, kPieceWords);
         numWords -= size;
-        ReverseBytes(words + numWords, size, bytes);
-        if (m_base == KQ_HEXADECIMAL)
-            WriteHex(bytes, 8 * size, m_upper_case ? kUpper : kLower, text);
-        else
-            WriteBinary(bytes, 8 * size, text);
-        text[size * 64 / m_base] = '\0';
+        WriteWords(words + numWords, size, text);
         m_text += text;
     }
 }

@@ -54,6 +54,8 @@ class KqDigitsText {
     void AppendWords(const uint64_t* words, size_t numWords);
 
   private:
+    void WriteWords(const uint64_t* words, size_t numWords, char* text) const;
+
     KQ_BASE m_base;
     bool m_upper_case;
     String& m_text;

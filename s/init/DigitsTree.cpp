@@ -67,6 +67,7 @@ class Chain {
             m_has_first = true;
             return;
         }
+        assert(!m_lowest->GetRightChild());
         LinkRight(m_lowest, operand);
         m_lowest = m_lowest->GetParent();
     }

@@ -89,6 +89,7 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
     const Table& table = *shard.table.load(std::memory_order_relaxed);
     Slot* const slot = table.SlotOf(name, length, hash);
     const KqName* const other = slot->load(std::memory_order_relaxed);
+    assert(!other || other->hash == hash);
     if (other)
         return *other;
     const KqName* const added = entry.release();
@@ -120,6 +121,7 @@ void KqNamePool::TakeTable(Shard& shard, std::unique_ptr<Table> larger) noexcept
             larger->SlotOf(entry->text.c_str(), entry->text.length(), entry->hash)
                 ->store(entry, std::memory_order_relaxed);
     }
+    assert(!table || larger->mask > table->mask);
     larger->outgrown.reset(table);
     shard.table.store(larger.release(), std::memory_order_release);
 }

@@ -79,6 +79,7 @@ class TreeBuilder {
     // Makes 'operand' the left operand of 'node'; its parent link is true from now on.
     void TakeLeft(Node* node, Node* operand)
     {
+        assert(!node->GetLeftChild());
         node->SetLeftChild(operand);
         operand->SetParent(node);
         if (operand->IsNot() && !m_holders.empty())
@@ -250,6 +251,8 @@ bool TreeBuilder::Refuse(Refusal::CODE code, const Node* node, size_t numAfter)
 {
     // The first token is placed unseen, and a ")" there is the fault whatever follows from it.
     const Node* first = m_nodes[0];
+    assert(node >= first);
+    assert(static_cast<size_t>(node - first) + numAfter < m_nodes.size());
     m_result.refusal = first->IsRp() ? Refusal::PAREN : code;
     // Nodes lie side by side in text order.
     m_result.refusedPosition = first->IsRp() ? 0 : static_cast<size_t>(node - first) + numAfter;
@@ -325,6 +328,7 @@ Node* TreeBuilder::FindRoot()
         if (!node->GetParent())
             root = node;
     }
+    assert(root); // invariant 1: a tree has a top
     return root;
 }
 

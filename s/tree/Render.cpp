@@ -2,6 +2,7 @@
 // The four renderings differ only in the spelling they ask a node for.
 #include "Render.h"
 
+#include <cassert>
 #include <cstring>
 
 #include "Walk.h"
@@ -109,6 +110,7 @@ void Writer::WriteToken(const String& token)
 
 void Writer::Flush()
 {
+    assert(m_length < kBufferSize);
     m_buffer[m_length] = '\0';
     if (m_length > 0)
         m_result += m_buffer;

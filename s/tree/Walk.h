@@ -114,6 +114,8 @@ void KqWalk(Place place, Visitor&& visitor)
             top.stage = AFTER_LAST;
             if (visitor.Between(top.place, place))
                 break;
+            visitor.Leave(top.place);
+            waiting.Pop();
         }
     }
 }

@@ -1,6 +1,7 @@
 // The packed result column and its kernels, each by name, against evaluation node by node; and the
 // program that they run.
 #include <algorithm>
+#include <cstdlib>
 #include <random>
 
 #include <gtest/gtest.h>
@@ -306,6 +307,25 @@ TEST(Column, EveryKernelGivesWhatThePlainOneGives)
         }
         EXPECT_GT(numCases, 200u) << kernels[index].name;
     }
+}
+
+TEST(Column, AKernelIsChosenByNameAndOtherwiseTheFastestOneIs)
+{
+    size_t numKernels = 0;
+    const KqNamedKernel* const kernels = KqGetKernels(&numKernels);
+    const KqNamedKernel* fastest = kernels;
+    for (size_t index = 0; index < numKernels; ++index)
+        fastest = kernels[index].isSupported() ? &kernels[index] : fastest;
+    for (size_t index = 0; index < numKernels; ++index) {
+        const KqNamedKernel* const wanted =
+            kernels[index].isSupported() ? &kernels[index] : fastest;
+        EXPECT_EQ(wanted, &KqChooseKernel(kernels[index].name)) << kernels[index].name;
+    }
+    for (const char* name : {"", "plai", "plain ", "PLAIN", "sse9"})
+        EXPECT_EQ(fastest, &KqChooseKernel(name)) << name;
+    EXPECT_EQ(fastest, &KqChooseKernel(nullptr));
+    // The tests columns.kernel_* set the variable.
+    EXPECT_EQ(&KqChooseKernel(std::getenv("MAV_KQ_BOOL_EQUATION_KERNEL")), &KqGetKernel());
 }
 
 // Blocks made by joins against the plain kernel, with the joins of each processor by name; trees in

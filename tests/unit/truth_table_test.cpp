@@ -345,6 +345,50 @@ TEST(TruthTable, WhatColumnAsksMayThrow)
     EXPECT_EQ(std::vector<uint64_t>(1, 0xba), words);
 }
 
+// Of few variables, of an init value's digits, of a tree in several pieces.
+TEST(TruthTable, WhatColumnAsksMaySetClearOrDestroyTheEquation)
+{
+    std::string wide = "x0";
+    for (unsigned int index = 1; index < 22; ++index)
+        wide += (index % 3 == 0 ? " ^ x" : " | ~x") + std::to_string(index);
+    for (unsigned int depth = 0; depth < 2000; ++depth)
+        wide += " ^ (x" + std::to_string(depth % 21) + " & x" + std::to_string(depth % 19) + ")";
+    struct Asked {
+        std::unique_ptr<Kq_BoolEquation> equation;
+        unsigned int deed;
+        unsigned int numCalls;
+    };
+    const auto change = [](void* context) {
+        Asked& asked = *static_cast<Asked*>(context);
+        if (++asked.numCalls > 1)
+            return true;
+        if (asked.deed == 0)
+            asked.equation.reset();
+        else if (asked.deed == 1)
+            asked.equation->Clear();
+        else
+            EXPECT_TRUE(asked.equation->SetEquation("a ^ b & c | d ^ e & f ^ g"));
+        return true;
+    };
+    const std::string digits = "0x" + std::string(200, '6') + std::string(56, 'a');
+    for (const std::string& text : {std::string("A & ~B"), wide, digits}) {
+        for (unsigned int deed = 0; deed < 3; ++deed) {
+            Asked asked = {std::make_unique<Kq_BoolEquation>(), deed, 0};
+            std::vector<String> terms;
+            for (unsigned int index = 0; text == digits && index < 10; ++index)
+                terms.push_back(("t" + std::to_string(index)).c_str());
+            ASSERT_TRUE(
+                asked.equation->SetEquationWithExplicitTerms(terms, text.c_str(), false, false));
+            std::vector<uint64_t> expected;
+            ASSERT_TRUE(asked.equation->GetColumn(expected));
+            std::vector<uint64_t> words;
+            EXPECT_TRUE(asked.equation->GetColumn(words, change, &asked));
+            EXPECT_TRUE(expected == words) << text.substr(0, 20) << " " << deed;
+            EXPECT_EQ(text == wide, asked.numCalls > 1);
+        }
+    }
+}
+
 TEST(TruthTable, ColumnIsTheSameInDebugModeAndSilent)
 {
     Kq_BoolEquation equation;

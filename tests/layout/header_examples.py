@@ -36,7 +36,8 @@ def main():
         lines, says = example_of(header)
         source, program = folder / f"{header.stem}.cpp", folder / header.stem
         code = "\n".join(f"    {line}" for line in lines)
-        source.write_text(f"#include <iostream>\n\n#include <kq_logic/{header.name}>\n\n"
+        name = header.resolve().relative_to(pathlib.Path(include).resolve())
+        source.write_text(f"#include <iostream>\n\n#include <{name}>\n\n"
                           f"int main()\n{{\n{code}\n    return 0;\n}}\n", encoding="utf-8")
         subprocess.run([compiler, "-std=c++17", "-Wall", "-Wextra", "-Werror", f"-I{include}",
                         source, "-o", program, *options], check=True)

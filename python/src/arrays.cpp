@@ -24,6 +24,7 @@ namespace {
 
 constexpr size_t kPartRows = 16 * kBlockRows; // of a thread at a time
 constexpr size_t kNodesLikeLookUps = 1500;    // steps that take as long as a look-up in a column
+constexpr size_t kMaxCopiedInputs = 16;       // whose column is copied at once, whatever is asked
 constexpr size_t kNoRow = static_cast<size_t>(-1);
 
 // A packed column that an array shows.
@@ -96,9 +97,13 @@ class Evaluator {
             m_program = std::make_unique<WordProgram>(Expanded(m_rows));
             return;
         }
-        // Digits are a column that only needs copying; the expression would be large.
-        if (isInit && numTableRows / 64 <= numRows) {
+        // Digits are a column that only needs copying; their expression would be large.
+        if (isInit && (m_num_inputs <= kMaxCopiedInputs || numTableRows / 64 <= numRows)) {
             RequireRows(content);
+            return;
+        }
+        if (isInit) {
+            m_digits = &content.equation;
             return;
         }
         const booleq::Expression expression = booleq::ToExpression(content.equation);
@@ -115,6 +120,8 @@ class Evaluator {
             UnpackBits(m_program->Run(block.data(), (numRows + 63) / 64), numRows, results);
             return;
         }
+        if (m_digits)
+            return RunByRow(block, numRows, results);
         std::vector<uint32_t> numbers(numRows);
         std::vector<uint8_t> values(numRows);
         for (size_t input = 0; input < m_num_inputs; ++input) {
@@ -139,8 +146,21 @@ class Evaluator {
         static_cast<void>(hasRows);
     }
 
+    void RunByRow(const std::vector<uint64_t>& block, size_t numRows, uint8_t* results) const
+    {
+        Kq_BoolEquation equation(*m_digits);
+        std::vector<unsigned int> values(m_num_inputs);
+        for (size_t row = 0; row < numRows; ++row) {
+            for (size_t input = 0; input < m_num_inputs; ++input)
+                values[input] = block[kBlockWords * input + row / 64] >> (row % 64) & 1u ? 1u : 0u;
+            results[row] = static_cast<uint8_t>(ValueOf(equation, values));
+        }
+    }
+
+    // One of the three: a program, an init value that is asked row by row, or its column.
     size_t m_num_inputs;
-    std::unique_ptr<WordProgram> m_program; // null: rows are looked up
+    std::unique_ptr<WordProgram> m_program;
+    const Kq_BoolEquation* m_digits = nullptr;
     booleq::Rows m_rows;
 };
 

@@ -337,6 +337,15 @@ void SetEquationClass(const py::object& type)
         PyType_IsSubtype(reinterpret_cast<PyTypeObject*>(type.ptr()), coreType) == 0)
         throw py::type_error("a class that is derived from Core");
     equationClass = reinterpret_cast<PyTypeObject*>(type.inc_ref().ptr());
+    // Classes written in Python are the garbage collector's matter. Equations hold texts and names
+    // and never each other, and a million of them would make it run through all memory again and
+    // again.  Requires: no objects yet.
+    equationClass->tp_flags &= ~Py_TPFLAGS_HAVE_GC;
+    equationClass->tp_traverse = nullptr;
+    equationClass->tp_clear = nullptr;
+    equationClass->tp_alloc = PyType_GenericAlloc;
+    equationClass->tp_free = PyObject_Free;
+    equationClass->tp_dealloc = Destroy;
 }
 
 } // namespace booleq_python

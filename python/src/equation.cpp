@@ -19,8 +19,7 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kLargeText = 2000;     // characters that take some ten microseconds
-constexpr size_t kEndlessText = 200000; // those that take so long that somebody may not wait
+constexpr size_t kEndlessText = 200000; // characters that take so long that somebody may not wait
 
 size_t Mix(size_t hash, size_t value)
 {
@@ -100,7 +99,8 @@ SharedContent Read(const std::string& bytes, const booleq::Reading& reading)
     return content;
 }
 
-// How a text is read that Python gives with these inputs, a tuple or None.
+} // namespace
+
 booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst)
 {
     booleq::Reading reading;
@@ -112,20 +112,25 @@ booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst)
     return reading;
 }
 
-} // namespace
-
-Equation::Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst)
-    : m_content(std::move(content)), m_text(std::move(text)),
-      m_given_inputs(std::move(givenInputs)), m_lsb_first(lsbFirst)
+unsigned int ValueOf(Kq_BoolEquation& equation, const std::vector<unsigned int>& values)
 {
-    assert(m_content && (m_text || m_content->IsInit()));
+    assert(values.size() == equation.GetNumVariables());
+    // The handle is a cached number, which any equation with so many variables honours. One asked
+    // for by name would list all places of the name, and so make the tree of an init value.
+    static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
+    Kq_BoolEquation::Handle handle = first;
+    for (size_t input = 0; input < values.size(); ++input) {
+        *handle.begin() = static_cast<unsigned int>(input);
+        equation.SetVariable(handle, values[input]);
+    }
+    return equation.Eval();
 }
 
-const py::object& Equation::Text() const
+const SharedContent& Equation::ReadAgain() const
 {
-    if (!m_text)
-        m_text = py::str(FunctionOf(*this).Hex());
-    return m_text;
+    m_content = Read(Encode(py::reinterpret_borrow<py::str>(m_text)), GetReading());
+    assert(m_content);
+    return m_content;
 }
 
 booleq::Reading Equation::GetReading() const
@@ -151,51 +156,42 @@ std::vector<std::string> Equation::InputBytes() const
 
 bool Equation::IsLargeText() const
 {
-    return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kLargeText;
+    return static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kLargeText;
 }
 
 bool Equation::IsEndlessText() const
 {
-    return m_text && static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kEndlessText;
+    return static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kEndlessText;
 }
 
 unsigned int Equation::Evaluate(const std::vector<unsigned int>& values) const
 {
     assert(values.size() == NumInputs());
-    const auto evaluate = [&](Kq_BoolEquation& equation) {
-        // The handle is a cached number, which any equation with so many variables honours.
-        static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
-        Kq_BoolEquation::Handle handle = first;
-        for (size_t input = 0; input < values.size(); ++input) {
-            *handle.begin() = static_cast<unsigned int>(input);
-            equation.SetVariable(handle, values[input]);
-        }
-        return equation.Eval();
-    };
-    if (IsLargeText()) { // without the lock, so with a copy that no other call knows
+    if (IsLargeText() && !IsInit()) { // without the lock, so with a copy that no other call knows
         Kq_BoolEquation copy(Get());
-        return Freely([&] { return evaluate(copy); });
+        return Freely([&] { return ValueOf(copy, values); });
     }
     if (!m_scratch)
         m_scratch = std::make_unique<Kq_BoolEquation>(Get());
-    return evaluate(*m_scratch);
+    return ValueOf(*m_scratch, values);
 }
 
 bool Equation::IsSame(const Equation& other) const
 {
-    if (m_content == other.m_content)
+    if (this == &other)
         return true;
-    const SharedContent own = m_content; // the lock is given up: nobody else may keep them
-    const SharedContent theirs = other.m_content;
-    return FreelyIf(IsLarge() && other.IsLarge(), [&] { return AreSame(*own, *theirs); });
+    const SharedContent own = Shared(); // the lock is given up: nobody else may keep them
+    const SharedContent theirs = other.Shared();
+    return own == theirs ||
+           FreelyIf(IsLarge() && other.IsLarge(), [&] { return AreSame(*own, *theirs); });
 }
 
 int Equation::Compare(const Equation& other) const
 {
     if (IsSame(other))
         return 0;
-    const SharedContent own = m_content;
-    const SharedContent theirs = other.m_content;
+    const SharedContent own = Shared();
+    const SharedContent theirs = other.Shared();
     return FreelyIf(IsLarge() || other.IsLarge(), [&] {
         const std::vector<std::string> left = SortKey(*own);
         const std::vector<std::string> right = SortKey(*theirs);
@@ -207,7 +203,7 @@ int Equation::Compare(const Equation& other) const
 size_t Equation::Hash() const
 {
     if (!m_has_hash) {
-        const SharedContent content = m_content;
+        const SharedContent content = Shared();
         m_hash = FreelyIf(IsLarge(), [&] { return HashOf(*content); });
         m_has_hash = true;
     }

@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <pybind11/pybind11.h>
@@ -32,20 +33,29 @@ struct Content {
 };
 typedef std::shared_ptr<const Content> SharedContent;
 
+// The value of the equation, which may be a copy, for values of its inputs in their order.
+unsigned int ValueOf(Kq_BoolEquation& equation, const std::vector<unsigned int>& values);
+
 // Invariants:
 // 1. A given list of inputs is a tuple of plain str, legal names, none twice; otherwise None.
 // 2. What is made on demand is made under the interpreter's lock.
+// 3. Without content it is of a text that is accepted, and not large: one of very many that were
+// read to see that, and whose trees would fill the memory. It is read again when asked for.
 class Equation {
   public:
-    // 'text' may be null for an init value: its digits are then made on demand.
-    Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst);
+    // 'content' may be null, see invariant 3.
+    Equation(SharedContent content, py::object text, py::object givenInputs, bool lsbFirst)
+        : m_content(std::move(content)), m_text(std::move(text)),
+          m_given_inputs(std::move(givenInputs)), m_lsb_first(lsbFirst)
+    {
+    }
 
-    const Kq_BoolEquation& Get() const { return m_content->equation; }
-    const SharedContent& Shared() const { return m_content; }
-    bool IsInit() const { return m_content->IsInit(); }
-    size_t NumInputs() const { return m_content->NumInputs(); }
+    const Kq_BoolEquation& Get() const { return Shared()->equation; }
+    const SharedContent& Shared() const { return m_content ? m_content : ReadAgain(); }
+    bool IsInit() const { return Shared()->IsInit(); }
+    size_t NumInputs() const { return Shared()->NumInputs(); }
 
-    const py::object& Text() const;
+    const py::object& Text() const { return m_text; }
     const py::object& GivenInputs() const { return m_given_inputs; }
     bool IsLsbFirst() const { return m_lsb_first; }
     // How the text was read.
@@ -59,7 +69,8 @@ class Equation {
     // Whether the text is so long that reading or writing it takes longer than somebody waits.
     bool IsEndlessText() const;
 
-    // 0 or 1 for values of the inputs in their order, each 0 or 1.
+    // 0 or 1 for values of the inputs in their order, each 0 or 1.  Cost: of an init value that of
+    // setting the inputs, however many rows there are.
     unsigned int Evaluate(const std::vector<unsigned int>& values) const;
 
     // The same text but for spelling, or the same digits, over the same inputs in the same order.
@@ -69,8 +80,10 @@ class Equation {
     size_t Hash() const;
 
   private:
-    SharedContent m_content;
-    mutable py::object m_text;
+    const SharedContent& ReadAgain() const;
+
+    mutable SharedContent m_content;
+    py::object m_text;
     py::object m_given_inputs;
     mutable py::object m_inputs; // null until asked for
     bool m_lsb_first;
@@ -82,6 +95,12 @@ class Equation {
 // The names of an iterable as a tuple of plain str.
 // Fails: TypeError, and ValueError for what is not a legal name or is listed twice.
 py::tuple RequireInputs(const py::object& inputs);
+
+// Characters of a text that takes some ten microseconds.
+constexpr size_t kLargeText = 2000;
+
+// How a text is read that Python gives with these inputs, a tuple or None.
+booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst);
 
 // Reads a text.  Fails: booleq.ParseError.
 py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool lsbFirst);

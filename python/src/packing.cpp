@@ -101,95 +101,6 @@ void Narrow(const ValueColumn& column, size_t first, size_t numRows, uint8_t* by
     }
 }
 
-#ifdef __SSE2__
-
-// Eight bytes of each of 16 rows, a row every 'stride' bytes, turned: pieces[k] is the 16 bits of
-// column k; at least numColumns of them are written.
-void TurnBytes(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uint16_t* pieces,
-               __m128i& all)
-{
-    __m128i in[16];
-    for (std::ptrdiff_t row = 0; row < 16; ++row) {
-        in[row] = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(rows + row * stride));
-        all = _mm_or_si128(all, in[row]);
-    }
-    // Each step puts a register beside the one half as many rows on.
-    __m128i two[8];
-    for (unsigned int row = 0; row < 8; ++row)
-        two[row] = _mm_unpacklo_epi8(in[row], in[row + 8]);
-    __m128i four[8]; // columns 0 to 3, then 4 to 7
-    for (unsigned int row = 0; row < 4; ++row) {
-        four[row] = _mm_unpacklo_epi8(two[row], two[row + 4]);
-        four[row + 4] = _mm_unpackhi_epi8(two[row], two[row + 4]);
-    }
-    for (unsigned int half = 0; half < (numColumns <= 4 ? 1 : 2); ++half) {
-        const __m128i* const from = four + 4 * half;
-        const __m128i eight[4] = {
-            _mm_unpacklo_epi8(from[0], from[2]), _mm_unpackhi_epi8(from[0], from[2]),
-            _mm_unpacklo_epi8(from[1], from[3]), _mm_unpackhi_epi8(from[1], from[3])};
-        const __m128i columns[4] = {
-            _mm_unpacklo_epi8(eight[0], eight[2]), _mm_unpackhi_epi8(eight[0], eight[2]),
-            _mm_unpacklo_epi8(eight[1], eight[3]), _mm_unpackhi_epi8(eight[1], eight[3])};
-        for (unsigned int column = 0; column < 4; ++column)
-            pieces[4 * half + column] =
-                static_cast<uint16_t>(_mm_movemask_epi8(_mm_slli_epi16(columns[column], 7)));
-    }
-}
-
-// 16 rows into bits 16 * part to 16 * part + 15 of the columns' words.
-class RowTurner {
-  public:
-    RowTurner(const ByteRows& rows, uint64_t* words, size_t wordStride)
-        : m_rows(rows), m_words(words), m_word_stride(wordStride),
-          m_end(rows.data + (static_cast<std::ptrdiff_t>(rows.numRows) - 1) * rows.rowStride +
-                static_cast<std::ptrdiff_t>(rows.numColumns))
-    {
-    }
-
-    void Turn(size_t firstRow, size_t numRows, size_t word, unsigned int part)
-    {
-        const uint8_t* const from =
-            m_rows.data + static_cast<std::ptrdiff_t>(firstRow) * m_rows.rowStride;
-        for (size_t column = 0; column < m_rows.numColumns; column += 8) {
-            const size_t numColumns = std::min<size_t>(8, m_rows.numColumns - column);
-            const uint8_t* source = from + column;
-            std::ptrdiff_t stride = m_rows.rowStride;
-            uint8_t copy[16 * 8];
-            if (numRows < 16 || source + 15 * stride + 8 > m_end) {
-                std::memset(copy, 0, sizeof copy);
-                for (size_t row = 0; row < numRows; ++row)
-                    std::memcpy(copy + 8 * row, source + static_cast<std::ptrdiff_t>(row) * stride,
-                                numColumns);
-                source = copy;
-                stride = 8;
-            }
-            uint16_t pieces[8];
-            __m128i all = _mm_setzero_si128();
-            TurnBytes(source, stride, numColumns, pieces, all);
-            uint64_t seen = 0;
-            _mm_storel_epi64(reinterpret_cast<__m128i*>(&seen), all);
-            const uint64_t mask = ~uint64_t(0) >> (64 - 8 * numColumns); // x86 is little-endian
-            m_seen |= seen & mask;
-            for (size_t index = 0; index < numColumns; ++index) {
-                uint64_t& target = m_words[(column + index) * m_word_stride + word];
-                const uint64_t bits = static_cast<uint64_t>(pieces[index]) << (16 * part);
-                target = part == 0 ? bits : target | bits;
-            }
-        }
-    }
-
-    bool IsFine() const { return (m_seen & ~kLowBits) == 0; }
-
-  private:
-    const ByteRows& m_rows;
-    uint64_t* m_words;
-    size_t m_word_stride;
-    const uint8_t* m_end;
-    uint64_t m_seen = 0;
-};
-
-#endif
-
 } // namespace
 
 bool PackColumn(const ValueColumn& column, size_t first, size_t numRows, uint64_t* words)
@@ -216,25 +127,6 @@ bool IsFault(const ValueColumn& column, size_t row)
     uint8_t byte = 0;
     Narrow(column, row, 1, &byte);
     return byte > 1;
-}
-
-bool PackRows(const ByteRows& rows, size_t first, size_t numRows, uint64_t* words,
-              size_t wordStride)
-{
-#ifdef __SSE2__
-    RowTurner turner(rows, words, wordStride);
-    for (size_t row = 0; row < numRows; row += 16)
-        turner.Turn(first + row, std::min<size_t>(16, numRows - row), row / kWordRows,
-                    static_cast<unsigned int>(row % kWordRows / 16));
-    return turner.IsFine();
-#else
-    bool isFine = true;
-    for (size_t column = 0; column < rows.numColumns; ++column)
-        isFine = PackColumn({rows.data + column, rows.rowStride, ItemKind::Byte}, first, numRows,
-                            words + column * wordStride) &&
-                 isFine;
-    return isFine;
-#endif
 }
 
 void UnpackBits(const uint64_t* words, size_t numBits, uint8_t* bytes)

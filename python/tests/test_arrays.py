@@ -211,3 +211,24 @@ class TestMemory:
         finally:
             resource.setrlimit(resource.RLIMIT_AS, old)
         assert equation.eval_many(np.ones((2, 30), dtype=bool)).tolist() == [1, 1]
+
+
+@pytest.mark.parametrize("gap", [0, 1, 3])
+@pytest.mark.parametrize("num_inputs", [1, 2, 3, 4, 5, 7, 8, 9, 15, 16, 17, 24, 25, 33])
+def test_rows_of_bytes(num_inputs: int, gap: int) -> None:
+    """Rows with and without gaps, whole words of them and some more, up to the end of memory."""
+    generator = np.random.default_rng(num_inputs)
+    names = [f"x{k}" for k in range(num_inputs)]
+    equation = Equation(" ^ ".join(f"({name} & {names[(7 * k + 1) % num_inputs]})"
+                                   for k, name in enumerate(names)) + " ^ x0", names)
+    for num_rows in (1, 15, 16, 63, 64, 65, 127, 128, 200, 70_001):
+        wide = generator.integers(0, 2, (num_rows, num_inputs + gap), dtype=np.uint8)
+        wide[:, num_inputs:] = 7  # nobody's
+        rows = wide[:, :num_inputs]
+        products = rows & rows[:, (7 * np.arange(num_inputs) + 1) % num_inputs]
+        expected = np.bitwise_xor.reduce(products, axis=1) ^ rows[:, 0]
+        assert np.array_equal(equation.eval_many(rows), expected)
+        row, column = generator.integers(num_rows), generator.integers(num_inputs)
+        rows[row, column] = 2
+        with pytest.raises(ValueError, match=rf"\[{row}, {column}\] must be 0 or 1, not 2"):
+            equation.eval_many(rows)

@@ -151,6 +151,40 @@ def test_a_leak_would_be_found() -> None:
     assert growth(lambda: column.append(EQUATION.packed_column()), NUM_CYCLES) > MAX_GROWTH
 
 
+WIDE = [f"x{place}" for place in range(16)]
+QUESTIONS: Mapping[str, Callable[[Equation], object]] = {
+    "value": lambda eq: eq(dict.fromkeys(WIDE, 1)),
+    "values of one row": lambda eq: eq.eval_many([[1] * 16]),
+    "value by name": lambda eq: eq.eval_many(dict.fromkeys(WIDE, [0, 1])),
+    "equality": lambda eq: (eq == EQUATION, hash(eq), eq < INIT),
+    "support": lambda eq: (eq.support, eq.count_ones()),
+    "decisions": lambda eq: (eq.satisfiable(), eq.is_tautology(), eq.equivalent(eq)),
+    "init value": lambda eq: (eq.hex_init(), eq.sized_init(True), eq.primary, str(eq), repr(eq)),
+    "others": lambda eq: (~eq, eq.cofactor(x3=1), eq.rename({"x1": "y"}), eq.permute(WIDE[::-1])),
+    "columns": lambda eq: (eq.packed_column(), eq.column(), eq.truth_table()),
+    "table for people": lambda eq: eq._repr_html_(),
+}
+
+
+@pytest.mark.parametrize("name", QUESTIONS)
+def test_no_question_makes_the_tree_of_an_init_value(name: str) -> None:
+    """Of 16 inputs it has a million nodes, which stay as long as the equation."""
+    value = int.from_bytes(np.random.default_rng(1).bytes(2 ** 13), "little")
+    QUESTIONS[name](Equation.from_init(value ^ 1, WIDE))
+    equation = Equation.from_init(value, WIDE)
+    before = resident_bytes()
+    QUESTIONS[name](equation)
+    assert resident_bytes() - before < 8 << 20
+
+
+def test_a_tree_would_be_found() -> None:
+    value = int.from_bytes(np.random.default_rng(1).bytes(2 ** 13), "little")
+    equation = Equation.from_init(value, WIDE)
+    before = resident_bytes()
+    equation.render("alt1")
+    assert resident_bytes() - before > 32 << 20
+
+
 def test_large_columns_go_with_their_arrays() -> None:
     """8 MB each, by an array, a view of it and an exception that holds neither."""
     equation = Equation("^".join(f"n{place}" for place in range(26)))

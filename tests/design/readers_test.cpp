@@ -472,4 +472,29 @@ TEST(NetlistFiles, HugeFilesAreRefusedBeforeTheyAreRead)
     std::remove(file.c_str());
 }
 
+// A short file could ask for any memory: each of these tables is 8 KB.
+TEST(NetlistFiles, ManyWideTablesAreRefusedAtALimit)
+{
+    const auto text = [](unsigned int count) {
+        std::string file = ".model m\n.inputs";
+        std::string pins;
+        for (unsigned int pin = 0; pin < 16; ++pin)
+            pins += " i" + std::to_string(pin);
+        file += pins + "\n";
+        for (unsigned int table = 0; table < count; ++table) {
+            std::string row;
+            for (unsigned int pin = 0; pin < 16; ++pin)
+                row += (table >> pin & 1u) != 0 ? '1' : '0';
+            file += ".names" + pins + " y" + std::to_string(table) + "\n" + row + " 1\n";
+        }
+        return file + ".end\n";
+    };
+    EXPECT_EQ(MustRead(text(32768)).tables.size(), 32768u);
+    EXPECT_EQ(
+        FaultOf(text(32769)),
+        "test: line 65539: with this table the different init values take more than 256 MB, a "
+        "table of 16 inputs taking 8192 bytes; map the design to narrower tables, or give it "
+        "in parts");
+}
+
 } // namespace

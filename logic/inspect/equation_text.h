@@ -33,6 +33,17 @@ struct FunctionTexts {
 // Threads: any.
 FunctionTexts MakeTexts(const Rows& rows, const Target& target);
 
+// Inputs for functions that stand for themselves: A, B, C and so on.
+std::vector<std::string> Letters(unsigned int numInputs);
+
+// What a function over such inputs is called, and its short expression.
+struct NamedFunction {
+    std::string kind;
+    std::string meaning;
+    std::string equation;
+};
+NamedFunction NameFunction(const Rows& rows);
+
 // Whether a target writes expressions; others write files.
 bool WritesExpressions(const Target& target);
 

@@ -216,10 +216,9 @@ class Lister {
     {
         m_output.Put(Visible(table.path) + "  " + Visible(table.type) + "\n    " +
                      Visible(table.output) + " = " +
-                     (table.equation.empty() ? "(no expression of bearable length)"
-                                             : Visible(table.equation)) +
-                     "\n    " + (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") +
-                     "init " + table.init + ", " + table.lsbInit + " least first; pins " +
+                     (table.equation.empty() ? kNoExpression : Visible(table.equation)) + "\n    " +
+                     (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") + "init " +
+                     table.init + ", " + table.lsbInit + " least first; pins " +
                      (table.pins.empty() ? "none" : Visible(Join(table.pins, ", "))) + "\n");
     }
 

@@ -22,7 +22,7 @@ ForeignText ReadForeignText(const std::string& text, const Notation& notation);
 
 // What the tree says as operators on bits, over its names. Where values are wider than a bit and
 // that shows, a short form of the function.
-// Fails: false, in that case, with more than 8 inputs or where no bearable length was found.
+// Fails: false, in that case, with more than 8 inputs or where none short enough was found.
 bool ToBits(const ForeignTree& tree, const WordFunction& function, Expression& expression);
 
 } // namespace booleq

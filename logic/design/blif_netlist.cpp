@@ -303,7 +303,10 @@ class BlifNetlistReader {
             return;
         }
         if (m_num_pins == 1 && m_num_rows == 1 && m_is_wire && !m_is_named) {
-            Connect(m_inputs[0], NetOf(m_output_name));
+            const LocalNet joined = NetOf(m_output_name);
+            Connect(m_inputs[0], joined);
+            AddNote(FindingCode::Buffer, joined,
+                    "only passes " + NameOf(m_inputs[0]) + "; the two nets are one");
             return;
         }
         const LocalNet output = NetOf(m_output_name);
@@ -332,8 +335,31 @@ class BlifNetlistReader {
             return;
         }
         const LocalNet output = NetOf(m_output_name);
-        if (output != kNetUnknown)
-            m_module->joins.emplace_back(m_rows_are == Rows01::Ones ? kNetOne : kNetZero, output);
+        if (output == kNetUnknown)
+            return;
+        const bool isOne = m_rows_are == Rows01::Ones;
+        m_module->joins.emplace_back(isOne ? kNetOne : kNetZero, output);
+        if (m_output_name != (isOne ? "$true" : "$false")) // which only spell a constant
+            AddNote(FindingCode::ConstantNet, output, isOne ? "always 1" : "always 0");
+    }
+
+    std::string NameOf(LocalNet net) const
+    {
+        return net < kNumFixedNets ? std::string("1'bx")
+                                   : std::string(m_job.design.names.Text(m_module->netNames[net]));
+    }
+
+    // What is said of a table that does not become one.
+    void AddNote(FindingCode code, LocalNet output, const std::string& text)
+    {
+        if (output < kNumFixedNets)
+            return;
+        ReadFinding finding;
+        finding.code = code;
+        finding.line = m_intake.Line();
+        finding.name = {0, m_module->netNames[output]};
+        finding.text = text;
+        m_module->findings.push_back(std::move(finding));
     }
 
     // --- cells

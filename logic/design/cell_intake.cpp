@@ -290,6 +290,21 @@ void CellIntake::EndPending()
     PlaceFindings(ReadFinding::kNoTable);
 }
 
+InitId CellIntake::AddInit(unsigned int numInputs, const uint64_t* words, const uint64_t* unknown)
+{
+    InitId init = 0;
+    if (m_inits.Add(numInputs, words, unknown, init))
+        return init;
+    const std::string what = "with this table the different init values take more than " +
+                             std::to_string(kMaxInitBytes >> 20) + " MB, a table of " +
+                             booleq::Count(numInputs, "input") + " taking " +
+                             std::to_string(NumWords(numInputs) * 8) +
+                             " bytes; map the design to narrower tables, or give it in parts";
+    if (m_line != 0)
+        ThrowAtLine(m_line, what);
+    throw ReadFault{"cell " + Quoted(m_design.names.Text(m_name)) + ": " + what};
+}
+
 void CellIntake::AddFinding(FindingCode code, const std::string& text)
 {
     ReadFinding finding;

@@ -34,6 +34,7 @@ class CellIntake {
 
     // 0 is not a name.
     void Begin(NameId name, uint32_t line);
+    uint32_t Line() const { return m_line; } // as Begin got it
     void SetType(std::string_view type) { m_type = type; }
     void SetName(NameId name) { m_name = name; }
     void SetKey(NameId key) { m_key = key; }
@@ -87,6 +88,7 @@ class CellIntake {
     bool ReadParameter(const CellParameter& parameter, uint32_t numBits, InitDigits& digits);
     bool AddOutput(const CellType& type, const ComposedTable& output, uint32_t designType);
     void RemoveTables(size_t first);
+    InitId AddInit(unsigned int numInputs, const uint64_t* words, const uint64_t* unknown);
     void PushTable(uint32_t designType, size_t outputPin, LocalNet output, InitId init);
     void AddFinding(FindingCode code, const std::string& text);
     void PlaceFindings(uint32_t table);

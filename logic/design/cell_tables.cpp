@@ -51,7 +51,7 @@ void CellIntake::EndVectorTable(const CellType& type, uint32_t designType)
         EndUnreadOf(designType);
         return;
     }
-    const InitId init = m_inits.Add(numInputs, m_digits[0].words.data(), UnknownOf(m_digits[0]));
+    const InitId init = AddInit(numInputs, m_digits[0].words.data(), UnknownOf(m_digits[0]));
     PushTable(designType, 0, OutputNet(type.outputPins[0]), init);
     Count(designType);
 }
@@ -159,8 +159,8 @@ bool CellIntake::AddOutput(const CellType& type, const ComposedTable& output, ui
     for (const uint32_t pin : output.Pins())
         m_inputs.push_back(InputNet(type.inputPins[pin], pin, type.isOpenZero));
     const bool hasUnknown = output.Tabulate(m_digits, m_words, m_unknown);
-    const InitId init = m_inits.Add(static_cast<unsigned int>(m_inputs.size()), m_words.data(),
-                                    hasUnknown ? m_unknown.data() : nullptr);
+    const InitId init = AddInit(static_cast<unsigned int>(m_inputs.size()), m_words.data(),
+                                hasUnknown ? m_unknown.data() : nullptr);
     const auto place =
         std::find(type.outputPins.begin(), type.outputPins.end(), output.Step().name);
     assert(place != type.outputPins.end());
@@ -198,8 +198,7 @@ void CellIntake::EndWithRows(const Rows& rows, const std::vector<LocalNet>& inpu
     if (known.designTypes.empty())
         known.designTypes.push_back(AddDesignType(m_type, CellRole::Table));
     m_inputs = inputs;
-    PushTable(known.designTypes[0], 0, output,
-              m_inits.Add(rows.NumInputs(), rows.Words(), nullptr));
+    PushTable(known.designTypes[0], 0, output, AddInit(rows.NumInputs(), rows.Words(), nullptr));
     Count(known.designTypes[0]);
 }
 

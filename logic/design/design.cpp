@@ -28,6 +28,8 @@ constexpr CodeText kCodeTexts[] = {
     {"too-wide", "the table has more than 16 inputs; the cell is not read"},
     {"mode-unread", "in this mode the cell is more than logic; it is not read"},
     {"cover-mixed", "the table has both rows of 0 and rows of 1; it is not read"},
+    {"buffer", "the table only passes a net: the two nets are one, and it is not counted"},
+    {"constant-net", "the table has no inputs: its net is constant, and it is not counted"},
     {"name-twice", "another cell has the same name"},
     {"driver-twice", "the net has a second driver"},
     {"module-unused", "the module is not below the top; it is not read"},
@@ -76,6 +78,14 @@ std::string NetName(const Design& design, NetId net)
 {
     static constexpr const char* kFixed[kNumFixedNets] = {"1'b0", "1'b1", "1'bx", "(open)"};
     return net < kNumFixedNets ? kFixed[net] : Path(design, design.nets[net]);
+}
+
+std::string TableName(const Design& design, uint32_t table)
+{
+    const DesignTable& own = design.tables[table];
+    const std::vector<std::string>& pins = design.types[own.type].outputPins;
+    const std::string path = Path(design, own.name);
+    return pins.size() > 1 ? path + " (" + pins[own.outputPin] + ")" : path;
 }
 
 } // namespace booleq

@@ -112,6 +112,8 @@ enum class FindingCode {
     TooWide,        // more than kMaxTableInputs inputs; the cell is not read
     ModeUnread,     // a parameter makes the cell more than logic; it is not read
     CoverMixed,     // rows of 0 and of 1 in one table; the cell is not read
+    Buffer,         // a table of BLIF that joins two nets; not among the tables
+    ConstantNet,    // a table of BLIF without inputs; not among the tables
     NameTwice,      // two cells of one name
     DriverTwice,    // a net with a second driver
     ModuleUnused,   // a module with tables that is not below the top; not read
@@ -168,6 +170,8 @@ struct Design {
 };
 
 std::string Path(const Design& design, const ScopedName& name);
+// A table as the file calls it: the path, of a cell with several outputs with the pin.
+std::string TableName(const Design& design, uint32_t table);
 // The name to show; "1'b0", "1'b1", "1'bx" and "(open)" for those that are not wires.
 std::string NetName(const Design& design, NetId net);
 

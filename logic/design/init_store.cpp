@@ -3,8 +3,6 @@
 #include <algorithm>
 #include <cassert>
 
-#include "read_fault.h"
-
 namespace booleq {
 
 namespace {
@@ -44,7 +42,8 @@ bool InitStore::IsSame(InitId init, unsigned int numInputs, const uint64_t* word
            (unknown == nullptr || std::equal(own + numWords, own + 2 * numWords, unknown));
 }
 
-InitId InitStore::Add(unsigned int numInputs, const uint64_t* words, const uint64_t* unknown)
+bool InitStore::Add(unsigned int numInputs, const uint64_t* words, const uint64_t* unknown,
+                    InitId& init)
 {
     assert(numInputs <= kMaxTableInputs);
     if ((m_design.inits.size() + 1) * 4 > m_slots.size() * 3)
@@ -52,11 +51,14 @@ InitId InitStore::Add(unsigned int numInputs, const uint64_t* words, const uint6
     const size_t mask = m_slots.size() - 1;
     size_t slot = static_cast<size_t>(Hash(numInputs, words, unknown)) & mask;
     for (; m_slots[slot] != 0; slot = (slot + 1) & mask)
-        if (IsSame(m_slots[slot] - 1, numInputs, words, unknown))
-            return m_slots[slot] - 1;
+        if (IsSame(m_slots[slot] - 1, numInputs, words, unknown)) {
+            init = m_slots[slot] - 1;
+            return true;
+        }
     const size_t numWords = NumWords(numInputs);
-    if (m_design.words.size() > UINT32_MAX - 2 * numWords)
-        throw ReadFault{"the init values are more than 32 GB"};
+    const size_t numNewWords = unknown != nullptr ? 2 * numWords : numWords;
+    if ((m_design.words.size() + numNewWords) * sizeof(uint64_t) > kMaxInitBytes)
+        return false;
     InitValue value;
     value.firstWord = static_cast<uint32_t>(m_design.words.size());
     value.numInputs = static_cast<uint8_t>(numInputs);
@@ -66,7 +68,8 @@ InitId InitStore::Add(unsigned int numInputs, const uint64_t* words, const uint6
         m_design.words.insert(m_design.words.end(), unknown, unknown + numWords);
     m_design.inits.push_back(value);
     m_slots[slot] = static_cast<uint32_t>(m_design.inits.size());
-    return m_slots[slot] - 1;
+    init = m_slots[slot] - 1;
+    return true;
 }
 
 void InitStore::Grow()

@@ -12,10 +12,12 @@
 
 #include <fcntl.h>
 #include <spawn.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include "read_fault.h"
+#include "text.h"
 #include "watch.h"
 
 extern char** environ;
@@ -121,6 +123,13 @@ class Child {
     bool m_has_ended = false;
 };
 
+// 0 for a file that is not there.
+uint64_t SizeOf(const std::string& file)
+{
+    struct stat status;
+    return stat(file.c_str(), &status) == 0 ? static_cast<uint64_t>(status.st_size) : 0;
+}
+
 // Why yosys refused the text: its line "design.v:3: ERROR: ..." without our name for the file.
 std::string ErrorIn(const std::string& file)
 {
@@ -152,12 +161,17 @@ void Await(Child& child, double seconds, const WorkFolder& folder)
         const std::chrono::duration<double> passed = std::chrono::steady_clock::now() - start;
         if (passed.count() > seconds)
             throw ReadFault{"yosys did not read the Verilog text within " +
-                            std::to_string(static_cast<uint64_t>(seconds)) + " seconds"};
+                            Count(static_cast<uint64_t>(seconds), "second")};
+        for (const char* file : {"design.json", "messages"})
+            if (SizeOf(folder.File(file)) > kMaxSourceBytes)
+                throw ReadFault{"yosys wrote more than 4,294,967,000 bytes"};
         const timespec pause = {0, 10000000}; // a hundredth of a second
         nanosleep(&pause, nullptr);
     }
     if (WIFEXITED(status) && WEXITSTATUS(status) == 127)
         throw ReadFault{kNotThere};
+    if (WIFSIGNALED(status))
+        throw ReadFault{std::string("yosys was ended by a signal: ") + strsignal(WTERMSIG(status))};
     if (!WIFEXITED(status) || WEXITSTATUS(status) != 0)
         throw ReadFault{"yosys does not read it: " + ErrorIn(folder.File("messages"))};
 }
@@ -171,6 +185,8 @@ void ConvertVerilog(SourceText& verilog, double seconds, SourceText& json)
     verilog.Release();
     Child child(folder.Path());
     Await(child, seconds, folder);
+    if (SizeOf(folder.File("design.json")) == 0)
+        throw ReadFault{"yosys wrote no netlist"};
     json.ReadFile(folder.File("design.json"));
 }
 

@@ -88,6 +88,23 @@ void CountFindings(const Design& design, Census& census)
 
 } // namespace
 
+const char* RoleWord(CellRole role)
+{
+    switch (role) {
+    case CellRole::Table:
+        return "table";
+    case CellRole::Constant:
+        return "constant";
+    case CellRole::Unread:
+        return "not read";
+    case CellRole::Module:
+        return "module";
+    case CellRole::Other:
+        break;
+    }
+    return "other";
+}
+
 Census TakeCensus(const Design& design)
 {
     Census census;

@@ -14,6 +14,8 @@
 
 namespace booleq {
 
+constexpr size_t kMaxCommonest = 10; // of the commonest functions, what reports name
+
 struct CountedFunction {
     Rows rows;
     uint64_t numTables = 0;
@@ -43,6 +45,9 @@ struct Census {
     uint64_t numUnread = 0; // cells
     std::vector<std::pair<FindingCode, uint64_t>> findings; // of the reader, by code
 };
+
+// "table", "constant", "not read", "module" or "other".
+const char* RoleWord(CellRole role);
 
 Census TakeCensus(const Design& design);
 

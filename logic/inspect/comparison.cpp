@@ -53,12 +53,20 @@ bool IsSameInSomeOrder(const Rows& left, const Rows& right)
     return booleq::Match(Function(names, left), Function(names, right), false, kSeconds).isFound;
 }
 
+void TieOpenInputs(Design& design, NetId by)
+{
+    if (by != kNetOpen)
+        std::replace(design.inputs.begin(), design.inputs.end(), kNetOpen, by);
+}
+
 } // namespace
 
 Comparison::Comparison(Design& left, Design& right, const CompareOptions& options)
     : m_left(left), m_right(right), m_match(left, right), m_nets(left, right),
-      m_is_renamed(left.nets.size(), false)
+      m_follows_wires(options.followsWires), m_is_renamed(left.nets.size(), false)
 {
+    TieOpenInputs(left, options.openInputs);
+    TieOpenInputs(right, options.openInputs);
     Match(options);
     CompareAll(options);
 }
@@ -229,10 +237,32 @@ std::string Comparison::NameOf(NetId number) const
     return NumberName(m_left, m_right, m_nets, number);
 }
 
+bool Comparison::HasOnlyWires(const Design& design, const std::vector<uint32_t>& tables) const
+{
+    return tables.empty() ||
+           (m_follows_wires && std::all_of(tables.begin(), tables.end(),
+                                           [&](uint32_t table) { return IsWire(design, table); }));
+}
+
+bool Comparison::IsSame() const
+{
+    return m_different.empty() && m_num_renamed == 0 && HasOnlyWires(m_left, m_pairing.onlyLeft) &&
+           HasOnlyWires(m_right, m_pairing.onlyRight);
+}
+
 bool IsWire(const Design& design, uint32_t table)
 {
     const NetFunction function = LeftFunction(design, table);
     return function.nets.empty() || (function.nets.size() == 1 && function.rows.At(1));
+}
+
+std::string WireText(const Design& design, uint32_t table)
+{
+    if (!IsWire(design, table))
+        return std::string();
+    const NetFunction function = Normalise(PinsOf(design, design.tables[table]));
+    return function.nets.empty() ? (function.rows.At(0) ? "constant 1" : "constant 0")
+                                 : "only passes " + NetName(design, function.nets.front());
 }
 
 } // namespace booleq

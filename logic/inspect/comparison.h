@@ -28,6 +28,9 @@ struct CompareOptions {
     // Who reads a net that only passes another one, by a table that the other design lacks, reads
     // that one. Wrong where the cell of such a table has a flip-flop, too.
     bool followsWires = false;
+    // What an input reads that nothing is connected to: kNetZero, kNetOne, or nothing that is
+    // known.
+    NetId openInputs = kNetOpen;
     void (*progress)(void* context, uint64_t numDone, uint64_t numTables) = nullptr;
     void* progressContext = nullptr;
 };
@@ -51,13 +54,18 @@ struct Difference {
     std::string expectedInit; // hexadecimal, for the right table's pins; empty where it lacks a net
 };
 
-// Designs stay as they are, but for what CompareOptions::followsWires changes in their inputs.
+// Designs stay as they are, but for their inputs, which CompareOptions::followsWires and openInputs
+// change.
 // Invariant: each pair is the same, the same but for renamed nets, or one of 'different'.
 class Comparison {
   public:
     // Requires: both designs outlive the comparison.
     Comparison(Design& left, Design& right, const CompareOptions& options);
 
+    // Nothing differs, is called otherwise or is on one side only, but for wires with followsWires.
+    bool IsSame() const;
+    const Design& Left() const { return m_left; }
+    const Design& Right() const { return m_right; }
     const Pairing& Pairs() const { return m_pairing; }
     const NetMap& Nets() const { return m_nets; }
     uint64_t NumSame() const { return m_num_same; }
@@ -77,6 +85,7 @@ class Comparison {
 
     void Match(const CompareOptions& options);
     void CompareAll(const CompareOptions& options);
+    bool HasOnlyWires(const Design& design, const std::vector<uint32_t>& tables) const;
     Verdict Compare(const TablePair& pair) const;
     Verdict CompareOutputs(const TablePair& pair) const;
     bool HasRenamed(const TablePair& pair) const;
@@ -90,6 +99,7 @@ class Comparison {
     Pairing m_pairing;
     Renames m_unused_renames;
     bool m_are_names_gone = false;
+    bool m_follows_wires;
     std::vector<bool> m_is_renamed; // by left net
     std::vector<RenamedNet> m_renamed;
     std::vector<TablePair> m_different;
@@ -100,6 +110,8 @@ class Comparison {
 
 // A table that only passes a net, or is constant.
 bool IsWire(const Design& design, uint32_t table);
+// "only passes NET", "constant 1", or empty for a table that is more.
+std::string WireText(const Design& design, uint32_t table);
 
 } // namespace booleq
 

@@ -106,6 +106,21 @@ FunctionTexts MakeTexts(const Rows& rows, const Target& target)
     return texts;
 }
 
+std::vector<std::string> Letters(unsigned int numInputs)
+{
+    std::vector<std::string> names;
+    for (unsigned int input = 0; input < numInputs; ++input)
+        names.push_back(std::string(1, static_cast<char>('A' + input)));
+    return names;
+}
+
+NamedFunction NameFunction(const Rows& rows)
+{
+    const FunctionTexts texts = MakeTexts(rows, *FindTarget("alt1"));
+    const std::vector<std::string> names = Letters(rows.NumInputs());
+    return {texts.kind, Fill(texts.meaning, names), Fill(texts.equation, names)};
+}
+
 bool WritesExpressions(const Target& target)
 {
     return target.wrapping != Wrapping::Always;

@@ -1,7 +1,7 @@
 // Equations of look-up tables in a notation, and their names among engineers: worked out once for
 // each different function, then written over the nets of each table that has it.
 // In: rows over pins, names of nets. Out: text, proved before the first use.  Fails: no text, for a
-// function without an expression of bearable length.
+// function without an short enough expression.
 #ifndef BOOLEQ_INSPECT_EQUATION_TEXT_H
 #define BOOLEQ_INSPECT_EQUATION_TEXT_H
 
@@ -32,6 +32,17 @@ struct FunctionTexts {
 // The texts of a function whose inputs all matter.  Cost: a microsecond to some milliseconds.
 // Threads: any.
 FunctionTexts MakeTexts(const Rows& rows, const Target& target);
+
+// Inputs for functions that stand for themselves: A, B, C and so on.
+std::vector<std::string> Letters(unsigned int numInputs);
+
+// What a function over such inputs is called, and its short expression.
+struct NamedFunction {
+    std::string kind;
+    std::string meaning;
+    std::string equation;
+};
+NamedFunction NameFunction(const Rows& rows);
 
 // Whether a target writes expressions; others write files.
 bool WritesExpressions(const Target& target);

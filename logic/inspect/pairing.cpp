@@ -201,4 +201,17 @@ size_t PairRest(const Design& left, const Design& right, const NetMap& nets, Pai
     return taken.size();
 }
 
+const char* PairedWord(PairedBy by)
+{
+    switch (by) {
+    case PairedBy::Path:
+        return "path";
+    case PairedBy::Net:
+        return "net";
+    case PairedBy::Key:
+        break;
+    }
+    return "key";
+}
+
 } // namespace booleq

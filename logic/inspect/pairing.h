@@ -13,6 +13,8 @@
 namespace booleq {
 
 enum class PairedBy : uint8_t { Path, Net, Key };
+// "path", "net" or "key".
+const char* PairedWord(PairedBy by);
 
 struct TablePair {
     uint32_t left; // of Design::tables

@@ -22,6 +22,9 @@ enum TableRule { IdleInput, ConstantTable, WireTable, InverterTable, SameFunctio
 Severity SeverityOf(FindingCode code)
 {
     switch (code) {
+    case FindingCode::Buffer:
+    case FindingCode::ConstantNet:
+        return Severity::Note;
     case FindingCode::InitShort:
     case FindingCode::InitLong:
     case FindingCode::InitUnknown:
@@ -158,6 +161,19 @@ class Inspector {
 };
 
 } // namespace
+
+const char* SeverityWord(Severity severity)
+{
+    switch (severity) {
+    case Severity::Error:
+        return "error";
+    case Severity::Warning:
+        return "warning";
+    case Severity::Note:
+        break;
+    }
+    return "note";
+}
 
 const std::vector<FindingRule>& FindingRules()
 {

@@ -13,6 +13,8 @@
 namespace booleq {
 
 enum class Severity { Error, Warning, Note };
+// "error", "warning" or "note".
+const char* SeverityWord(Severity severity);
 
 // What kinds of findings there are: a stable word, how bad it is, and a sentence.
 struct FindingRule {

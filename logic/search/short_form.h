@@ -16,7 +16,7 @@ namespace booleq {
 constexpr size_t kMaxShortFormInputs = 16;
 
 struct ShortForm {
-    bool isFound = false; // false: no expression of bearable length
+    bool isFound = false; // false: no expression short enough
     Expression expression;
     bool isMinimal = false; // proved: no expression of & | ^ ~ mentions inputs fewer times
     size_t numLiterals = 0; // how often inputs are mentioned

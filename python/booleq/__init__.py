@@ -14,18 +14,23 @@ if _sys.version_info < (3, 11):
 from ._booleq import __version__
 from ._equation import Equation, Operand, Syntax, Target, equations, minimize_pla
 from ._luts import Canonical, Described, Distinct, LutArray
+from ._netlists import (CellCount, FunctionCount, LoneTable, Netlist, NetlistDiff, NetlistError,
+                        NetlistFinding, NetlistStats, NetlistTable, NetlistTables, RenamedNet,
+                        TableDifference, read_netlist)
 from ._results import (Assignment, Conversion, Difference, Equivalence, Explanation, Finding,
                        KarnaughMap, LintReport, Match, Minimum, Node, ParseError, Reading,
                        Satisfiability)
 
-__all__ = ["Assignment", "Canonical", "Conversion", "Described", "Difference",
-           "Distinct", "Equation",
-           "Equivalence", "Explanation", "Finding", "KarnaughMap", "LintReport", "LutArray",
-           "Match", "Minimum", "Node", "Operand", "ParseError", "Reading", "Satisfiability",
-           "Syntax", "Target", "__version__", "equations", "minimize_pla"]
+__all__ = ["Assignment", "Canonical", "CellCount", "Conversion", "Described", "Difference",
+           "Distinct", "Equation", "Equivalence", "Explanation", "Finding", "FunctionCount",
+           "KarnaughMap", "LintReport", "LoneTable", "LutArray", "Match", "Minimum", "Netlist",
+           "NetlistDiff", "NetlistError", "NetlistFinding", "NetlistStats", "NetlistTable",
+           "NetlistTables", "Node", "Operand", "ParseError", "Reading", "RenamedNet",
+           "Satisfiability", "Syntax", "TableDifference", "Target", "__version__", "equations",
+           "minimize_pla", "read_netlist"]
 
 for _name in __all__:  # where users import it from, for help() and pickles
     if isinstance(globals()[_name], type):
         globals()[_name].__module__ = __name__
-equations.__module__ = minimize_pla.__module__ = __name__
+equations.__module__ = minimize_pla.__module__ = read_netlist.__module__ = __name__
 del _name

@@ -15,6 +15,7 @@ void BindAlgebra(py::module_& module);   // equations made of equations
 void BindQuestions(py::module_& module); // what is decided, counted and matched
 void BindArrays(py::module_& module);    // many rows at once
 void BindLuts(py::module_& module);      // arrays of look-up tables
+void BindNetlists(py::module_& module);  // netlists read and compared
 void BindMinimize(py::module_& module);  // smallest sums
 void BindReports(py::module_& module);   // trees, maps, explanations, lint
 

@@ -14,6 +14,7 @@
 #include "lock.h"
 #include "lut_kernels.h"
 #include "lut_texts.h"
+#include "number_array.h"
 #include "text.h"
 #include "unicode.h"
 
@@ -154,16 +155,6 @@ void CountOnes(const py::buffer& tables, unsigned int numInputs, const py::buffe
     const Dense out(results, true);
     WithLuts(tables, numInputs, out, 1,
              [&](const booleq::LutArray& luts) { booleq::CountLutOnes(luts, out.Bytes()); });
-}
-
-py::object ArrayOf(const std::vector<uint64_t>& words)
-{
-    const py::module_ numpy = py::module_::import("numpy");
-    py::object array = numpy.attr("empty")(words.size(), "uint64");
-    const py::buffer_info info = py::buffer(array).request(true);
-    if (!words.empty())
-        std::memcpy(info.ptr, words.data(), words.size() * sizeof(uint64_t));
-    return array;
 }
 
 // Words of the distinct tables, their first places, their counts, and which one each table is.

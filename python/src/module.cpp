@@ -28,6 +28,7 @@ void Fill(py::module_ module)
     BindQuestions(module);
     BindArrays(module);
     BindLuts(module);
+    BindNetlists(module);
     BindMinimize(module);
     BindReports(module);
 }

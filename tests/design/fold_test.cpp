@@ -21,7 +21,7 @@ Design MakeDesign(unsigned int numInputs, Random& random)
         word = random() & RowMask(numInputs);
     InitStore inits(design);
     DesignTable table;
-    table.init = inits.Add(numInputs, words.data(), nullptr);
+    EXPECT_TRUE(inits.Add(numInputs, words.data(), nullptr, table.init));
     for (unsigned int pin = 0; pin < numInputs; ++pin)
         design.inputs.push_back(static_cast<NetId>(random() % (kNumFixedNets + 4)));
     design.nets.resize(kNumFixedNets + 4);

@@ -101,8 +101,9 @@ TEST(JsonReader, WhatIsWrongIsSaidWithItsPlace)
     EXPECT_EQ(FaultOf(Replaced(kJson, "[5, 3]", "[5, 3.5]")).substr(0, 13), "test: line 14");
     EXPECT_NE(FaultOf(Replaced(kJson, "[5, 3]", "[5, \"2\"]")).find("module 'top', cell 's0', 'p'"),
               std::string::npos);
-    EXPECT_NE(FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name is given twice"),
-              std::string::npos);
+    EXPECT_NE(
+        FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name is given twice"),
+        std::string::npos);
     EXPECT_NE(FaultOf(Replaced(kJson, "\"sub\": {\"attr", "\"top\": {\"attr")).find("twice"),
               std::string::npos);
     EXPECT_NE(FaultOf(Replaced(kJson, "\"type\": \"FDRE\"", "\"type\": 7")).find("'ff'"),
@@ -470,6 +471,31 @@ TEST(NetlistFiles, HugeFilesAreRefusedBeforeTheyAreRead)
     EXPECT_FALSE(ReadDesign(file, ReadOptions(), design, fault));
     EXPECT_NE(fault.find("larger than 4,294,967,000 bytes"), std::string::npos) << fault;
     std::remove(file.c_str());
+}
+
+// A short file could ask for any memory: each of these tables is 8 KB.
+TEST(NetlistFiles, ManyWideTablesAreRefusedAtALimit)
+{
+    const auto text = [](unsigned int count) {
+        std::string file = ".model m\n.inputs";
+        std::string pins;
+        for (unsigned int pin = 0; pin < 16; ++pin)
+            pins += " i" + std::to_string(pin);
+        file += pins + "\n";
+        for (unsigned int table = 0; table < count; ++table) {
+            std::string row;
+            for (unsigned int pin = 0; pin < 16; ++pin)
+                row += (table >> pin & 1u) != 0 ? '1' : '0';
+            file += ".names" + pins + " y" + std::to_string(table) + "\n" + row + " 1\n";
+        }
+        return file + ".end\n";
+    };
+    EXPECT_EQ(MustRead(text(32768)).tables.size(), 32768u);
+    EXPECT_EQ(
+        FaultOf(text(32769)),
+        "test: line 65539: with this table the different init values take more than 256 MB, a "
+        "table of 16 inputs taking 8192 bytes; map the design to narrower tables, or give it "
+        "in parts");
 }
 
 } // namespace

@@ -221,4 +221,81 @@ TEST(KqLogicNetlist, ARefusedTextLeavesTheNetlistAsItWas)
     EXPECT_EQ(kq_logic::Netlist().NumTables(), 0u);
 }
 
+TEST(KqLogicNetlist, TablesOfAWidthAreArrays)
+{
+    const kq_logic::Netlist netlist = ReadNetlist(
+        ".model m\n.inputs a b c\n.outputs x y\n.names a b x\n11 1\n.names x a c y\n1-1 1\n.end\n");
+    EXPECT_EQ(netlist.Widths(), (std::vector<unsigned int>{2, 3}));
+    EXPECT_EQ(netlist.Types(), (std::vector<std::string>{".names"}));
+    EXPECT_EQ(netlist.Top(), "m");
+    EXPECT_EQ(netlist.Format(), "BLIF");
+    size_t numTables = 0;
+    for (const unsigned int width : netlist.Widths()) {
+        const kq_logic::NetlistArrays arrays = netlist.Arrays(width);
+        ASSERT_EQ(arrays.tables.size(), 1u);
+        ASSERT_EQ(arrays.inputs.size(), width);
+        const kq_logic::NetlistTable table = netlist.At(arrays.tables[0]);
+        EXPECT_EQ(netlist.PathAt(arrays.tables[0]), table.path);
+        EXPECT_EQ(netlist.NetAt(arrays.outputs[0]), table.output);
+        EXPECT_EQ(arrays.lines[0], table.line);
+        for (unsigned int input = 0; input < width; ++input)
+            EXPECT_EQ(netlist.NetAt(arrays.inputs[input]), table.inputs[input]);
+        Function function;
+        ASSERT_TRUE(function.Set(table.inputs, arrays.words));
+        EXPECT_EQ(function.Hex(), table.init);
+        ++numTables;
+    }
+    EXPECT_EQ(numTables, netlist.NumTables());
+    EXPECT_TRUE(netlist.Arrays(16).tables.empty());
+    EXPECT_TRUE(netlist.Arrays(1000).tables.empty());
+}
+
+TEST(KqLogicNetlist, WhatItIsMadeOfIsCounted)
+{
+    const kq_logic::NetlistStats stats = ReadNetlist(Blif("1- 1")).Stats();
+    EXPECT_EQ(stats.numTables, 1u);
+    EXPECT_EQ(stats.numWires, 1u);
+    EXPECT_EQ(stats.numIdle, 1u);
+    EXPECT_EQ(stats.byPins, (std::vector<uint64_t>{0, 0, 1}));
+    EXPECT_EQ(stats.byInputs, (std::vector<uint64_t>{0, 1}));
+    ASSERT_EQ(stats.commonest.size(), 1u);
+    EXPECT_EQ(stats.commonest[0].function.Hex(), "0x2");
+    ASSERT_EQ(stats.types.size(), 1u);
+    EXPECT_EQ(stats.types[0].role, "table");
+}
+
+TEST(KqLogicNetlist, FindingsEndWhenNobodyTakesMore)
+{
+    const kq_logic::Netlist netlist = ReadNetlist(Blif("1- 1"));
+    std::vector<std::string> codes;
+    EXPECT_EQ(netlist.Check([&codes](const kq_logic::NetlistFinding& finding) {
+        codes.push_back(finding.code);
+        EXPECT_EQ(finding.line, 4u);
+        return true;
+    }),
+              2u);
+    EXPECT_EQ(codes, (std::vector<std::string>{"idle-input", "wire"}));
+    EXPECT_EQ(netlist.Check([](const kq_logic::NetlistFinding&) { return false; }), 1u);
+}
+
+TEST(KqLogicNetlist, OptionsOfAComparison)
+{
+    const kq_logic::Netlist left = ReadNetlist(Blif("10 1"));
+    const kq_logic::Netlist right =
+        ReadNetlist(".model m\n.inputs a b\n.outputs y w\n.names a b y\n10 1\n.names a w\n1 1\n"
+                    ".cname w\n.end\n");
+    kq_logic::CompareOptions options;
+    const kq_logic::NetlistComparison strict = Compare(left, right, options);
+    EXPECT_FALSE(strict.isSame);
+    ASSERT_EQ(strict.added.size(), 1u);
+    EXPECT_EQ(strict.added[0].path, "w");
+    EXPECT_EQ(strict.added[0].wire, "only passes a");
+    options.allowsWires = true;
+    EXPECT_TRUE(Compare(left, right, options).isSame);
+    options.maxDescribed = 0;
+    const kq_logic::NetlistComparison counted = Compare(left, ReadNetlist(Blif("11 1")), options);
+    EXPECT_EQ(counted.numDifferent, 1u);
+    EXPECT_TRUE(counted.differences.empty());
+}
+
 } // namespace

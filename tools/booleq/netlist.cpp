@@ -115,12 +115,4 @@ bool ReadNetlists(const Request& request, const CellTypes& cellTypes,
     return isLeft && isRight;
 }
 
-std::string TableName(const Design& design, uint32_t table)
-{
-    const DesignTable& own = design.tables[table];
-    const std::vector<std::string>& pins = design.types[own.type].outputPins;
-    const std::string path = Path(design, own.name);
-    return pins.size() > 1 ? path + " (" + pins[own.outputPin] + ")" : path;
-}
-
 } // namespace booleq

@@ -1,5 +1,4 @@
-// What the commands 'netlist ...' share: their options, reading a file as the request says, and the
-// tables' names for people.
+// What the commands 'netlist ...' share: their options, and reading a file as the request says.
 #ifndef BOOLEQ_NETLIST_H
 #define BOOLEQ_NETLIST_H
 
@@ -13,6 +12,9 @@
 #include "output.h"
 
 namespace booleq {
+
+// What stands for the equation of a function that has no short one.
+constexpr char kNoExpression[] = "(no expression short enough)";
 
 // --cells and --top.
 std::vector<Option> NetlistOptions();
@@ -29,9 +31,6 @@ bool ReadNetlist(const std::string& file, const Request& request, const CellType
 // Two of them, at once where there are two processors.
 bool ReadNetlists(const Request& request, const CellTypes& cellTypes,
                   const std::string& keyAttribute, Output& output, Design& left, Design& right);
-
-// A table as the file calls it: the path, of a cell with several outputs with the pin.
-std::string TableName(const Design& design, uint32_t table);
 
 } // namespace booleq
 

@@ -11,19 +11,6 @@ namespace booleq {
 
 namespace {
 
-const char* SeverityWord(Severity severity)
-{
-    switch (severity) {
-    case Severity::Error:
-        return "error";
-    case Severity::Warning:
-        return "warning";
-    case Severity::Note:
-        break;
-    }
-    return "note";
-}
-
 std::string PlaceOf(const std::string& file, const TableFinding& finding)
 {
     return Visible(file) + (finding.line > 0 ? ":" + std::to_string(finding.line) : "");

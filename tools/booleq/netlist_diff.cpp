@@ -1,13 +1,12 @@
 // The command 'netlist diff': whether every look-up table of a netlist is still the function it
 // was.
 #include <algorithm>
-#include <map>
 
 #include "cause_text.h"
 #include "commands.h"
 #include "comparison.h"
-#include "equation_text.h"
 #include "lines.h"
+#include "net_equations.h"
 #include "netlist.h"
 #include "options.h"
 #include "progress.h"
@@ -18,6 +17,15 @@ namespace booleq {
 namespace {
 
 constexpr uint64_t kDefaultDescribed = 20;
+
+// "0" or "1".
+NetId ParseOpen(const Request& request)
+{
+    const std::string word = request.Get("--open");
+    if (word != "0" && word != "1")
+        throw UsageError("--open is 0 or 1, not '" + Visible(word) + "'");
+    return word == "0" ? kNetZero : kNetOne;
+}
 
 // Lines of two names; '#' begins a comment.
 Renames ReadRenames(const std::string& file)
@@ -60,32 +68,9 @@ NetNames ParseNames(const Request& request)
     return NetNames::Gone;
 }
 
-// An input that nothing is connected to is a constant.
-void TieOpenInputs(const Request& request, Design& design)
-{
-    const std::string word = request.Get("--open");
-    if (word != "0" && word != "1")
-        throw UsageError("--open is 0 or 1, not '" + Visible(word) + "'");
-    std::replace(design.inputs.begin(), design.inputs.end(), kNetOpen,
-                 word == "0" ? kNetZero : kNetOne);
-}
-
 void ShowTables(void* context, uint64_t numDone, uint64_t /*numTables*/)
 {
     static_cast<Progress*>(context)->Show(numDone);
-}
-
-const char* PairedWord(PairedBy by)
-{
-    switch (by) {
-    case PairedBy::Path:
-        return "path";
-    case PairedBy::Net:
-        return "net";
-    case PairedBy::Key:
-        break;
-    }
-    return "key";
 }
 
 class DiffAnswer {
@@ -93,7 +78,7 @@ class DiffAnswer {
     DiffAnswer(const Request& request, Output& output, Design& left, Design& right,
                const CompareOptions& options)
         : m_request(request), m_output(output), m_left(left), m_right(right),
-          m_comparison(left, right, options), m_target(*FindTarget("alt1")),
+          m_comparison(left, right, options), m_equations(m_comparison),
           m_max_described(request.Has("--rows") ? ParseRows(request.Get("--rows"))
                                                 : kDefaultDescribed)
     {
@@ -112,46 +97,20 @@ class DiffAnswer {
             PutJsonAnswer();
         else
             PutText();
-        return IsSame() ? kDone : kFindings;
+        return m_comparison.IsSame() ? kDone : kFindings;
     }
 
   private:
-    bool IsSame() const
+    std::string EquationText(const NetFunction& function)
     {
-        if (!m_comparison.Different().empty() || m_comparison.NumRenamed() > 0)
-            return false;
-        return std::all_of(m_comparison.Pairs().onlyLeft.begin(),
-                           m_comparison.Pairs().onlyLeft.end(),
-                           [this](uint32_t table) { return IsAllowed(m_left, table); }) &&
-               std::all_of(m_comparison.Pairs().onlyRight.begin(),
-                           m_comparison.Pairs().onlyRight.end(),
-                           [this](uint32_t table) { return IsAllowed(m_right, table); });
+        const std::string equation = m_equations.Of(function);
+        return equation.empty() ? kNoExpression : Visible(equation);
     }
 
-    // With --allow-wires what only passes something may be on one side only.
-    bool IsAllowed(const Design& design, uint32_t table) const
+    Json EquationJson(const NetFunction& function)
     {
-        return m_request.Has("--allow-wires") && IsWire(design, table);
-    }
-
-    // The equation of a function over nets by their common numbers.
-    std::string EquationOf(const NetFunction& function)
-    {
-        auto known = m_texts.find(function.rows);
-        if (known == m_texts.end())
-            known = m_texts.emplace(function.rows, MakeTexts(function.rows, m_target)).first;
-        std::vector<std::string> names;
-        for (const NetId number : function.nets)
-            names.push_back(SpellNumber(number));
-        const std::string equation = Fill(known->second.equation, names);
-        return equation.empty() ? "(no expression short enough)" : equation;
-    }
-
-    std::string SpellNumber(NetId number) const
-    {
-        const NetMap& nets = m_comparison.Nets();
-        return nets.IsLeft(number) ? SpellNet(m_left, number, m_target)
-                                   : SpellNet(m_right, nets.RightOf(number), m_target);
+        const std::string equation = m_equations.Of(function);
+        return equation.empty() ? Json(nullptr) : Json(equation);
     }
 
     void PutDifference(const TablePair& pair)
@@ -172,8 +131,8 @@ class DiffAnswer {
                      Visible(row) + (row.empty() ? "" : ": ") + (difference.left ? "1" : "0") +
                          " and " + (difference.right ? "1" : "0"));
         }
-        PutField(m_output, "  left is", Visible(EquationOf(difference.leftFunction)));
-        PutField(m_output, "  right is", Visible(EquationOf(difference.rightFunction)));
+        PutField(m_output, "  left is", EquationText(difference.leftFunction));
+        PutField(m_output, "  right is", EquationText(difference.rightFunction));
         if (difference.causes.empty())
             PutField(m_output, "  cause", "none that is known");
         for (const Cause& cause : difference.causes)
@@ -192,15 +151,6 @@ class DiffAnswer {
         for (unsigned int pin = m_right.NumInputs(table); pin-- > 0;)
             names.push_back(NetName(m_right, m_right.Inputs(table)[pin]));
         return Join(names, ", ");
-    }
-
-    std::string WireText(const Design& design, uint32_t table) const
-    {
-        if (!IsWire(design, table))
-            return std::string();
-        const NetFunction function = Normalise(PinsOf(design, design.tables[table]));
-        return function.nets.empty() ? (function.rows.At(0) ? "constant 1" : "constant 0")
-                                     : "only passes " + NetName(design, function.nets.front());
     }
 
     void PutLone(const char* label, const Design& design, uint32_t table)
@@ -241,7 +191,7 @@ class DiffAnswer {
             counts += ", " + std::to_string(m_comparison.NumRenamed()) + " the same but for names";
         counts += ", " + std::to_string(pairing.onlyLeft.size()) + " missing, " +
                   std::to_string(pairing.onlyRight.size()) + " added";
-        PutField(m_output, IsSame() ? "same" : "not the same", counts);
+        PutField(m_output, m_comparison.IsSame() ? "same" : "not the same", counts);
         if (m_comparison.AreNamesGone())
             PutField(m_output, "",
                      "names of nets are not looked at: " +
@@ -268,8 +218,8 @@ class DiffAnswer {
             difference.isSameFunction ? Json(nullptr) : Json(difference.left ? 1 : 0);
         json["right_value"] =
             difference.isSameFunction ? Json(nullptr) : Json(difference.right ? 1 : 0);
-        json["left_equation"] = EquationOf(difference.leftFunction);
-        json["right_equation"] = EquationOf(difference.rightFunction);
+        json["left_equation"] = EquationJson(difference.leftFunction);
+        json["right_equation"] = EquationJson(difference.rightFunction);
         json["should_be"] =
             difference.expectedInit.empty() ? Json(nullptr) : Json(difference.expectedInit);
         json["causes"] = Json::array();
@@ -311,8 +261,8 @@ class DiffAnswer {
                                          {"right", NetName(m_right, net.right)},
                                          {"tables", net.numTables}});
         result["different"] = Json::array();
-        const auto around =
-            JsonAroundArray({m_request.operands[0], 0}, m_request, IsSame() ? "yes" : "no", result);
+        const auto around = JsonAroundArray({m_request.operands[0], 0}, m_request,
+                                            m_comparison.IsSame() ? "yes" : "no", result);
         m_output.Put(around.first);
         const std::vector<TablePair>& different = m_comparison.Different();
         const size_t numDescribed =
@@ -329,9 +279,8 @@ class DiffAnswer {
     const Design& m_left;
     const Design& m_right;
     Comparison m_comparison;
-    const Target& m_target;
+    NetEquations m_equations;
     uint64_t m_max_described;
-    std::map<Rows, FunctionTexts> m_texts;
 };
 
 int RunDiff(const Request& request, Output& output)
@@ -341,6 +290,8 @@ int RunDiff(const Request& request, Output& output)
     options.followsWires = request.Has("--allow-wires");
     if (request.Has("--rows"))
         ParseRows(request.Get("--rows")); // wrong usage shows before any work
+    if (request.Has("--open"))
+        options.openInputs = ParseOpen(request);
     if (request.Has("--rename"))
         options.renames = ReadRenames(request.Get("--rename"));
     const CellTypes cellTypes = CellTypesOf(request);
@@ -348,10 +299,6 @@ int RunDiff(const Request& request, Output& output)
     Design right;
     if (!ReadNetlists(request, cellTypes, request.Get("--key"), output, left, right))
         return kRefused;
-    if (request.Has("--open")) {
-        TieOpenInputs(request, left);
-        TieOpenInputs(request, right);
-    }
     Progress progress("comparing", left.tables.size());
     options.progress = ShowTables;
     options.progressContext = &progress;

@@ -215,13 +215,12 @@ class Lister {
 
     void PutText(const ListedTable& table)
     {
-        m_output.Put(
-            Visible(table.path) + "  " + Visible(table.type) + "\n    " + Visible(table.output) +
-            " = " +
-            (table.equation.empty() ? "(no expression short enough)" : Visible(table.equation)) +
-            "\n    " + (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") + "init " +
-            table.init + ", " + table.lsbInit + " least first; pins " +
-            (table.pins.empty() ? "none" : Visible(Join(table.pins, ", "))) + "\n");
+        m_output.Put(Visible(table.path) + "  " + Visible(table.type) + "\n    " +
+                     Visible(table.output) + " = " +
+                     (table.equation.empty() ? kNoExpression : Visible(table.equation)) + "\n    " +
+                     (table.kind.empty() ? "" : Visible(table.meaning) + "\n    ") + "init " +
+                     table.init + ", " + table.lsbInit + " least first; pins " +
+                     (table.pins.empty() ? "none" : Visible(Join(table.pins, ", "))) + "\n");
     }
 
     void PutCsv(const ListedTable& table)

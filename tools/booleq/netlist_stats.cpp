@@ -13,31 +13,6 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxShown = 10; // of the commonest functions
-
-// A function over inputs that are called A, B, C and so on.
-std::vector<std::string> Letters(unsigned int numInputs)
-{
-    std::vector<std::string> names;
-    for (unsigned int input = 0; input < numInputs; ++input)
-        names.push_back(std::string(1, static_cast<char>('A' + input)));
-    return names;
-}
-
-// What a function is called, or its short expression.
-struct NamedFunction {
-    std::string kind;
-    std::string meaning;
-    std::string equation;
-};
-
-NamedFunction NameFunction(const Rows& rows)
-{
-    const FunctionTexts texts = MakeTexts(rows, *FindTarget("alt1"));
-    const std::vector<std::string> names = Letters(rows.NumInputs());
-    return {texts.kind, Fill(texts.meaning, names), Fill(texts.equation, names)};
-}
-
 std::string Percent(uint64_t part, uint64_t whole)
 {
     const uint64_t tenths = whole == 0 ? 0 : (part * 1000 + whole / 2) / whole;
@@ -47,23 +22,6 @@ std::string Percent(uint64_t part, uint64_t whole)
 std::string Column(const std::string& text, size_t width)
 {
     return std::string(text.size() < width ? width - text.size() : 0, ' ') + text;
-}
-
-const char* RoleWord(CellRole role)
-{
-    switch (role) {
-    case CellRole::Table:
-        return "table";
-    case CellRole::Constant:
-        return "constant";
-    case CellRole::Unread:
-        return "not read";
-    case CellRole::Module:
-        return "module";
-    case CellRole::Other:
-        break;
-    }
-    return "other";
 }
 
 std::string WidthsText(const std::vector<uint64_t>& widths)
@@ -87,7 +45,7 @@ void PutTypes(const Census& census, Output& output)
 void PutFunctions(const Census& census, Output& output)
 {
     output.Put("\n");
-    const size_t numShown = std::min(kMaxShown, census.functions.size());
+    const size_t numShown = std::min(kMaxCommonest, census.functions.size());
     for (size_t place = 0; place < numShown; ++place) {
         const CountedFunction& function = census.functions[place];
         const NamedFunction named = NameFunction(function.rows);
@@ -152,7 +110,7 @@ Json TypesJson(const Census& census)
 Json FunctionsJson(const Census& census)
 {
     Json json = Json::array();
-    for (size_t place = 0; place < std::min(kMaxShown, census.functions.size()); ++place) {
+    for (size_t place = 0; place < std::min(kMaxCommonest, census.functions.size()); ++place) {
         const CountedFunction& function = census.functions[place];
         const NamedFunction named = NameFunction(function.rows);
         const Function whole(Letters(function.rows.NumInputs()), function.rows);
@@ -195,7 +153,7 @@ Json ToJson(const Design& design, const Census& census)
 std::vector<Bar> FunctionBars(const Census& census)
 {
     std::vector<Bar> bars;
-    for (size_t place = 0; place < std::min(kMaxShown, census.functions.size()); ++place) {
+    for (size_t place = 0; place < std::min(kMaxCommonest, census.functions.size()); ++place) {
         const CountedFunction& function = census.functions[place];
         const NamedFunction named = NameFunction(function.rows);
         bars.push_back({named.kind.empty() ? named.equation : named.meaning, function.numTables});

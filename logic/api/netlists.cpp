@@ -2,7 +2,7 @@
 #include <algorithm>
 #include <cassert>
 
-#include <kq_logic/netlist.h>
+#include <kq_logic/netlist_compare.h>
 
 #include "cause_text.h"
 #include "census.h"
@@ -91,10 +91,10 @@ booleq::CompareOptions OptionsOf(const CompareOptions& options)
     return own;
 }
 
-NetlistStats::FunctionCount ToPublic(const booleq::CountedFunction& counted)
+NetlistFunctionCount ToPublic(const booleq::CountedFunction& counted)
 {
     const booleq::NamedFunction named = NameFunction(counted.rows);
-    NetlistStats::FunctionCount count;
+    NetlistFunctionCount count;
     const uint64_t* const words = counted.rows.Words();
     const bool isSet =
         count.function.Set(booleq::Letters(counted.rows.NumInputs()),

@@ -4,7 +4,7 @@
 #include <unordered_map>
 #include <vector>
 
-#include <kq_logic/netlist.h>
+#include <kq_logic/netlist_compare.h>
 
 #include "bind.h"
 #include "lock.h"

@@ -12,7 +12,7 @@
 #include <kq_logic/decide.h>
 #include <kq_logic/explain.h>
 #include <kq_logic/match.h>
-#include <kq_logic/netlist.h>
+#include <kq_logic/netlist_compare.h>
 #include <kq_logic/permute.h>
 #include <kq_logic/short_form.h>
 #include <kq_logic/watch.h>

@@ -3,6 +3,7 @@
 #include "Builder.h"
 
 #include <cassert>
+#include <cstdint>
 #include <unordered_map>
 
 #include "Messages.h"
@@ -286,21 +287,21 @@ bool TreeBuilder::RefuseChildren(const Node* node)
     return Refuse(node == m_nodes[0] ? Refusal::NO_LEFT_OPERAND : Refusal::NO_RIGHT_OPERAND, node);
 }
 
-bool HasAllowedChildren(const Node& node)
+// Which children a node has, as bits of what its type allows.
+enum CHILDREN : unsigned int { NO_CHILD = 1, LEFT_CHILD = 2, RIGHT_CHILD = 4, BOTH_CHILDREN = 8 };
+
+constexpr unsigned int AllowedChildren(Node::TYPE type)
 {
-    const Node* left = node.GetLeftChild();
-    const Node* right = node.GetRightChild();
-    switch (node.GetType()) {
+    switch (type) {
     case Node::NOT:
-        return left && !right;
+        return LEFT_CHILD;
     case Node::ID:
     case Node::ZERO:
     case Node::ONE:
     case Node::RP:
-        return !left && !right;
+        return NO_CHILD;
     case Node::LP:
-        // The left child is not asked for: "()" is an empty group.
-        return right && right->IsRp();
+        return RIGHT_CHILD | BOTH_CHILDREN; // "()" is an empty group
     case Node::AND:
     case Node::NAND:
     case Node::NOR:
@@ -311,7 +312,30 @@ bool HasAllowedChildren(const Node& node)
     case Node::SENTINEL: // no token makes one
         break;
     }
-    return left && right;
+    return BOTH_CHILDREN;
+}
+
+struct AllowedTable {
+    uint8_t of[Node::SENTINEL + 1];
+};
+
+constexpr AllowedTable MakeAllowedTable()
+{
+    AllowedTable table = {};
+    for (unsigned int type = 0; type <= Node::SENTINEL; ++type)
+        table.of[type] = static_cast<uint8_t>(AllowedChildren(static_cast<Node::TYPE>(type)));
+    return table;
+}
+
+// A table, because the types of a text follow no pattern that a processor could foretell.
+constexpr AllowedTable kAllowed = MakeAllowedTable();
+
+bool HasAllowedChildren(const Node& node)
+{
+    const Node* const right = node.GetRightChild();
+    const unsigned int children = (node.GetLeftChild() ? 1u : 0u) + (right ? 2u : 0u);
+    assert(node.GetType() <= Node::SENTINEL);
+    return (kAllowed.of[node.GetType()] >> children & 1u) != 0 && (!node.IsLp() || right->IsRp());
 }
 
 // Checks every node; the one without a parent is the root.

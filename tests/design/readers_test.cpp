@@ -101,7 +101,7 @@ TEST(JsonReader, WhatIsWrongIsSaidWithItsPlace)
     EXPECT_EQ(FaultOf(Replaced(kJson, "[5, 3]", "[5, 3.5]")).substr(0, 13), "test: line 14");
     EXPECT_NE(FaultOf(Replaced(kJson, "[5, 3]", "[5, \"2\"]")).find("module 'top', cell 's0', 'p'"),
               std::string::npos);
-    EXPECT_NE(FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name stands twice"),
+    EXPECT_NE(FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0': the name stands twice"),
               std::string::npos);
     EXPECT_NE(FaultOf(Replaced(kJson, "\"sub\": {\"attr", "\"top\": {\"attr")).find("twice"),
               std::string::npos);

@@ -128,7 +128,7 @@ class Inspector {
     void TakeOf(uint32_t table, TableRule rule, const std::string& text)
     {
         const DesignTable& own = m_design.tables[table];
-        Take(kNumReaderRules + rule, own.line, Path(m_design, own.name), text);
+        Take(kNumReaderRules + rule, own.line, TableName(m_design, table), text);
     }
 
     void Look(uint32_t table)
@@ -157,8 +157,7 @@ class Inspector {
         if (added.second || LeftFunction(m_design, added.first->second) != function)
             return;
         TakeOf(table, SameFunction,
-               "the same function of the same nets as " +
-                   Path(m_design, m_design.tables[added.first->second].name));
+               "the same function of the same nets as " + TableName(m_design, added.first->second));
     }
 
     const Design& m_design;

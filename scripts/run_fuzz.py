@@ -23,7 +23,8 @@ import time
 WORKERS = 2
 SECONDS_PER_INPUT = 10  # a hang is a finding
 MEGABYTES = 3072  # the pool of names keeps every name it has seen
-MAX_LENGTH = {"text": 240, "init_value": 320, "script": 400, "column": 240, "lean": 80}
+MAX_LENGTH = {"text": 240, "init_value": 320, "script": 400, "column": 240, "lean": 80, "pla": 400,
+              "netlist_blif": 2000, "netlist_edif": 3000, "netlist_json": 3000}
 DICTIONARY = {"text": "text", "lean": "text"}
 
 PROGRESS = re.compile(r"^#(\d+): cov: ", re.MULTILINE)  # the number of executions so far

@@ -3,6 +3,7 @@
 // them.
 #include <algorithm>
 #include <cassert>
+#include <unordered_set>
 
 #include "cell_intake.h"
 #include "read_fault.h"
@@ -161,9 +162,8 @@ class BlifNetlistReader {
         m_intake.EnterModule(*m_module);
         ++m_epoch;
         m_module->name = m_words.size() > 1 ? m_job.design.names.Add(m_words[1]) : 0;
-        for (size_t module = 0; module + 1 < m_job.modules.size(); ++module)
-            if (m_job.modules[module].name == m_module->name)
-                Refuse("there are two models " + Quoted(m_words.size() > 1 ? m_words[1] : ""));
+        if (!m_model_names.insert(m_module->name).second)
+            Refuse("there are two models " + Quoted(m_words.size() > 1 ? m_words[1] : ""));
     }
 
     void ReadInputs() { ReadPorts(PortDirection::Input); }
@@ -458,6 +458,7 @@ class BlifNetlistReader {
     std::vector<std::string_view> m_words; // of the line
     uint32_t m_line = 0;
     uint32_t m_start = 0; // the line where m_words begin
+    std::unordered_set<NameId> m_model_names;
     ModuleContent* m_module = nullptr;
     std::vector<KnownNet> m_nets; // by name
     uint32_t m_epoch = 0;         // of the model

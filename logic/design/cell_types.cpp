@@ -223,7 +223,7 @@ class TypeReader {
         for (size_t step = 0; step < m_type->steps.size(); ++step)
             if (m_type->steps[step].name == name)
                 return static_cast<uint32_t>(m_type->inputPins.size() + step);
-        Refuse(Quoted(name) + " is neither an input nor a table before");
+        Refuse(Quoted(name) + " is neither an input nor a table before this");
     }
 
     // A parameter, bits of one (INIT[31:0]), or a number.

@@ -29,6 +29,8 @@ class EdifReader {
                 ReadLibrary();
             else if (m_tokens.IsOpen("design"))
                 ReadDesignForm();
+            else if (m_tokens.IsOpen("edifVersion"))
+                ReadVersion();
             else
                 m_tokens.Skip();
         }
@@ -37,6 +39,16 @@ class EdifReader {
     }
 
   private:
+    // Other versions say nets in other forms.
+    void ReadVersion()
+    {
+        std::string version;
+        while (m_forms.NextPart("edifVersion"))
+            version += (version.empty() ? "" : " ") + std::string(m_tokens.Text().substr(0, 40));
+        if (version != "2 0 0")
+            m_forms.Refuse("it is EDIF " + Quoted(version) + ", and 2 0 0 is what is read");
+    }
+
     // --- libraries and cells
 
     void ReadLibrary()
@@ -182,7 +194,7 @@ class EdifReader {
         }
         const auto found = m_cell_numbers.find(CellKey(library, ident));
         if (found == m_cell_numbers.end())
-            m_forms.Refuse("there is no cell " + Quoted(name.ident) + " before");
+            m_forms.Refuse("no cell " + Quoted(name.ident) + " stands before this");
         return found->second;
     }
 
@@ -346,7 +358,7 @@ class EdifReader {
             const std::string_view ident = m_forms.ReadName().ident;
             const Known& known = KnownOf(ident);
             if (known.instanceEpoch != m_epoch)
-                m_forms.Refuse("there is no instance " + Quoted(ident) + " before");
+                m_forms.Refuse("no instance " + Quoted(ident) + " stands before this");
             joint.instance = known.instance;
             m_forms.Close("instanceRef");
         }

@@ -294,12 +294,15 @@ class Layout {
         }
     }
 
-    // Of tables without a name, that which their net shows now.
+    // Of tables without a name, that which their net shows now; also in what is said of them.
     void NameByOutputs()
     {
         for (DesignTable& table : m_design.tables)
             if (table.isNamedByOutput && table.output >= kNumFixedNets)
                 table.name = m_design.nets[table.output];
+        for (ReadFinding& finding : m_design.findings)
+            if (finding.table != ReadFinding::kNoTable)
+                finding.name = m_design.tables[finding.table].name;
     }
 
     void AddPorts(const Frame& frame)

@@ -43,7 +43,7 @@ class JsonReader {
             if (m_document.current_location().get(rest) == simdjson::SUCCESS)
                 Refuse("something follows the last '}'");
         } catch (const simdjson::simdjson_error& error) {
-            Refuse(simdjson::error_message(error.error()));
+            Refuse(ReasonOf(error.error()));
         }
     }
 
@@ -70,16 +70,38 @@ class JsonReader {
     [[noreturn]] void Refuse(const std::string& what)
     {
         const size_t location = Location();
-        std::string where;
-        if (location != 0)
-            where = "line " + std::to_string(m_job.source.LineOf(location)) + ": ";
+        std::vector<std::string> where;
         if (!m_place.module.empty())
-            where += "module " + Quoted(m_place.module) + ", ";
+            where.push_back("module " + Quoted(m_place.module));
         if (!m_place.item.empty())
-            where += std::string(m_place.section) + " " + Quoted(m_place.item) + ", ";
+            where.push_back(std::string(m_place.section) + " " + Quoted(m_place.item));
         if (!m_place.part.empty())
-            where += Quoted(m_place.part) + ", ";
-        throw ReadFault{where + what};
+            where.push_back(Quoted(m_place.part));
+        const std::string text = (where.empty() ? "" : Join(where, ", ") + ": ") + what;
+        if (location != 0)
+            ThrowAtLine(m_job.source.LineOf(location), text);
+        throw ReadFault{text};
+    }
+
+    // In place of the parser's words, those that a reader of the message can do something with.
+    static std::string ReasonOf(simdjson::error_code error)
+    {
+        switch (error) {
+        case simdjson::INCORRECT_TYPE:
+            return "the value is not of the type that write_json writes there";
+        case simdjson::EMPTY:
+        case simdjson::UNCLOSED_STRING:
+        case simdjson::INCOMPLETE_ARRAY_OR_OBJECT:
+            return "the JSON text is not whole";
+        case simdjson::TAPE_ERROR:
+            return "the JSON text is not well-formed";
+        case simdjson::UTF8_ERROR:
+            return "the JSON text is not UTF-8";
+        case simdjson::DEPTH_ERROR:
+            return "the JSON text is nested too deep";
+        default: // the parser has more
+            return simdjson::error_message(error);
+        }
     }
 
     // Says of each name whether it stood in this section before.
@@ -179,7 +201,8 @@ class JsonReader {
         if (text == "1")
             return kNetOne;
         if (text != "x" && text != "z")
-            Refuse("a bit is a number, \"0\", \"1\", \"x\" or \"z\", not " + Quoted(text));
+            Refuse("a bit is a number from 0 on, \"0\", \"1\", \"x\" or \"z\", not " +
+                   Quoted(text));
         return kNetUnknown;
     }
 
@@ -190,10 +213,11 @@ class JsonReader {
         for (auto element : bits.get_array()) {
             json::value bit = element.value();
             uint64_t number = 0;
+            std::string_view text;
             if (bit.get_uint64().get(number) == simdjson::SUCCESS)
                 m_bits.push_back(NetOf(number));
             else
-                m_bits.push_back(ConstantOf(StringOf(bit)));
+                m_bits.push_back(ConstantOf(GetString(bit, text) ? text : Token(bit)));
         }
     }
 

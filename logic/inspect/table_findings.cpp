@@ -66,6 +66,16 @@ std::vector<FindingRule> MakeRules()
     return rules;
 }
 
+// The code's sentence after the pin or parameter that it is about.
+std::string SentenceOf(const ReadFinding& finding)
+{
+    if (finding.text.empty())
+        return CodeSentence(finding.code);
+    const bool isWhole =
+        finding.code == FindingCode::Buffer || finding.code == FindingCode::ConstantNet;
+    return isWhole ? finding.text : finding.text + ": " + CodeSentence(finding.code);
+}
+
 uint64_t Mix(uint64_t hash, uint64_t value)
 {
     hash = (hash ^ value) * 0x9e3779b97f4a7c15u;
@@ -95,7 +105,7 @@ class Inspector {
             if (m_is_over)
                 break;
             Take(static_cast<size_t>(finding.code), finding.line, Path(m_design, finding.name),
-                 finding.text.empty() ? CodeSentence(finding.code) : finding.text);
+                 SentenceOf(finding));
         }
         for (uint32_t table = 0; table < m_design.tables.size() && !m_is_over; ++table) {
             if (table % kWatchedTables == 0)
@@ -118,7 +128,7 @@ class Inspector {
     void TakeOf(uint32_t table, TableRule rule, const std::string& text)
     {
         const DesignTable& own = m_design.tables[table];
-        Take(kNumReaderRules + rule, own.line, Path(m_design, own.name), text);
+        Take(kNumReaderRules + rule, own.line, TableName(m_design, table), text);
     }
 
     void Look(uint32_t table)
@@ -147,8 +157,7 @@ class Inspector {
         if (added.second || LeftFunction(m_design, added.first->second) != function)
             return;
         TakeOf(table, SameFunction,
-               "the same function of the same nets as " +
-                   Path(m_design, m_design.tables[added.first->second].name));
+               "the same function of the same nets as " + TableName(m_design, added.first->second));
     }
 
     const Design& m_design;

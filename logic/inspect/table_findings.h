@@ -28,7 +28,7 @@ const std::vector<FindingRule>& FindingRules();
 struct TableFinding {
     size_t rule;      // of FindingRules
     uint32_t line;    // in the file; 0: not known
-    std::string path; // of the cell or net
+    std::string path; // of the table (TableName), cell or net
     std::string text; // a sentence without a full stop
 };
 

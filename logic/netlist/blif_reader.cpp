@@ -2,6 +2,8 @@
 // takes what a network has room for: one model, one output, tables alone, each signal defined
 // before its use. Fails: false, 'network' is as it was.  Cost: in step with the text and the rows
 // of the tables.
+#include <algorithm>
+
 #include "fold.h"
 #include "network_builder.h"
 #include "read_design.h"
@@ -21,8 +23,13 @@ class DesignNetwork {
 
     bool Make(Network& network)
     {
-        if (!m_design.findings.empty() || !m_design.unread.empty() ||
-            m_design.numCells != m_design.tables.size() || m_design.scopes.size() != 1)
+        const bool isSound = std::all_of(
+            m_design.findings.begin(), m_design.findings.end(), [](const ReadFinding& finding) {
+                return finding.code == FindingCode::Buffer ||
+                       finding.code == FindingCode::ConstantNet; // another name, a constant
+            });
+        if (!isSound || !m_design.unread.empty() || m_design.numCells != m_design.tables.size() ||
+            m_design.scopes.size() != 1)
             return false;
         std::string output;
         NetId outputNet = kNetOpen;

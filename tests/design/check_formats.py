@@ -1,12 +1,13 @@
 """One design in four formats has the same tables.
 
-usage: check_formats.py SHOW_DESIGN [FOLDER]
+usage: check_formats.py [--booleq BOOLEQ] SHOW_DESIGN [FOLDER]
 
 Yosys writes a design as JSON, BLIF, EDIF and Verilog; all four, read here, are the same functions of
 the same nets. Without FOLDER the design is a small one with hierarchy, else each BLIF file of it,
-which is compared as it is, too. Status 77: Yosys or the folder is not there.
+which is compared as it is, too. With BOOLEQ its 'netlist diff' must say so as well. Status 77: Yosys or the folder is not there.
 """
 
+import argparse
 import pathlib
 import shutil
 import subprocess
@@ -73,7 +74,16 @@ def functions(show, file, reference):
     return run.stdout.splitlines()
 
 
-def compare(show, folder, files, minimum):
+def diff(booleq, left, right):
+    run = subprocess.run(
+        [booleq, "netlist", "diff", str(left), str(right)], capture_output=True, text=True, timeout=600
+    )
+    if run.returncode != 0:
+        sys.exit(f"diff of {left.name} and {right.name}: {run.stdout[-2000:]}{run.stderr}")
+
+
+def compare(arguments, folder, files, minimum):
+    show = str(arguments.show.resolve())
     reference = folder / files[0]
     expected = functions(show, reference, reference)
     if len(expected) < minimum:
@@ -83,11 +93,18 @@ def compare(show, folder, files, minimum):
         if found != expected:
             odd = sorted(set(found) ^ set(expected))
             sys.exit(f"{file} differs from {files[0]} in {len(odd)} lines:\n" + "\n".join(odd[:8]))
+        if arguments.booleq:
+            diff(arguments.booleq.resolve(), reference, folder / file)
+            diff(arguments.booleq.resolve(), folder / file, folder / files[-1])
     return len(expected)
 
 
 def main():
-    show = str(pathlib.Path(sys.argv[1]).resolve())
+    parser = argparse.ArgumentParser()
+    parser.add_argument("--booleq", type=pathlib.Path)
+    parser.add_argument("show", type=pathlib.Path)
+    parser.add_argument("folder", type=pathlib.Path, nargs="?")
+    arguments = parser.parse_args()
     if shutil.which("yosys") is None:
         print("skipped: yosys is not installed")
         return 77
@@ -95,7 +112,7 @@ def main():
         folder = pathlib.Path(name)
         (folder / "map.v").write_text(MAP)
         mapped = ["mapped.json", "mapped.edif", "mapped.blif", "mapped.v"]
-        if len(sys.argv) == 2:
+        if arguments.folder is None:
             (folder / "design.v").write_text(DESIGN)
             plain = "write_json plain.json; write_edif plain.edif; write_blif plain.blif; "
             yosys(
@@ -105,15 +122,15 @@ def main():
                 folder,
             )
             # BLIF without names of cells has none for instances of modules.
-            print(compare(show, folder, ["plain.json", "plain.edif"] + mapped, 40), "tables")
+            print(compare(arguments, folder, ["plain.json", "plain.edif"] + mapped, 40), "tables")
             yosys(
                 "read_verilog design.v; synth -flatten -top top; abc -lut 6; clean; " + plain, folder
             )
-            print(compare(show, folder, ["plain.json", "plain.edif", "plain.blif"], 30), "tables")
+            print(compare(arguments, folder, ["plain.json", "plain.edif", "plain.blif"], 30), "tables")
             return 0
-        netlists = sorted(pathlib.Path(sys.argv[2]).glob("*.blif"))
+        netlists = sorted(arguments.folder.glob("*.blif"))
         if not netlists:
-            print("skipped: no BLIF files in", sys.argv[2])
+            print("skipped: no BLIF files in", arguments.folder)
             return 77
         for netlist in netlists:
             shutil.copyfile(netlist, folder / "original.blif")
@@ -123,7 +140,7 @@ def main():
                 folder,
             )
             files = ["plain.json", "original.blif", "plain.edif"] + mapped
-            print(netlist.name, compare(show, folder, files, 1), "tables", flush=True)
+            print(netlist.name, compare(arguments, folder, files, 1), "tables", flush=True)
     return 0
 
 

@@ -102,7 +102,7 @@ TEST(JsonReader, WhatIsWrongIsSaidWithItsPlace)
     EXPECT_NE(FaultOf(Replaced(kJson, "[5, 3]", "[5, \"2\"]")).find("module 'top', cell 's0', 'p'"),
               std::string::npos);
     EXPECT_NE(
-        FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0', the name is given twice"),
+        FaultOf(Replaced(kJson, "\"s1\"", "\"s0\"")).find("cell 's0': the name is given twice"),
         std::string::npos);
     EXPECT_NE(FaultOf(Replaced(kJson, "\"sub\": {\"attr", "\"top\": {\"attr")).find("twice"),
               std::string::npos);
@@ -248,7 +248,7 @@ TEST(CellTypes, BadLinesAreRefusedWithTheirNumber)
         {"cell a\ninput p\ninit I 4\ntable y = I p",
          "line 4: the table has 2 rows, and there are 4 bits"},
         {"cell a\ninput p\ninit I 2\ntable y = I q",
-         "line 4: 'q' is neither an input nor a table before"},
+         "line 4: 'q' is neither an input nor a table before this"},
         {"cell a\ninput p\ninit I 4\ntable y = I[9:2] p",
          "line 4: expected a number up to 3 instead of '9'"},
         {"cell a\ninit I 99999999", "line 2: expected a number up to 65536 instead of '99999999'"},
@@ -398,9 +398,11 @@ TEST(EdifReader, RenamesArraysAndHierarchy)
 TEST(EdifReader, WhatIsWrongIsSaidWithItsLine)
 {
     EXPECT_EQ(FaultOf(Replaced(kEdif, "(cellRef sub)", "(cellRef what)")),
-              "test: line 19: there is no cell 'what' before");
+              "test: line 19: no cell 'what' stands before this");
     EXPECT_EQ(FaultOf(Replaced(kEdif, "(instanceRef vcc)", "(instanceRef what)")),
-              "test: line 24: there is no instance 'what' before");
+              "test: line 24: no instance 'what' stands before this");
+    EXPECT_EQ(FaultOf(Replaced(kEdif, "(edifVersion 2 0 0)", "(edifVersion 3 0 0)")),
+              "test: line 2: it is EDIF '3 0 0', and 2 0 0 is what is read");
     EXPECT_EQ(FaultOf(Replaced(kEdif, "(portRef P ", "(portRef Z ")),
               "test: line 24: cell 'VCC' has no port 'Z'");
     EXPECT_EQ(FaultOf(Replaced(kEdif, "(member p 1) (instanceRef", "(member p 2) (instanceRef")),

@@ -71,6 +71,12 @@ CellTypes CellTypesOf(const Request& request)
     return types;
 }
 
+void CheckFiles(const Request& request)
+{
+    for (const std::string& file : request.operands)
+        CheckFile(file);
+}
+
 bool ReadNetlist(const std::string& file, const Request& request, const CellTypes& cellTypes,
                  const std::string& keyAttribute, Output& output, Design& design)
 {
@@ -93,8 +99,7 @@ bool ReadNetlists(const Request& request, const CellTypes& cellTypes,
     const std::string& rightFile = request.operands[1];
     if (leftFile == "-" && rightFile == "-")
         throw UsageError("standard input can be one of the files, not both");
-    CheckFile(leftFile);
-    CheckFile(rightFile);
+    CheckFiles(request);
     ReadOptions options = OptionsOf(request, cellTypes, keyAttribute);
     std::string rightFault;
     auto other = std::async(std::thread::hardware_concurrency() > 1 ? std::launch::async

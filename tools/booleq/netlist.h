@@ -23,6 +23,9 @@ std::vector<Option> NetlistOptions();
 // Fails: UsageError for a file that cannot be read or is not such a table.
 CellTypes CellTypesOf(const Request& request);
 
+// Fails: IoError, for an operand that is a file and cannot be opened.
+void CheckFiles(const Request& request);
+
 // Reads a netlist; shows how far it is, on a terminal.
 // Fails: false, and the refusal has been said or answered: return kRefused. IoError, when the file
 // cannot be opened.

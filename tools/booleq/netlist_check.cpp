@@ -96,6 +96,9 @@ class FindingsOut {
 
 int RunNetlistCheck(const Request& request, Output& output)
 {
+    if (request.Get("--sarif") == "-")
+        throw UsageError(
+            "--sarif writes a file beside the lines on standard output: give its name");
     const CellTypes cellTypes = CellTypesOf(request);
     const std::string& file = request.operands.front();
     Design design;

@@ -87,9 +87,12 @@ class DiffAnswer {
     int Put()
     {
         for (const auto& rename : m_comparison.UnusedRenames())
-            Complain(m_output, "warning: --rename: " + Visible(rename.first) + " or " +
+            Complain(m_output, "warning: --rename: '" + Visible(rename.first) + " " +
                                    Visible(rename.second) +
-                                   " does not exist, or has the same name in both");
+                                   "' is not used: one of the nets does not exist, or already "
+                                   "has a counterpart");
+        WarnOfKey(m_left, m_request.operands[0]);
+        WarnOfKey(m_right, m_request.operands[1]);
         if (m_comparison.Pairs().numKeysTwice > 0)
             Complain(m_output, "warning: " + Count(m_comparison.Pairs().numKeysTwice, "cell") +
                                    " of the right netlist with the key of another one");
@@ -101,6 +104,15 @@ class DiffAnswer {
     }
 
   private:
+    void WarnOfKey(const Design& design, const std::string& file)
+    {
+        const auto hasNone = [](NameId key) { return key == 0; };
+        if (m_request.Has("--key") && !design.tables.empty() &&
+            std::all_of(design.keys.begin(), design.keys.end(), hasNone))
+            Complain(m_output, "warning: --key: no table of " + Visible(file) +
+                                   " has the attribute " + Visible(m_request.Get("--key")));
+    }
+
     std::string EquationText(const NetFunction& function)
     {
         const std::string equation = m_equations.Of(function);
@@ -290,6 +302,8 @@ int RunDiff(const Request& request, Output& output)
     options.followsWires = request.Has("--allow-wires");
     if (request.Has("--rows"))
         ParseRows(request.Get("--rows")); // wrong usage shows before any work
+    if (request.Has("--key") && request.Get("--key").empty())
+        throw UsageError("--key needs the name of an attribute");
     if (request.Has("--open"))
         options.openInputs = ParseOpen(request);
     if (request.Has("--rename"))

@@ -175,6 +175,7 @@ int RunStats(const Request& request, Output& output)
     const CellTypes cellTypes = CellTypesOf(request);
     if (request.Has("--svg") && request.operands.size() > 1)
         throw UsageError("--svg makes one picture: give one file");
+    CheckFiles(request); // before any answer
     int status = kDone;
     for (const std::string& file : request.operands) {
         Design design;

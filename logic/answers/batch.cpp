@@ -177,6 +177,8 @@ Listed ListedOf(const std::vector<std::string>& inputs)
     listed.reading.hasInputs = !inputs.empty();
     listed.terms = TermsOf(listed.reading);
     listed.fault = CheckNames(inputs);
+    if (listed.fault.outcome == BatchOutcome::kOk)
+        listed.splitName = FirstSplitName(inputs);
     return listed;
 }
 
@@ -223,6 +225,8 @@ BatchResult RowCompleter::Complete(BatchRow& row)
                     "always " +
                         std::string(rows.At(0) ? "1" : "0"));
     const bool hasInit = !IsBlank(row.init);
+    if (!hasInit && !listed.splitName.empty())
+        return Fail(BatchOutcome::kIncomplete, SplitNameReason(listed.splitName));
     if (hasInit && listed.reading.hasInputs) {
         result = CompareInit(row, listed, rows);
     } else if (hasInit) {

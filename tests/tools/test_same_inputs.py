@@ -225,10 +225,10 @@ def compare_members(group, comparison):
         comparison.expect(tuple(names), equation.inputs, *where)
         comparison.expect(names, list(equation.explain().inputs), "explain", *where)
         comparison.expect(tuple(names), equation.minimize().inputs, "minimize", *where)
-        if not any("'" in name.rstrip("'")[1:] for name in names): # an init value over such is none
-            turned = equation.permute(reversed(names))
-            comparison.expect(tuple(reversed(names)), turned.inputs, "permute", *where)
-            comparison.expect(True, bool(equation.equivalent(turned)), "equivalent", *where)
+        turned = equation.permute(reversed(names))
+        comparison.expect(tuple(reversed(names)), turned.inputs, "permute", *where)
+        comparison.expect(True, bool(equation.equivalent(turned)), "equivalent", *where)
+        comparison.expect(tuple(names), (~equation).inputs, "invert", *where)
         comparison.expect(names, list(equation.lint().inputs), "lint", *where)
         comparison.expect((1 << len(names), len(names) + 1), equation.truth_table().shape,
                           "truth_table", *where)

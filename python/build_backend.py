@@ -30,6 +30,7 @@ PROJECT = tomllib.loads((ROOT / "pyproject.toml").read_text(encoding="utf-8"))["
 NAME = PROJECT["name"]
 SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
            "include", "logic", "port", "python", "s", "tools"]
+SOLVER_NOTICE = "LICENSE.cadical"
 DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
 
 
@@ -47,15 +48,27 @@ def _tag():
     return f"{interpreter}-{abi}-{platform}"
 
 
-def _metadata():
+def _metadata(has_solver_notice=True):
     lines = ["Metadata-Version: 2.1", f"Name: {NAME}", f"Version: {_version()}",
              f"Summary: {PROJECT['description']}", "License: MIT",
              f"License-File: {PROJECT['license']['file']}"]
+    lines += [f"License-File: {SOLVER_NOTICE}"] if has_solver_notice else []
     lines += [f"Classifier: {name}" for name in PROJECT["classifiers"]]
     lines.append(f"Requires-Python: {PROJECT['requires-python']}")
     lines += [f"Requires-Dist: {name}" for name in PROJECT["dependencies"]]
     lines.append("Description-Content-Type: text/markdown")
     return "\n".join(lines) + "\n\n" + (ROOT / PROJECT["readme"]).read_text(encoding="utf-8")
+
+
+def _solver_notice():
+    """The solver's authors and terms, which are also ours: who passes its code on passes them on."""
+    packed = (ROOT / "cmake/packages/solver.copyright").read_text(encoding="utf-8")
+    holders = re.search(r"^Copyright: (.*?)^Comment:", packed, re.MULTILINE | re.DOTALL)[1]
+    terms = (ROOT / PROJECT["license"]["file"]).read_text(encoding="utf-8")
+    lines = ["Built where the solver CaDiCaL is found, the module and the tool hold its code. Its licence:",
+             "", *(f"Copyright {line.strip()}" for line in holders.splitlines()), "",
+             terms[terms.index("Permission is hereby granted"):]]
+    return "\n".join(lines)
 
 
 def _wheel_information():
@@ -121,11 +134,16 @@ class _Wheel:
         self._file.close()
 
 
-def _write_information(write):
-    """Calls write(name, bytes) for the files of the directory *.dist-info but RECORD."""
-    write("METADATA", _metadata().encode())
+def _write_information(write, is_wheel=True):
+    """Calls write(name, bytes) for the files of the directory *.dist-info but RECORD.
+
+    A package that another program makes has its own place for the solver's notice.
+    """
+    write("METADATA", _metadata(is_wheel).encode())
     write("WHEEL", _wheel_information().encode())
     write("LICENSE", (ROOT / PROJECT["license"]["file"]).read_bytes())
+    if is_wheel:
+        write(SOLVER_NOTICE, _solver_notice().encode())
 
 
 # --- the hooks --------------------------------------------------------------------------------
@@ -209,7 +227,8 @@ def _write_installed(directory):
     """What pip and importlib.metadata read of a package that another program has installed."""
     information = Path(directory) / f"{NAME}-{_version()}.dist-info"
     information.mkdir(parents=True, exist_ok=True)
-    _write_information(lambda name, content: (information / name).write_bytes(content))
+    _write_information(lambda name, content: (information / name).write_bytes(content),
+                       is_wheel=False)
     (information / "INSTALLER").write_text("cmake\n", encoding="utf-8")
 
 

@@ -4,7 +4,7 @@
 usage: bench_batch.py TOOL [--rows N] [--kinds KIND,...] [--tries N]
 
 Kinds of rows: 'equations' whose init value is missing, 'both' to be compared, 'values' whose equation
-is missing. Each table is of N rows (1,000,000) and from a fixed seed. The fastest of some tries (3)
+is missing, 'chains' without groups, each input once, whose init value is missing. Each table is of N rows (1,000,000) and from a fixed seed. The fastest of some tries (3)
 counts, by the clock; the output goes through a pipe, and must be the same for all numbers of threads.
 Prints a Markdown table.
 """
@@ -18,7 +18,7 @@ import sys
 import tempfile
 import time
 
-KINDS = ["equations", "both", "values"]
+KINDS = ["equations", "both", "values", "chains"]
 OPERATORS = ["&", "|", "^", "~&", "~|"]
 NAMES = ["sel", "a", "b", "en", "d0", "d1"]
 
@@ -49,6 +49,12 @@ def random_equation(rng, names):
     return terms[0][0][1:-1], terms[0][1]
 
 
+def random_chain(rng, names):
+    """'a & ~b | c': grouped from the left. Its value is left to the tool."""
+    return " {} ".join(("~" if rng.random() < 0.2 else "") + name for name in names) \
+        .format(*(rng.choice(OPERATORS[:3]) for _ in names[1:]))
+
+
 def write_table(path, kind, rows):
     rng = random.Random(1)
     with open(path, "w", encoding="ascii") as file:
@@ -56,10 +62,11 @@ def write_table(path, kind, rows):
         for number in range(rows):
             count = rng.randrange(4, 7)
             names = NAMES[:count]
-            equation, value = random_equation(rng, names)
+            equation, value = (random_chain(rng, names), 0) if kind == "chains" else \
+                random_equation(rng, names)
             digits = f"0x{value:0{(1 << count) // 4}x}"
             file.write(f'c{number},"{",".join(names)}",{"" if kind == "values" else equation},'
-                       f'{"" if kind == "equations" else digits}\n')
+                       f'{digits if kind in ("both", "values") else ""}\n')
 
 
 def run(tool, path, jobs):

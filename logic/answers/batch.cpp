@@ -50,11 +50,6 @@ std::string RowText(const Function& function, uint64_t row)
     return ValuesByName(function.Inputs(), values);
 }
 
-std::string InitFor(const Function& function)
-{
-    return function.NumInputs() == 1 ? function.Binary() : function.Hex();
-}
-
 // The first variable that is not listed; null when all are. Those that are come first.
 const Port::StringBase<char>* Unlisted(const Kq_BoolEquation& equation, const Reading& reading)
 {
@@ -110,6 +105,8 @@ bool BeginsLikeInit(const std::string& text)
 // Compares the row's init value with the rows of its equation, over the same inputs.
 BatchResult CompareInit(const BatchRow& row, const Listed& listed, const Rows& rows)
 {
+    if (listed.splitName.empty() && row.init == InitOf(rows))
+        return {}; // it reads back, so there is nothing to read
     if (!BeginsLikeInit(row.init))
         return RefuseNoInit(row.init);
     Kq_BoolEquation equation;
@@ -127,7 +124,7 @@ BatchResult CompareInit(const BatchRow& row, const Listed& listed, const Rows& r
                           RowText(function, different) + "), the init value " +
                           (given.At(different) ? "1" : "0");
     if (rows.NumInputs() <= kMaxWrittenInputs)
-        message += "; the equation's is " + InitFor(function);
+        message += "; the equation's is " + InitOf(rows);
     return Fail(BatchOutcome::kDiffers, std::move(message));
 }
 
@@ -177,6 +174,8 @@ Listed ListedOf(const std::vector<std::string>& inputs)
     listed.reading.hasInputs = !inputs.empty();
     listed.terms = TermsOf(listed.reading);
     listed.fault = CheckNames(inputs);
+    if (listed.fault.outcome == BatchOutcome::kOk)
+        listed.splitName = FirstSplitName(inputs);
     return listed;
 }
 
@@ -223,6 +222,8 @@ BatchResult RowCompleter::Complete(BatchRow& row)
                     "always " +
                         std::string(rows.At(0) ? "1" : "0"));
     const bool hasInit = !IsBlank(row.init);
+    if (!hasInit && !listed.splitName.empty())
+        return Fail(BatchOutcome::kIncomplete, SplitNameReason(listed.splitName));
     if (hasInit && listed.reading.hasInputs) {
         result = CompareInit(row, listed, rows);
     } else if (hasInit) {
@@ -236,7 +237,7 @@ BatchResult RowCompleter::Complete(BatchRow& row)
         row.inputs = InputNames(equation);
     assert(row.inputs.size() == rows.NumInputs());
     if (!hasInit)
-        row.init = InitFor({row.inputs, std::move(rows)});
+        row.init = InitOf(rows);
     return result;
 }
 

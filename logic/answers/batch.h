@@ -53,7 +53,8 @@ class RowCompleter {
     struct Listed {
         Reading reading;
         std::vector<Port::StringBase<char>> terms;
-        BatchResult fault; // of these inputs; kOk for none
+        BatchResult fault;     // of these inputs; kOk for none
+        std::string splitName; // one over which no init value reads back; empty for none
     };
 
   private:

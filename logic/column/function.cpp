@@ -11,17 +11,17 @@ namespace booleq {
 
 namespace {
 
-std::string Digits(const Function& function, const char* prefix, unsigned int bitsPerDigit)
+std::string Digits(const Rows& rows, const char* prefix, unsigned int bitsPerDigit)
 {
     static constexpr char kDigits[] = "0123456789abcdef";
-    const size_t numRows = function.NumRows();
+    const size_t numRows = size_t(1) << rows.NumInputs();
     const size_t rowsPerDigit = std::min<size_t>(bitsPerDigit, numRows);
     std::string text = prefix;
     text.reserve(text.size() + numRows / rowsPerDigit);
     for (size_t row = numRows; row > 0;) {
         row -= rowsPerDigit;
-        const uint64_t rows = function.GetRows().Words()[row / 64] >> (row % 64);
-        text += kDigits[rows & ((1u << rowsPerDigit) - 1)];
+        const uint64_t bits = rows.Words()[row / 64] >> (row % 64);
+        text += kDigits[bits & ((1u << rowsPerDigit) - 1)];
     }
     return text;
 }
@@ -36,12 +36,17 @@ Function::Function(std::vector<std::string> inputs, Rows rows)
 
 std::string Function::Hex() const
 {
-    return Digits(*this, "0x", 4);
+    return Digits(m_rows, "0x", 4);
 }
 
 std::string Function::Binary() const
 {
-    return Digits(*this, "0b", 1);
+    return Digits(m_rows, "0b", 1);
+}
+
+std::string InitOf(const Rows& rows)
+{
+    return rows.NumInputs() == 1 ? Digits(rows, "0b", 1) : Digits(rows, "0x", 4);
 }
 
 Function Function::Over(const std::vector<std::string>& inputs) const

@@ -64,6 +64,9 @@ class Function {
     Rows m_rows;
 };
 
+// The init value that reads back: hexadecimal, binary over one input.
+std::string InitOf(const Rows& rows);
+
 // The names of an equation's variables in their order.
 std::vector<std::string> InputNames(const Kq_BoolEquation& equation);
 // The rows of a set equation, its first variable being input 0.

@@ -33,10 +33,8 @@ void SwapRowBits(Rows& rows, unsigned int low, unsigned int high)
     if (high < 6) {
         const unsigned int distance = (1u << high) - (1u << low);
         const uint64_t movers = BitPattern(low) & ~BitPattern(high);
-        for (size_t word = 0; word < numWords; ++word) {
-            const uint64_t change = (words[word] ^ (words[word] >> distance)) & movers;
-            words[word] ^= change ^ (change << distance);
-        }
+        for (size_t word = 0; word < numWords; ++word)
+            words[word] = DeltaSwapped(words[word], movers, distance);
         return;
     }
     const size_t highStep = size_t(1) << (high - 6);

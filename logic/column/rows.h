@@ -35,6 +35,15 @@ constexpr uint64_t BitPattern(size_t bit)
     return kPatterns[bit];
 }
 
+// The bits of 'movers' trade places with those 'distance' above them: the delta swap of H. S.
+// Warren, Hacker's Delight, 2nd edition, section 7-1.
+template <class Word>
+constexpr Word DeltaSwapped(Word word, Word movers, unsigned int distance)
+{
+    const auto change = static_cast<Word>((word ^ (word >> distance)) & movers);
+    return static_cast<Word>(word ^ change ^ (change << distance));
+}
+
 // Word 'word' of the column of input 'input', and beyond the last row, too.
 constexpr uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word)
 {

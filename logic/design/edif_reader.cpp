@@ -381,19 +381,22 @@ class EdifReader {
     uint32_t FindPort(const EdifCell& cell, std::string_view ident)
     {
         const NameId id = m_idents.Find(ident);
-        if (cell.ports.size() > 16) {
+        const auto numPorts = static_cast<uint32_t>(cell.ports.size());
+        uint32_t place = numPorts;
+        if (numPorts > 16) {
             auto& ports = m_ports_of[static_cast<uint32_t>(&cell - m_cells.data())];
-            for (auto port = static_cast<uint32_t>(ports.size()); port < cell.ports.size(); ++port)
+            for (auto port = static_cast<uint32_t>(ports.size()); port < numPorts; ++port)
                 ports.emplace(cell.ports[port].ident, port);
             const auto found = ports.find(id);
             if (found != ports.end())
-                return found->second;
+                place = found->second;
         } else {
-            for (uint32_t port = 0; port < cell.ports.size(); ++port)
-                if (cell.ports[port].ident == id)
-                    return port;
+            for (place = 0; place < numPorts && cell.ports[place].ident != id;)
+                ++place;
         }
-        m_forms.Refuse("cell " + Quoted(cell.typeText) + " has no port " + Quoted(ident));
+        if (place == numPorts)
+            m_forms.Refuse("cell " + Quoted(cell.typeText) + " has no port " + Quoted(ident));
+        return place;
     }
 
     // What an identifier means in the view that is read.

@@ -4,6 +4,7 @@
 #include <set>
 
 #include "init_literal.h"
+#include "text.h"
 
 namespace booleq {
 
@@ -92,6 +93,20 @@ bool SplitInputs(const std::string& list, std::vector<std::string>& inputs)
     }
     inputs.push_back(WithoutOuterBlanks(name));
     return !quoted;
+}
+
+std::string SplitNameReason(const std::string& name)
+{
+    return "no expression or init value can hold the name " + Excerpt(name) +
+           ": it would be read as a name and more; choose another";
+}
+
+std::string FirstSplitName(const std::vector<std::string>& names)
+{
+    for (const std::string& name : names)
+        if (name.front() == '\'' && name.find('\'', 1) + 1 != name.size())
+            return name;
+    return std::string();
 }
 
 InputCheck CheckInputs(const std::vector<std::string>& inputs)

@@ -49,6 +49,13 @@ InitWidth WidthOfInit(const std::string& text);
 // name do not.  Fails: false when a quote is not closed.
 bool SplitInputs(const std::string& list, std::vector<std::string>& inputs);
 
+// The first name that a text cannot mention, because there it is a name and more ('a'+b); empty
+// when none is. It can be listed. An init value over it stands for the expression that mentions it.
+// Requires: legal names.
+std::string FirstSplitName(const std::vector<std::string>& names);
+// What to say where a text would have to mention it.
+std::string SplitNameReason(const std::string& name);
+
 // Sorts out what the library would skip without a word.
 struct InputCheck {
     std::vector<std::string> usable;   // each once, in the order listed

@@ -113,6 +113,7 @@ class Canonicaliser {
                 }
             }
         }
+        assert(best != nullptr); // a candidate has a transformation at least
         found.transformation = TransformationOf(*best, bestIndex);
         assert(Transform(found.transformation, table, m_num_inputs) == found.form);
         return found;

@@ -91,16 +91,14 @@ constexpr Word LutMask(unsigned int numInputs)
     return LutWord<Word>::Of(RowMask(numInputs), numInputs > 6 ? ~uint64_t(0) : 0);
 }
 
-// Two inputs of a table trade places; 'low' and 'high' are bits of the row number. This is the
-// delta swap of H. S. Warren, Hacker's Delight, 2nd edition, section 7-1. Requires: low <= high; if
-// they are the same, nothing moves.
+// Two inputs of a table trade places; 'low' and 'high' are bits of the row number.
+// Requires: low <= high; if they are the same, nothing moves.
 template <class Word>
 constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
 {
     const unsigned int distance = (1u << high) - (1u << low);
     const auto movers = static_cast<Word>(LutPattern<Word>(low) & ~LutPattern<Word>(high));
-    const auto change = static_cast<Word>((word ^ (word >> distance)) & movers);
-    return static_cast<Word>(word ^ change ^ (change << distance));
+    return DeltaSwapped(word, movers, distance);
 }
 
 // An input of a table is taken inverted; 'bit' is its bit of the row number.

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <cstring>
 
+#include "function.h"
 #include "init_literal.h"
 #include "text.h"
 
@@ -157,7 +158,7 @@ std::string Place::ImplicationHint() const
 // "6 " for a size of 64 rows, nothing for one that is not a number of rows.
 std::string NumInputsOf(const std::string& literal)
 {
-    for (size_t numInputs = 1; numInputs <= 30; ++numInputs)
+    for (size_t numInputs = 1; numInputs <= kMaxFunctionInputs; ++numInputs)
         if (literal.compare(0, literal.find('\''), std::to_string(uint64_t(1) << numInputs)) == 0)
             return numInputs == 1 ? "" : std::to_string(numInputs) + " ";
     return std::string();

@@ -9,10 +9,11 @@
 
 #include <kq_logic/permute.h>
 
-#include "algebra.h"
 #include "bind.h"
+#include "equation.h"
 #include "errors.h"
 #include "function_access.h"
+#include "listed_inputs.h"
 #include "lock.h"
 #include "messages.h"
 #include "notation_writer.h"
@@ -27,6 +28,7 @@ namespace booleq_python {
 namespace {
 
 constexpr size_t kMaxShortenedInputs = 6; // an init value has a short form at once
+constexpr size_t kMaxExpandedInputs = 16; // an init value stands for at most a million operands
 
 // A result on its way to Python, made without the interpreter's lock.
 struct Made {
@@ -47,17 +49,84 @@ Made Read(std::string text, const std::vector<std::string>& names, bool isListed
     return {content, std::move(text), isListed};
 }
 
-Made FromFunction(const booleq::Function& function)
+booleq::Function FunctionOf(const Content& content)
 {
-    if (function.NumInputs() == 0)
-        return Read(function.At(0) ? "1" : "0", {}, false);
-    return Read(function.Hex(), function.Inputs(), true);
+    booleq::Function function;
+    if (!booleq::FunctionOf(content.equation, function))
+        throw py::value_error(booleq::NoFunctionReason(content.NumInputs()));
+    return function;
+}
+
+// Whether the digits are the function. Over a split name the library reads the expression that
+// they stand for, and that is what such an equation is.
+bool IsDigits(const Content& content)
+{
+    return content.IsInit() && booleq::FirstSplitName(booleq::InputNames(content.equation)).empty();
+}
+
+booleq::Expression ExpressionOf(const Content& content)
+{
+    if (IsDigits(content) && content.NumInputs() <= kMaxShortenedInputs) {
+        booleq::ShortForm found = FindShortForm(FunctionOf(content));
+        if (found.isFound) {
+            assert(found.expression.names.size() == content.NumInputs());
+            return found.expression;
+        }
+    }
+    return booleq::ToExpression(content.equation);
+}
+
+[[noreturn]] void RefuseSplitName(const std::string& name)
+{
+    throw py::value_error(booleq::SplitNameReason(name));
 }
 
 Made FromNodes(const booleq::Expression& expression)
 {
+    const std::vector<std::string> names = NamesInText(expression);
+    const std::string split = booleq::FirstSplitName(names);
+    if (!split.empty())
+        RefuseSplitName(split);
     std::string text = WriteOwn(expression, booleq::OwnSyntax::AsTyped, booleq::Parentheses::Clear);
-    return Read(std::move(text), expression.names, NamesInText(expression) != expression.names);
+    return Read(std::move(text), expression.names, names != expression.names);
+}
+
+Made FromFunction(const booleq::Function& function);
+
+// Of a function with split names, which only stand in the list of inputs.
+Made FromIdleNames(const booleq::Function& function)
+{
+    std::vector<std::string> names;
+    std::vector<unsigned int> places;
+    for (unsigned int input = 0; input < function.NumInputs(); ++input) {
+        const std::string& name = function.Inputs()[input];
+        const bool isSplit = !booleq::FirstSplitName({name}).empty();
+        if (isSplit && DependsOn(function.GetRows(), input))
+            RefuseSplitName(name);
+        if (isSplit)
+            continue;
+        names.push_back(name);
+        places.push_back(input);
+    }
+    if (names.size() > kMaxExpandedInputs)
+        RefuseSplitName(booleq::FirstSplitName(function.Inputs()));
+    const Made whole = FromFunction({names, Restrict(function.GetRows(), places)});
+    booleq::Expression expression = ExpressionOf(*whole.content);
+    for (booleq::Expression::Node& node : expression.nodes)
+        if (node.op == booleq::Operator::Input)
+            node.left = places[node.left];
+    expression.names = function.Inputs();
+    return FromNodes(expression);
+}
+
+// An init value where the names of the inputs allow one.
+Made FromFunction(const booleq::Function& function)
+{
+    if (function.NumInputs() == 0)
+        return Read(function.At(0) ? "1" : "0", {}, false);
+    if (!booleq::FirstSplitName(function.Inputs()).empty())
+        return FromIdleNames(function);
+    return Read(function.Hex(), function.Inputs(), true);
 }
 
 py::object Give(const Made& made)
@@ -72,34 +141,15 @@ py::object Give(const Made& made)
     return Wrap({made.content, Decode(made.text), inputs, false});
 }
 
-booleq::Function FunctionOf(const Content& content)
-{
-    booleq::Function function;
-    if (!booleq::FunctionOf(content.equation, function))
-        throw py::value_error(booleq::NoFunctionReason(content.NumInputs()));
-    return function;
-}
-
-booleq::Expression ExpressionOf(const Content& content)
-{
-    if (content.IsInit() && content.NumInputs() <= kMaxShortenedInputs) {
-        booleq::ShortForm found = FindShortForm(FunctionOf(content));
-        if (found.isFound) {
-            assert(found.expression.names.size() == content.NumInputs());
-            return found.expression;
-        }
-    }
-    return booleq::ToExpression(content.equation);
-}
-
 bool HasRowsOnly(const Content& content)
 {
-    return content.IsInit() || content.NumInputs() == 0;
+    return IsDigits(content) || content.NumInputs() == 0;
 }
 
 Made Join(const Content& left, booleq::Operator op, const Content& right)
 {
-    if ((left.IsInit() || right.IsInit()) && HasRowsOnly(left) && HasRowsOnly(right)) {
+    const bool hasDigits = left.IsInit() || right.IsInit();
+    if (hasDigits && HasRowsOnly(left) && HasRowsOnly(right)) {
         const booleq::Function own = FunctionOf(left);
         const booleq::Function other = FunctionOf(right);
         std::vector<std::string> names = own.Inputs();
@@ -117,7 +167,7 @@ Made Join(const Content& left, booleq::Operator op, const Content& right)
 
 Made Inverted(const Content& content)
 {
-    if (content.IsInit()) {
+    if (IsDigits(content)) {
         const booleq::Function function = FunctionOf(content);
         return FromFunction({function.Inputs(), ~function.GetRows()});
     }
@@ -247,7 +297,7 @@ py::object Cofactor(const py::object& self, const py::dict& items)
         values[RequireInput(inputs, item.first)] =
             static_cast<int>(RequireBit(item.second, item.first));
     return Give(FreelyIf(Own(self).IsLarge(), [&] {
-        return content->IsInit() ? FixRows(*content, values) : FixNodes(*content, values);
+        return IsDigits(*content) ? FixRows(*content, values) : FixNodes(*content, values);
     }));
 }
 
@@ -262,7 +312,7 @@ py::object Rename(const py::object& self, const py::dict& items)
     if (!fault.empty())
         throw py::value_error(fault + " among the new names");
     return Give(FreelyIf(Own(self).IsLarge(), [&] {
-        if (content->IsInit())
+        if (IsDigits(*content))
             return FromFunction({names, FunctionOf(*content).GetRows()});
         booleq::Expression expression = booleq::ToExpression(content->equation);
         expression.names = names;
@@ -281,7 +331,17 @@ py::object Permute(const py::object& self, const py::object& inputs)
     if (!forgotten.empty())
         throw py::value_error("inputs does not list " + booleq::Excerpt(forgotten));
     const SharedContent content = equation.Shared();
-    return Give(FreelyIf(order.size() > 10, [&] {
+    return Give(FreelyIf(equation.IsLarge() || order.size() > 10, [&] {
+        if (!booleq::FirstSplitName(order).empty() && !IsDigits(*content)) {
+            booleq::Expression expression = booleq::ToExpression(content->equation);
+            std::vector<std::string> names = order;
+            const std::vector<uint32_t> places = booleq::Merge(expression.names, names);
+            for (booleq::Expression::Node& node : expression.nodes)
+                if (node.op == booleq::Operator::Input)
+                    node.left = places[node.left];
+            expression.names = order;
+            return FromNodes(expression);
+        }
         kq_logic::Function permuted;
         const std::string fault = kq_logic::Permute(
             kq_logic::FunctionAccess::Make(FunctionOf(*content)), order, permuted);
@@ -292,16 +352,6 @@ py::object Permute(const py::object& self, const py::object& inputs)
 }
 
 } // namespace
-
-py::object GiveFunction(const booleq::Function& function)
-{
-    return Give(FreelyIf(function.NumInputs() > 10, [&] { return FromFunction(function); }));
-}
-
-py::object GiveExpression(const booleq::Expression& expression)
-{
-    return Give(FreelyIf(expression.nodes.size() > 500, [&] { return FromNodes(expression); }));
-}
 
 void BindAlgebra(py::module_& module)
 {

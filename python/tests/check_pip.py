@@ -74,7 +74,12 @@ def check_wheel(path: Path, root: Path) -> None:
         info = next(name for name in names if name.endswith("/METADATA")).split("/", 1)[0]
         metadata = wheel.read(f"{info}/METADATA").decode()
         assert "\nRequires-Dist: numpy" in metadata and "\nLicense: MIT\n" in metadata
-        assert f"{info}/LICENSE" in names
+        own = wheel.read(f"{info}/LICENSE").decode()
+        solver = wheel.read(f"{info}/LICENSE.cadical").decode() # its code is linked in statically
+        assert "\nLicense-File: LICENSE\nLicense-File: LICENSE.cadical\n" in metadata
+        assert "\nCopyright 2016-2021 Armin Biere, Johannes Kepler University Linz" in solver
+        assert solver.count("\nCopyright ") == 4 and "(c)" not in solver
+        assert solver.endswith(own[own.index("Permission is hereby granted"):])
         records = wheel.read(f"{info}/RECORD").decode().splitlines()
         assert sorted(line.split(",")[0] for line in records) == sorted(names)
         for name in names:

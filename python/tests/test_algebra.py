@@ -9,7 +9,7 @@ import pytest
 import sympy as sympy_module
 import trees
 from booleq import Assignment, Equation, ParseError
-from hypothesis import given
+from hypothesis import given, reject
 from hypothesis import strategies as st
 from trees import examples
 
@@ -116,6 +116,75 @@ def test_compose_cofactor_rename(data: st.DataObject) -> None:
     assert renamed.inputs == tuple(new_names.get(name, name) for name in equation.inputs)
     assert np.array_equal(renamed.column(), equation.column())
     assert renamed.rename({new: old for old, new in new_names.items()}).equivalent(equation)
+
+
+#: Legal names that a text reads as a name and more, so that they only stand in lists of inputs.
+split_names = st.builds("'{}'{}".format, st.sampled_from(["a", "b", "x y"]),
+                        st.text("+~&|^()b' 1", min_size=1, max_size=4)) \
+    .filter(lambda name: not name[1:].endswith("'") or name.count("'") != 2)
+
+
+@st.composite
+def equations_over_split_names(draw: st.DrawFn) -> Equation:
+    """Of a text, or an init value that stands for what its names say."""
+    names = draw(st.permutations(["A", "b", "'a'"]))[:draw(st.integers(0, 3))]
+    names += draw(st.lists(split_names, min_size=1, max_size=2, unique=True))
+    names = draw(st.permutations(names))
+    try:
+        if draw(st.booleans()):
+            return Equation(draw(st.sampled_from(["A & b", "A", "1", "b ^ 'a' | A", "~'a'"])), names)
+        return Equation.from_init(draw(st.integers(0, 2 ** 2 ** len(names) - 1)), names)
+    except ParseError:
+        reject() # of the expression that it stands for, 'a'~ & b
+
+
+@examples(200)
+@given(equations_over_split_names(), equations_over_split_names() | equations(), st.data())
+def test_names_that_no_text_holds(left: Equation, right: Equation, data: st.DataObject) -> None:
+    names = merged(left, right)
+    cases: Any = [(left & right, operator.and_), (left | right, operator.or_),
+                  (right ^ left, operator.xor), (left & ~right, lambda a, b: a & (1 - b))]
+    for result, function in cases:
+        assert set(result.inputs) == set(names)
+        for row in rows_of(names):
+            assert value(result, row) == function(value(left, row), value(right, row))
+    order = data.draw(st.permutations([*names, "new", "'n'&w"]))
+    permuted = left.permute(order)
+    assert list(permuted.inputs) == order and permuted.equivalent(left)
+
+    name = data.draw(st.sampled_from(left.inputs))
+    composed = left.compose({name: right})
+    for row in rows_of(merged(left, right)):
+        assert value(composed, row) == left(
+            {other: value(right, row) if other == name else row[other] for other in left.inputs})
+    for bit in (0, 1):
+        cofactor = left.cofactor({name: bit})
+        assert cofactor.inputs == tuple(other for other in left.inputs if other != name)
+        for row in rows_of(list(cofactor.inputs)):
+            assert value(cofactor, row) == left({**row, name: bit})
+
+    new_name = data.draw(split_names.filter(lambda other: other not in left.inputs))
+    try:
+        renamed = left.rename({name: new_name})
+    except ValueError as error:
+        assert "no expression or init value can hold the name" in str(error)
+        assert "choose another" in str(error)
+        assert name in left.expression
+    else:
+        assert np.array_equal(renamed.column(), left.column())
+        assert name not in left.support
+    for result in (permuted, composed, left & right, ~left):
+        again = Equation(result.text, result.given_inputs)
+        assert again == result and again.equivalent(result)
+
+
+def test_init_value_over_more_names_than_an_expression_is_written_for() -> None:
+    names = [f"n{number}" for number in range(17)]
+    equation = Equation.from_init(1 << 131071, names)
+    with pytest.raises(ValueError, match="can hold the name 'a'\\+b: .* choose another"):
+        equation.permute([*names, "'a'+b"])
+    wide = Equation(" & ".join(names)).permute([*names[::-1], "'a'+b"])
+    assert wide.inputs == (*names[::-1], "'a'+b") and wide.equivalent(equation)
 
 
 def test_faults_of_compose_cofactor_rename() -> None:

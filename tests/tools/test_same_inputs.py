@@ -173,6 +173,31 @@ def compare_minimize(tool, group, comparison):
         comparison.expect(column_of(known), ones_of(answer["result"]["cubes"], len(names)), *where)
 
 
+# The columns as look-up tables of a file of gates, where a pin takes a net in place of a name.
+def compare_netlist(tool, group, comparison):
+    gates, expected = [], {}
+    for index, known in enumerate(group.known):
+        if known is None or known[0] == "-" or len(known) > 7:
+            continue
+        nets = [f"n{place}" for place in range(len(known) - 1)]
+        pins = " ".join(f"I{bit}={net}" for bit, net in enumerate(reversed(nets)))
+        gates.append(f".gate LUT{len(nets)} {pins} O=f{index}\n"
+                     f".param INIT {int(known[0], 16):0{1 << len(nets)}b}")
+        expected[f"f{index}"] = (nets, int(known[0], 16))
+    lines = [".model m", ".inputs n0 n1 n2 n3 n4 n5", f".outputs {' '.join(expected)}", *gates, ".end"]
+    tables = [json.loads(line) for line in run([tool, "netlist", "list", "--json", "-"], lines)]
+    comparison.expect(sorted(expected), sorted(table["output"] for table in tables), "netlist list")
+    for table in tables:
+        nets, value = expected[table["output"]]
+        where = ("netlist list", hex(value))
+        comparison.expect(nets, table["pins"], *where)
+        comparison.expect(value, int(table["init"], 0), *where)
+        again = json.loads(run([tool, "init", "--json", "--inputs", ",".join(nets), "--",
+                                table["equation"]], [])[0])["result"]
+        comparison.expect(nets, again["inputs"], *where)
+        comparison.expect(value, int(again["msb_first"]["hex"], 16), *where)
+
+
 def compare_batch(tool, group, comparison):
     if group.flags or not group.inputs: # the table has neither
         return
@@ -225,11 +250,22 @@ def compare_members(group, comparison):
         comparison.expect(tuple(names), equation.inputs, *where)
         comparison.expect(names, list(equation.explain().inputs), "explain", *where)
         comparison.expect(tuple(names), equation.minimize().inputs, "minimize", *where)
-        if not any("'" in name.rstrip("'")[1:] for name in names): # an init value over such is none
-            turned = equation.permute(reversed(names))
-            comparison.expect(tuple(reversed(names)), turned.inputs, "permute", *where)
-            comparison.expect(True, bool(equation.equivalent(turned)), "equivalent", *where)
-        comparison.expect(names, list(equation.lint().inputs), "lint", *where)
+        turned = equation.permute(reversed(names))
+        comparison.expect(tuple(reversed(names)), turned.inputs, "permute", *where)
+        comparison.expect(True, bool(equation.equivalent(turned)), "equivalent", *where)
+        comparison.expect(tuple(names), (~equation).inputs, "invert", *where)
+        for member, found in [
+                ("lint", equation.lint().inputs),
+                ("convert", [name for name, _ in equation.convert("paren").names]),
+                ("match", [name for name, *_ in equation.match(equation).mapping] +
+                 list(equation.explain().without_effect)),
+                ("satisfiable", equation.satisfiable().assignment or names),
+                ("compose", equation.compose({}).inputs), ("rename", equation.rename({}).inputs),
+                ("equations", booleq.equations([text], group.inputs, equation.lsb_first)[0].inputs),
+                ("kmap", equation.kmap().row_inputs + equation.kmap().column_inputs
+                 if 1 <= len(names) <= 6 else names)]:
+            ordered = [name for name in names if name in found] if member == "match" else list(found)
+            comparison.expect(names, ordered, member, *where)
         comparison.expect((1 << len(names), len(names) + 1), equation.truth_table().shape,
                           "truth_table", *where)
         if column == "-":
@@ -238,6 +274,12 @@ def compare_members(group, comparison):
         bits = [value >> row & 1 for row in range(1 << len(names))]
         comparison.expect(column, equation.hex_init(), "hex_init", *where)
         comparison.expect(value, int(equation.binary_init(), 2), "binary_init", *where)
+        comparison.expect(f"{1 << len(names)}'h{value:0{max(1, (1 << len(names)) // 4)}x}",
+                          equation.sized_init(), "sized_init", *where)
+        comparison.expect(bin(value).count("1"), equation.count_ones(), "count_ones", *where)
+        matters = [name for weight, name in zip(reversed(range(len(names))), names)
+                   if any(bit != bits[row ^ 1 << weight] for row, bit in enumerate(bits))]
+        comparison.expect(tuple(matters), equation.support, "support", *where)
         comparison.expect(bits, equation.column().tolist(), "column", *where)
         comparison.expect(bits, equation.truth_table()[:, -1].tolist(), "truth_table", *where)
         comparison.expect(bits, equation.eval_many(equation.truth_table()[:, :-1]).tolist(),
@@ -269,6 +311,7 @@ def main():
             compare_batch(options.tool, group, comparison)
             compare_permute(options.tool, group, comparison)
             compare_minimize(options.tool, group, comparison)
+            compare_netlist(options.tool, group, comparison)
     for difference in comparison.differences[:20]:
         print(difference)
     print(f"{num_accepted} accepted texts, {comparison.num_compared} comparisons, "

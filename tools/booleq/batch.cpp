@@ -26,6 +26,17 @@ struct Line {
     size_t number;
 };
 
+// Some lines one after the other, in one piece of memory: a thread that frees what another one has
+// allocated waits for it.
+struct Lines {
+    struct Place {
+        size_t end; // in 'text', where the next one begins
+        size_t number;
+    };
+    std::string text;
+    std::vector<Place> places;
+};
+
 int StatusOf(BatchOutcome outcome)
 {
     switch (outcome) {
@@ -221,16 +232,21 @@ void RunAlone(const Request& request, TableReader& reader, Answers& answers)
 }
 
 // Some lines at a time for a thread; what they become keeps their order.
-Answered AnswerLines(const std::vector<Line>& lines, const Request& request,
-                     const TableFormat& header)
+Answered AnswerLines(const Lines& lines, const Request& request, const TableFormat& header)
 {
     std::optional<NoMessages> silence; // of the thread that answers
     if (!request.debug)
         silence.emplace();
     Answering answering(request, header);
     Answered answered;
-    for (const Line& line : lines)
+    Line line;
+    size_t start = 0;
+    for (const Lines::Place& place : lines.places) {
+        line.text.assign(lines.text, start, place.end - start);
+        line.number = place.number;
         answering.Answer(line, answered);
+        start = place.end;
+    }
     return answered;
 }
 
@@ -240,12 +256,14 @@ void RunTogether(const Request& request, unsigned int numJobs, TableReader& read
 {
     constexpr size_t kLinesTogether = 512;
     WorkQueue<Answered> queue(numJobs, 4 * size_t(numJobs));
+    Line line;
     for (bool isMore = true; isMore;) {
-        auto lines = std::make_shared<std::vector<Line>>();
-        Line line;
-        while (lines->size() < kLinesTogether && (isMore = reader.Next(line)))
-            lines->push_back(std::move(line));
-        if (lines->empty())
+        const auto lines = std::make_shared<Lines>();
+        while (lines->places.size() < kLinesTogether && (isMore = reader.Next(line))) {
+            lines->text += line.text;
+            lines->places.push_back({lines->text.size(), line.number});
+        }
+        if (lines->places.empty())
             break;
         if (queue.IsFull())
             answers.Put(queue.Take());

@@ -75,7 +75,7 @@ int RunEval(const Request& request, Output& output)
             throw UsageError(fault);
         if (!fault.empty()) {
             Refuse(text, request, output, fault);
-            return kWrongUsage;
+            return kRefused;
         }
         const unsigned int value = equation.Eval();
         if (request.json) {

@@ -38,6 +38,9 @@ void PutText(const kq_logic::Function& function, Output& output)
             "; " + Visible(function.Inputs().front()) + " is the most significant, row k is bit k";
     PutField(output, "inputs", names);
     PutBitOrders(function, Reversed(function), output);
+    const std::string split = FirstSplitName(function.Inputs());
+    if (!split.empty())
+        PutField(output, "note", "does not read back: " + Visible(SplitNameReason(split)));
 }
 
 int RunPermute(const Request& request, Output& output)

@@ -1,6 +1,7 @@
 #include "table_format.h"
 
 #include <algorithm>
+#include <cassert>
 #include <utility>
 
 #include "answer.h"
@@ -113,10 +114,10 @@ class CsvFormat : public TableFormat {
                            std::to_string(m_num_columns));
         row.equation = m_fields[m_equation];
         row.init = m_fields[m_init];
-        const InputList& list = m_lists.Get(m_fields[m_inputs], Split);
-        if (!list.isClosed)
+        m_list = &m_lists.Get(m_fields[m_inputs], Split);
+        if (!m_list->isClosed)
             return Refused("a single quote is not closed among the inputs");
-        row.inputs = list.inputs;
+        row.inputs = m_list->inputs;
         return {};
     }
 
@@ -124,7 +125,8 @@ class CsvFormat : public TableFormat {
                   std::string& written) override
     {
         if (result.outcome == BatchOutcome::kOk || result.outcome == BatchOutcome::kFilled) {
-            JoinInputs(row.inputs, m_fields[m_inputs]);
+            assert(m_list->inputs.empty() || m_list->inputs == row.inputs);
+            m_fields[m_inputs] = m_list->inputs.empty() ? Join(row.inputs, ",") : m_list->joined;
             if (result.outcome == BatchOutcome::kFilled) {
                 m_fields[m_equation] = row.equation;
                 m_fields[m_init] = row.init;
@@ -144,6 +146,7 @@ class CsvFormat : public TableFormat {
     // The names of a field.
     struct InputList {
         std::vector<std::string> inputs;
+        std::string joined;
         bool isClosed = true; // false: a quote is not
     };
 
@@ -152,18 +155,8 @@ class CsvFormat : public TableFormat {
         InputList list;
         if (!IsBlank(field))
             list.isClosed = SplitInputs(field, list.inputs);
+        list.joined = Join(list.inputs, ",");
         return list;
-    }
-
-    static void JoinInputs(const std::vector<std::string>& inputs, std::string& field)
-    {
-        field.clear();
-        for (const std::string& input : inputs) {
-            field += input;
-            field += ',';
-        }
-        if (!inputs.empty())
-            field.pop_back();
     }
 
     static void AppendCsvLine(const std::vector<std::string>& fields, std::string& line)
@@ -183,6 +176,7 @@ class CsvFormat : public TableFormat {
     size_t m_num_written = 0;          // columns of what is written
     std::vector<std::string> m_fields; // of the line read last
     Recent<std::string, InputList> m_lists;
+    const InputList* m_list = nullptr; // of the line read last, where it was read so far
 };
 
 class JsonFormat : public TableFormat {

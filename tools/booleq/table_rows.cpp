@@ -180,11 +180,10 @@ std::string CsvField(const std::string& text)
 
 void AppendCsvField(const std::string& text, std::string& line)
 {
-    // find_first_of looks through its four characters for each one of the text.
-    const auto isSpecial = [](char character) {
-        return character == ',' || character == '"' || character == '\r' || character == '\n';
-    };
-    if (std::none_of(text.begin(), text.end(), isSpecial)) {
+    bool isSpecial = false; // to the end without a branch, so that many are compared at once
+    for (const char character : text)
+        isSpecial |= character == ',' || character == '"' || character == '\r' || character == '\n';
+    if (!isSpecial) {
         line += text;
         return;
     }

@@ -156,6 +156,7 @@ WIDE = [f"x{k}" for k in range(30)]
 INIT = Equation.from_init(int.from_bytes(np.random.default_rng(1).bytes(2 ** 13), "little"),
                           WIDE[:16])
 WORDS = np.random.default_rng(1).integers(0, 2 ** 63, 1_000_000, dtype=np.uint64)
+SORTED = [Equation(f"a{k * 7 % 999} & b{k % 98}") for k in range(20_000)]
 LONG_STEPS: Mapping[str, Callable[[], object]] = {
     "support": lambda: Equation("&".join(WIDE)).support,
     "join": lambda: INIT & "x0",
@@ -166,7 +167,6 @@ LONG_STEPS: Mapping[str, Callable[[], object]] = {
     "sorting": lambda: sorted(SORTED),
     "from_inits": lambda: Equation.from_inits(WORDS, WIDE[:6]),
 }
-SORTED = [Equation(f"a{k * 7 % 999} & b{k % 98}") for k in range(20_000)]
 
 
 @pytest.mark.parametrize("name", LONG_STEPS)

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cassert>
 #include <numeric>
+#include <vector>
 
 #include "lut_word.h"
 #include "watch.h"
@@ -11,7 +12,12 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kWatchedTables = 65536;
+// Watch() at every so many steps.
+void WatchAt(size_t step)
+{
+    if (step % 65536 == 0)
+        Watch();
+}
 
 // Tables that were met, found by a hash: open addressing, at most half full. Elements of the table
 // of hashes are places among the distinct ones, one more than that; 0 is free.
@@ -58,6 +64,7 @@ class Meeting {
     {
         m_slots.assign(4 * m_slots.size(), 0);
         for (size_t distinct = 0; distinct < m_words.size(); ++distinct) {
+            WatchAt(distinct);
             size_t slot = SlotOf(m_words[distinct]);
             while (m_slots[slot] != 0)
                 slot = (slot + 1) & (m_slots.size() - 1);
@@ -71,25 +78,46 @@ class Meeting {
     std::vector<uint64_t> m_counts;
 };
 
+// The places of the words in ascending order of these.
+template <class Word>
+std::vector<size_t> SortedPlaces(const std::vector<Word>& words)
+{
+    struct Element {
+        Word word;
+        size_t place;
+    };
+    std::vector<Element> elements;
+    elements.reserve(words.size());
+    for (const Word word : words)
+        elements.push_back({word, elements.size()});
+    size_t numCompared = 0;
+    std::sort(elements.begin(), elements.end(), [&](const Element& left, const Element& right) {
+        WatchAt(numCompared++);
+        return left.word < right.word;
+    });
+    std::vector<size_t> places;
+    places.reserve(words.size());
+    for (const Element& element : elements)
+        places.push_back(element.place);
+    return places;
+}
+
 template <class Word>
 DistinctLuts FindDistinct(const Word* tables, size_t count, bool isTwo, uint64_t* distinctPlaces)
 {
     Meeting<Word> meeting;
     for (size_t place = 0; place < count; ++place) {
-        if (place % kWatchedTables == 0)
-            Watch();
+        WatchAt(place);
         const size_t distinct = meeting.Meet(tables[place], place);
         if (distinctPlaces != nullptr)
             distinctPlaces[place] = distinct;
     }
     const std::vector<Word>& words = meeting.Words();
-    std::vector<size_t> sorted(words.size());
-    std::iota(sorted.begin(), sorted.end(), size_t(0));
-    std::sort(sorted.begin(), sorted.end(),
-              [&](size_t left, size_t right) { return words[left] < words[right]; });
+    const std::vector<size_t> sorted = SortedPlaces(words);
     DistinctLuts result;
     std::vector<uint64_t> placeOf(words.size());
     for (size_t place = 0; place < sorted.size(); ++place) {
+        WatchAt(place);
         const size_t distinct = sorted[place];
         placeOf[distinct] = place;
         result.words.push_back(LutWord<Word>::Lower(words[distinct]));
@@ -98,9 +126,10 @@ DistinctLuts FindDistinct(const Word* tables, size_t count, bool isTwo, uint64_t
         result.firstPlaces.push_back(meeting.FirstPlace(distinct));
         result.counts.push_back(meeting.Count(distinct));
     }
-    if (distinctPlaces != nullptr)
-        std::transform(distinctPlaces, distinctPlaces + count, distinctPlaces,
-                       [&](uint64_t distinct) { return placeOf[static_cast<size_t>(distinct)]; });
+    for (size_t place = 0; distinctPlaces != nullptr && place < count; ++place) {
+        WatchAt(place);
+        distinctPlaces[place] = placeOf[static_cast<size_t>(distinctPlaces[place])];
+    }
     assert(std::accumulate(result.counts.begin(), result.counts.end(), uint64_t(0)) == count);
     return result;
 }

@@ -11,6 +11,7 @@ if _sys.version_info < (3, 11):
     raise ImportError("booleq needs Python 3.11 or newer; this is Python " +
                       ".".join(str(number) for number in _sys.version_info[:3]))
 
+from ._batch import batch
 from ._booleq import __version__
 from ._equation import Equation, Operand, Syntax, Target, equations, minimize_pla
 from ._luts import Canonical, Described, Distinct, LutArray
@@ -26,11 +27,12 @@ __all__ = ["Assignment", "Canonical", "CellCount", "Conversion", "Described", "D
            "KarnaughMap", "LintReport", "LoneTable", "LutArray", "Match", "Minimum", "Netlist",
            "NetlistDiff", "NetlistError", "NetlistFinding", "NetlistStats", "NetlistTable",
            "NetlistTables", "Node", "Operand", "ParseError", "Reading", "RenamedNet",
-           "Satisfiability", "Syntax", "TableDifference", "Target", "__version__", "equations",
-           "minimize_pla", "read_netlist"]
+           "Satisfiability", "Syntax", "TableDifference", "Target", "__version__", "batch",
+           "equations", "minimize_pla", "read_netlist"]
 
 for _name in __all__:  # where users import it from, for help() and pickles
     if isinstance(globals()[_name], type):
         globals()[_name].__module__ = __name__
-equations.__module__ = minimize_pla.__module__ = read_netlist.__module__ = __name__
-del _name
+for _function in (batch, equations, minimize_pla, read_netlist):
+    _function.__module__ = __name__
+del _name, _function

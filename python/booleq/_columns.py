@@ -19,7 +19,8 @@ Column = npt.NDArray[Any]
 Mask = npt.NDArray[np.bool_]
 
 
-def _is_frame(table: Any) -> bool:
+def is_frame(table: Any) -> bool:
+    """A DataFrame, which is known by what it has: pandas need not be there."""
     return hasattr(table, "columns") and hasattr(table, "iloc")
 
 
@@ -46,7 +47,7 @@ def _readable(values: Any, where: str) -> Tuple[Column, Optional[Mask]]:
     kind = array.dtype.kind
     if kind == "O":
         flat = array.reshape(-1)
-        narrowed = _booleq.narrow_objects(flat, _missing()).reshape(array.shape)
+        narrowed = _booleq.narrow_objects(flat, missing_value()).reshape(array.shape)
         missing = narrowed == 3
         if missing.any():
             narrowed[missing] = 0
@@ -67,7 +68,7 @@ def _readable(values: Any, where: str) -> Tuple[Column, Optional[Mask]]:
     return array, mask
 
 
-def _missing() -> Any:
+def missing_value() -> Any:
     """pandas' NA where pandas is in use."""
     import sys
     pandas = sys.modules.get("pandas")
@@ -145,7 +146,7 @@ def evaluate(equation: Equation, table: Table) -> npt.NDArray[np.uint8]:
     """What Equation.eval_many does."""
     if type(table) is np.ndarray and table.dtype.names is None:
         return _by_position(equation, table)
-    if _is_frame(table):
+    if is_frame(table):
         _check_names(equation, list(table.columns), "the DataFrame")  # type: ignore[union-attr]
         return _by_name(equation, table, "the DataFrame")
     names = getattr(getattr(table, "dtype", None), "names", None)

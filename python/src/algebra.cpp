@@ -1,5 +1,6 @@
 // Equations made of equations: operators, others in place of inputs, inputs fixed, renamed and
 // reordered. An init value stays one where rows say it all; beside an expression it becomes one.
+#include <algorithm>
 #include <cassert>
 #include <set>
 #include <stdexcept>
@@ -195,14 +196,14 @@ py::object JoinObjects(const py::object& left, char op, const py::object& right)
         return py::reinterpret_borrow<py::object>(Py_NotImplemented);
     const SharedContent first = Own(own).Shared();
     const SharedContent second = Own(other).Shared();
-    const bool isLong = Own(own).IsLarge() || Own(other).IsLarge();
-    return Give(FreelyIf(isLong, [&] { return Join(*first, OperatorOf(op), *second); }));
+    const Length length = std::max(Own(own).GetLength(), Own(other).GetLength());
+    return Give(Run(length, [first, op, second] { return Join(*first, OperatorOf(op), *second); }));
 }
 
 py::object InvertObject(const py::object& self)
 {
     const SharedContent content = Own(self).Shared();
-    return Give(FreelyIf(Own(self).IsLarge(), [&] { return Inverted(*content); }));
+    return Give(Run(Own(self).GetLength(), [content] { return Inverted(*content); }));
 }
 
 size_t RequireInput(const std::vector<std::string>& inputs, const py::handle& name)
@@ -223,6 +224,7 @@ py::object Compose(const py::object& self, const py::dict& items)
     const SharedContent content = Own(self).Shared();
     const std::vector<std::string> inputs = Own(self).InputBytes();
     std::vector<SharedContent> others(inputs.size());
+    Length length = Own(self).GetLength();
     for (const auto& item : items) {
         const py::object other = ToEquation(item.second);
         if (!other)
@@ -230,8 +232,9 @@ py::object Compose(const py::object& self, const py::dict& items)
                                  " comes an Equation, a text, 0 or 1, not " +
                                  TypeName(item.second));
         others[RequireInput(inputs, item.first)] = Own(other).Shared();
+        length = std::max(length, Own(other).GetLength());
     }
-    return Give(Freely([&] {
+    return Give(RunLong(length, [content, inputs, others] {
         std::vector<std::string> names;
         std::vector<booleq::Substitute> substitutes(inputs.size());
         std::vector<booleq::Expression> expressions(inputs.size());
@@ -296,7 +299,7 @@ py::object Cofactor(const py::object& self, const py::dict& items)
     for (const auto& item : items)
         values[RequireInput(inputs, item.first)] =
             static_cast<int>(RequireBit(item.second, item.first));
-    return Give(FreelyIf(Own(self).IsLarge(), [&] {
+    return Give(Run(Own(self).GetLength(), [content, values] {
         return IsDigits(*content) ? FixRows(*content, values) : FixNodes(*content, values);
     }));
 }
@@ -311,7 +314,7 @@ py::object Rename(const py::object& self, const py::dict& items)
     const std::string fault = booleq::OrderFault(names);
     if (!fault.empty())
         throw py::value_error(fault + " among the new names");
-    return Give(FreelyIf(Own(self).IsLarge(), [&] {
+    return Give(Run(Own(self).GetLength(), [content, names] {
         if (IsDigits(*content))
             return FromFunction({names, FunctionOf(*content).GetRows()});
         booleq::Expression expression = booleq::ToExpression(content->equation);
@@ -331,7 +334,8 @@ py::object Permute(const py::object& self, const py::object& inputs)
     if (!forgotten.empty())
         throw py::value_error("inputs does not list " + booleq::Excerpt(forgotten));
     const SharedContent content = equation.Shared();
-    return Give(FreelyIf(equation.IsLarge() || order.size() > 10, [&] {
+    const Length length = order.size() > 10 ? Length::Long : Length::Short;
+    return Give(Run(std::max(length, equation.GetLength()), [content, order] {
         if (!booleq::FirstSplitName(order).empty() && !IsDigits(*content)) {
             booleq::Expression expression = booleq::ToExpression(content->equation);
             std::vector<std::string> names = order;

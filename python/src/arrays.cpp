@@ -165,9 +165,8 @@ class Evaluator {
 };
 
 // Evaluates all rows; gives back the first block with a value that is neither 0 nor 1, or kNoRow.
-size_t EvaluateAll(const Content& content, const Assignments& assignments, uint8_t* results)
+size_t EvaluateAll(const Evaluator& evaluator, const Assignments& assignments, uint8_t* results)
 {
-    const Evaluator evaluator(content, assignments.numRows);
     std::atomic<size_t> fault{kNoRow};
     booleq::RunInParts(assignments.numRows, kPartRows, booleq::LutWork(),
                        [&](size_t begin, size_t end) {
@@ -192,9 +191,14 @@ py::object Evaluate(const Equation& equation, const Assignments& assignments)
     py::object results = NewArray(py::make_tuple(assignments.numRows));
     uint8_t* const bytes = DataOf(results);
     const SharedContent content = equation.Shared();
-    const bool isLong = assignments.numRows > kBlockRows || equation.IsLarge();
+    const size_t numRows = assignments.numRows;
+    const Length length = equation.GetLength();
+    const auto evaluator = Run(length, [content, numRows] {
+        return std::make_shared<const Evaluator>(*content, numRows);
+    });
+    const bool isLong = numRows > kBlockRows || length != Length::Short;
     const size_t fault =
-        FreelyIf(isLong, [&] { return EvaluateAll(*content, assignments, bytes); });
+        FreelyIf(isLong, [&] { return EvaluateAll(*evaluator, assignments, bytes); });
     if (fault == kNoRow)
         return results;
     for (size_t row = fault; row < assignments.numRows; ++row)
@@ -261,7 +265,7 @@ py::object TruthTable(const py::object& self)
     uint8_t* const bytes = DataOf(table);
     const booleq::Rows column = RowsOf(equation);
     FreelyIf(numRows > 1024, [&] {
-        booleq::RunInParts(numRows, 65536, booleq::LutWork(), [&](size_t begin, size_t end) {
+        booleq::RunInParts(numRows, 8192, booleq::LutWork(), [&](size_t begin, size_t end) {
             uint8_t* byte = bytes + begin * (numInputs + 1);
             for (size_t row = begin; row < end; ++row) {
                 // The first input is the highest bit of the row number.
@@ -303,7 +307,10 @@ py::object NarrowObjects(const py::object& array, const py::object& missing)
     const py::tuple values(array.attr("tolist")());
     py::object narrowed = NewArray(py::make_tuple(values.size()));
     uint8_t* byte = DataOf(narrowed);
+    const uint8_t* const first = byte;
     for (const py::handle value : values) {
+        if ((byte - first) % 4096 == 0)
+            CheckSignals();
         unsigned int bit = 2;
         if (value.is_none() || value.is(missing))
             bit = 3;

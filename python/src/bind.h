@@ -10,6 +10,7 @@
 namespace booleq_python {
 
 void BindTexts(py::module_& module);     // renderings, init values, other notations
+void BindBatch(py::module_& module);     // tables of functions completed
 void BindMany(py::module_& module);      // equations by the thousand
 void BindAlgebra(py::module_& module);   // equations made of equations
 void BindQuestions(py::module_& module); // what is decided, counted and matched

@@ -19,8 +19,6 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kEndlessText = 200000; // characters that take so long that somebody may not wait
-
 size_t Mix(size_t hash, size_t value)
 {
     return (hash ^ value) * 0x9e3779b97f4a7c15u + (hash >> 29);
@@ -71,22 +69,40 @@ bool AreSame(const Content& left, const Content& right)
     return left.equation == right.equation;
 }
 
-// What sorting goes by: of texts their tokens and then how they are grouped; of init values the
-// digits, the highest row first.
-std::vector<std::string> SortKey(const Content& content)
+// What sorting goes by after the kind: of texts the tokens, of init values the digits, the highest
+// row first.
+std::string FirstKey(const Content& content)
 {
-    std::vector<std::string> key = {content.IsInit() ? "1" : "0"};
     booleq::Function function;
-    if (content.IsInit() && booleq::FunctionOf(content.equation, function)) {
-        key.push_back(function.Hex());
-    } else {
-        key.push_back(booleq::ToStd(content.equation.GetEquationAlt1(true)));
-        key.push_back(WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::First,
-                               booleq::Parentheses::Whole));
-    }
+    if (content.IsInit() && booleq::FunctionOf(content.equation, function))
+        return function.Hex();
+    return booleq::ToStd(content.equation.GetEquationAlt1(true));
+}
+
+// And then: of texts how the tokens are grouped, and the names, in either case.
+std::vector<std::string> OtherKeys(const Content& content)
+{
+    std::vector<std::string> keys;
+    if (!content.IsInit())
+        keys.push_back(WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::First,
+                                booleq::Parentheses::Whole));
     for (const auto& variable : content.equation.GetVariables())
-        key.push_back(booleq::ToStd(variable.first));
-    return key;
+        keys.push_back(booleq::ToStd(variable.first));
+    return keys;
+}
+
+// Below or above 0.  Requires: they are not the same.
+int Order(const Content& left, const Content& right)
+{
+    if (left.IsInit() != right.IsInit())
+        return right.IsInit() ? -1 : 1;
+    const int order = FirstKey(left).compare(FirstKey(right));
+    if (order != 0)
+        return order;
+    const std::vector<std::string> own = OtherKeys(left);
+    const std::vector<std::string> other = OtherKeys(right);
+    assert(own != other);
+    return own < other ? -1 : 1;
 }
 
 // Null for a text that is refused.
@@ -159,9 +175,25 @@ bool Equation::IsLargeText() const
     return static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kLargeText;
 }
 
-bool Equation::IsEndlessText() const
+Length Equation::GetLength() const
 {
-    return static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())) > kEndlessText;
+    constexpr size_t kLongRows = 10;    // inputs whose rows take longer than a switch of threads
+    constexpr size_t kEndlessRows = 22; // whose rows are memory that takes a while to get
+    constexpr size_t kEndlessTree = 12; // whose init value has a tree of 100,000 nodes
+    const size_t numInputs = NumInputs();
+    const bool hasRows = numInputs <= booleq::kMaxFunctionInputs;
+    const Length ofText = LengthOfText(static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())));
+    if (hasRows && numInputs > (IsInit() ? kEndlessTree : kEndlessRows))
+        return Length::Endless;
+    return std::max(ofText, numInputs > kLongRows ? Length::Long : Length::Short);
+}
+
+Length LengthOfText(size_t numCharacters)
+{
+    constexpr size_t kEndlessText = 50000;
+    if (numCharacters > kEndlessText)
+        return Length::Endless;
+    return numCharacters > kLargeText ? Length::Long : Length::Short;
 }
 
 unsigned int Equation::Evaluate(const std::vector<unsigned int>& values) const
@@ -182,8 +214,8 @@ bool Equation::IsSame(const Equation& other) const
         return true;
     const SharedContent own = Shared(); // the lock is given up: nobody else may keep them
     const SharedContent theirs = other.Shared();
-    return own == theirs ||
-           FreelyIf(IsLarge() && other.IsLarge(), [&] { return AreSame(*own, *theirs); });
+    return own == theirs || Run(std::min(GetLength(), other.GetLength()),
+                                [own, theirs] { return AreSame(*own, *theirs); });
 }
 
 int Equation::Compare(const Equation& other) const
@@ -192,19 +224,16 @@ int Equation::Compare(const Equation& other) const
         return 0;
     const SharedContent own = Shared();
     const SharedContent theirs = other.Shared();
-    return FreelyIf(IsLarge() || other.IsLarge(), [&] {
-        const std::vector<std::string> left = SortKey(*own);
-        const std::vector<std::string> right = SortKey(*theirs);
-        assert(left != right);
-        return left < right ? -1 : 1;
-    });
+    CheckSignals(); // sorting asks very often, and nobody else
+    return Run(std::max(GetLength(), other.GetLength()),
+               [own, theirs] { return Order(*own, *theirs); });
 }
 
 size_t Equation::Hash() const
 {
     if (!m_has_hash) {
         const SharedContent content = Shared();
-        m_hash = FreelyIf(IsLarge(), [&] { return HashOf(*content); });
+        m_hash = Run(GetLength(), [content] { return HashOf(*content); });
         m_has_hash = true;
     }
     return m_hash;
@@ -228,11 +257,11 @@ py::object ReadEquation(const py::str& text, const py::object& givenInputs, bool
 {
     const std::string bytes = Encode(text);
     const booleq::Reading reading = ReadingOf(givenInputs, lsbFirst);
-    SharedContent content;
-    if (bytes.size() > kEndlessText)
-        content = Beside([bytes, reading] { return Read(bytes, reading); });
-    else
-        content = FreelyIf(bytes.size() > kLargeText, [&] { return Read(bytes, reading); });
+    const auto read = [&bytes, &reading] { return Read(bytes, reading); };
+    const Length length = LengthOfText(bytes.size());
+    const SharedContent content = length == Length::Endless
+                                      ? Beside([bytes, reading] { return Read(bytes, reading); })
+                                      : Run(length, read);
     if (!content)
         RaiseParseError(text, bytes, reading);
     return Wrap({content, text, givenInputs, lsbFirst});
@@ -248,20 +277,26 @@ py::object MakeEquation(const py::object& text, const py::object& inputs,
 
 booleq::Rows RowsOf(const Equation& equation)
 {
-    booleq::Rows rows;
-    const SharedContent content = equation.Shared();
-    if (!FreelyIf(equation.IsLarge(), [&] { return booleq::RowsOf(content->equation, rows); }))
+    if (equation.NumInputs() > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
-    return rows;
+    const SharedContent content = equation.Shared();
+    return Run(equation.GetLength(), [content] {
+        booleq::Rows rows;
+        booleq::RowsOf(content->equation, rows);
+        return rows;
+    });
 }
 
 kq_logic::Function FunctionOf(const Equation& equation)
 {
-    kq_logic::Function function;
-    const SharedContent content = equation.Shared();
-    if (!FreelyIf(equation.IsLarge(), [&] { return function.Set(content->equation); }))
+    if (equation.NumInputs() > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
-    return function;
+    const SharedContent content = equation.Shared();
+    return Run(equation.GetLength(), [content] {
+        kq_logic::Function function;
+        function.Set(content->equation);
+        return function;
+    });
 }
 
 bool IsBit(const py::handle& value, unsigned int& bit)

@@ -19,6 +19,7 @@
 #include "expression.h"
 #include "function.h"
 #include "listed_inputs.h"
+#include "lock.h"
 
 namespace booleq_python {
 
@@ -63,11 +64,9 @@ class Equation {
     // A tuple of str.
     const py::object& Inputs() const;
     std::vector<std::string> InputBytes() const;
-    // Whether answers take longer than a switch of threads.
-    bool IsLarge() const { return IsLargeText() || NumInputs() > 10; }
     bool IsLargeText() const;
-    // Whether the text is so long that reading or writing it takes longer than somebody waits.
-    bool IsEndlessText() const;
+    // How long answers take that go through the text, all rows, or the tree of an init value.
+    Length GetLength() const;
 
     // 0 or 1 for values of the inputs in their order, each 0 or 1.  Cost: of an init value that of
     // setting the inputs, however many rows there are.
@@ -98,6 +97,8 @@ py::tuple RequireInputs(const py::object& inputs);
 
 // Characters of a text that takes some ten microseconds.
 constexpr size_t kLargeText = 2000;
+// How long reading or writing a text of so many takes.
+Length LengthOfText(size_t numCharacters);
 
 // How a text is read that Python gives with these inputs, a tuple or None.
 booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst);

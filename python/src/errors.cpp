@@ -41,7 +41,7 @@ void RaiseParseError(const py::str& text, const booleq::RefusalReport& report)
 
 void RaiseParseError(const py::str& text, const std::string& bytes, const booleq::Reading& reading)
 {
-    constexpr size_t kLongText = 100000;
+    constexpr size_t kLongText = 50000;
     const auto explain = [bytes, reading] { return booleq::ExplainRefusal(bytes, reading); };
     RaiseParseError(text, bytes.size() > kLongText ? Beside(explain) : explain());
 }

@@ -4,6 +4,7 @@
 #ifndef BOOLEQ_PYTHON_LOCK_H
 #define BOOLEQ_PYTHON_LOCK_H
 
+#include <algorithm>
 #include <atomic>
 #include <chrono>
 #include <functional>
@@ -90,11 +91,24 @@ auto Beside(const Work& work) -> decltype(work())
     });
 }
 
-// The one or the other, by how long the work's texts are.
+// How long work takes: no longer than kShortWork; longer, but with a check of signals every few
+// milliseconds; or with steps between two checks that somebody would wait for.
+enum class Length { Short, Long, Endless };
+
+// Calls work with the lock, without it, or beside.  Requires: as of Beside.
 template <class Work>
-auto BesideIf(bool isEndless, const Work& work) -> decltype(work())
+auto Run(Length length, const Work& work) -> decltype(work())
 {
-    return isEndless ? Beside(work) : Freely(work);
+    if (length == Length::Endless)
+        return Beside(work);
+    return FreelyIf(length == Length::Long, work);
+}
+
+// The same for what is never short.
+template <class Work>
+auto RunLong(Length length, const Work& work) -> decltype(work())
+{
+    return Run(std::max(length, Length::Long), work);
 }
 
 } // namespace booleq_python

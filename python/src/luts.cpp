@@ -1,5 +1,6 @@
 // Arrays of look-up tables: what booleq/_luts.py hands to the kernels of logic/luts. Tables and
 // results are buffers of NumPy, made and checked there; they are dense and aligned.
+#include <algorithm>
 #include <cassert>
 #include <cstring>
 #include <string>
@@ -15,6 +16,7 @@
 #include "lut_kernels.h"
 #include "lut_texts.h"
 #include "number_array.h"
+#include "parallel.h"
 #include "text.h"
 #include "unicode.h"
 
@@ -132,12 +134,17 @@ void Fix(const py::buffer& tables, unsigned int numInputs, unsigned int input, b
     });
 }
 
-// A row of 'numInputs' bytes for each set, 1 where the input is in it.
-void SpreadSets(const std::vector<uint8_t>& sets, unsigned int numInputs, uint8_t* bytes)
+// A byte for each input, 1 where it is in the set.
+void SpreadSet(unsigned int set, unsigned int numInputs, uint8_t* bytes)
 {
-    for (const uint8_t set : sets)
-        for (unsigned int input = 0; input < numInputs; ++input)
-            *bytes++ = static_cast<uint8_t>(set >> input & 1u);
+    for (unsigned int input = 0; input < numInputs; ++input)
+        bytes[input] = static_cast<uint8_t>(set >> input & 1u);
+}
+
+// What is quickly done with each table.
+void InParts(size_t count, const booleq::PartRunner& run)
+{
+    booleq::RunInParts(count, 65536, booleq::LutWork(), run);
 }
 
 void Supports(const py::buffer& tables, unsigned int numInputs, const py::buffer& results)
@@ -146,7 +153,10 @@ void Supports(const py::buffer& tables, unsigned int numInputs, const py::buffer
     WithLuts(tables, numInputs, out, numInputs, [&](const booleq::LutArray& luts) {
         std::vector<uint8_t> sets(luts.count);
         booleq::FindLutSupports(luts, sets.data());
-        SpreadSets(sets, numInputs, out.Bytes());
+        InParts(luts.count, [&](size_t begin, size_t end) {
+            for (size_t place = begin; place < end; ++place)
+                SpreadSet(sets[place], numInputs, out.Bytes() + place * numInputs);
+        });
     });
 }
 
@@ -190,15 +200,14 @@ void Canonical(const py::buffer& tables, unsigned int numInputs, bool hasInversi
                                          : booleq::CanonicalScope::Order;
         std::vector<booleq::LutTransformation> transformations(luts.count);
         booleq::FindCanonicals(luts, scope, outForms.Bytes(), transformations.data());
-        for (size_t place = 0; place < luts.count; ++place) {
-            const booleq::LutTransformation& found = transformations[place];
-            for (unsigned int input = 0; input < numInputs; ++input) {
-                outOrders.Bytes()[place * numInputs + input] = found.order[input];
-                outInverted.Bytes()[place * numInputs + input] =
-                    static_cast<uint8_t>(found.invertedInputs >> input & 1u);
+        InParts(luts.count, [&](size_t begin, size_t end) {
+            for (size_t place = begin; place < end; ++place) {
+                const booleq::LutTransformation& found = transformations[place];
+                std::copy_n(found.order, numInputs, outOrders.Bytes() + place * numInputs);
+                SpreadSet(found.invertedInputs, numInputs, outInverted.Bytes() + place * numInputs);
+                outOutputs.Bytes()[place] = found.invertsOutput;
             }
-            outOutputs.Bytes()[place] = found.invertsOutput;
-        }
+        });
     });
 }
 

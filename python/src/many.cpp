@@ -90,8 +90,11 @@ class Texts {
             throw py::error_already_set();
         const size_t size = Size();
         m_bytes.reserve(size);
-        for (size_t place = 0; place < size; ++place)
+        for (size_t place = 0; place < size; ++place) {
             Add(At(place), place);
+            if (place % kPart == 0)
+                CheckSignals();
+        }
     }
 
     size_t Size() const { return static_cast<size_t>(PyList_GET_SIZE(m_objects.ptr())); }
@@ -199,6 +202,8 @@ py::list GiveAll(size_t size, const std::vector<size_t>& sources, const Make& ma
         PyList_SET_ITEM(given.ptr(), static_cast<Py_ssize_t>(place), object.inc_ref().ptr());
     };
     for (size_t place = 0; place < size; ++place) {
+        if (place % kPart == 0)
+            CheckSignals();
         if (PyList_GET_ITEM(given.ptr(), static_cast<Py_ssize_t>(place)))
             continue;
         const size_t source = sources[place];

@@ -1,4 +1,5 @@
 // Smallest sums of products: of an equation with free rows, and of a PLA file.
+#include <algorithm>
 #include <memory>
 #include <string>
 
@@ -36,10 +37,34 @@ booleq::Sum Minimised(const booleq::Pla& table, const booleq::SumOptions& option
     return sum;
 }
 
+struct Smallest {
+    booleq::Pla table;
+    std::unique_ptr<const booleq::Sum> sum; // over the table's space
+    booleq::Conversion conversion;          // as text
+};
+
+// 'free' may be null.
+std::shared_ptr<const Smallest> FindSmallest(const Content& content, const Content* free,
+                                             const booleq::SumOptions& options)
+{
+    booleq::TableOutput output = {"f", booleq::ToExpression(content.equation), false, {}};
+    output.hasFree = free != nullptr;
+    if (free)
+        output.free = booleq::ToExpression(free->equation);
+    const auto found = std::make_shared<Smallest>();
+    booleq::Work work;
+    found->table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
+    found->sum = std::make_unique<const booleq::Sum>(Minimised(found->table, options));
+    found->conversion = Convert(ExpressionOf(found->table, found->sum->cubes, 0, false),
+                                *booleq::FindTarget("primary"), "", {10});
+    return found;
+}
+
 py::object MinimizeEquation(const py::object& self, const py::object& dontCare,
                             const py::object& isExact, double seconds)
 {
     const SharedContent content = Own(self).Shared();
+    Length length = Own(self).GetLength();
     SharedContent free;
     if (!dontCare.is_none()) {
         const py::object converted = ToEquation(dontCare);
@@ -47,22 +72,14 @@ py::object MinimizeEquation(const py::object& self, const py::object& dontCare,
             throw py::type_error("dont_care must be an Equation, a text, 0, 1 or None, not " +
                                  TypeName(dontCare));
         free = Own(converted).Shared();
+        length = std::max(length, Own(converted).GetLength());
     }
     const booleq::SumOptions options = Options(isExact, seconds);
-    booleq::Pla table;
-    std::unique_ptr<booleq::Sum> sum;
-    booleq::Conversion conversion;
-    Freely([&] {
-        booleq::TableOutput output = {"f", booleq::ToExpression(content->equation), false, {}};
-        output.hasFree = free != nullptr;
-        if (free)
-            output.free = booleq::ToExpression(free->equation);
-        booleq::Work work;
-        table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
-        sum = std::make_unique<booleq::Sum>(Minimised(table, options));
-        conversion = Convert(ExpressionOf(table, sum->cubes, 0, false),
-                             *booleq::FindTarget("primary"), "", {10});
-    });
+    const std::shared_ptr<const Smallest> smallest = RunLong(
+        length, [content, free, options] { return FindSmallest(*content, free.get(), options); });
+    const booleq::Pla& table = smallest->table;
+    const booleq::Sum* const sum = smallest->sum.get();
+    const booleq::Conversion& conversion = smallest->conversion;
     if (!conversion.fault.empty())
         throw py::value_error(conversion.fault);
     py::list cubes;
@@ -81,7 +98,7 @@ py::str MinimizePla(const py::object& text, const py::object& isExact, double se
 {
     const std::string bytes = Encode(RequireStr(text, "text"));
     const booleq::SumOptions options = Options(isExact, seconds);
-    return Decode(Freely([&] {
+    return Decode(RunLong(LengthOfText(bytes.size()), [bytes, options] {
         booleq::Pla table;
         booleq::PlaFault fault;
         if (!ReadPla(bytes, table, fault))

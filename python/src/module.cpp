@@ -23,6 +23,7 @@ void Fill(py::module_ module)
     PrepareInterrupts();
     BindCore(module);
     BindTexts(module);
+    BindBatch(module);
     BindMany(module);
     BindAlgebra(module);
     BindQuestions(module);

@@ -1,4 +1,5 @@
 // What is decided, counted and matched.
+#include <algorithm>
 #include <set>
 #include <stdexcept>
 #include <string>
@@ -53,8 +54,8 @@ py::object FindDifference(const py::object& self, const py::object& other, doubl
         throw py::type_error("other must be an Equation, a text, 0 or 1, not " + TypeName(other));
     const SharedContent left = Own(self).Shared();
     const SharedContent right = Own(converted).Shared();
-    const bool isEndless = Own(self).IsEndlessText() || Own(converted).IsEndlessText();
-    return Differing(BesideIf(isEndless, [left, right, seconds] {
+    const Length length = std::max(Own(self).GetLength(), Own(converted).GetLength());
+    return Differing(RunLong(length, [left, right, seconds] {
         return kq_logic::DecideEqual(left->equation, right->equation, LimitsOf(seconds));
     }));
 }
@@ -63,7 +64,7 @@ py::object FindDifference(const py::object& self, const py::object& other, doubl
 py::object FindOther(const py::object& self, bool value, double seconds)
 {
     const SharedContent content = Own(self).Shared();
-    return Differing(BesideIf(Own(self).IsEndlessText(), [content, value, seconds] {
+    return Differing(RunLong(Own(self).GetLength(), [content, value, seconds] {
         return kq_logic::DecideConstant(content->equation, value, LimitsOf(seconds));
     }));
 }
@@ -108,41 +109,43 @@ std::vector<std::string> SupportOf(const Content& content)
 py::tuple Support(const py::object& self)
 {
     const SharedContent content = Own(self).Shared();
-    return DecodeAll(FreelyIf(Own(self).IsLarge(), [&] { return SupportOf(*content); }));
+    return DecodeAll(Run(Own(self).GetLength(), [content] { return SupportOf(*content); }));
 }
 
-// The ones over the inputs that the text names, and how many other inputs there are.
+struct Counted {
+    uint64_t numOnes = 0; // over the inputs that the text names
+    size_t numIdle = 0;   // the other inputs
+};
+
+Counted CountOnesOf(const Content& content)
+{
+    Counted counted;
+    if (content.NumInputs() <= booleq::kMaxFunctionInputs) {
+        booleq::Rows rows;
+        booleq::RowsOf(content.equation, rows);
+        counted.numOnes = booleq::NumOnes(rows);
+        return counted;
+    }
+    booleq::Expression expression = booleq::ToExpression(content.equation);
+    std::vector<std::string> named = NamesInText(expression);
+    counted.numIdle = expression.names.size() - named.size();
+    if (named.size() > booleq::kMaxFunctionInputs)
+        throw py::value_error(booleq::NoFunctionReason(named.size()));
+    std::vector<booleq::Substitute> substitutes(expression.names.size());
+    const std::vector<uint32_t> places = booleq::Merge(expression.names, named);
+    for (size_t input = 0; input < substitutes.size(); ++input)
+        substitutes[input].places = {places[input]};
+    named.resize(named.size() - counted.numIdle);
+    counted.numOnes =
+        booleq::NumOnes(ToFunction(Substituted(expression, substitutes, named)).GetRows());
+    return counted;
+}
+
 py::tuple CountOnes(const py::object& self)
 {
     const SharedContent content = Own(self).Shared();
-    uint64_t numOnes = 0;
-    size_t numIdle = 0;
-    std::string fault;
-    FreelyIf(Own(self).IsLarge(), [&] {
-        booleq::Rows rows;
-        if (content->NumInputs() <= booleq::kMaxFunctionInputs) {
-            booleq::RowsOf(content->equation, rows);
-            numOnes = booleq::NumOnes(rows);
-            return;
-        }
-        booleq::Expression expression = booleq::ToExpression(content->equation);
-        std::vector<std::string> named = NamesInText(expression);
-        numIdle = expression.names.size() - named.size();
-        if (named.size() > booleq::kMaxFunctionInputs) {
-            fault = booleq::NoFunctionReason(named.size());
-            return;
-        }
-        std::vector<booleq::Substitute> substitutes(expression.names.size());
-        const std::vector<uint32_t> places = booleq::Merge(expression.names, named);
-        for (size_t input = 0; input < substitutes.size(); ++input)
-            substitutes[input].places = {places[input]};
-        named.resize(named.size() - numIdle);
-        numOnes =
-            booleq::NumOnes(ToFunction(Substituted(expression, substitutes, named)).GetRows());
-    });
-    if (!fault.empty())
-        throw py::value_error(fault);
-    return py::make_tuple(numOnes, numIdle);
+    const Counted counted = Run(Own(self).GetLength(), [content] { return CountOnesOf(*content); });
+    return py::make_tuple(counted.numOnes, counted.numIdle);
 }
 
 // None without a match; otherwise whether it takes inversions, the pairs, and the output's.

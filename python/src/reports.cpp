@@ -35,7 +35,7 @@ py::list Tree(const py::object& self)
     const py::object node = ResultClass("Node");
     const SharedContent content = Own(self).Shared();
     const booleq::TreeList list =
-        FreelyIf(Own(self).IsLarge(), [&] { return booleq::TreeList(content->equation); });
+        Run(Own(self).GetLength(), [content] { return booleq::TreeList(content->equation); });
     py::list nodes;
     for (size_t index = 0; index < list.Entries().size(); ++index) {
         const booleq::TreeList::Entry& entry = list.Entries()[index];
@@ -49,7 +49,7 @@ py::list Tree(const py::object& self)
 py::str TreeDot(const py::object& self)
 {
     const SharedContent content = Own(self).Shared();
-    return Decode(FreelyIf(Own(self).IsLarge(), [&] {
+    return Decode(Run(Own(self).GetLength(), [content] {
         std::string dot;
         PutDot(booleq::TreeList(content->equation), [&dot](const std::string& piece) {
             dot += piece;
@@ -169,7 +169,7 @@ py::object LintEquation(const py::object& self, double seconds)
     const std::string text = Encode(py::reinterpret_borrow<py::str>(equation.Text()));
     const booleq::Reading reading = equation.GetReading();
     const booleq::LintReport report =
-        BesideIf(equation.IsEndlessText(), [text, content, reading, seconds] {
+        RunLong(equation.GetLength(), [text, content, reading, seconds] {
             return booleq::Lint(text, content->equation, reading, {seconds});
         });
     py::list readers;

@@ -49,8 +49,8 @@ py::str Render(const py::object& self, const py::object& syntax, const py::objec
         const auto write = [content, render, spaces] {
             return booleq::ToStd((content->equation.*render)(spaces));
         };
-        const bool isLong = equation.IsLargeText() || (equation.IsInit() && equation.IsLarge());
-        return Decode(isLong ? Beside(write) : write());
+        const bool isShort = equation.GetLength() == Length::Short;
+        return Decode(isShort ? write() : Beside(write));
     }
     throw py::value_error("there is no syntax '" + booleq::Excerpt(name) +
                           "'; there are primary, alt1, alt2, alt3, expression");
@@ -102,13 +102,19 @@ booleq::Rows RequireRows(const Equation& equation, const py::object& isLsbFirst)
     const bool lsbFirst = RequireFlag(isLsbFirst, "lsb_first");
     if (equation.NumInputs() == 0)
         throw py::value_error("an equation without inputs has no init value");
-    booleq::Rows rows = RowsOf(equation);
     if (!lsbFirst)
-        return rows;
-    std::vector<unsigned int> order(rows.NumInputs());
-    for (unsigned int input = 0; input < rows.NumInputs(); ++input)
-        order[input] = rows.NumInputs() - 1 - input;
-    return FreelyIf(equation.IsLarge(), [&] { return PermuteInputs(std::move(rows), order); });
+        return RowsOf(equation);
+    if (equation.NumInputs() > booleq::kMaxFunctionInputs)
+        throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
+    const SharedContent content = equation.Shared();
+    return Run(equation.GetLength(), [content] {
+        booleq::Rows rows;
+        booleq::RowsOf(content->equation, rows);
+        std::vector<unsigned int> order(rows.NumInputs());
+        for (unsigned int input = 0; input < rows.NumInputs(); ++input)
+            order[input] = rows.NumInputs() - 1 - input;
+        return PermuteInputs(std::move(rows), order);
+    });
 }
 
 py::str HexInit(const py::object& self, const py::object& lsbFirst)
@@ -136,7 +142,7 @@ py::str Str(const py::object& self)
     booleq::Reading reading = equation.GetReading();
     const std::string text = Encode(py::reinterpret_borrow<py::str>(equation.Text()));
     const auto write = [content, text, reading] { return ReadableText(*content, text, reading); };
-    return Decode(equation.IsLargeText() ? Beside(write) : write());
+    return Decode(Run(equation.GetLength(), write));
 }
 
 // An int as the binary digits of all rows.
@@ -151,8 +157,18 @@ py::str BinaryDigits(const py::object& value, size_t numInputs)
         throw py::value_error("an init value over " + booleq::Count(numInputs, "input") + " has " +
                               std::to_string(numRows) + " bits: 0 <= value < 2**" +
                               std::to_string(numRows));
-    const py::object format = py::module_::import("builtins").attr("format");
-    return py::str("0b") + py::str(format(value, "0" + std::to_string(numRows) + "b"));
+    const size_t numBytes = (numRows + 7) / 8;
+    const py::bytes little = value.attr("to_bytes")(numBytes, "little");
+    const auto* const bytes = reinterpret_cast<const uint8_t*>(PyBytes_AS_STRING(little.ptr()));
+    booleq::Rows rows(static_cast<unsigned int>(numInputs));
+    FreelyIf(numRows > 4096, [&] {
+        for (size_t byte = 0; byte < numBytes; ++byte) {
+            rows.Words()[byte / 8] |= static_cast<uint64_t>(bytes[byte]) << (8 * (byte % 8));
+            if (byte % 65536 == 0)
+                booleq::Watch();
+        }
+    });
+    return Digits(rows, "0b", 1);
 }
 
 py::object FromInit(const py::object& value, const py::object& inputs, const py::object& lsbFirst)
@@ -199,15 +215,20 @@ py::str FromNotation(const std::string& notation, const py::object& given)
     for (const Reader& reader : kReaders) {
         if (notation != reader.name)
             continue;
-        booleq::ForeignText read;
-        const std::string own = Freely([&] {
-            read = booleq::ReadForeignText(bytes, reader.notation());
-            return read.fault.empty() ? WriteOwn(read.expression, booleq::OwnSyntax::First,
-                                                 booleq::Parentheses::Clear)
-                                      : std::string();
+        struct Read {
+            std::string own;
+            std::string fault;
+        };
+        const Read read = RunLong(LengthOfText(bytes.size()), [bytes, &reader]() -> Read {
+            const booleq::ForeignText foreign = booleq::ReadForeignText(bytes, reader.notation());
+            if (!foreign.fault.empty())
+                return {std::string(), foreign.fault};
+            return {
+                WriteOwn(foreign.expression, booleq::OwnSyntax::First, booleq::Parentheses::Clear),
+                std::string()};
         });
         if (read.fault.empty())
-            return Decode(own);
+            return Decode(read.own);
         booleq::RefusalReport report;
         report.code = "notation";
         report.reason = std::string(reader.notation().name) + " does not read it: " + read.fault;
@@ -241,7 +262,7 @@ py::object ConvertEquation(const py::object& self, const py::object& to, const p
     const std::string target = Encode(RequireStr(to, "to"));
     const std::string name = Encode(RequireStr(unit, "name"));
     const Kq_BoolEquation converted = isShort ? Shortened(equation) : content->equation;
-    const auto conversion = BesideIf(equation.IsEndlessText(), [converted, target, name, seconds] {
+    const auto conversion = RunLong(equation.GetLength(), [converted, target, name, seconds] {
         kq_logic::Limits limits;
         limits.seconds = seconds;
         return kq_logic::Convert(converted, target, name, limits);

@@ -11,4 +11,6 @@ mkdir -p -- "$cache"
 cd -- "$cache" # stubtest keeps its cache where it stands
 MYPYPATH=$PYTHONPATH "$python" -m mypy --config-file "$configuration" --cache-dir "$cache" \
     "$tests" "$tests/../bench"
-"$python" -m mypy.stubtest booleq._booleq --mypy-config-file "$configuration"
+# A class that pybind11 makes has a metaclass of its own, which has no name to write into a stub.
+"$python" -m mypy.stubtest booleq._booleq --mypy-config-file "$configuration" \
+    --allowlist <(echo booleq._booleq.NetlistCore)

@@ -39,6 +39,7 @@ luts.canonical("np")  # type: ignore[arg-type]
 luts.words = luts.words  # type: ignore[misc]
 LutArray([1])  # type: ignore[call-arg]
 booleq.equations("A", 1)  # type: ignore[arg-type]
+booleq.batch()  # type: ignore[call-overload]
 
 
 class Derived(Equation):  # type: ignore[misc]

@@ -4,15 +4,15 @@ import subprocess
 import sys
 import time
 from types import FrameType
-from typing import Any, Callable, Optional
+from typing import Any, Callable, Mapping, Optional
 
 import numpy as np
 import pytest
 
-from booleq import Equation
+from booleq import Equation, LutArray
 
 SECONDS_BEFORE = 0.2
-SECONDS_AFTER = 1.0  # on a loaded machine; it is some hundredths as a rule
+SECONDS_AFTER = 0.5  # on a loaded machine; it is some hundredths as a rule
 
 Products = Callable[[int, int], str]
 
@@ -110,7 +110,7 @@ def test_an_interrupt_from_outside() -> None:
     """As a terminal does it: another process sends the signal."""
     script = """
 import random, sys
-from booleq import Equation
+from booleq import Equation, LutArray
 generator = random.Random(1)
 terms = ["(" + " & ".join(f"x{k}" for k in generator.sample(range(30), 8)) + ")"
          for _ in range(20000)]
@@ -150,3 +150,42 @@ def test_a_handler_that_does_not_raise_and_uses_the_equation(parity_of_products:
         signal.signal(signal.SIGALRM, old)
     assert seen and all(hexadecimal == "0x8" for _, hexadecimal in seen)
     assert all(np.array_equal(column, expected) for column in columns)
+
+
+WIDE = [f"x{k}" for k in range(30)]
+INIT = Equation.from_init(int.from_bytes(np.random.default_rng(1).bytes(2 ** 13), "little"),
+                          WIDE[:16])
+WORDS = np.random.default_rng(1).integers(0, 2 ** 63, 1_000_000, dtype=np.uint64)
+SORTED = [Equation(f"a{k * 7 % 999} & b{k % 98}") for k in range(20_000)]
+LONG_STEPS: Mapping[str, Callable[[], object]] = {
+    "support": lambda: Equation("&".join(WIDE)).support,
+    "join": lambda: INIT & "x0",
+    "compose": lambda: INIT.compose(x0="x1 & y"),
+    "convert": lambda: INIT.convert("verilog"),
+    "unique": LutArray(WORDS, 6).unique,
+    "canonical": LutArray(WORDS, 6).canonical,
+    "sorting": lambda: sorted(SORTED),
+    "from_inits": lambda: Equation.from_inits(WORDS, WIDE[:6]),
+}
+
+
+@pytest.mark.parametrize("name", LONG_STEPS)
+def test_checks_are_not_far_apart(name: str) -> None:
+    """Between two of them this thread never works for as long as somebody would notice."""
+    longest = last = 0.0
+
+    def check(number: int, frame: Optional[FrameType]) -> None:
+        nonlocal longest, last
+        now = time.thread_time()  # whatever else the machine does
+        longest, last = max(longest, now - last), now
+
+    old = signal.signal(signal.SIGALRM, check)
+    try:
+        last = time.thread_time()
+        signal.setitimer(signal.ITIMER_REAL, 0.002, 0.002)
+        LONG_STEPS[name]()
+        check(0, None)
+    finally:
+        signal.setitimer(signal.ITIMER_REAL, 0)
+        signal.signal(signal.SIGALRM, old)
+    assert longest < 0.1

@@ -13,7 +13,7 @@ import numpy as np
 import pytest
 from booleq import Equation, LutArray
 
-SECONDS_AFTER = 1.0  # on a machine that does much else; it is some hundredths as a rule
+SECONDS_AFTER = 0.5  # on a machine that does much else; it is some hundredths as a rule
 HARD = "".join(f"(x{k} & x{(k * 7 + 3) % 20} | x{(k * 5 + 1) % 20}) ^ " for k in range(20)) + "x0"
 
 

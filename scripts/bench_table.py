@@ -33,7 +33,8 @@ TARGETS = (
     *(Target(f"column, {size} variables, {2 * size} operators, {kind}", "pair",
              f"column/n={size}/{kind}/", 5.0 if size == 16 else 1.5)
       for size in (16, 20, 24, 28) for kind in ("order", "chain", "tree")),
-    Target("hexadecimal text, 30 variables, 60 operators", "pair", "hex_text/n=30/", 3.5),
+    *(Target(f"hexadecimal text, {size} variables, {2 * size} operators", "pair",
+             f"hex_text/n={size}/", limit) for size, limit in ((20, 2.0), (24, 1.4), (30, 1.4))),
     Target("peak memory of that text", "peak", "hex_text_peak/n=30/", 3.0),
     Target("hexadecimal text, 6 variables, 20 operators", "pair", "hex_text/n=6/", 3.0),
     Target("engine rows, 10 variables", "pair", "engine_rows/n=10/", 1.2),

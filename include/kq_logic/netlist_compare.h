@@ -34,8 +34,8 @@ enum class NetlistNames {
 
 // How two netlists are compared.
 struct CompareOptions {
-    std::vector<std::pair<std::string, std::string>>
-        renames;                             // a net's left name and its right name
+    // Pairs of a net's left name and its right name.
+    std::vector<std::pair<std::string, std::string>> renames;
     bool allowsWires = false;                // tables that only pass a net may be on one side only
     NetlistNames names = NetlistNames::Auto; // whether names count
     int openInputs = -1;                     // what an unconnected input reads; -1: not known

@@ -46,7 +46,7 @@ class Documentation(unittest.TestCase):
         """Puts members in front of Dbg of the facade, after a blank line."""
         path = self.copy / HEADER
         header = path.read_text(encoding="utf-8")
-        comment = header.index("    // Writes everything about the equation")
+        comment = header.index("    void Dbg() const; // writes all")
         path.write_text(header[:comment] + "\n" + text + "\n" + header[comment:], encoding="utf-8")
         return header[:comment].count("\n") + 2
 

@@ -4,14 +4,15 @@
 #include <cerrno>
 #include <chrono>
 #include <csignal>
-#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <ctime>
 #include <vector>
 
 #include <fcntl.h>
-#include <spawn.h>
+#if defined(__linux__)
+#include <sys/prctl.h>
+#endif
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -20,8 +21,6 @@
 #include "text.h"
 #include "watch.h"
 
-extern char** environ;
-
 namespace booleq {
 
 namespace {
@@ -29,77 +28,110 @@ namespace {
 constexpr char kNotThere[] =
     "Verilog is read by the program yosys, which is not installed; install it "
     "(Debian: apt-get install yosys), or write the netlist as JSON, BLIF or EDIF";
-constexpr char kScript[] = "read_verilog design.v; write_json design.json";
 
-// A folder of our own, removed with the files that may be in it.
-class WorkFolder {
+// A child has its files as these descriptors.
+enum Place { kTextPlace = 3, kJsonPlace = 4 };
+constexpr char kTextName[] = "/dev/fd/3:";
+constexpr int kFreePlace = 5;
+constexpr int kCannotStart = 126; // statuses of the child, as shells have them
+constexpr int kNotFound = 127;
+constexpr char kScript[] = "read_verilog /dev/fd/3; write_json /dev/fd/4";
+
+// A file without a name: nothing of it is left when we end, in whatever way.
+class NamelessFile {
   public:
-    WorkFolder()
+    NamelessFile()
     {
         const char* place = std::getenv("TMPDIR");
-        m_path = std::string(place != nullptr && *place != 0 ? place : "/tmp") + "/booleq.XXXXXX";
-        if (mkdtemp(m_path.data()) == nullptr)
-            throw ReadFault{"cannot make a folder for yosys: " + m_path + ": " +
-                            std::strerror(errno)};
+        std::string path =
+            std::string(place != nullptr && *place != 0 ? place : "/tmp") + "/booleq.XXXXXX";
+        m_descriptor = mkostemp(path.data(), O_CLOEXEC);
+        if (m_descriptor < 0)
+            throw ReadFault{"cannot make a file for yosys: " + path + ": " + std::strerror(errno)};
+        unlink(path.c_str());
     }
-    ~WorkFolder()
-    {
-        for (const char* file : {"design.v", "design.json", "messages"})
-            unlink(File(file).c_str());
-        rmdir(m_path.c_str());
-    }
-    WorkFolder(const WorkFolder&) = delete;
-    WorkFolder& operator=(const WorkFolder&) = delete;
+    ~NamelessFile() { close(m_descriptor); }
+    NamelessFile(const NamelessFile&) = delete;
+    NamelessFile& operator=(const NamelessFile&) = delete;
 
-    const std::string& Path() const { return m_path; }
-    std::string File(const char* name) const { return m_path + "/" + name; }
+    int Descriptor() const { return m_descriptor; }
+
+    void Write(std::string_view text)
+    {
+        while (!text.empty()) {
+            const ssize_t numWritten = write(m_descriptor, text.data(), text.size());
+            if (numWritten < 0 && errno == EINTR)
+                continue;
+            if (numWritten <= 0)
+                throw ReadFault{std::string("cannot write a file for yosys: ") +
+                                std::strerror(errno)};
+            text.remove_prefix(static_cast<size_t>(numWritten));
+        }
+    }
+
+    uint64_t Size() const
+    {
+        struct stat status;
+        return fstat(m_descriptor, &status) == 0 ? static_cast<uint64_t>(status.st_size) : 0;
+    }
+
+    void ReadInto(SourceText& text) const
+    {
+        lseek(m_descriptor, 0, SEEK_SET);
+        text.ReadStream(m_descriptor);
+    }
 
   private:
-    std::string m_path;
+    int m_descriptor;
 };
 
-void WriteFile(const std::string& file, std::string_view text)
+struct WorkFiles {
+    NamelessFile text;
+    NamelessFile json;
+    NamelessFile messages;
+};
+
+// In the child, between fork and exec: nothing here allocates or locks.
+[[noreturn]] void RunYosys(const WorkFiles& files, pid_t parent, char* const* arguments)
 {
-    std::FILE* stream = std::fopen(file.c_str(), "wb");
-    bool isWritten = stream != nullptr;
-    if (isWritten && !text.empty())
-        isWritten = std::fwrite(text.data(), 1, text.size(), stream) == text.size();
-    if (stream != nullptr && std::fclose(stream) != 0)
-        isWritten = false;
-    if (!isWritten)
-        throw ReadFault{"cannot write " + file + ": " + std::strerror(errno)};
+    setpgid(0, 0); // a group of its own, so that all of it can be ended
+#if defined(__linux__)
+    prctl(PR_SET_PDEATHSIG, SIGKILL); // who ends us ends it, too
+    if (getppid() != parent)
+        _exit(kCannotStart);
+#else
+    static_cast<void>(parent);
+#endif
+    // Copies above all places first, so that none is overwritten before it is copied.
+    const int text = fcntl(files.text.Descriptor(), F_DUPFD, kFreePlace);
+    const int json = fcntl(files.json.Descriptor(), F_DUPFD, kFreePlace);
+    const int messages = fcntl(files.messages.Descriptor(), F_DUPFD, kFreePlace);
+    const int nothing = open("/dev/null", O_RDONLY);
+    const bool isReady = dup2(nothing, STDIN_FILENO) >= 0 && dup2(messages, STDOUT_FILENO) >= 0 &&
+                         dup2(messages, STDERR_FILENO) >= 0 && dup2(text, kTextPlace) >= 0 &&
+                         dup2(json, kJsonPlace) >= 0 && chdir("/") == 0;
+    if (isReady)
+        execvp(arguments[0], arguments);
+    _exit(errno == ENOENT ? kNotFound : kCannotStart);
 }
 
 // A running program with all that it starts; it does not outlive this.
 class Child {
   public:
-    explicit Child(const std::string& folder)
+    explicit Child(const WorkFiles& files)
     {
-        posix_spawn_file_actions_t actions;
-        posix_spawnattr_t attributes;
-        posix_spawn_file_actions_init(&actions);
-        posix_spawnattr_init(&attributes);
-        posix_spawn_file_actions_addchdir_np(&actions, folder.c_str());
-        posix_spawn_file_actions_addopen(&actions, STDIN_FILENO, "/dev/null", O_RDONLY, 0);
-        posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "messages",
-                                         O_WRONLY | O_CREAT | O_TRUNC, 0600);
-        posix_spawn_file_actions_adddup2(&actions, STDOUT_FILENO, STDERR_FILENO);
-        // A group of its own, so that all of it can be ended.
-        posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETPGROUP);
-        posix_spawnattr_setpgroup(&attributes, 0);
         std::vector<std::string> words = {"yosys", "-q", "-p", kScript};
         std::vector<char*> arguments;
         for (std::string& word : words)
             arguments.push_back(word.data());
         arguments.push_back(nullptr);
-        const int error =
-            posix_spawnp(&m_process, "yosys", &actions, &attributes, arguments.data(), environ);
-        posix_spawnattr_destroy(&attributes);
-        posix_spawn_file_actions_destroy(&actions);
-        if (error == ENOENT)
-            throw ReadFault{kNotThere};
-        if (error != 0)
-            throw ReadFault{std::string("cannot start yosys: ") + std::strerror(error)};
+        const pid_t parent = getpid();
+        m_process = fork();
+        if (m_process < 0)
+            throw ReadFault{std::string("cannot start yosys: ") + std::strerror(errno)};
+        if (m_process == 0)
+            RunYosys(files, parent, arguments.data());
+        setpgid(m_process, m_process); // whoever of the two comes first
     }
     ~Child()
     {
@@ -123,18 +155,11 @@ class Child {
     bool m_has_ended = false;
 };
 
-// 0 for a file that is not there.
-uint64_t SizeOf(const std::string& file)
-{
-    struct stat status;
-    return stat(file.c_str(), &status) == 0 ? static_cast<uint64_t>(status.st_size) : 0;
-}
-
-// Why yosys refused the text: its line "design.v:3: ERROR: ..." without our name for the file.
-std::string ErrorIn(const std::string& file)
+// Why yosys refused the text: its line "/dev/fd/3:7: ERROR: ..." without our name for the file.
+std::string ErrorIn(const NamelessFile& file)
 {
     SourceText messages;
-    messages.ReadFile(file);
+    file.ReadInto(messages);
     const std::string_view text = messages.Text();
     size_t start = 0;
     while (start < text.size()) {
@@ -145,14 +170,21 @@ std::string ErrorIn(const std::string& file)
         if (sign == std::string_view::npos)
             continue;
         std::string reason(line.substr(sign + 7));
-        if (line.substr(0, 9) == "design.v:" && sign > 11)
-            reason = "line " + std::string(line.substr(9, sign - 11)) + ": " + reason;
+        const size_t length = sizeof kTextName - 1;
+        if (line.substr(0, length) == kTextName && sign > length + 2)
+            reason = "line " + std::string(line.substr(length, sign - length - 2)) + ": " + reason;
         return reason;
     }
     return "it gave no reason";
 }
 
-void Await(Child& child, double seconds, const WorkFolder& folder)
+void RefuseTooLong(const WorkFiles& files)
+{
+    if (std::max(files.json.Size(), files.messages.Size()) > kMaxSourceBytes)
+        throw ReadFault{"yosys wrote more than 4,294,967,000 bytes"};
+}
+
+void Await(Child& child, double seconds, const WorkFiles& files)
 {
     const auto start = std::chrono::steady_clock::now();
     int status = 0;
@@ -162,32 +194,33 @@ void Await(Child& child, double seconds, const WorkFolder& folder)
         if (passed.count() > seconds)
             throw ReadFault{"yosys did not read the Verilog text within " +
                             Count(static_cast<uint64_t>(seconds), "second")};
-        for (const char* file : {"design.json", "messages"})
-            if (SizeOf(folder.File(file)) > kMaxSourceBytes)
-                throw ReadFault{"yosys wrote more than 4,294,967,000 bytes"};
+        RefuseTooLong(files);
         const timespec pause = {0, 10000000}; // a hundredth of a second
         nanosleep(&pause, nullptr);
     }
-    if (WIFEXITED(status) && WEXITSTATUS(status) == 127)
-        throw ReadFault{kNotThere};
+    RefuseTooLong(files);
     if (WIFSIGNALED(status))
         throw ReadFault{std::string("yosys was ended by a signal: ") + strsignal(WTERMSIG(status))};
-    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0)
-        throw ReadFault{"yosys does not read it: " + ErrorIn(folder.File("messages"))};
+    if (WEXITSTATUS(status) == kNotFound)
+        throw ReadFault{kNotThere};
+    if (WEXITSTATUS(status) == kCannotStart)
+        throw ReadFault{"yosys cannot be started"};
+    if (WEXITSTATUS(status) != 0)
+        throw ReadFault{"yosys does not read it: " + ErrorIn(files.messages)};
 }
 
 } // namespace
 
 void ConvertVerilog(SourceText& verilog, double seconds, SourceText& json)
 {
-    const WorkFolder folder;
-    WriteFile(folder.File("design.v"), verilog.Text());
+    WorkFiles files;
+    files.text.Write(verilog.Text());
     verilog.Release();
-    Child child(folder.Path());
-    Await(child, seconds, folder);
-    if (SizeOf(folder.File("design.json")) == 0)
+    Child child(files);
+    Await(child, seconds, files);
+    if (files.json.Size() == 0)
         throw ReadFault{"yosys wrote no netlist"};
-    json.ReadFile(folder.File("design.json"));
+    files.json.ReadInto(json);
 }
 
 } // namespace booleq

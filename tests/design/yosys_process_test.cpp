@@ -9,6 +9,7 @@
 #include <thread>
 
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <gtest/gtest.h>
@@ -47,7 +48,7 @@ class YosysProcess : public testing::Test {
         std::filesystem::remove_all(m_folder);
     }
 
-    // What runs as yosys, in the folder of the text design.v.
+    // What runs as yosys, with the text as /dev/fd/3 and the netlist as /dev/fd/4.
     void Install(const std::string& commands)
     {
         const std::filesystem::path program = m_folder / "yosys";
@@ -72,7 +73,12 @@ class YosysProcess : public testing::Test {
         pid_t process = 0;
         std::ifstream(m_folder / "process") >> process;
         EXPECT_GT(process, 0);
-        return kill(process, 0) == 0;
+        if (kill(process, 0) != 0)
+            return false;
+        std::string status; // "12 (sleep) S ...": Z has ended, and nobody has asked for its status
+        std::ifstream stream("/proc/" + std::to_string(process) + "/stat");
+        std::getline(stream, status);
+        return status.find(") Z ") == std::string::npos;
     }
 
     std::filesystem::path m_folder;
@@ -82,7 +88,7 @@ class YosysProcess : public testing::Test {
 
 TEST_F(YosysProcess, WhatItWritesIsRead)
 {
-    Install("grep -q 'assign y = a' design.v || exit 1\ncat >design.json <<'END'\n" +
+    Install("grep -q 'assign y = a' /dev/fd/3 || exit 1\ncat >/dev/fd/4 <<'END'\n" +
             std::string(kJson) + "\nEND");
     EXPECT_EQ(FaultOf(kVerilog), "");
     EXPECT_EQ(m_design.format, "Verilog");
@@ -109,7 +115,7 @@ TEST_F(YosysProcess, AProgramThatCannotRunIsNamed)
 
 TEST_F(YosysProcess, ItsReasonHasTheLineOfTheText)
 {
-    Install("echo 'Warning: something'; echo 'design.v:3: ERROR: syntax error'; exit 1");
+    Install("echo 'Warning: something'; echo '/dev/fd/3:3: ERROR: syntax error'; exit 1");
     EXPECT_EQ(FaultOf(kVerilog), "test: yosys does not read it: line 3: syntax error");
     Install("echo 'ERROR: Module m is not there.' >&2; exit 1");
     EXPECT_EQ(FaultOf(kVerilog), "test: yosys does not read it: Module m is not there.");
@@ -131,9 +137,9 @@ TEST_F(YosysProcess, OneThatWritesNothingIsSaid)
 
 TEST_F(YosysProcess, AnythingElseThanANetlistIsRefused)
 {
-    Install("echo nonsense >design.json");
+    Install("echo nonsense >/dev/fd/4");
     EXPECT_NE(FaultOf(kVerilog), "");
-    Install("head -c 100000 /dev/urandom >design.json");
+    Install("head -c 100000 /dev/urandom >/dev/fd/4");
     EXPECT_NE(FaultOf(kVerilog), "");
 }
 
@@ -147,13 +153,35 @@ TEST_F(YosysProcess, WhatDoesNotEndIsEnded)
 // Files of which no block is written: they take no room.
 TEST_F(YosysProcess, OutputThatIsTooLongEndsIt)
 {
-    Install("truncate -s 5000000000 design.json; exec sleep 100");
+    Install("truncate -s 5000000000 /dev/fd/4; exec sleep 100");
     EXPECT_EQ(FaultOf(kVerilog), "test: yosys wrote more than 4,294,967,000 bytes");
     EXPECT_FALSE(IsRunning());
-    Install("truncate -s 5000000000 messages; exec sleep 100");
+    Install("truncate -s 5000000000 /dev/fd/1; exec sleep 100");
     EXPECT_EQ(FaultOf(kVerilog), "test: yosys wrote more than 4,294,967,000 bytes");
-    Install("truncate -s 5000000000 design.json");
-    EXPECT_NE(FaultOf(kVerilog).find("4,294,967,000 bytes"), std::string::npos);
+    Install("truncate -s 5000000000 /dev/fd/4");
+    EXPECT_EQ(FaultOf(kVerilog), "test: yosys wrote more than 4,294,967,000 bytes");
+}
+
+// Whoever ends this process ends yosys, and no file is left.
+TEST_F(YosysProcess, ItEndsWithUs)
+{
+    Install("exec sleep 100");
+    const pid_t own = fork();
+    ASSERT_GE(own, 0);
+    if (own == 0) {
+        FaultOf(kVerilog);
+        _exit(0);
+    }
+    for (int tries = 0; tries < 1000 && !std::filesystem::exists(m_folder / "process"); ++tries)
+        std::this_thread::sleep_for(std::chrono::milliseconds(10));
+    std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    EXPECT_TRUE(IsRunning());
+    kill(own, SIGKILL);
+    waitpid(own, nullptr, 0);
+    std::this_thread::sleep_for(std::chrono::milliseconds(300));
+#if defined(__linux__)
+    EXPECT_FALSE(IsRunning());
+#endif
 }
 
 struct Ended {};

@@ -4,6 +4,22 @@
 
 namespace booleq {
 
+namespace {
+
+// A number of 64 bits; another one stays a text, which is then not an init value.
+bool ToNumber(CellValue& value)
+{
+    for (const char character : value.text) {
+        const auto digit = static_cast<uint64_t>(character - '0');
+        if (character < '0' || character > '9' || value.number > (UINT64_MAX - digit) / 10)
+            return false;
+        value.number = value.number * 10 + digit;
+    }
+    return !value.text.empty();
+}
+
+} // namespace
+
 bool EdifForms::NextPart(const char* form)
 {
     if (m_pace.IsDue())
@@ -85,6 +101,28 @@ EdifName EdifForms::ReadName()
     name.numBits = static_cast<uint32_t>(Number(kMaxPortBits));
     Close("array");
     return name;
+}
+
+bool EdifForms::ReadValue(CellValue& value)
+{
+    bool isRead = false;
+    while (NextPart("property")) {
+        const bool isString = m_tokens.IsOpen("string");
+        const bool isInteger = m_tokens.IsOpen("integer") || m_tokens.IsOpen("number");
+        if (!isString && !isInteger) {
+            m_tokens.Skip();
+            continue;
+        }
+        m_tokens.Next();
+        if (m_tokens.Kind() == EdifToken::Close)
+            continue; // no value
+        value.text = isString ? Decoded(m_tokens.Text()) : m_tokens.Text();
+        value.isNumber = isInteger && ToNumber(value);
+        m_tokens.Skip();
+        Close("property");
+        isRead = true;
+    }
+    return isRead;
 }
 
 uint64_t EdifForms::Number(uint64_t max) const

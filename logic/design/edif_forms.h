@@ -7,6 +7,7 @@
 #include <deque>
 #include <string>
 
+#include "cell_intake.h"
 #include "edif_tokens.h"
 #include "readers.h"
 
@@ -39,6 +40,8 @@ class EdifForms {
     EdifName CurrentName();
     // The next token is a name, or an array of one with a number of bits.
     EdifName ReadName();
+    // The value in the rest of a (property NAME ...) of a string or an integer; false for others.
+    bool ReadValue(CellValue& value);
     // The current token as a number.
     uint64_t Number(uint64_t max) const;
 

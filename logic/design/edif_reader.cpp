@@ -275,39 +275,11 @@ class EdifReader {
     {
         EdifProperty property;
         property.name = m_forms.ReadName().text;
-        bool isRead = false;
-        while (m_forms.NextPart("property")) {
-            const bool isString = m_tokens.IsOpen("string");
-            const bool isInteger = m_tokens.IsOpen("integer") || m_tokens.IsOpen("number");
-            if (!isString && !isInteger) {
-                m_tokens.Skip();
-                continue;
-            }
-            m_tokens.Next();
-            if (m_tokens.Kind() == EdifToken::Close)
-                continue; // no value
-            property.value.text = isString ? m_forms.Decoded(m_tokens.Text()) : m_tokens.Text();
-            property.value.isNumber = isInteger && ToNumber(property.value);
-            m_tokens.Skip();
-            m_forms.Close("property");
-            isRead = true;
-        }
-        if (isRead && property.name == m_job.options.keyAttribute)
+        if (!m_forms.ReadValue(property.value))
+            return;
+        if (property.name == m_job.options.keyAttribute)
             instance.key = m_job.design.names.Add(property.value.text);
-        if (isRead)
-            m_view.properties.push_back(property);
-    }
-
-    // A number of 64 bits; another one stays a text, which is then not an init value.
-    static bool ToNumber(CellValue& value)
-    {
-        for (const char character : value.text) {
-            const auto digit = static_cast<uint64_t>(character - '0');
-            if (character < '0' || character > '9' || value.number > (UINT64_MAX - digit) / 10)
-                return false;
-            value.number = value.number * 10 + digit;
-        }
-        return !value.text.empty();
+        m_view.properties.push_back(property);
     }
 
     void ReadNet(uint32_t cell)

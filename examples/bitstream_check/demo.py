@@ -17,7 +17,7 @@ HERE = pathlib.Path(__file__).resolve().parent
 # What the comparison says of each fault.
 CAUSES = {
     "pins-swapped": "pins swapped without the init value",
-    "digit-flipped": "one digit of the init value is another one",
+    "digit-flipped": "one digit of the init value changed",
     "halves-exchanged": "the halves of the init value are exchanged",
     "mask-shortened": "the digits of the init value are shifted: 1 hexadecimal digit to the right",
     "output-inverted": "the output is inverted",

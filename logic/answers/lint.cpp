@@ -197,8 +197,8 @@ class Linter {
             }
             if (finding.details.empty())
                 continue;
-            finding.message = std::string("written ") + (hasBlanks ? "with" : "without") +
-                              " blanks by the library, the equation does not read back";
+            finding.message = std::string("the library's rendering ") +
+                              (hasBlanks ? "with" : "without") + " blanks does not read back";
             finding.details.emplace_back("write", ClearText());
             m_report.findings.push_back(finding);
         }
@@ -208,7 +208,7 @@ class Linter {
     {
         if (m_text.size() < 3 || m_text[0] != '0')
             return;
-        Add("leading-zero", "over listed inputs a text that begins with \"0\" is taken for an init "
+        Add("leading-zero", "over listed inputs a text that begins with \"0\" is read as an init "
                             "value and refused")
             .details = {{"write", "(" + m_text + ")"}};
     }

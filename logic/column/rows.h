@@ -128,7 +128,7 @@ Rows Widen(const Rows& rows);
 
 // Two inputs trade places; the same twice changes nothing.
 Rows SwapInputs(Rows rows, unsigned int first, unsigned int second);
-// An input is taken inverted.
+// An input is inverted.
 Rows InvertInput(Rows rows, unsigned int input);
 // Input k of the result is input order[k] of 'rows'.
 // Requires: order is a permutation of all inputs.  Cost: O(inputs * words).

@@ -90,7 +90,7 @@ class Decider {
 
     void SetTimeIsOver()
     {
-        SetUndecided("the time is over");
+        SetUndecided("out of time");
         m_decision.isTimeOver = true;
     }
 

@@ -63,7 +63,7 @@ struct Side {
 Side SideOf(const Expression& expression);
 
 // Inputs are the same when their names are.
-// Fails: Undecided, when the time is over or this build has no solver and more than
+// Fails: Undecided, when out of time or this build has no solver and more than
 // kMaxFirstRowInputs inputs matter; what the watcher throws goes through.
 // Cost: O(n log n) for n nodes of the same operators and operands; exponential at worst.
 Decision DecideEqual(const Side& left, const Side& right, const Limits& limits);

@@ -45,7 +45,7 @@ class Solver {
 
     // With the assumptions, for this question only. The watcher is called meanwhile; what it throws
     // leaves here, and the solver can be asked again.
-    // Fails: Unknown, after 'maxConflicts' conflicts or when the time is over.
+    // Fails: Unknown, after 'maxConflicts' conflicts or when out of time.
     Answer Solve(std::initializer_list<int> assumptions, int maxConflicts = kNoLimit);
 
     // Requires: the last answer was Satisfiable.

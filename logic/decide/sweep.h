@@ -22,7 +22,7 @@ namespace booleq {
 class Sweep {
   public:
     // 'maxConflicts' bounds each question to the solver. Ends early, with gates left alone, when
-    // the time is over. The deadline outlives the sweep; the graph may go. Fails: std::bad_alloc,
+    // out of time. The deadline outlives the sweep; the graph may go. Fails: std::bad_alloc,
     // or what the watcher throws.
     Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline& deadline);
 

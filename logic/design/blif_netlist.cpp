@@ -37,7 +37,7 @@ class BlifNetlistReader {
                 ReadDirective();
         }
         if (m_module != nullptr)
-            ThrowAtLine(m_line, "the text ends within model " +
+            ThrowAtLine(m_line, "the text ends inside model " +
                                     Quoted(m_job.design.names.Text(m_module->name)) +
                                     ", without .end");
     }

@@ -79,7 +79,7 @@ class TypeReader {
             if (m_words.size() < directive.minWords)
                 Refuse("'" + m_words[0] + "' needs more words");
             if (directive.read != &TypeReader::ReadCell && !m_type)
-                Refuse("'" + m_words[0] + "' stands before the first 'cell'");
+                Refuse("'" + m_words[0] + "' comes before the first 'cell'");
             (this->*directive.read)();
             return;
         }
@@ -104,7 +104,7 @@ class TypeReader {
         if (m_type->inputPins.size() > kMaxCellPins)
             Refuse("more than 16 inputs");
         if (!m_type->steps.empty())
-            Refuse("inputs stand before the tables");
+            Refuse("list the inputs before the tables");
     }
 
     void ReadOther()
@@ -118,7 +118,7 @@ class TypeReader {
         for (const std::vector<std::string>* all :
              {&m_type->inputPins, &m_type->outputPins, &m_type->otherPins})
             if (std::find(all->begin(), all->end(), name) != all->end())
-                Refuse("pin " + Quoted(name) + " stands twice");
+                Refuse("pin " + Quoted(name) + " is listed twice");
         names.push_back(name);
     }
 
@@ -290,7 +290,7 @@ class TypeReader {
             Refuse("cell " + Quoted(m_type->name) + " above has no table");
         if (!isTable && (!m_type->steps.empty() || m_type->outputPins.size() > 1))
             Refuse("cell " + Quoted(m_type->name) +
-                   " above has a table and is something else, too");
+                   " above has a table, so it cannot be anything else");
         m_types.push_back(std::move(*m_type));
         m_type.reset();
     }

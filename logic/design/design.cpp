@@ -14,9 +14,9 @@ struct CodeText {
 
 constexpr CodeText kCodeTexts[] = {
     {"init-short",
-     "the init value has fewer digits than the table has rows; zeros stand before them"},
+     "the init value has fewer digits than the table has rows; the missing ones count as 0"},
     {"init-long",
-     "the init value has more digits than the table has rows; the first ones are dropped"},
+     "the init value has more digits than the table has rows; the first ones are ignored"},
     {"init-unknown", "the init value has x or z digits; they count as 0"},
     {"init-missing", "the cell has no init value; the default of its type is used"},
     {"init-illegible", "the init value is not a number; the cell is not read"},
@@ -26,7 +26,7 @@ constexpr CodeText kCodeTexts[] = {
     {"pin-strange", "the cell's type has no such pin; the cell is not read"},
     {"pin-twice", "a pin is connected twice; the first connection counts"},
     {"too-wide", "the table has more than 16 inputs; the cell is not read"},
-    {"mode-unread", "in this mode the cell is more than logic; it is not read"},
+    {"mode-unread", "in this mode the cell is more than a look-up table; it is not read"},
     {"cover-mixed", "the table has both rows of 0 and rows of 1; it is not read"},
     {"buffer", "the table only passes a net: the two nets are one, and it is not counted"},
     {"constant-net", "the table has no inputs: its net is constant, and it is not counted"},

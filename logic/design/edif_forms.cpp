@@ -34,7 +34,7 @@ bool EdifForms::NextPart(const char* form)
     case EdifToken::End:
         break;
     }
-    Refuse(std::string("the text ends within (") + form + " ...");
+    Refuse(std::string("the text ends inside (") + form + " ...");
 }
 
 void EdifForms::Close(const char* form)

@@ -35,7 +35,7 @@ class EdifReader {
                 m_tokens.Skip();
         }
         if (m_tokens.Next() != EdifToken::End)
-            m_forms.Refuse("something follows the last ')'");
+            m_forms.Refuse("unexpected text after the last ')'");
     }
 
   private:
@@ -259,7 +259,7 @@ class EdifReader {
             }
         }
         if (instance.cell == EdifView::kNone)
-            ThrowAtLine(instance.line, "instance " + Quoted(name.text) + " does not say its cell");
+            ThrowAtLine(instance.line, "instance " + Quoted(name.text) + " does not name its cell");
         instance.numProperties =
             static_cast<uint32_t>(m_view.properties.size()) - instance.firstProperty;
         Known& known = KnownOf(name.ident);

@@ -96,7 +96,7 @@ void EdifTokens::Skip()
             --depth;
             break;
         case EdifToken::End:
-            ThrowAtLine(line, "the text ends within (" + Excerpt(form) + " ...");
+            ThrowAtLine(line, "the text ends inside (" + Excerpt(form) + " ...");
         case EdifToken::Word:
         case EdifToken::String:
             break;

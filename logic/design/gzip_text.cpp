@@ -64,7 +64,7 @@ void SourceText::Inflate()
         plain.m_size += room - stream.avail_out;
         if (status == Z_BUF_ERROR ||
             (status == Z_OK && numTaken == m_size && stream.avail_out != 0))
-            throw ReadFault{"the compressed file is not whole"};
+            throw ReadFault{"the compressed file is truncated"};
         if (status != Z_OK && status != Z_STREAM_END)
             throw ReadFault{"the compressed file is damaged"};
     }

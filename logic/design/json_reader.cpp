@@ -38,10 +38,10 @@ class JsonReader {
                 ReadModules(field.value());
             }
             if (!hasModules)
-                throw ReadFault{"the JSON text has no \"modules\"; is it of write_json?"};
+                throw ReadFault{"the JSON text has no \"modules\"; was it written by write_json?"};
             const char* rest = nullptr; // there is none at the end
             if (m_document.current_location().get(rest) == simdjson::SUCCESS)
-                Refuse("something follows the last '}'");
+                Refuse("unexpected text after the last '}'");
         } catch (const simdjson::simdjson_error& error) {
             Refuse(ReasonOf(error.error()));
         }

@@ -20,7 +20,7 @@ struct FormatRow {
 };
 
 constexpr char kUnknown[] =
-    "it is not a netlist that can be read: Yosys JSON begins with '{', BLIF with "
+    "it is not a netlist of a known format: Yosys JSON begins with '{', BLIF with "
     "'.model', EDIF with '(edif', Verilog with a module";
 
 bool BeginsWith(std::string_view text, std::string_view start)

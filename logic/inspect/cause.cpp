@@ -44,9 +44,9 @@ std::string ChangedDigit(const Rows& changed)
         numChanged += changed.At(row) ? 1 : 0;
     if (numChanged != NumOnes(changed))
         return std::string();
-    return numChanged == 1
-               ? "bit " + std::to_string(first)
-               : "hexadecimal digit " + std::to_string(digit) + ", the last one being 0";
+    return numChanged == 1 ? "bit " + std::to_string(first)
+                           : "hexadecimal digit " + std::to_string(digit) +
+                                 ", counted from the last, which is 0";
 }
 
 class CauseFinder {
@@ -178,7 +178,7 @@ class CauseFinder {
         const bool isSameInit = m_left.rows == m_right.rows && m_left.nets != m_right.nets;
         m_causes.push_back(
             {CauseCode::PinsSwapped, std::move(nets),
-             isSameInit ? "the init value is the same, the order of pins is not" : ""});
+             isSameInit ? "the pins changed their order, the init value did not change" : ""});
     }
 
     // Over the right table's pins; else over the left one's, where the right one has idle pins.

@@ -38,7 +38,7 @@ std::string CauseText(const Comparison& comparison, const Cause& cause)
     case CauseCode::HalvesExchanged:
         return "the halves of the init value are exchanged, as if " + first + " were inverted";
     case CauseCode::InputInverted:
-        return "the input " + first + " is taken inverted";
+        return "the input " + first + " is inverted";
     case CauseCode::DigitsShifted:
         return "the digits of the init value are shifted" + detail;
     case CauseCode::DigitsRotated:
@@ -48,13 +48,13 @@ std::string CauseText(const Comparison& comparison, const Cause& cause)
     case CauseCode::DigitsReversed:
         return "the digits of the init value are reversed" + detail;
     case CauseCode::DigitChanged:
-        return "one digit of the init value is another one" + detail;
+        return "one digit of the init value changed" + detail;
     case CauseCode::OtherNet:
-        return "an input comes from " + comparison.NameOf(nets[1]) + " in place of " + first;
+        return "an input comes from " + comparison.NameOf(nets[1]) + " instead of " + first;
     case CauseCode::InputStuck:
         return "the input " + first + " is taken as " + cause.detail;
     case CauseCode::OutputMoved:
-        return "the same function drives " + comparison.NameOf(nets[1]) + " in place of " + first;
+        return "the same function drives " + comparison.NameOf(nets[1]) + " instead of " + first;
     }
     return std::string();
 }

@@ -66,9 +66,9 @@ void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun,
     for (uint64_t count = 1; count < numDigits; ++count) {
         const uint64_t distance = count * digit;
         const std::string by = Count(count, noun);
-        faults.push_back({CauseCode::DigitsShifted, by + " to the left, zeros put in",
+        faults.push_back({CauseCode::DigitsShifted, by + " to the left, filled with zeros",
                           [=](const Rows& rows) { return ShiftUp(rows, distance); }, nullptr});
-        faults.push_back({CauseCode::DigitsShifted, by + " to the right, zeros put in",
+        faults.push_back({CauseCode::DigitsShifted, by + " to the right, filled with zeros",
                           [=](const Rows& rows) { return ShiftDown(rows, distance); }, nullptr});
         // Half way round is the exchange of halves; less than that is the shorter way.
         if (2 * distance < numRows) {
@@ -77,11 +77,10 @@ void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun,
             faults.push_back({CauseCode::DigitsRotated, by + " to the left", left, right});
             faults.push_back({CauseCode::DigitsRotated, by + " to the right", right, left});
         }
-        faults.push_back({CauseCode::DigitsLost,
-                          "the first " + by + (count == 1 ? " is" : " are") +
-                              " lost, zeros in place of " + (count == 1 ? "it" : "them"),
-                          [=](const Rows& rows) { return DropFirst(rows, numRows - distance); },
-                          nullptr});
+        faults.push_back(
+            {CauseCode::DigitsLost,
+             "the first " + by + (count == 1 ? " is" : " are") + " lost and replaced by zeros",
+             [=](const Rows& rows) { return DropFirst(rows, numRows - distance); }, nullptr});
     }
     if (numDigits > 1) {
         const auto reverse = [=](const Rows& rows) { return ReverseGroups(rows, digit); };
@@ -99,8 +98,8 @@ std::vector<InitFault> InitFaults(unsigned int numInputs)
     std::vector<InitFault> faults = {{CauseCode::OutputInverted, "", invert, invert}};
     if (numInputs > 2)
         faults.push_back({CauseCode::BitOrder,
-                          "the first pin counts most in the one, least in the other", ReverseInputs,
-                          ReverseInputs});
+                          "the first pin is most significant in one, least in the other",
+                          ReverseInputs, ReverseInputs});
     for (unsigned int input = 0; input < numInputs; ++input) {
         const auto turn = [=](const Rows& rows) { return InvertInput(rows, input); };
         faults.push_back({input == 0 ? CauseCode::HalvesExchanged : CauseCode::InputInverted, "",

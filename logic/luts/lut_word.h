@@ -101,7 +101,7 @@ constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
     return DeltaSwapped(word, movers, distance);
 }
 
-// An input of a table is taken inverted; 'bit' is its bit of the row number.
+// An input of a table is inverted; 'bit' is its bit of the row number.
 template <class Word>
 constexpr Word InvertLutBit(Word word, unsigned int bit)
 {

@@ -50,7 +50,8 @@ class CsvReader {
                 return false;
         }
         if (m_num_columns == 0)
-            return Fail("no line with the names of the columns", "write for example 'a,b,f'");
+            return Fail("expected a line with the names of the columns",
+                        "write, for example, 'a,b,f'");
         return true;
     }
 

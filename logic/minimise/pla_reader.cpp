@@ -240,7 +240,7 @@ class PlaReader {
     {
         return m_row_line == m_line ? ""
                                     : "it goes on in line " + std::to_string(m_line) +
-                                          "; is a digit missing before?";
+                                          "; is a digit missing before that?";
     }
 
     bool FailDigit(char digit, size_t column)

@@ -59,7 +59,7 @@ PyObject* New(PyTypeObject* type, PyObject* arguments, PyObject* named)
                                      &text, &inputs, &lsbFirst))
         return nullptr;
     if (type != equationClass) {
-        PyErr_SetString(PyExc_TypeError, "booleq.Equation is what is made, and nothing derived");
+        PyErr_SetString(PyExc_TypeError, "Equation cannot have derived classes");
         return nullptr;
     }
     return Guarded<PyObject*>(nullptr, [&] {

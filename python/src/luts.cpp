@@ -128,7 +128,7 @@ void Fix(const py::buffer& tables, unsigned int numInputs, unsigned int input, b
     WithLuts(tables, numInputs, out, out.RowBytes(), [&](const booleq::LutArray& luts) {
         if (input >= numInputs ||
             !booleq::HasLutShape(numInputs - 1, static_cast<unsigned int>(out.RowBytes())))
-            throw py::value_error("no such input, or tables of another width");
+            throw py::value_error("no such input, or tables of a different width");
         booleq::FixLutInput(luts, input, value, out.Bytes(),
                             static_cast<unsigned int>(out.RowBytes()));
     });

@@ -165,7 +165,7 @@ py::object Match(const py::object& self, const py::object& other, const py::obje
     if (!matching.fault.empty())
         throw py::value_error(matching.fault);
     if (!matching.isDecided)
-        RaiseUndecided("the time is over", true);
+        RaiseUndecided("out of time", true);
     if (!matching.isFound)
         return py::none();
     bool hasInversions = matching.isInverted;

@@ -286,7 +286,7 @@ def test_files(tmp_path: pathlib.Path) -> None:
 
 @pytest.mark.parametrize("text, line, reason", [
     (MAPPED.replace("11 1", "1x 1"), 8, "expected 0, 1 or -, not '1x'"),
-    (MAPPED[:-5], 10, "the text ends within model 'top', without .end"),
+    (MAPPED[:-5], 10, "the text ends inside model 'top', without .end"),
     ("hello", None, "it is not a netlist"),
     ("", None, "it is empty"),
     ('{"modules": {"a": {}, "b": {}}}', None, "several modules can be the top"),

@@ -51,7 +51,7 @@ TEST_F(GzipText, MembersOfAFileAreOneText)
     ASSERT_EQ(m_design.tables.size(), 1u);
     EXPECT_EQ(Path(m_design, m_design.tables[0].name), "y");
     EXPECT_EQ(m_design.tables[0].line, 4u);
-    EXPECT_EQ(FaultOf(kHead), "test: line 3: the text ends within model 'm', without .end");
+    EXPECT_EQ(FaultOf(kHead), "test: line 3: the text ends inside model 'm', without .end");
 }
 
 // Every way to cut it off.
@@ -60,9 +60,9 @@ TEST_F(GzipText, AFileThatIsNotWholeIsRefused)
     const std::string whole = kHead + kRest;
     for (size_t size = 2; size < whole.size(); ++size)
         EXPECT_NE(FaultOf(whole.substr(0, size)), "") << size;
-    EXPECT_EQ(FaultOf(whole.substr(0, 30)), "test: the compressed file is not whole");
-    EXPECT_EQ(FaultOf(whole.substr(0, whole.size() - 1)), "test: the compressed file is not whole");
-    EXPECT_EQ(FaultOf(whole.substr(0, 2)), "test: the compressed file is not whole");
+    EXPECT_EQ(FaultOf(whole.substr(0, 30)), "test: the compressed file is truncated");
+    EXPECT_EQ(FaultOf(whole.substr(0, whole.size() - 1)), "test: the compressed file is truncated");
+    EXPECT_EQ(FaultOf(whole.substr(0, 2)), "test: the compressed file is truncated");
 }
 
 // Every bit: of the data and of its sum; the name, time and system in the head say nothing.
@@ -84,7 +84,7 @@ TEST_F(GzipText, WhatFollowsIsNotSwallowed)
 {
     EXPECT_EQ(FaultOf(kHead + kRest + "more"), "test: the compressed file is damaged");
     EXPECT_EQ(FaultOf(kHead + kRest + std::string(1, '\x1f')),
-              "test: the compressed file is not whole");
+              "test: the compressed file is truncated");
 }
 
 TEST_F(GzipText, NothingAndWhatIsCompressedTwiceAreNoNetlists)

@@ -241,7 +241,7 @@ TEST(CellTypes, AUsersTypesAreAdded)
 TEST(CellTypes, BadLinesAreRefusedWithTheirNumber)
 {
     const char* rows[][2] = {
-        {"table y = INIT a", "line 1: 'table' stands before the first 'cell'"},
+        {"table y = INIT a", "line 1: 'table' comes before the first 'cell'"},
         {"cell a\nwhat", "line 2: expected cell, input, other, vector, init, table, inner, open, "
                          "constant, unread or note instead of 'what'"},
         {"cell a\ninput p p", "line 2: pin 'p' stands twice"},
@@ -330,7 +330,7 @@ TEST(BlifReader, WhatIsWrongIsSaidWithItsLine)
     EXPECT_EQ(FaultOf(Replaced(kBlif, "q re c 2\n.end", "q re c 2")),
               "test: line 23: the previous model has no .end");
     EXPECT_EQ(FaultOf(".model m\n.inputs a\n"),
-              "test: line 2: the text ends within model 'm', without .end");
+              "test: line 2: the text ends inside model 'm', without .end");
     EXPECT_EQ(FaultOf(".names a b\n1 1\n.end\n"),
               "test: line 1: .names comes before the first .model");
 }
@@ -411,7 +411,8 @@ TEST(EdifReader, WhatIsWrongIsSaidWithItsLine)
               "test: line 20: there are two instances 'g'");
     EXPECT_EQ(FaultOf(Replaced(kEdif, "\"p[1:0]\") 2)", "\"p[1:0]\") 10000000000)")),
               "test: line 9: expected a number up to 1048576 instead of '10000000000'");
-    EXPECT_EQ(FaultOf(std::string(kEdif) + ")"), "test: line 27: something follows the last ')'");
+    EXPECT_EQ(FaultOf(std::string(kEdif) + ")"),
+              "test: line 27: unexpected text after the last ')'");
     EXPECT_EQ(FaultOf("(what)"), "test: line 1: expected (edif ...");
 }
 
@@ -425,7 +426,7 @@ TEST(EdifReader, TextsThatEndEarlyAreRefused)
 TEST(EdifReader, AMillionParenthesesTakeNoStack)
 {
     const std::string deep(1000000, '(');
-    EXPECT_EQ(FaultOf("(edif a " + deep), "test: line 1: the text ends within ( ...");
+    EXPECT_EQ(FaultOf("(edif a " + deep), "test: line 1: the text ends inside ( ...");
     EXPECT_NE(FaultOf("(edif a (library b (cell c " + deep + std::string(1000000, ')') + ")))"),
               "");
     EXPECT_NE(FaultOf("{\"modules\": " + std::string(1000000, '[')), "");

@@ -301,7 +301,7 @@ TEST_F(SolverDecision, EndsWhenTheTimeIsOverAndWhenItIsInterrupted)
     EXPECT_LT(SecondsSince(start), 1.0); // on a machine that does other things too
     EXPECT_EQ(decision.verdict, Verdict::Undecided);
     EXPECT_TRUE(decision.isTimeOver);
-    EXPECT_EQ(decision.reason, "the time is over");
+    EXPECT_EQ(decision.reason, "out of time");
 
     SetWatch(InterruptWhenItIsTime);
     start = std::chrono::steady_clock::now();

@@ -206,8 +206,7 @@ class DiffAnswer {
         PutField(m_output, m_comparison.IsSame() ? "same" : "not the same", counts);
         if (m_comparison.AreNamesGone())
             PutField(m_output, "",
-                     "names of nets are not looked at: " +
-                         std::to_string(m_comparison.Nets().NumKnown()) +
+                     "net names are ignored: " + std::to_string(m_comparison.Nets().NumKnown()) +
                          " nets are matched by the tables around them" +
                          (m_comparison.NumByOrder() == 0
                               ? ""

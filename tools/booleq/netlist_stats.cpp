@@ -78,7 +78,7 @@ void PutText(const std::string& file, const Design& design, const Census& census
     PutField(output, "idle inputs", "in " + Count(census.numIdle, "table"));
     PutField(output, "not read", Count(census.numUnread, "cell") + " that may hold tables");
     if (census.findings.empty())
-        PutField(output, "findings", "none of the reader");
+        PutField(output, "findings", "none while reading");
     for (const auto& finding : census.findings)
         PutField(output, "findings",
                  std::to_string(finding.second) + " " + CodeWord(finding.first) + ": " +

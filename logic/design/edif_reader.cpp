@@ -287,7 +287,7 @@ class EdifReader {
             if (m_tokens.Kind() == EdifToken::Close)
                 continue; // no value
             property.value.text = isString ? m_forms.Decoded(m_tokens.Text()) : m_tokens.Text();
-            property.value.isNumber = isInteger && ToNumber(property.value);
+            property.value.isNumber = isInteger && TakeNumber(property.value);
             m_tokens.Skip();
             m_forms.Close("property");
             isRead = true;
@@ -296,18 +296,6 @@ class EdifReader {
             instance.key = m_job.design.names.Add(property.value.text);
         if (isRead)
             m_view.properties.push_back(property);
-    }
-
-    // A number of 64 bits; another one stays a text, which is then not an init value.
-    static bool ToNumber(CellValue& value)
-    {
-        for (const char character : value.text) {
-            const auto digit = static_cast<uint64_t>(character - '0');
-            if (character < '0' || character > '9' || value.number > (UINT64_MAX - digit) / 10)
-                return false;
-            value.number = value.number * 10 + digit;
-        }
-        return !value.text.empty();
     }
 
     void ReadNet(uint32_t cell)

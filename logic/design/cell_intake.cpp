@@ -18,6 +18,17 @@ bool IsAnyOf(const std::vector<std::string>& names, std::string_view name)
 
 } // namespace
 
+bool TakeNumber(CellValue& value)
+{
+    for (const char character : value.text) {
+        const auto digit = static_cast<uint64_t>(character - '0');
+        if (character < '0' || character > '9' || value.number > (UINT64_MAX - digit) / 10)
+            return false;
+        value.number = value.number * 10 + digit;
+    }
+    return !value.text.empty();
+}
+
 CellIntake::CellIntake(Design& design, const CellTypes& cellTypes, BareDigits bare)
     : m_design(design), m_cell_types(cellTypes), m_bare(bare), m_inits(design),
       m_outputs(cellTypes.All().size())

@@ -23,6 +23,10 @@ struct CellValue {
     bool isNumber = false;
 };
 
+// Sets the number from a text of decimal digits.  Fails: false for more than 64 bits; the value
+// stays a text then, which is not an init value.
+bool TakeNumber(CellValue& value);
+
 // Between Begin and End, views must stay valid.
 class CellIntake {
   public:

@@ -4,22 +4,6 @@
 
 namespace booleq {
 
-namespace {
-
-// A number of 64 bits; another one stays a text, which is then not an init value.
-bool ToNumber(CellValue& value)
-{
-    for (const char character : value.text) {
-        const auto digit = static_cast<uint64_t>(character - '0');
-        if (character < '0' || character > '9' || value.number > (UINT64_MAX - digit) / 10)
-            return false;
-        value.number = value.number * 10 + digit;
-    }
-    return !value.text.empty();
-}
-
-} // namespace
-
 bool EdifForms::NextPart(const char* form)
 {
     if (m_pace.IsDue())
@@ -117,7 +101,7 @@ bool EdifForms::ReadValue(CellValue& value)
         if (m_tokens.Kind() == EdifToken::Close)
             continue; // no value
         value.text = isString ? Decoded(m_tokens.Text()) : m_tokens.Text();
-        value.isNumber = isInteger && ToNumber(value);
+        value.isNumber = isInteger && TakeNumber(value);
         m_tokens.Skip();
         Close("property");
         isRead = true;

@@ -7,6 +7,7 @@
 #include "names.h"
 #include "network.h"
 #include "notation_writer.h"
+#include "solver.h"
 
 namespace {
 
@@ -85,7 +86,11 @@ TEST(Convert, ProvesTextsOfAnyNumberOfInputs)
          {"verilog", "vhdl", "c", "python", "liberty", "blif", "eqn", "alt3"}) {
         const Conversion conversion = Converted(Parsed(text), target, "");
         EXPECT_EQ(conversion.fault, "");
-        EXPECT_TRUE(conversion.isProved) << conversion.doubt;
+        // Without a solver only what groups the operands in the same way is proved.
+        if (Solver::IsThere())
+            EXPECT_TRUE(conversion.isProved) << conversion.doubt;
+        else
+            EXPECT_EQ(conversion.isProved, conversion.doubt.find("no solver") == std::string::npos);
     }
 }
 
@@ -157,8 +162,7 @@ TEST(Reader, RefusesWhatTheNotationHasNot)
     EXPECT_EQ(Seen(VhdlNotation(), "a and b or c"), "\"and\" and \"or\" need parentheses there");
     EXPECT_EQ(Seen(VhdlNotation(), "a nand b nand c"),
               "\"nand\" and \"nand\" need parentheses there");
-    EXPECT_EQ(Seen(VerilogNotation(), "~~a"),
-              "\"~\" cannot be repeated there without parentheses");
+    EXPECT_EQ(Seen(VerilogNotation(), "~~a"), "\"~\" cannot be repeated there without parentheses");
     EXPECT_EQ(Seen(PythonNotation(), "a == not b"), "\"not\" may not follow \"==\" there");
 }
 

@@ -2,6 +2,7 @@
 # Random texts, init values and odd names: every command of the tool, and with --python every member
 # of the module that is on the path, reports the inputs and the column that the library itself has.
 import argparse
+import io
 import json
 import random
 import subprocess
@@ -173,8 +174,9 @@ def compare_minimize(tool, group, comparison):
         comparison.expect(column_of(known), ones_of(answer["result"]["cubes"], len(names)), *where)
 
 
-# The columns as look-up tables of a file of gates, where a pin takes a net in place of a name.
-def compare_netlist(tool, group, comparison):
+# The columns as look-up tables of a file of gates, where a pin takes a net in place of a name; and
+# for each output its nets and its value.
+def netlist_of(group):
     gates, expected = [], {}
     for index, known in enumerate(group.known):
         if known is None or known[0] == "-" or len(known) > 7:
@@ -184,7 +186,12 @@ def compare_netlist(tool, group, comparison):
         gates.append(f".gate LUT{len(nets)} {pins} O=f{index}\n"
                      f".param INIT {int(known[0], 16):0{1 << len(nets)}b}")
         expected[f"f{index}"] = (nets, int(known[0], 16))
-    lines = [".model m", ".inputs n0 n1 n2 n3 n4 n5", f".outputs {' '.join(expected)}", *gates, ".end"]
+    return [".model m", ".inputs n0 n1 n2 n3 n4 n5", f".outputs {' '.join(expected)}", *gates,
+            ".end"], expected
+
+
+def compare_netlist(tool, group, comparison):
+    lines, expected = netlist_of(group)
     tables = [json.loads(line) for line in run([tool, "netlist", "list", "--json", "-"], lines)]
     comparison.expect(sorted(expected), sorted(table["output"] for table in tables), "netlist list")
     for table in tables:
@@ -230,6 +237,18 @@ def compare_permute(tool, group, comparison):
             comparison.expect(group.column(index), answer["result"]["from"]["hex"], *where)
         else:
             comparison.expect(True, len(group.names(index)) > len(group.inputs), *where)
+
+
+def compare_netlist_members(group, comparison):
+    import booleq
+    lines, expected = netlist_of(group)
+    netlist = booleq.read_netlist(io.StringIO("".join(line + "\n" for line in lines)))
+    comparison.expect(len(expected), len(netlist), "read_netlist")
+    for table in netlist:
+        comparison.expect(expected[table.output], (list(table.inputs), int(table.init, 0)),
+                          "read_netlist", table)
+    values = sorted(int(value) for width in netlist.widths for value in netlist.tables(width).words[:, 0])
+    comparison.expect(sorted(value for _, value in expected.values()), values, "Netlist.tables")
 
 
 def compare_members(group, comparison):
@@ -305,6 +324,7 @@ def main():
         num_accepted += sum(known is not None for known in group.known)
         if options.python:
             compare_members(group, comparison)
+            compare_netlist_members(group, comparison)
         else:
             compare_commands(options.tool, group, comparison)
             compare_values(options.tool, group, comparison)

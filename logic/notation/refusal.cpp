@@ -82,6 +82,18 @@ class Context {
     const Refusal& m_refusal;
 };
 
+// The token's byte, with those after it where all are one character that can be shown.
+std::string WholeCharacter(const Context& context)
+{
+    constexpr size_t kMaxBytes = 4;
+    std::string character = context.Token();
+    if (Visible(character) == character)
+        return character;
+    while (character.size() < kMaxBytes && (context.At(character.size()) & 0xc0) == 0x80)
+        character += context.At(character.size());
+    return Visible(character) == character ? character : context.Token();
+}
+
 void ExplainCharacter(const Context& context, RefusalReport& report)
 {
     const char character = context.At(0);
@@ -90,7 +102,7 @@ void ExplainCharacter(const Context& context, RefusalReport& report)
         report.hint = "remove it (DOS line ends: tr -d '\\r')";
         return;
     }
-    report.reason = Quoted(context.Token()) + " is not part of the syntax";
+    report.reason = Quoted(WholeCharacter(context)) + " is not part of the syntax";
     if (character >= '2' && character <= '9')
         report.reason = Quoted(context.Token()) +
                         " is not a constant (0 and 1 are), and no name begins with a digit";

@@ -33,6 +33,8 @@ def _seconds(seconds: Optional[float]) -> float:
     """0 is for ever inside."""
     if seconds is None:
         return 0.0
+    if not isinstance(seconds, (int, float)):
+        raise TypeError(f"seconds must be a number or None, not {type(seconds).__name__}")
     if not seconds > 0:
         raise ValueError("seconds must be above 0")
     return float(seconds)
@@ -114,8 +116,10 @@ class Equation(_booleq.Core):
         >>> Equation.from_inits([0x8, 0xe], ["A", "B"])
         [Equation('0x8', inputs=['A', 'B']), Equation('0xe', inputs=['A', 'B'])]
         """
-        from ._luts import LutArray
+        from ._luts import MAX_INPUTS, LutArray
         names = tuple(inputs)
+        if len(names) > MAX_INPUTS:
+            return [cls.from_init(value, names, lsb_first) for value in values]
         return LutArray(values, len(names), lsb_first=lsb_first).equations(names)
 
     @classmethod
@@ -244,7 +248,8 @@ class Equation(_booleq.Core):
     def __repr__(self) -> str:
         text = self.text
         if len(text) > MAX_REPR:
-            return (f"<Equation of {len(text):,} characters over {len(self.inputs):,} inputs: "
+            inputs = "1 input" if len(self.inputs) == 1 else f"{len(self.inputs):,} inputs"
+            return (f"<Equation of {len(text):,} characters over {inputs}: "
                     f"{text[:60]!r}...>")
         words = [repr(text)]
         if self.given_inputs is not None:

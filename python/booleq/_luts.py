@@ -2,6 +2,7 @@
 from __future__ import annotations
 
 from dataclasses import dataclass
+from operator import index
 from typing import TYPE_CHECKING, Any, Iterable, List, Literal, Optional, Tuple, Union, final
 
 import numpy as np
@@ -85,6 +86,7 @@ class LutArray:
     _num_inputs: int
 
     def __init__(self, values: Any, num_inputs: int, *, lsb_first: bool = False) -> None:
+        num_inputs = index(num_inputs)
         if not 1 <= num_inputs <= MAX_INPUTS:
             raise ValueError(f"num_inputs must be 1 to {MAX_INPUTS}, not {num_inputs}")
         if isinstance(values, LutArray):

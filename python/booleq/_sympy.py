@@ -77,4 +77,5 @@ def to_text(expression: sympy.Basic) -> str:
             texts[part] = f"(({condition} & {then}) | (~{condition} & {otherwise}))"
         else:
             raise TypeError(f"{type(part).__name__} is not a Boolean operator: {part}")
-    return texts[expression]
+    text = texts[expression]
+    return text[1:-1] if text.startswith("(") else text  # which then closes at the end

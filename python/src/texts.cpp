@@ -145,8 +145,8 @@ py::str Str(const py::object& self)
     return Decode(Run(equation.GetLength(), write));
 }
 
-// An int as the binary digits of all rows.
-py::str BinaryDigits(const py::object& value, size_t numInputs)
+// An int as the digits of all rows.
+py::str DigitsOf(const py::object& value, size_t numInputs)
 {
     if (numInputs == 0)
         throw py::value_error("an equation without inputs has no init value");
@@ -168,7 +168,7 @@ py::str BinaryDigits(const py::object& value, size_t numInputs)
                 booleq::Watch();
         }
     });
-    return Digits(rows, "0b", 1);
+    return numInputs == 1 ? Digits(rows, "0b", 1) : Digits(rows, "0x", 4);
 }
 
 py::object FromInit(const py::object& value, const py::object& inputs, const py::object& lsbFirst)
@@ -184,7 +184,7 @@ py::object FromInit(const py::object& value, const py::object& inputs, const py:
         const auto number = py::reinterpret_steal<py::object>(PyNumber_Index(value.ptr()));
         if (!number)
             throw py::error_already_set();
-        text = BinaryDigits(number, names.size());
+        text = DigitsOf(number, names.size());
     }
     py::object made = ReadEquation(text, names, isLsbFirst);
     if (!Own(made).IsInit()) {

@@ -101,6 +101,13 @@ def test_init_values(num_inputs: int) -> None:
         assert eq == alone and eq.hex_init() == alone.hex_init() and eq.inputs == alone.inputs
 
 
+def test_init_values_of_more_inputs_than_arrays_have() -> None:
+    names = [f"x{k}" for k in range(9)]
+    made = Equation.from_inits([5, "0x" + "1" * 128, 2 ** 512 - 1], names)
+    assert [eq.count_ones() for eq in made] == [2, 128, 512]
+    assert made[0] == Equation.from_init(5, names)
+
+
 def test_init_values_over_names_that_are_not_one_token() -> None:
     """Such a name is read as the expression that it is, so each value is."""
     names = ["'a'+b", "c"]

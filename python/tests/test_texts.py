@@ -227,13 +227,13 @@ class TestFromInit:
         assert Equation.from_init("0x2", ["A", "B"], lsb_first=True).hex_init() == "0x4"
 
     @pytest.mark.parametrize("value, inputs, text", [
-        (0b0100, ["A", "B"], "0b0100"), (0, ["A"], "0b00"), (3, ["A"], "0b11"),
-        (True, ["A"], "0b01"), (np.uint8(8), ["A", "B"], "0b1000"),
-        (2 ** 128 - 1, list("ABCDEFG"), "0b" + 128 * "1")])
+        (0b0100, ["A", "B"], "0x4"), (0, ["A"], "0b00"), (3, ["A"], "0b11"),
+        (True, ["A"], "0b01"), (np.uint8(8), ["A", "B"], "0x8"),
+        (2 ** 128 - 1, list("ABCDEFG"), "0x" + 32 * "f")])
     def test_of_an_int(self, value: int, inputs: List[str], text: str) -> None:
         equation = Equation.from_init(value, inputs)
         assert equation.text == text
-        assert equation.binary_init() == text
+        assert int(equation.binary_init(), 2) == value
 
     def test_every_function_of_two_inputs(self) -> None:
         for value in range(16):
@@ -425,3 +425,12 @@ class TestCopies:
         second = copy.copy(first)
         del first
         assert second(A=1, B=1) == 1
+
+
+@pytest.mark.parametrize("text, shown", [
+    ("\u00e9 & a", "'\u00e9' is not"), ("a \u20ac", "'\u20ac' is not"),
+    ("a & \U0001f600", "'\U0001f600' is not"),
+    ("a & \udcff", r"'\\xff' is not"), ("a & \udcc3b", r"'\\xc3' is not")])
+def test_characters_are_shown_whole(text: str, shown: str) -> None:
+    with pytest.raises(ParseError, match=shown):
+        Equation(text)

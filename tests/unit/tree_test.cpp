@@ -227,6 +227,24 @@ TEST(Tree, FailureDumpIsWholeUpToOneMebibyte)
     }
 }
 
+// To the byte, lines for which child a node is and their indentation included.
+TEST(Tree, FailureDumpOfExactlyOneMebibyteIsWhole)
+{
+    const auto dumpOf = [](size_t length) {
+        const std::string text = "a b c d e f " + std::string(length, 'g');
+        const Messages messages;
+        Engine engine;
+        EXPECT_FALSE(engine.SetEquation(text.c_str()));
+        return messages.Text();
+    };
+    const size_t numOtherBytes = dumpOf(1).size() - 1;
+    const size_t longest = (size_t(1) << 20) - numOtherBytes;
+    EXPECT_EQ(size_t(1) << 20, dumpOf(longest).size());
+    const std::string cut = dumpOf(longest + 1);
+    EXPECT_LT(cut.size(), numOtherBytes);
+    EXPECT_EQ("NODE: ...\n", cut.substr(cut.size() - 10));
+}
+
 // A list that outlives the failure, because another object shares it, is one of loose tokens again.
 TEST(Tree, ListThatFailedCanBeBuiltAgain)
 {

@@ -84,16 +84,30 @@ def bench_luts(repeats: int) -> None:
 
 
 def bench_equations(repeats: int) -> None:
-    texts = [f"(a{k % 100} & ~b | c) ^ (d | e{k % 50})" for k in range(200_000)]
-    bulk = seconds(lambda: booleq.equations(texts), repeats)
-    single = seconds(lambda: [Equation(text) for text in texts], repeats)
-    lut = [Equation.from_init(int(value), list("abcdef"))
-           for value in np.random.default_rng(3).integers(0, 2 ** 63, 200)]
-    explain = seconds(lambda: [equation.explain() for equation in lut], repeats)
-    per_text = 1e6 / len(texts)
-    print(f"| `booleq.equations`, a text of 14 tokens | {bulk * per_text:.2f} us |")
-    print(f"| `Equation`, the same | {single * per_text:.2f} us |")
-    print(f"| `explain` of a random six-input function | {explain / len(lut) * 1e3:.2f} ms |")
+    distinct = [f"(a{k % 60} & ~b{k // 60 % 60} | c{k // 3600}) ^ (d | e{k % 50})"
+                for k in range(200_000)]
+    repeated = [f"(a{k % 100} & ~b | c) ^ (d | e{k % 50})" for k in range(200_000)]
+    generator = np.random.default_rng(3)
+    inits = generator.integers(0, 2 ** 63, 200_000, dtype=np.uint64)
+    names = list("abcdef")
+    made = booleq.equations(distinct)
+    works: List[Any] = [
+        ("`booleq.equations`, a text of 14 tokens, all different",
+         lambda: booleq.equations(distinct)),
+        ("the same, 100 different ones", lambda: booleq.equations(repeated)),
+        ("the first, and `hex_init()` of each",
+         lambda: [equation.hex_init() for equation in booleq.equations(distinct)]),
+        ("`hex_init()` alone", lambda: [equation.hex_init() for equation in made]),
+        ("`Equation.from_inits`, six inputs, all different",
+         lambda: Equation.from_inits(inits, names)),
+        ("the same, 100 different ones", lambda: Equation.from_inits(inits[:100].repeat(2000), names)),
+        ("`Equation`, the text of 14 tokens", lambda: [Equation(text) for text in distinct])]
+    [equation.hex_init() for equation in made]
+    for what, work in works:
+        print(f"| {what} | {seconds(work, repeats) / len(distinct) * 1e6:.2f} us |")
+    luts = [Equation.from_init(int(value), names) for value in inits[:200]]
+    explain = seconds(lambda: [equation.explain() for equation in luts], repeats)
+    print(f"| `explain` of a random six-input function | {explain / len(luts) * 1e3:.2f} ms |")
 
 
 def main() -> None:

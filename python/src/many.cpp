@@ -214,16 +214,6 @@ py::list GiveAll(size_t size, const std::vector<size_t>& sources, const Make& ma
     return given;
 }
 
-// The names are one token each to the library: an init value over them is read whatever its digits.
-bool ArePlain(const std::vector<std::string>& names)
-{
-    return std::all_of(names.begin(), names.end(), [](const std::string& name) {
-        const Kq_BoolEquation probe(name.c_str());
-        return probe.GetNumVariables() == 1 &&
-               probe.GetVariables()[0].first.length() == name.size();
-    });
-}
-
 py::list Equations(const py::object& texts, const py::object& inputs, const py::object& lsbFirst)
 {
     const py::object given = inputs.is_none() ? inputs : RequireInputs(inputs);
@@ -293,7 +283,8 @@ py::list FromWords(const py::buffer& words, const py::object& inputs)
             recent.Put(hash ^ hash >> 32, place);
         }
     }
-    const bool arePlain = ArePlain(EncodeAll(given));
+    // Over others the library reads the expression that the digits stand for.
+    const bool arePlain = booleq::FirstSplitName(EncodeAll(given)).empty();
     return GiveAll(size, sources, [&](size_t place) {
         py::object text = TextOf(tables + place * numWords, numInputs);
         if (arePlain)

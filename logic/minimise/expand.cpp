@@ -307,16 +307,24 @@ void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work&
     for (size_t index = 0; index < cubes.Size(); ++index)
         if (cover.isPrime[index] != 0)
             others.Close(index);
-    for (const uint32_t index : OrderByWeight(space, cubes)) {
-        if (!others.IsOpen(index))
-            continue;
-        others.Close(index);
-        expander.Expand(cubes.At(index), nullptr, others);
-        cover.isPrime[index] = 1;
-        TakeIn(space, cubes.At(index), others, isKept, work);
+    const auto finish = [&] {
+        KeepInCover(cover, isKept);
+        DropEqualPrimes(cover);
+    };
+    try {
+        for (const uint32_t index : OrderByWeight(space, cubes)) {
+            if (!others.IsOpen(index))
+                continue;
+            others.Close(index);
+            expander.Expand(cubes.At(index), nullptr, others);
+            cover.isPrime[index] = 1;
+            TakeIn(space, cubes.At(index), others, isKept, work);
+        }
+    } catch (const OutOfWork&) {
+        finish(); // a cover all the same
+        throw;
     }
-    KeepInCover(cover, isKept);
-    DropEqualPrimes(cover);
+    finish();
 }
 
 } // namespace booleq

@@ -90,7 +90,8 @@ struct Cover {
 // Cubes whose flag is 0 go.
 void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept);
 
-// All cubes become primes; those that others then contain go.
+// All cubes become primes; those that others then contain go. When the work is used up some stay as
+// they are, and OutOfWork is thrown on.
 void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work& work);
 
 // The order that puts cubes first which have little in common with the others.

@@ -144,7 +144,8 @@ size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const u
     for (size_t word = 0; word < m_num_words; ++word)
         m_scratch[word] = m_raised[word] | m_free[word];
     m_obstacles.ClearLowered(m_free.data(), with, m_scratch.data());
-    std::vector<uint32_t> lost;
+    std::vector<uint32_t>& lost = m_lost;
+    lost.clear();
     for (size_t word = 0; word < m_num_words; ++word)
         AppendBits((m_raised[word] | m_free[word]) & ~m_scratch[word], word, lost);
     if (lost.empty())

@@ -78,6 +78,7 @@ class Expander {
     std::vector<uint64_t> m_feasible;        // of each block of the others
     std::vector<uint32_t> m_feasible_blocks; // that have any
     std::vector<uint32_t> m_counts;
+    std::vector<uint32_t> m_lost; // scratch
 };
 
 // Whether a cube is known to be a prime, beside each cube of a cover.

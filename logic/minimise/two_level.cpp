@@ -82,7 +82,8 @@ class SmallSumSearch {
             if (m_work.Spent() > kMaxSpentForMore)
                 return true;
             first = m_best;
-            DescendFromUnited(on);
+            if (IsShared(on))
+                DescendFromUnited(on);
             ChooseFromPool();
         } catch (const OutOfWork&) {
             if (!isFirstDone)
@@ -150,6 +151,17 @@ class SmallSumSearch {
         do
             Improve();
         while (GainByLastGasp());
+    }
+
+    // Whether a cube has several outputs; otherwise both starts are one.
+    bool IsShared(const CubeList& on) const
+    {
+        CubeList united = on;
+        UniteOutputs(m_space, united);
+        for (size_t index = 0; index < united.Size(); ++index)
+            if (CountOutputs(m_space, united.At(index)) > 1)
+                return true;
+        return false;
     }
 
     // The other start: products that outputs share as they are given.

@@ -247,15 +247,17 @@ class RowSumSearch {
     {
         for (RowCube& cube : m_cubes) {
             const RowCube reduced = Reduced(cube);
-            assert(reduced.outputs != 0);
             Remove(cube);
             cube.outputs = reduced.outputs;
+            if (reduced.outputs == 0) // one that grew before took it in
+                continue;
             uint32_t candidates = AllInputs() & ~cube.open;
             size_t worth = 0;
             while (GrowOnce(cube, reduced.outputs, m_open, candidates, worth))
                 assert(cube.outputs == reduced.outputs);
             Add(cube);
         }
+        DropEmpty();
     }
 
     const RowTable& m_rows;

@@ -15,7 +15,8 @@ import resource
 import subprocess
 import sys
 
-VERDICT = re.compile(r"# (\d+) terms?, (\d+) literals?; (?:(proved)|not proved: .* than (\d+) terms)")
+VERDICT = re.compile(
+    r"# (\d+) terms?, (\d+) literals?; (?:(proved)|not proved(?:: .* than (\d+) terms)?)")
 
 
 def minimise(tool, path, exact):
@@ -30,7 +31,8 @@ def minimise(tool, path, exact):
         raise ValueError(f"{path}: {done.stdout[:100]}")
     seconds = after.ru_utime + after.ru_stime - before.ru_utime - before.ru_stime
     terms = int(match[1])
-    return terms, int(match[2]), terms if match[3] else int(match[4]), bool(match[3]), seconds
+    bound = terms if match[3] else int(match[4] or min(terms, 1))
+    return terms, int(match[2]), bound, bool(match[3]), seconds
 
 
 def main():

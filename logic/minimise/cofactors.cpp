@@ -20,13 +20,18 @@ void AppendOfOutput(const CubeSpace& space, const CubeList& cubes, size_t output
 {
     assert(target.NumWords() == space.NumInputWords());
     const size_t bit = space.OutputBit(output);
+    const size_t numWords = space.NumInputWords();
+    size_t count = target.Size();
+    target.Resize(count + cubes.Size());
     for (size_t index = 0; index < cubes.Size(); ++index) {
-        if (!GetBit(cubes.At(index), bit))
+        const uint64_t* cube = cubes.At(index);
+        if (!GetBit(cube, bit))
             continue;
-        target.Resize(target.Size() + 1);
-        for (size_t word = 0; word < space.NumInputWords(); ++word)
-            target.At(target.Size() - 1)[word] = cubes.At(index)[word] | ~space.Inputs(word);
+        uint64_t* inputs = target.At(count++);
+        for (size_t word = 0; word < numWords; ++word)
+            inputs[word] = cube[word] | ~space.Inputs(word);
     }
+    target.Resize(count);
 }
 
 Cofactors::Cofactors(const CubeSpace& space, CubeIndex& first, CubeIndex& second, Work& work)

@@ -236,10 +236,13 @@ class ComplementSearch {
 
 } // namespace
 
-CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work)
+bool ComplementInputs(const CubeSpace& space, CubeList& cubes, size_t maxCubes, Work& work,
+                      CubeList& result)
 {
     assert(cubes.NumWords() == space.NumInputWords());
-    return ComplementSearch(space, cubes, SIZE_MAX, work).Find({0, cubes.Size()});
+    ComplementSearch search(space, cubes, maxCubes, work);
+    result = search.Find({0, cubes.Size()});
+    return !search.IsTooLarge();
 }
 
 void UniteOutputs(const CubeSpace& space, CubeList& cubes)
@@ -249,13 +252,7 @@ void UniteOutputs(const CubeSpace& space, CubeList& cubes)
     for (size_t index = 0; index < order.size(); ++index)
         order[index] = static_cast<uint32_t>(index);
     const auto compare = [&](uint32_t left, uint32_t right) {
-        for (size_t word = 0; word < space.NumInputWords(); ++word) {
-            const uint64_t leftInputs = cubes.At(left)[word] & space.Inputs(word);
-            const uint64_t rightInputs = cubes.At(right)[word] & space.Inputs(word);
-            if (leftInputs != rightInputs)
-                return leftInputs < rightInputs ? -1 : 1;
-        }
-        return 0;
+        return CompareInputs(space, cubes.At(left), cubes.At(right));
     };
     std::stable_sort(order.begin(), order.end(),
                      [&](uint32_t left, uint32_t right) { return compare(left, right) < 0; });
@@ -290,9 +287,8 @@ bool FindComplement(const CubeSpace& space, const CubeList& first, const CubeLis
         CubeList cubes(space.NumInputWords());
         AppendOfOutput(space, first, output, cubes);
         AppendOfOutput(space, second, output, cubes);
-        ComplementSearch search(space, cubes, maxCubes, work);
-        const CubeList rows = search.Find({0, cubes.Size()});
-        if (search.IsTooLarge()) {
+        CubeList rows(space.NumInputWords());
+        if (!ComplementInputs(space, cubes, maxCubes, work, rows)) {
             result.Resize(0);
             return false;
         }

@@ -76,6 +76,17 @@ void CubeList::SortAndUnite()
     Keep(isFirst);
 }
 
+int CompareInputs(const CubeSpace& space, const uint64_t* left, const uint64_t* right)
+{
+    for (size_t word = 0; word < space.NumInputWords(); ++word) {
+        const uint64_t leftInputs = left[word] & space.Inputs(word);
+        const uint64_t rightInputs = right[word] & space.Inputs(word);
+        if (leftInputs != rightInputs)
+            return leftInputs < rightInputs ? -1 : 1;
+    }
+    return 0;
+}
+
 size_t CountCubeLiterals(const CubeSpace& space, const uint64_t* cube)
 {
     size_t numLiterals = 0;

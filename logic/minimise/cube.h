@@ -16,9 +16,13 @@ namespace booleq {
 
 constexpr uint64_t kLowBits = 0x5555555555555555u;
 
+// Not the compiler's own: without a processor option that is a call of its library.
 inline size_t CountBits(uint64_t word)
 {
-    return static_cast<size_t>(__builtin_popcountll(word));
+    word -= word >> 1 & kLowBits;
+    word = (word & 0x3333333333333333u) + (word >> 2 & 0x3333333333333333u);
+    word = (word + (word >> 4)) & 0x0f0f0f0f0f0f0f0fu;
+    return static_cast<size_t>(word * 0x0101010101010101u >> 56);
 }
 
 inline size_t LowestBit(uint64_t word)
@@ -160,6 +164,8 @@ inline size_t Distance(const CubeSpace& space, const uint64_t* left, const uint6
     return distance;
 }
 
+// Negative, 0 or positive: an order of the cubes' inputs.
+int CompareInputs(const CubeSpace& space, const uint64_t* left, const uint64_t* right);
 // Inputs that the cube fixes.
 size_t CountCubeLiterals(const CubeSpace& space, const uint64_t* cube);
 size_t CountLiterals(const CubeSpace& space, const CubeList& cubes);

@@ -33,7 +33,14 @@ void AppendCover(const CubeSpace& space, const Function& function, const Places&
     }
 }
 
-// The cubes of an expression's operands, from the leaves up.
+// An exclusive or of n inputs has 2^(n-1) cubes: so many are written down of an operand, and of all
+// that wait to be combined, and that is the work that they may take.
+constexpr size_t kMaxCubes = size_t(1) << 17;
+constexpr size_t kMaxWaitingCubes = 8 * kMaxCubes;
+constexpr uint64_t kMaxUnits = uint64_t(1) << 32;
+
+// The cubes of an expression's operands, from the leaves up. Throws OutOfWork when they are too
+// many.
 class CubesOfExpression {
   public:
     CubesOfExpression(const CubeSpace& space, const Expression& expression, const Places& places,
@@ -57,7 +64,7 @@ class CubesOfExpression {
         if (IsBinary(node.op)) {
             const CubeList right = Pop();
             const CubeList left = Pop();
-            m_stack.push_back(Combined(node.op, left, right));
+            Push(Combined(node.op, left, right));
             return;
         }
         CubeList cubes(m_full.size());
@@ -83,6 +90,14 @@ class CubesOfExpression {
             assert(false);
             break;
         }
+        Push(cubes);
+    }
+
+    void Push(const CubeList& cubes)
+    {
+        m_num_waiting += cubes.Size();
+        if (cubes.Size() > kMaxCubes || m_num_waiting > kMaxWaitingCubes)
+            throw OutOfWork{false};
         m_stack.push_back(cubes);
     }
 
@@ -91,10 +106,17 @@ class CubesOfExpression {
         assert(!m_stack.empty());
         CubeList cubes = std::move(m_stack.back());
         m_stack.pop_back();
+        m_num_waiting -= cubes.Size();
         return cubes;
     }
 
-    CubeList Inverted(CubeList cubes) { return ComplementInputs(m_space, cubes, m_work); }
+    CubeList Inverted(CubeList cubes)
+    {
+        CubeList inverted(m_full.size());
+        if (!ComplementInputs(m_space, cubes, kMaxCubes, m_work, inverted))
+            throw OutOfWork{false};
+        return inverted;
+    }
 
     CubeList Product(const CubeList& left, const CubeList& right)
     {
@@ -109,6 +131,8 @@ class CubesOfExpression {
                     cube[word] = left.At(index)[word] & right.At(other)[word];
                 product.Append(cube.data());
             }
+            if (product.Size() > kMaxWaitingCubes)
+                throw OutOfWork{false};
         }
         RemoveContained(m_input_space, product, m_work);
         return product;
@@ -141,6 +165,7 @@ class CubesOfExpression {
     std::vector<uint64_t> m_full;
     const CubeSpace m_input_space; // of cubes without outputs
     std::vector<CubeList> m_stack;
+    size_t m_num_waiting = 0; // cubes on the stack
 };
 
 void AppendExpression(const CubeSpace& space, const Expression& expression, const Places& places,
@@ -173,24 +198,38 @@ Pla EmptyTable(const std::vector<std::string>& inputs, std::vector<std::string> 
 
 } // namespace
 
-Pla TableOf(const std::vector<TableOutput>& outputs, const std::vector<std::string>& inputs,
-            Work& work)
+bool TableOf(const std::vector<TableOutput>& outputs, const std::vector<std::string>& inputs,
+             Pla& table, PlaFault& fault, Work& work)
 {
     std::vector<std::string> names;
     names.reserve(outputs.size());
     for (const TableOutput& output : outputs)
         names.push_back(output.name);
-    Pla table = EmptyTable(inputs, names);
+    table = EmptyTable(inputs, names);
     Places places;
     for (const std::string& input : inputs)
         places.emplace(input, places.size());
+    const uint64_t limit = work.Limit();
     for (size_t output = 0; output < outputs.size(); ++output) {
-        AppendExpression(table.space, outputs[output].on, places, output, table.on, work);
-        if (outputs[output].hasFree)
-            AppendExpression(table.space, outputs[output].free, places, output, table.free, work);
+        work.SetLimit(std::min(limit, work.Spent() + kMaxUnits));
+        try {
+            AppendExpression(table.space, outputs[output].on, places, output, table.on, work);
+            if (outputs[output].hasFree)
+                AppendExpression(table.space, outputs[output].free, places, output, table.free,
+                                 work);
+        } catch (const OutOfWork&) {
+            fault = {0,
+                     "the equation of " + outputs[output].name + " needs more than " +
+                         std::to_string(kMaxCubes) + " products when it is multiplied out",
+                     "minimise its operands on their own; exclusive or doubles the products with "
+                     "each input"};
+            work.SetLimit(limit);
+            return false;
+        }
     }
+    work.SetLimit(limit);
     table.onLines.assign(table.on.Size(), 0);
-    return table;
+    return true;
 }
 
 std::vector<std::string> InputsOf(const std::vector<TableOutput>& outputs)

@@ -19,10 +19,11 @@ struct TableOutput {
 };
 
 // The table over 'inputs', which hold all names of the expressions.
-// Cost: for up to 16 inputs as many steps as there are rows; for more by cubes of the operands, so
-// an exclusive or of n inputs takes 2^n of them. Recursion: none.
-Pla TableOf(const std::vector<TableOutput>& outputs, const std::vector<std::string>& inputs,
-            Work& work);
+// Fails: false with the fault, for an operand of too many cubes.
+// Cost: for up to 16 inputs as many steps as there are rows; for more by cubes of the operands, of
+// which an exclusive or of n inputs has 2^(n-1). Recursion: none.
+bool TableOf(const std::vector<TableOutput>& outputs, const std::vector<std::string>& inputs,
+             Pla& table, PlaFault& fault, Work& work);
 // The names of all expressions in order of first occurrence.
 std::vector<std::string> InputsOf(const std::vector<TableOutput>& outputs);
 

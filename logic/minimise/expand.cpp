@@ -144,7 +144,8 @@ size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const u
     for (size_t word = 0; word < m_num_words; ++word)
         m_scratch[word] = m_raised[word] | m_free[word];
     m_obstacles.ClearLowered(m_free.data(), with, m_scratch.data());
-    std::vector<uint32_t> lost;
+    std::vector<uint32_t>& lost = m_lost;
+    lost.clear();
     for (size_t word = 0; word < m_num_words; ++word)
         AppendBits((m_raised[word] | m_free[word]) & ~m_scratch[word], word, lost);
     if (lost.empty())
@@ -307,16 +308,24 @@ void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work&
     for (size_t index = 0; index < cubes.Size(); ++index)
         if (cover.isPrime[index] != 0)
             others.Close(index);
-    for (const uint32_t index : OrderByWeight(space, cubes)) {
-        if (!others.IsOpen(index))
-            continue;
-        others.Close(index);
-        expander.Expand(cubes.At(index), nullptr, others);
-        cover.isPrime[index] = 1;
-        TakeIn(space, cubes.At(index), others, isKept, work);
+    const auto finish = [&] {
+        KeepInCover(cover, isKept);
+        DropEqualPrimes(cover);
+    };
+    try {
+        for (const uint32_t index : OrderByWeight(space, cubes)) {
+            if (!others.IsOpen(index))
+                continue;
+            others.Close(index);
+            expander.Expand(cubes.At(index), nullptr, others);
+            cover.isPrime[index] = 1;
+            TakeIn(space, cubes.At(index), others, isKept, work);
+        }
+    } catch (const OutOfWork&) {
+        finish(); // a cover all the same
+        throw;
     }
-    KeepInCover(cover, isKept);
-    DropEqualPrimes(cover);
+    finish();
 }
 
 } // namespace booleq

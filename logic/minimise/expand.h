@@ -78,6 +78,7 @@ class Expander {
     std::vector<uint64_t> m_feasible;        // of each block of the others
     std::vector<uint32_t> m_feasible_blocks; // that have any
     std::vector<uint32_t> m_counts;
+    std::vector<uint32_t> m_lost; // scratch
 };
 
 // Whether a cube is known to be a prime, beside each cube of a cover.
@@ -90,7 +91,8 @@ struct Cover {
 // Cubes whose flag is 0 go.
 void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept);
 
-// All cubes become primes; those that others then contain go.
+// All cubes become primes; those that others then contain go. When the work is used up some stay as
+// they are, and OutOfWork is thrown on.
 void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work& work);
 
 // The order that puts cubes first which have little in common with the others.

@@ -15,7 +15,9 @@ namespace booleq {
 namespace {
 
 constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; each row has a cube anyway
-constexpr uint32_t kFixed = UINT32_MAX;          // label of cubes that stay
+// Overlapping cubes can have more choices than there are rows; then there is no choosing.
+constexpr uint64_t kChoiceUnits = uint64_t(1) << 23;
+constexpr uint32_t kFixed = UINT32_MAX; // label of cubes that stay
 
 // Appends a row for each place that only labelled cubes cover.
 class ChoiceSearch {
@@ -140,6 +142,56 @@ std::vector<std::vector<uint32_t>> FindChoices(const CubeSpace& space, const Cub
     return rows;
 }
 
+// The cubes that are left when those with most literals go first, as long as the others cover them.
+std::vector<uint32_t> DropInOrder(const CubeSpace& space, CubeList choices, const CubeList& fixed,
+                                  Work& work)
+{
+    std::vector<uint32_t> order(choices.Size());
+    std::iota(order.begin(), order.end(), 0u);
+    std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {
+        return CountCubeLiterals(space, choices.At(left)) >
+               CountCubeLiterals(space, choices.At(right));
+    });
+    std::vector<uint32_t> kept;
+    CubeIndex choiceIndex(space, choices);
+    CubeIndex fixedIndex(space, fixed);
+    Cofactors ofOthers(space, choiceIndex, fixedIndex, work);
+    for (const uint32_t choice : order) {
+        if (!ofOthers.Cover(choices.At(choice), choice)) {
+            kept.push_back(choice);
+            continue;
+        }
+        std::fill(choices.At(choice), choices.At(choice) + space.NumWords(), 0);
+        choiceIndex.Update(choice);
+    }
+    return kept;
+}
+
+// The choices to keep, so that they and 'fixed' cover what all of them did.
+std::vector<uint32_t> Choose(const CubeSpace& space, const CubeList& choices, const CubeList& fixed,
+                             Work& work)
+{
+    if (choices.IsEmpty())
+        return {};
+    const uint64_t limit = work.Limit();
+    const uint64_t choiceLimit = work.Spent() + kChoiceUnits;
+    CoveringProblem problem;
+    work.SetLimit(std::min(limit, choiceLimit));
+    try {
+        problem.rows = FindChoices(space, choices, fixed, work);
+    } catch (const OutOfWork& out) {
+        work.SetLimit(limit);
+        if (out.isTime || limit <= choiceLimit)
+            throw;
+        return DropInOrder(space, choices, fixed, work);
+    }
+    work.SetLimit(limit);
+    const uint64_t costOfCube = CountLiterals(space, choices) + 1;
+    for (size_t index = 0; index < choices.Size(); ++index)
+        problem.costs.push_back(costOfCube + CountCubeLiterals(space, choices.At(index)));
+    return SolveCovering(problem, kIrredundantUnits, work).columns;
+}
+
 } // namespace
 
 void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free, Work& work)
@@ -168,16 +220,9 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
             places.push_back(static_cast<uint32_t>(index));
         }
     }
-    if (!choices.IsEmpty()) {
-        CoveringProblem problem;
-        problem.rows = FindChoices(space, choices, fixed, work);
-        const uint64_t costOfCube = CountLiterals(space, choices) + 1;
-        for (size_t index = 0; index < choices.Size(); ++index)
-            problem.costs.push_back(costOfCube + CountCubeLiterals(space, choices.At(index)));
-        for (const uint32_t choice : SolveCovering(problem, kIrredundantUnits, work).columns) {
-            assert(isKept[places[choice]] == 0);
-            isKept[places[choice]] = 1;
-        }
+    for (const uint32_t choice : Choose(space, choices, fixed, work)) {
+        assert(isKept[places[choice]] == 0);
+        isKept[places[choice]] = 1;
     }
     KeepInCover(cover, isKept);
 }

@@ -48,9 +48,11 @@ bool Obstacles::IsMet(const uint64_t* cube)
 
 void Obstacles::Start(const uint64_t* raised, const uint64_t* free)
 {
-    Parts closed;
-    Parts given;
-    Parts open;
+    Parts& closed = m_inputs;
+    Parts& given = m_given;
+    Parts& open = m_outputs;
+    for (Parts* parts : {&closed, &given, &open})
+        parts->clear();
     for (size_t word = 0; word < m_space.NumWords(); ++word) {
         const uint64_t literals = Literals(m_space, raised, word);
         const uint64_t low = m_space.InputLow(word);
@@ -93,7 +95,8 @@ void Obstacles::ListOpen(const uint64_t* free, const uint64_t* with)
 
 void Obstacles::Settle(uint64_t* raised, uint64_t* free)
 {
-    Parts added;
+    Parts& added = m_given;
+    added.clear();
     for (size_t word = m_space.FirstOutputWord(); word < m_space.NumWords(); ++word) {
         AppendBits(raised[word] & ~m_seen[word] & m_space.Outputs(word), word, added);
         m_seen[word] |= raised[word];

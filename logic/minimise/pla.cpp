@@ -134,11 +134,14 @@ bool FindMeeting(const CubeSpace& space, const CubeList& left, const CubeList& r
 
 namespace {
 
-// Adds to problem.free the rows that the file calls free, without those that are off.
-void AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
+// Adds to problem.free the rows that the file calls free, without those that are off. Fails: false
+// when that takes too many cubes.
+bool AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
 {
     const CubeList none(pla.space.NumWords());
-    const CubeList notOff = Complement(pla.space, pla.off, none, work);
+    CubeList notOff(pla.space.NumWords());
+    if (!FindComplement(pla.space, pla.off, none, kMaxCubes, work, notOff))
+        return false;
     std::vector<uint64_t> common(pla.space.NumWords());
     for (size_t index = 0; index < pla.free.Size(); ++index) {
         work.Spend(notOff.Size());
@@ -149,8 +152,11 @@ void AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
                 common[word] = pla.free.At(index)[word] & notOff.At(other)[word];
             problem.free.Append(common.data());
         }
+        if (problem.free.Size() > kMaxCubes)
+            return false;
     }
     RemoveContained(problem.space, problem.free, work);
+    return true;
 }
 
 } // namespace
@@ -165,6 +171,29 @@ void SetOff(TwoLevelProblem& problem, Work& work)
         FindComplement(problem.space, problem.on, problem.free, maxCubes, work, problem.off);
 }
 
+bool IsConsistent(const Pla& pla, PlaFault& fault, Work& work)
+{
+    if (pla.type == PlaType::F || pla.type == PlaType::Fd)
+        return true;
+    size_t onIndex = 0;
+    size_t offIndex = 0;
+    if (!FindMeeting(pla.space, pla.on, pla.off, work, onIndex, offIndex))
+        return true;
+    assert(!IsDisjoint(pla.space, pla.on.At(onIndex), pla.off.At(offIndex)));
+    const size_t first = std::min(pla.onLines[onIndex], pla.offLines[offIndex]);
+    const size_t second = std::max(pla.onLines[onIndex], pla.offLines[offIndex]);
+    size_t output = 0;
+    while (!GetBit(pla.on.At(onIndex), pla.space.OutputBit(output)) ||
+           !GetBit(pla.off.At(offIndex), pla.space.OutputBit(output)))
+        ++output;
+    fault = {second,
+             "lines " + std::to_string(first) + " and " + std::to_string(second) +
+                 " contradict each other: output " + pla.outputs[output] +
+                 " is both 1 and 0 in a row",
+             ""};
+    return false;
+}
+
 bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& work)
 {
     problem.on = pla.on;
@@ -173,33 +202,14 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
         SetOff(problem, work);
         return true;
     }
-    size_t onIndex = 0;
-    size_t offIndex = 0;
-    if (FindMeeting(pla.space, pla.on, pla.off, work, onIndex, offIndex)) {
-        assert(!IsDisjoint(pla.space, pla.on.At(onIndex), pla.off.At(offIndex)));
-        const size_t first = std::min(pla.onLines[onIndex], pla.offLines[offIndex]);
-        const size_t second = std::max(pla.onLines[onIndex], pla.offLines[offIndex]);
-        size_t output = 0;
-        while (!GetBit(pla.on.At(onIndex), pla.space.OutputBit(output)) ||
-               !GetBit(pla.off.At(offIndex), pla.space.OutputBit(output)))
-            ++output;
-        fault = {second,
-                 "lines " + std::to_string(first) + " and " + std::to_string(second) +
-                     " contradict each other: output " + pla.outputs[output] +
-                     " is both 1 and 0 in a row",
-                 ""};
-        return false;
-    }
     problem.off = pla.off;
     // Free is what is neither on nor off, and what is said to be free as long as it is not off.
-    if (!FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free)) {
-        fault = {0, "the rows that the table leaves out need too many cubes",
-                 "write them with '-' and leave the rows that are 0 out (.type fd)"};
-        return false;
-    }
-    if (!pla.free.IsEmpty())
-        AppendFree(pla, problem, work);
-    return true;
+    if (FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free) &&
+        (pla.free.IsEmpty() || AppendFree(pla, problem, work)))
+        return true;
+    fault = {0, "the rows that the table leaves out need too many cubes",
+             "write them with '-' and leave the rows that are 0 out (.type fd)"};
+    return false;
 }
 
 std::string CubeText(const CubeSpace& space, const uint64_t* cube)

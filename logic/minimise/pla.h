@@ -46,8 +46,11 @@ struct PlaFault {
 // Cost: in step with the text; memory about the cubes of the rows, twice while it reads.
 bool ReadPla(const std::string& text, Pla& pla, PlaFault& fault);
 
-// Sets of rows for the search. Fails: false when a row is both on and off for an output, with the
-// two lines in the fault.
+// Fails: false when a row is both on and off for an output, with the two lines in the fault.
+bool IsConsistent(const Pla& pla, PlaFault& fault, Work& work);
+
+// Sets of rows for the search. Fails: false when these would be too many cubes.
+// Requires: IsConsistent(pla).
 bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& work);
 
 // Sets 'off' from the other lists, or says that it has too many cubes to be of use.

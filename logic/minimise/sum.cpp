@@ -4,9 +4,9 @@
 #include <algorithm>
 #include <stdexcept>
 
-#include "cofactors.h"
+#include "proof.h"
 #include "reduce.h"
-#include "unate.h"
+#include "row_sum.h"
 
 namespace booleq {
 
@@ -17,6 +17,8 @@ namespace {
 constexpr uint64_t kTrialShare = 1;
 constexpr uint64_t kTrialUnits = 1u << 20;
 constexpr uint64_t kMaxTrialUnits = 3u << 20;
+constexpr size_t kManyPairs = 20000; // of cubes and outputs that are on
+constexpr size_t kManyCubes = 16384;
 
 void SetSeconds(double seconds, Work& work)
 {
@@ -25,89 +27,13 @@ void SetSeconds(double seconds, Work& work)
                                                   std::chrono::duration<double>(seconds)));
 }
 
-bool DoCoverAll(const CubeSpace& space, const CubeList& cubes, CubeIndex& first, CubeIndex& second,
-                Work& work)
-{
-    Cofactors cofactors(space, first, second, work);
-    for (size_t index = 0; index < cubes.Size(); ++index)
-        if (!cofactors.Cover(cubes.At(index), SIZE_MAX))
-            return false;
-    return true;
-}
-
-// What is on lies in the sum; the free cubes, which may be many, are asked where it does not.
-bool IsOnCovered(const Pla& table, CubeIndex& sum, CubeIndex& free, Work& work)
-{
-    const CubeList none(table.space.NumWords());
-    CubeIndex noIndex(table.space, none);
-    Cofactors ofSum(table.space, sum, noIndex, work);
-    Cofactors ofBoth(table.space, sum, free, work);
-    for (size_t index = 0; index < table.on.Size(); ++index)
-        if (!ofSum.Cover(table.on.At(index), SIZE_MAX) &&
-            !ofBoth.Cover(table.on.At(index), SIZE_MAX))
-            return false;
-    return true;
-}
-
-bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
-{
-    const CubeSpace& space = table.space;
-    CubeIndex sumIndex(space, sum);
-    CubeIndex onIndex(space, table.on);
-    CubeIndex freeIndex(space, table.free);
-    if (!IsOnCovered(table, sumIndex, freeIndex, work))
-        return false;
-    if (table.type == PlaType::Fr || table.type == PlaType::Fdr) {
-        size_t left = 0;
-        size_t right = 0;
-        return !FindMeeting(space, sum, table.off, work, left, right);
-    }
-    return DoCoverAll(space, sum, onIndex, freeIndex, work); // everything else is off
-}
-
-// The inverted sum: 1 on every row that nothing is said of or that is off; 0 where on and not free.
-bool IsInversionRight(const Pla& table, const CubeList& sum, Work& work)
-{
-    const CubeSpace& space = table.space;
-    const bool areZerosGiven = table.type == PlaType::Fr || table.type == PlaType::Fdr;
-    const CubeList none(space.NumWords());
-    CubeIndex sumIndex(space, sum);
-    CubeIndex freeIndex(space, table.free);
-    CubeIndex noIndex(space, none);
-    if (areZerosGiven) {
-        if (!DoCoverAll(space, table.off, sumIndex, noIndex, work))
-            return false;
-    } else {
-        CubeList known = table.on;
-        known.Append(table.free);
-        std::vector<uint64_t> all(space.NumWords());
-        for (size_t word = 0; word < all.size(); ++word)
-            all[word] = space.All(word);
-        if (!IsCovered(space, all.data(), sum, known, work))
-            return false;
-    }
-    Cofactors ofFree(space, freeIndex, noIndex, work);
-    std::vector<uint64_t> common(space.NumWords());
-    std::vector<uint32_t> found;
-    for (size_t index = 0; index < table.on.Size(); ++index) {
-        sumIndex.Find(table.on.At(index), 0, work, found);
-        for (const uint32_t term : found) {
-            for (size_t word = 0; word < common.size(); ++word)
-                common[word] = table.on.At(index)[word] & sum.At(term)[word];
-            if (!ofFree.Cover(common.data(), SIZE_MAX))
-                return false;
-        }
-    }
-    return true;
-}
-
 // Where nothing is known of the off-set an exact search has no rows to start from, but a sum of
 // essential primes has no rival: each has a row that no other prime covers, so each sum has a term
 // within it for that row, with no fewer literals.
 void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work& work)
 {
     const CubeSpace& space = problem.space;
-    work.SetDeadline(Work::Clock::time_point::max()); // less than the search before
+    work.SetDeadline(Work::Clock::time_point::max());
     Expander expander(problem, work);
     Cover primes(space.NumWords());
     primes.cubes = sum.cubes;
@@ -128,6 +54,18 @@ void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work&
     }
     sum.isSecondProved =
         areAllEssential && CountLiterals(space, primes.cubes) == sum.cost.numLiterals;
+}
+
+void TryEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work& work)
+{
+    const uint64_t limit = work.Limit();
+    work.SetLimit(std::min(limit, 2 * work.Spent() + kTrialUnits));
+    try {
+        ProveByEssential(problem, goal, sum, work);
+    } catch (const OutOfWork&) {
+        // the sum stays as it was found
+    }
+    work.SetLimit(limit);
 }
 
 void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum, Work& work)
@@ -151,37 +89,78 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
 
 } // namespace
 
-bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& fault, Work& work)
+namespace {
+
+// So many rows that growing cube by cube against what is off would take seconds.
+bool IsLong(const Pla& table)
 {
-    TwoLevelProblem problem(table.space);
-    if (!ToProblem(table, problem, fault, work))
-        return false;
-    if (options.isInverted && !problem.hasOff) {
+    const size_t numCubes = table.on.Size() + table.free.Size() + table.off.Size();
+    size_t numPairs = numCubes > kManyCubes ? kManyPairs + 1 : 0;
+    for (size_t index = 0; index < table.on.Size() && numPairs <= kManyPairs; ++index)
+        numPairs += CountOutputs(table.space, table.on.At(index));
+    return numPairs > kManyPairs && CanListRows(table);
+}
+
+// The sum by rows, if that is cheaper than the one there is.
+void TakeSumOfRows(const Pla& table, const SumOptions& options, Sum& sum, Work& work)
+{
+    const RowTable rows = ListRows(table, options.isInverted, work);
+    const CubeList found = FindSumOfRows(table.space, rows, work);
+    const CoverCost cost = CostOf(table.space, found);
+    if (sum.cubes.IsEmpty() || IsCheaper(cost, CostOf(table.space, sum.cubes)))
+        sum.cubes = found;
+}
+
+bool Invert(TwoLevelProblem& problem, PlaFault& fault, Work& work)
+{
+    if (!problem.hasOff) {
         fault = {0, "a product of sums needs cubes of the rows that are 0, and there are too many",
                  "ask for a sum of products"};
         return false;
     }
-    if (options.isInverted) {
-        TwoLevelProblem inverted(table.space);
-        inverted.on = problem.off;
-        inverted.free = problem.free;
-        SetOff(inverted, work);
-        problem = inverted;
-    }
-    SetSeconds(options.seconds, work);
-    sum.cubes = FindSmallSum(problem, work);
-    if (problem.hasOff)
-        Improve(problem, options, sum, work);
-    else
-        ProveByEssential(problem, options.goal, sum, work);
-    if (!IsSumOf(table, sum.cubes, options.isInverted, work))
-        throw std::logic_error("the sum found is not the function: please report this");
+    TwoLevelProblem inverted(problem.space);
+    inverted.on = problem.off;
+    inverted.free = problem.free;
+    SetOff(inverted, work);
+    problem = inverted;
     return true;
 }
 
-bool IsSumOf(const Pla& table, const CubeList& sum, bool isInverted, Work& work)
+} // namespace
+
+bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& fault, Work& work)
 {
-    return isInverted ? IsInversionRight(table, sum, work) : IsSumRight(table, sum, work);
+    if (!IsConsistent(table, fault, work))
+        return false;
+    const bool isLong = IsLong(table);
+    if (isLong) {
+        SetSeconds(options.seconds, work);
+        TakeSumOfRows(table, options, sum, work);
+        work.SetDeadline(Work::Clock::time_point::max());
+    }
+    if (!isLong || options.isExact) {
+        TwoLevelProblem problem(table.space);
+        if (!ToProblem(table, problem, fault, work) ||
+            (options.isInverted && !Invert(problem, fault, work)))
+            return false;
+        SetSeconds(options.seconds, work);
+        if (!isLong)
+            sum.isCutShort = !FindSmallSum(problem, work, sum.cubes);
+        if (sum.isCutShort && CanListRows(table)) {
+            TakeSumOfRows(table, options, sum, work);
+            sum.isCutShort = false;
+        }
+        if (problem.hasOff && !sum.isCutShort)
+            Improve(problem, options, sum, work);
+        else if (!sum.isCutShort)
+            TryEssential(problem, options.goal, sum, work);
+        work.SetDeadline(Work::Clock::time_point::max());
+    }
+    sum.cost = CostOf(table.space, sum.cubes);
+    sum.lowerBound = std::max<size_t>(sum.lowerBound, sum.cubes.IsEmpty() ? 0 : 1);
+    if (!IsSumOf(table, sum.cubes, options.isInverted, work))
+        throw std::logic_error("the sum found is not the function: please report this");
+    return true;
 }
 
 } // namespace booleq

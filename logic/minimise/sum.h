@@ -23,16 +23,13 @@ struct Sum {
     size_t lowerBound = 0;       // no sum has fewer terms (literals, if these count first)
     bool isProved = false;       // this one has no more
     bool isSecondProved = false; // and among those it has the fewest of the other
+    bool isCutShort = false;     // the search ended early: terms may be as they were given
 };
 
 // Fails: false with the fault, for a table that contradicts itself.
 // Throws what the watcher throws, and std::logic_error if the proof of the answer fails, which is a
 // mistake of ours.
 bool Minimise(const Pla& table, const SumOptions& options, Sum& sum, PlaFault& fault, Work& work);
-
-// Whether the sum, or for 'isInverted' its inversion, is 1 where the table is on and not free and 0
-// where it is off.
-bool IsSumOf(const Pla& table, const CubeList& sum, bool isInverted, Work& work);
 
 } // namespace booleq
 

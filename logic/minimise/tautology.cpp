@@ -100,6 +100,11 @@ class TautologyCheck {
 bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work)
 {
     assert(cubes.NumWords() == space.NumInputWords());
+    work.Spend(cubes.Size() * cubes.NumWords() + 1);
+    if (cubes.IsEmpty()) // the most frequent answers
+        return false;
+    if (HasUniversal(cubes, {0, cubes.Size()}))
+        return true;
     return TautologyCheck(space, cubes, work).Check({0, cubes.Size()});
 }
 

@@ -30,51 +30,74 @@ constexpr size_t kMaxToCompare = 20000;
 constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start from
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
+constexpr uint64_t kMaxUnits = uint64_t(1) << 31; // several seconds
+constexpr uint64_t kMaxUnitsAtEnd = kMaxUnits / 8;
 
 class SmallSumSearch {
   public:
     SmallSumSearch(const TwoLevelProblem& problem, Work& work)
-        : m_space(problem.space), m_work(work), m_free(problem.free), m_expander(problem, work),
-          m_cover(m_space.NumWords()), m_best(m_space.NumWords()), m_pool(m_space.NumWords()),
-          m_essential(m_space.NumWords())
+        : m_space(problem.space), m_work(work), m_free(problem.free),
+          m_num_given_free(m_free.Size()), m_expander(problem, work), m_cover(m_space.NumWords()),
+          m_best(m_space.NumWords()), m_pool(m_space.NumWords()), m_essential(m_space.NumWords())
     {
     }
 
-    CubeList Run(const CubeList& on)
+    bool Run(const CubeList& on, CubeList& sum)
     {
-        Work& work = m_work;
-        const Work::Clock::time_point deadline = work.Deadline();
-        work.SetDeadline(Work::Clock::time_point::max()); // there is to be an answer
-        StartFrom(SplitOutputs(on));
-        SetEssentialAside();
-        m_best = m_cover;
-        work.SetDeadline(deadline);
-        try {
-            Descend();
-            if (work.Spent() <= kMaxSpentForMore) {
-                DescendFromUnited(on);
-                ChooseFromPool();
-            }
-        } catch (const OutOfWork&) {
-            // what was under way is lost
-        }
+        const Work::Clock::time_point deadline = m_work.Deadline();
+        const uint64_t limit = m_work.Limit();
+        m_work.SetLimit(std::min(limit, m_work.Spent() + kMaxUnits));
+        bool isWhole = Search(on);
         m_cover = m_best;
         assert(m_cover.cubes.Size() == m_cover.isPrime.size());
-        work.SetDeadline(Work::Clock::time_point::max());
         m_cover.cubes.Append(m_essential);
         m_cover.isPrime.resize(m_cover.cubes.Size(), 1);
         assert(m_free.Size() == m_num_given_free + m_essential.Size());
         m_free.Resize(m_num_given_free);
-        MakeSparse(m_space, m_expander, m_cover, m_free, m_work);
-        work.SetDeadline(deadline);
-        return m_cover.cubes;
+        m_work.SetDeadline(Work::Clock::time_point::max());
+        m_work.SetLimit(m_work.Spent() + kMaxUnitsAtEnd);
+        try {
+            MakeSparse(m_space, m_expander, m_cover, m_free, m_work);
+        } catch (const OutOfWork&) {
+            isWhole = false;
+        }
+        m_work.SetLimit(limit);
+        m_work.SetDeadline(deadline);
+        sum = m_cover.cubes;
+        return isWhole;
     }
 
   private:
+    // False when it ended early. m_best is a cover then too, with m_essential.
+    bool Search(const CubeList& on)
+    {
+        bool isFirstDone = false;
+        Cover first(m_space.NumWords());
+        try {
+            StartFrom(SplitOutputs(on));
+            SetEssentialAside();
+            m_best = m_cover;
+            isFirstDone = true;
+            Descend();
+            if (m_work.Spent() > kMaxSpentForMore)
+                return true;
+            first = m_best;
+            if (IsShared(on))
+                DescendFromUnited(on);
+            ChooseFromPool();
+        } catch (const OutOfWork&) {
+            if (!isFirstDone)
+                m_best = m_cover;
+            else if (!first.cubes.IsEmpty() && first.cubes.Size() < m_best.cubes.Size())
+                m_best = first;
+            return false;
+        }
+        return true;
+    }
+
     void SetEssentialAside()
     {
         std::vector<uint8_t> isEssential = FindEssential(m_space, m_cover.cubes, m_free, m_work);
-        m_num_given_free = m_free.Size();
         for (size_t index = 0; index < isEssential.size(); ++index) {
             if (isEssential[index] != 0) {
                 m_essential.Append(m_cover.cubes.At(index));
@@ -128,6 +151,17 @@ class SmallSumSearch {
         do
             Improve();
         while (GainByLastGasp());
+    }
+
+    // Whether a cube has several outputs; otherwise both starts are one.
+    bool IsShared(const CubeList& on) const
+    {
+        CubeList united = on;
+        UniteOutputs(m_space, united);
+        for (size_t index = 0; index < united.Size(); ++index)
+            if (CountOutputs(m_space, united.At(index)) > 1)
+                return true;
+        return false;
     }
 
     // The other start: products that outputs share as they are given.
@@ -220,7 +254,7 @@ class SmallSumSearch {
     const CubeSpace& m_space;
     Work& m_work;
     CubeList m_free; // as given, then the essential primes
-    size_t m_num_given_free = 0;
+    size_t m_num_given_free;
     Expander m_expander;
     Cover m_cover;
     Cover m_best;
@@ -230,9 +264,9 @@ class SmallSumSearch {
 
 } // namespace
 
-CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work)
+bool FindSmallSum(const TwoLevelProblem& problem, Work& work, CubeList& sum)
 {
-    return SmallSumSearch(problem, work).Run(problem.on);
+    return SmallSumSearch(problem, work).Run(problem.on, sum);
 }
 
 void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)
@@ -242,7 +276,7 @@ void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work)
     cover.cubes = cubes;
     cover.isPrime.assign(cubes.Size(), 0);
     MakeSparse(problem.space, expander, cover, problem.free, work);
-    assert(cover.cubes.Size() == cubes.Size()); // an irredundant cover needs each
+    assert(cover.cubes.Size() == cubes.Size());
     cubes = cover.cubes;
 }
 

@@ -33,13 +33,14 @@ struct CoverCost {
 CoverCost CostOf(const CubeSpace& space, const CubeList& cubes);
 bool IsCheaper(const CoverCost& left, const CoverCost& right);
 
-// An irredundant cover, by the classical loop. Repeatable: the same problem gives the same cover,
-// unless the work has a deadline, which ends the loop early.
-CubeList FindSmallSum(const TwoLevelProblem& problem, Work& work);
+// A cover by the classical loop. Repeatable: the same problem gives the same cover, unless the work
+// has a deadline. True when the loop came to its end; then the cover is irredundant. Otherwise, by
+// a deadline or because the problem is too large, it is what had been reached, which may have cubes
+// as they were given.
+bool FindSmallSum(const TwoLevelProblem& problem, Work& work, CubeList& sum);
 
 // Outputs that other cubes cover go, then inputs that are not needed for those left: fewer literals
 // for the same terms.
-// Requires: an irredundant cover of the problem.
 void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work);
 
 } // namespace booleq

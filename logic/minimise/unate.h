@@ -15,7 +15,9 @@ bool IsTautology(const CubeSpace& space, CubeList& cubes, Work& work);
 
 // A cover of the rows that no cube covers; not always of primes. 'cubes' is scratch space
 // afterwards.
-CubeList ComplementInputs(const CubeSpace& space, CubeList& cubes, Work& work);
+// Fails: false when there are more than 'maxCubes', or finding them takes too long for so many.
+bool ComplementInputs(const CubeSpace& space, CubeList& cubes, size_t maxCubes, Work& work,
+                      CubeList& result);
 
 // Adds to 'found' the parts of input cube that occur in rows that no cube covers; what 'found' has
 // already is not looked for, so it starts with the parts that are of no interest. 'cubes' is
@@ -45,7 +47,7 @@ class UncoveredRows {
     size_t m_output = 0;  // outputs before it are covered
 };
 
-// Cubes of the same inputs become one, with the outputs of all.
+// Cubes of the same inputs become one, with the outputs of all; in the order of CompareInputs.
 void UniteOutputs(const CubeSpace& space, CubeList& cubes);
 
 // For each output the rows that no cube of the two lists has; cubes of the same inputs are one.

@@ -27,13 +27,18 @@ booleq::SumOptions Options(const py::object& isExact, double seconds)
     return options;
 }
 
+std::string TextOf(const booleq::PlaFault& fault)
+{
+    return fault.message + (fault.hint.empty() ? "" : "; " + fault.hint);
+}
+
 booleq::Sum Minimised(const booleq::Pla& table, const booleq::SumOptions& options)
 {
     booleq::Sum sum(table.space);
     booleq::PlaFault fault;
     booleq::Work work;
     if (!Minimise(table, options, sum, fault, work))
-        throw py::value_error(fault.message);
+        throw py::value_error(TextOf(fault));
     return sum;
 }
 
@@ -53,7 +58,9 @@ std::shared_ptr<const Smallest> FindSmallest(const Content& content, const Conte
         output.free = booleq::ToExpression(free->equation);
     const auto found = std::make_shared<Smallest>();
     booleq::Work work;
-    found->table = booleq::TableOf({output}, booleq::InputsOf({output}), work);
+    booleq::PlaFault fault;
+    if (!TableOf({output}, booleq::InputsOf({output}), found->table, fault, work))
+        throw py::value_error(TextOf(fault));
     found->sum = std::make_unique<const booleq::Sum>(Minimised(found->table, options));
     found->conversion = Convert(ExpressionOf(found->table, found->sum->cubes, 0, false),
                                 *booleq::FindTarget("primary"), "", {10});
@@ -102,8 +109,7 @@ py::str MinimizePla(const py::object& text, const py::object& isExact, double se
         booleq::Pla table;
         booleq::PlaFault fault;
         if (!ReadPla(bytes, table, fault))
-            throw py::value_error("line " + std::to_string(fault.line) + ": " + fault.message +
-                                  (fault.hint.empty() ? "" : "; " + fault.hint));
+            throw py::value_error("line " + std::to_string(fault.line) + ": " + TextOf(fault));
         const booleq::Sum sum = Minimised(table, options);
         return WritePla(table, sum.cubes);
     }));

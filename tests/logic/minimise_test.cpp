@@ -10,6 +10,7 @@
 #include "covering.h"
 #include "cube_table.h"
 #include "logic_support.h"
+#include "proof.h"
 #include "sum.h"
 #include "unate.h"
 
@@ -367,11 +368,27 @@ TEST(Minimise, EquationsOfManyInputsGoByCubes)
         text += " | (v" + std::to_string(input) + " & ~v" + std::to_string(input + 1) + ")";
     const TableOutput output = {"f", Parsed(text), false, Expression()};
     Work work;
-    const Pla table = TableOf({output}, InputsOf({output}), work);
+    Pla table;
+    PlaFault fault;
+    ASSERT_TRUE(TableOf({output}, InputsOf({output}), table, fault, work)) << fault.message;
     const Sum sum = Minimised(table, SumOptions());
     EXPECT_EQ(sum.cost.numTerms, 10u);
     EXPECT_TRUE(sum.isProved);
     EXPECT_EQ(ExpressionOf(table, sum.cubes, 0, false).names.size(), 20u);
+}
+
+TEST(Minimise, RefusesEquationsOfTooManyProducts)
+{
+    std::string text = "v0";
+    for (size_t input = 1; input < 30; ++input)
+        text += " ^ v" + std::to_string(input);
+    const TableOutput output = {"parity", Parsed(text), false, Expression()};
+    Work work;
+    Pla table;
+    PlaFault fault;
+    EXPECT_FALSE(TableOf({output}, InputsOf({output}), table, fault, work));
+    EXPECT_NE(fault.message.find("parity"), std::string::npos) << fault.message;
+    EXPECT_FALSE(fault.hint.empty());
 }
 
 std::string FaultOf(const std::string& text)
@@ -381,7 +398,7 @@ std::string FaultOf(const std::string& text)
     Work work;
     if (ReadPla(text, table, fault)) {
         TwoLevelProblem problem(table.space);
-        if (ToProblem(table, problem, fault, work))
+        if (IsConsistent(table, fault, work) && ToProblem(table, problem, fault, work))
             return "none";
     }
     return std::to_string(fault.line) + ": " + fault.message;

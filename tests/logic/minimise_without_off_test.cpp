@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include "expand.h"
+#include "proof.h"
 #include "sum.h"
 
 namespace {
@@ -77,7 +78,8 @@ TEST(MinimiseWithoutOff, GrowsByTautologyToPrimesToo)
         TwoLevelProblem without = problem;
         without.off.Resize(0);
         without.hasOff = false;
-        const CubeList sum = FindSmallSum(without, work);
+        CubeList sum(table.space.NumWords());
+        EXPECT_TRUE(FindSmallSum(without, work, sum));
         EXPECT_TRUE(IsSumOf(table, sum, false, work)) << text;
         Cover cover(table.space.NumWords());
         cover.cubes = table.on;

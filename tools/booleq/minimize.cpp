@@ -70,9 +70,13 @@ std::string Verdict(const Sum& sum, Goal goal, bool isInverted)
     const std::string form = isInverted ? "product" : "sum";
     std::string verdict =
         Count(sum.cost.numTerms, "term") + ", " + Count(sum.cost.numLiterals, "literal");
-    if (!sum.isProved)
-        return verdict + "; not proved: no " + form + " has fewer than " +
-               std::to_string(sum.lowerBound) + " " + first;
+    if (!sum.isProved) {
+        verdict += "; not proved";
+        if (sum.lowerBound > 1)
+            verdict +=
+                ": no " + form + " has fewer than " + std::to_string(sum.lowerBound) + " " + first;
+        return verdict + (sum.isCutShort ? "; the search was cut short" : "");
+    }
     verdict += "; proved: no " + form + " has fewer " + first;
     if (sum.isSecondProved)
         verdict += ", and none with as many has fewer " + second;
@@ -91,6 +95,7 @@ Json AsJson(const Pla& table, const Sum& sum, const SumOptions& options)
     json["counts"] = options.goal == Goal::Terms ? "terms" : "literals";
     json["proved"] = sum.isProved;
     json["second_proved"] = sum.isSecondProved;
+    json["cut_short"] = sum.isCutShort;
     json["cubes"] = Json::array();
     for (size_t index = 0; index < sum.cubes.Size(); ++index)
         json["cubes"].push_back(CubeText(table.space, sum.cubes.At(index)));

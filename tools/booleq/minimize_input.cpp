@@ -111,13 +111,18 @@ class EquationReader {
 
     bool IsEmpty() const { return m_outputs.empty(); }
 
-    Pla Table(Work& work)
+    // Fails: false, and the refusal has been said.
+    bool MakeTable(Work& work, MinimizeInput& input)
     {
         for (size_t index = 0; index < m_outputs.size(); ++index)
             if (m_outputs[index].name.empty())
                 m_outputs[index].name =
                     m_outputs.size() == 1 ? "f" : "f" + std::to_string(index + 1);
-        return TableOf(m_outputs, InputsOf(m_outputs), work);
+        PlaFault fault;
+        if (TableOf(m_outputs, InputsOf(m_outputs), input.table, fault, work))
+            return true;
+        RefuseFault(input, m_request, m_output, fault);
+        return false;
     }
 
   private:
@@ -200,8 +205,7 @@ bool ReadText(const std::string& text, const Request& request, Output& output, W
     }
     if (request.Has("--dc") && !reader.AddFreeForAll(request.Get("--dc")))
         return false;
-    input.table = reader.Table(work);
-    return true;
+    return reader.MakeTable(work, input);
 }
 
 bool ReadInit(const Request& request, Output& output, MinimizeInput& input)
@@ -243,8 +247,7 @@ bool ReadMinimizeInput(const Request& request, Output& output, Work& work, Minim
             return false;
     if (request.Has("--dc") && !reader.AddFreeForAll(request.Get("--dc")))
         return false;
-    input.table = reader.Table(work);
-    return true;
+    return reader.MakeTable(work, input);
 }
 
 void RefuseFault(const MinimizeInput& input, const Request& request, Output& output,

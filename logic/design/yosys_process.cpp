@@ -121,10 +121,9 @@ class Child {
     explicit Child(const WorkFiles& files)
     {
         std::vector<std::string> words = {"yosys", "-q", "-p", kScript};
-        std::vector<char*> arguments;
-        for (std::string& word : words)
-            arguments.push_back(word.data());
-        arguments.push_back(nullptr);
+        std::vector<char*> arguments(words.size() + 1); // the last is null
+        std::transform(words.begin(), words.end(), arguments.begin(),
+                       [](std::string& word) { return word.data(); });
         const pid_t parent = getpid();
         m_process = fork();
         if (m_process < 0)
@@ -169,11 +168,11 @@ std::string ErrorIn(const NamelessFile& file)
         const size_t sign = line.find("ERROR: ");
         if (sign == std::string_view::npos)
             continue;
-        std::string reason(line.substr(sign + 7));
+        std::string reason;
         const size_t length = sizeof kTextName - 1;
         if (line.substr(0, length) == kTextName && sign > length + 2)
-            reason = "line " + std::string(line.substr(length, sign - length - 2)) + ": " + reason;
-        return reason;
+            reason.append("line ").append(line.substr(length, sign - length - 2)).append(": ");
+        return reason.append(line.substr(sign + 7));
     }
     return "it gave no reason";
 }

@@ -21,6 +21,15 @@ bool EdifForms::NextPart(const char* form)
     Refuse(std::string("the text ends inside (") + form + " ...");
 }
 
+void EdifForms::RequireVersion()
+{
+    std::string version;
+    while (NextPart("edifVersion"))
+        version += (version.empty() ? "" : " ") + std::string(m_tokens.Text().substr(0, 40));
+    if (version != "2 0 0")
+        Refuse("it is EDIF " + Quoted(version) + ", and 2 0 0 is what is read");
+}
+
 void EdifForms::Close(const char* form)
 {
     while (NextPart(form))

@@ -32,6 +32,8 @@ class EdifForms {
     [[noreturn]] void Refuse(const std::string& what) const { m_tokens.Refuse(what); }
     // The next part of a form; false at its end.
     bool NextPart(const char* form);
+    // Reads the rest of (edifVersion ..., which must be 2 0 0: others say nets in other forms.
+    void RequireVersion();
     // Skips the rest of a form.
     void Close(const char* form);
     // A string with its escapes replaced.

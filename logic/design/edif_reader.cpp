@@ -30,7 +30,7 @@ class EdifReader {
             else if (m_tokens.IsOpen("design"))
                 ReadDesignForm();
             else if (m_tokens.IsOpen("edifVersion"))
-                ReadVersion();
+                m_forms.RequireVersion();
             else
                 m_tokens.Skip();
         }
@@ -39,16 +39,6 @@ class EdifReader {
     }
 
   private:
-    // Other versions say nets in other forms.
-    void ReadVersion()
-    {
-        std::string version;
-        while (m_forms.NextPart("edifVersion"))
-            version += (version.empty() ? "" : " ") + std::string(m_tokens.Text().substr(0, 40));
-        if (version != "2 0 0")
-            m_forms.Refuse("it is EDIF " + Quoted(version) + ", and 2 0 0 is what is read");
-    }
-
     // --- libraries and cells
 
     void ReadLibrary()

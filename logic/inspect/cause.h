@@ -32,7 +32,7 @@ struct Cause {
     CauseCode code;
     std::vector<NetId> nets; // of PinsSwapped the nets of the left table, then what each is taken
                              // for; of the others the nets that they are about
-    std::string detail;      // what the nets do not say: "by 2 digits to the right, filled with zeros"
+    std::string detail; // more than the nets say: "by 2 digits to the right, filled with zeros"
 };
 
 // "pins-swapped" and so on, for reports.

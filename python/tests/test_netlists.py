@@ -279,7 +279,7 @@ def test_files(tmp_path: pathlib.Path) -> None:
     with pytest.raises(IsADirectoryError):
         read_netlist(tmp_path)
     packed.write_bytes(packed.read_bytes()[:-9])
-    with pytest.raises(NetlistError, match="not whole") as damaged:
+    with pytest.raises(NetlistError, match="truncated") as damaged:
         read_netlist(packed)
     assert damaged.value.file == str(packed) and damaged.value.line is None
 

@@ -244,7 +244,7 @@ TEST(CellTypes, BadLinesAreRefusedWithTheirNumber)
         {"table y = INIT a", "line 1: 'table' comes before the first 'cell'"},
         {"cell a\nwhat", "line 2: expected cell, input, other, vector, init, table, inner, open, "
                          "constant, unread or note instead of 'what'"},
-        {"cell a\ninput p p", "line 2: pin 'p' stands twice"},
+        {"cell a\ninput p p", "line 2: pin 'p' is listed twice"},
         {"cell a\ninput p\ninit I 4\ntable y = I p",
          "line 4: the table has 2 rows, and there are 4 bits"},
         {"cell a\ninput p\ninit I 2\ntable y = I q",

@@ -160,7 +160,7 @@ install_tools() {
         awk '$1 == "Inst" { print $2 }'); do
         is_ours "$name" || dependencies+=("$name")
     done
-    apt_get_install developer g++ cmake pkg-config python3 man-db bash-completion \
+    apt_get_install developer g++ cmake ninja-build pkg-config python3 man-db bash-completion \
         "${dependencies[@]}"
 }
 

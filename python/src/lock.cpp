@@ -4,6 +4,7 @@
 #include <cassert>
 #include <condition_variable>
 #include <mutex>
+#include <new>
 #include <thread>
 
 #include "watch.h"
@@ -41,6 +42,18 @@ void WaitForHelpers()
     Helpers& helpers = GetHelpers();
     std::unique_lock<std::mutex> guard(helpers.mutex);
     helpers.isFewer.wait(guard, [&] { return helpers.number == 0; });
+}
+
+void CountHelper(bool isNew)
+{
+    Helpers& helpers = GetHelpers();
+    const std::lock_guard<std::mutex> guard(helpers.mutex);
+    assert(isNew || helpers.number > 0);
+    if (isNew)
+        ++helpers.number;
+    else
+        --helpers.number;
+    helpers.isFewer.notify_all();
 }
 
 // A child has the one thread that forked.
@@ -99,20 +112,18 @@ void PrepareInterrupts()
 
 void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work)
 {
-    Helpers& helpers = GetHelpers();
-    {
-        const std::lock_guard<std::mutex> guard(helpers.mutex);
-        ++helpers.number;
+    CountHelper(true);
+    try {
+        std::thread([isAbandoned, work = std::move(work)]() mutable {
+            abandoned = isAbandoned.get();
+            work();
+            work = nullptr; // what it holds goes before anybody thinks that it has ended
+            CountHelper(false);
+        }).detach();
+    } catch (...) { // no thread is to be had, which is a lack of memory as a rule
+        CountHelper(false);
+        throw std::bad_alloc();
     }
-    std::thread([isAbandoned, work = std::move(work)]() mutable {
-        abandoned = isAbandoned.get();
-        work();
-        work = nullptr; // what it holds goes before anybody thinks that it has ended
-        Helpers& own = GetHelpers();
-        const std::lock_guard<std::mutex> guard(own.mutex);
-        --own.number;
-        own.isFewer.notify_all();
-    }).detach();
 }
 
 } // namespace booleq_python

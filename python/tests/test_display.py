@@ -1,5 +1,6 @@
 """Equations in notebooks."""
 import os
+import shutil
 import stat
 from pathlib import Path
 from typing import Any
@@ -60,6 +61,7 @@ class TestHtml:
 
 
 class TestSvg:
+    @pytest.mark.skipif(shutil.which("dot") is None, reason="there is no Graphviz")
     def test_picture(self) -> None:
         text = Equation("A & '<\u00fc>'").tree_svg()
         assert text is not None

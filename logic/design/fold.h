@@ -10,25 +10,14 @@ namespace booleq {
 // Cost: one copy of the words.
 Rows TableRows(const Design& design, const InitValue& init);
 
-// A table of up to six inputs after folding. nets[k] is input k of the rows, the first one the most
-// significant bit of the row's number; a net stands once, kNetOpen and kNetUnknown as often as
-// pins.
-struct FoldedWord {
-    uint64_t word = 0; // bits above the last row are 0
-    unsigned int numInputs = 0;
-    NetId nets[6] = {};
-};
-
-// A table without its inputs that are constants or repeat a net; inputs without effect stay.
-// Requires: at most six inputs.  Cost: some operations on the word for each input, no allocation.
-FoldedWord FoldSmallTable(const Design& design, const DesignTable& table);
-
+// A table after folding. nets[k] is input k of the rows; a net stands once, kNetOpen and
+// kNetUnknown as often as pins.
 struct FoldedRows {
     Rows rows;
     std::vector<NetId> nets;
 };
 
-// The same for any number of inputs.
+// A table without its inputs that are constants or repeat a net; inputs without effect stay.
 FoldedRows FoldTable(const Design& design, const DesignTable& table);
 
 } // namespace booleq

@@ -35,7 +35,6 @@ class NetMap {
                                         : false; // a known right net has a left number
     }
     NetId NumberOfRight(NetId right) const { return m_numbers[right]; }
-    const std::vector<NetId>& NumbersOfRight() const { return m_numbers; }
     bool IsLeft(NetId number) const { return number < m_rights.size(); }
     // The right net of a number of its own.
     NetId RightOf(NetId number) const { return number - static_cast<NetId>(m_rights.size()); }

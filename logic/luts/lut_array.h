@@ -2,7 +2,7 @@
 // netlists and canonical forms hand tables to each other. It owns nothing.
 // Input 0 is the most significant bit of a row's number, row k is bit k of the table, as in rows.h;
 // a table of seven inputs is two words of 64 bits, rows 0 to 63 first.
-// Fails: nothing does; what must hold is asked before by FirstUncleanLut.
+// Fails: nothing does; who makes an array sees to its invariants.
 #ifndef BOOLEQ_LUTS_LUT_ARRAY_H
 #define BOOLEQ_LUTS_LUT_ARRAY_H
 
@@ -23,7 +23,7 @@ struct LutWork {
 };
 
 // Tables to be read.
-// Invariants, which FirstUncleanLut and HasLutShape check:
+// Invariants, of which HasLutShape checks the first:
 // 1. A table has tableBytes bytes: 1, 2, 4 or 8, or 16 for two words; enough for 2^numInputs rows.
 // 2. Bits beyond the last row are 0.
 struct LutArray {
@@ -44,10 +44,6 @@ LutArray LutsOf(const std::vector<uint64_t>& words, unsigned int numInputs);
 
 // Whether numInputs and tableBytes go together (invariant 1).
 bool HasLutShape(unsigned int numInputs, unsigned int tableBytes);
-
-// The place of the first table with a bit beyond its last row, kNoLut when there is none.
-// Requires: invariant 1.
-size_t FirstUncleanLut(const LutArray& luts, const LutWork& work = LutWork());
 
 } // namespace booleq
 

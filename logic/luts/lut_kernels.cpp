@@ -79,18 +79,6 @@ uint8_t NumOnes(TwoWords word)
     return static_cast<uint8_t>(NumOnes(word.lower) + NumOnes(word.upper));
 }
 
-uint8_t FirstOne(uint64_t word)
-{
-    return word == 0 ? kSameLut : static_cast<uint8_t>(__builtin_ctzll(word));
-}
-
-uint8_t FirstOne(TwoWords word)
-{
-    if (word.lower != 0 || word.upper == 0)
-        return FirstOne(word.lower);
-    return static_cast<uint8_t>(64 + FirstOne(word.upper));
-}
-
 // The half of a word where input 'bit' of the row number is fixed, in the rows where it is 0; other
 // bits are whatever they were.
 template <class Word>
@@ -146,30 +134,6 @@ void InvertLuts(const LutArray& luts, void* results, const LutWork& work)
     });
 }
 
-void InvertLutInputs(const LutArray& luts, uint8_t inputs, void* results, const LutWork& work)
-{
-    assert((inputs & ~AllLutInputs(luts.numInputs)) == 0);
-    const unsigned int numInputs = luts.numInputs;
-    MapLuts(luts, results, work, [numInputs, inputs](auto word) {
-        for (unsigned int input = 0; input < numInputs; ++input) {
-            if ((inputs >> input & 1u) != 0)
-                word = InvertLutBit(word, numInputs - 1 - input);
-        }
-        return word;
-    });
-}
-
-void CofactorLuts(const LutArray& luts, unsigned int input, bool value, void* results,
-                  const LutWork& work)
-{
-    const unsigned int bit = BitOf(luts, input);
-    MapLuts(luts, results, work, [bit, value](auto word) {
-        typedef decltype(word) Word;
-        const Word half = Selected(word, bit, value) & ~LutPattern<Word>(bit);
-        return static_cast<Word>(half | half << (1u << bit));
-    });
-}
-
 void FixLutInput(const LutArray& luts, unsigned int input, bool value, void* results,
                  unsigned int resultBytes, const LutWork& work)
 {
@@ -202,18 +166,6 @@ void FindLutSupports(const LutArray& luts, uint8_t* inputs, const LutWork& work)
 void CountLutOnes(const LutArray& luts, uint8_t* counts, const LutWork& work)
 {
     ForEachLut(luts, counts, work, [](auto word, size_t) { return NumOnes(word); });
-}
-
-void CompareLuts(const LutArray& left, const LutArray& right, uint8_t* firstDifferentRows,
-                 const LutWork& work)
-{
-    assert(left.count == right.count && left.numInputs == right.numInputs &&
-           left.tableBytes == right.tableBytes);
-    ForEachLut(left, firstDifferentRows, work, [&right](auto word, size_t place) {
-        typedef decltype(word) Word;
-        const auto* const others = static_cast<const Word*>(right.tables);
-        return FirstOne(word ^ others[place]);
-    });
 }
 
 } // namespace booleq

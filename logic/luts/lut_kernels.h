@@ -37,16 +37,9 @@ size_t FirstBadOrder(const uint8_t* orders, size_t count, unsigned int numInputs
 
 // Every row's value is inverted.
 void InvertLuts(const LutArray& luts, void* results, const LutWork& work = LutWork());
-// The inputs of a set are taken inverted.  Requires: no input beyond numInputs.
-void InvertLutInputs(const LutArray& luts, uint8_t inputs, void* results,
-                     const LutWork& work = LutWork());
-// The function with an input fixed. It keeps its inputs and does not depend on that one.
-// Requires: input < numInputs.
-void CofactorLuts(const LutArray& luts, unsigned int input, bool value, void* results,
-                  const LutWork& work = LutWork());
-// The same over the other inputs alone: 'results' has tables of one input less, which take
-// resultBytes each.  Requires: input < numInputs; HasLutShape(numInputs - 1, resultBytes); other
-// memory than the tables.
+// The function with an input fixed, over the other inputs: 'results' has tables of one input less,
+// which take resultBytes each.  Requires: input < numInputs; HasLutShape(numInputs - 1,
+// resultBytes); other memory than the tables.
 void FixLutInput(const LutArray& luts, unsigned int input, bool value, void* results,
                  unsigned int resultBytes, const LutWork& work = LutWork());
 
@@ -54,12 +47,6 @@ void FixLutInput(const LutArray& luts, unsigned int input, bool value, void* res
 void FindLutSupports(const LutArray& luts, uint8_t* inputs, const LutWork& work = LutWork());
 // In how many rows a table is 1, at most 128.
 void CountLutOnes(const LutArray& luts, uint8_t* counts, const LutWork& work = LutWork());
-
-// The first row in which two tables differ, kSameLut where none does.
-// Requires: arrays of one shape and count.
-constexpr uint8_t kSameLut = 255;
-void CompareLuts(const LutArray& left, const LutArray& right, uint8_t* firstDifferentRows,
-                 const LutWork& work = LutWork());
 
 } // namespace booleq
 

@@ -28,7 +28,6 @@ class WordProgram {
     size_t BlockSize() const { return kBlockWords * (m_num_inputs + m_num_slots); }
     // The results of the first 'numWords' words of each column; the pointer is into the block.
     const uint64_t* Run(uint64_t* block, size_t numWords) const;
-    size_t NumSteps() const { return m_steps.size(); }
 
   private:
     struct Step {

@@ -99,16 +99,15 @@ const Node* KqStore::PayTree() const
     return m_root.load(std::memory_order_relaxed);
 }
 
-bool KqStore::TakeTokens(const KqTokens& tokens)
+void KqStore::TakeTokens(const KqTokens& tokens)
 {
     KqTree made;
     made.MakeNodes(tokens);
     const std::lock_guard<std::mutex> taking(s_sharedStores);
     if (HasEquation() || !m_list.empty())
-        return false;
+        return;
     m_list.swap(made.list);
     m_block.Swap(made.block);
-    return true;
 }
 
 void KqStore::CopyTokens(KqTree& copy) const

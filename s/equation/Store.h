@@ -71,8 +71,8 @@ class KqStore {
     // A list whose capacity may serve the next tree.
     void LendList(std::vector<Node*>& list) noexcept { m_list.swap(list); }
 
-    // Loose tokens, also of a shared store. Makes nodes of them; false when the store is not empty.
-    bool TakeTokens(const KqTokens& tokens);
+    // Loose tokens, also of a shared store. Makes nodes of them, unless the store is not empty.
+    void TakeTokens(const KqTokens& tokens);
     // Makes copies of the nodes while they are loose; none when there are none or a tree.
     void CopyTokens(KqTree& copy) const;
     // Links the nodes as a tree of such copies is linked, unless somebody else has done so.

@@ -41,18 +41,11 @@ class ChoiceSearch {
     // Depth: one level for each input.
     void Find(StackPart part)
     {
-        size_t numBinate = 0;
+        UnateCount count;
         for (;;) {
             m_work.Spend(2 * part.count * m_num_words + 1);
-            uint64_t anyUnate = 0;
-            numBinate = 0;
-            for (size_t word = 0; word < m_num_words; ++word) {
-                const Occurrence occurrence = FindOccurrence(m_space, m_stack, part, word);
-                m_binate[word] = occurrence.zeros & occurrence.ones;
-                numBinate += CountBits(m_binate[word]);
-                anyUnate |= occurrence.zeros ^ occurrence.ones;
-            }
-            if (anyUnate == 0)
+            count = FindBinate(m_space, m_stack, part, m_binate);
+            if (!count.hasUnate)
                 break;
             // Where an input that is unate has its worse value, fewer cubes are left: the rows
             // found there imply those elsewhere.
@@ -69,7 +62,7 @@ class ChoiceSearch {
                 return;
             universal.push_back(m_labels[index]);
         }
-        if (numBinate == 0) {
+        if (count.numBinate == 0) {
             assert(!universal.empty()); // nothing else covers this place
             std::sort(universal.begin(), universal.end());
             m_rows.push_back(std::move(universal));

@@ -43,20 +43,13 @@ class TautologyCheck {
             m_is_tautology = false;
             if (part.count == 0)
                 return false;
-            uint64_t anyUnate = 0;
-            size_t numBinate = 0;
-            for (size_t word = 0; word < m_num_words; ++word) {
-                const Occurrence occurrence = FindOccurrence(m_space, m_stack, part, word);
-                m_binate[word] = occurrence.zeros & occurrence.ones;
-                numBinate += CountBits(m_binate[word]);
-                anyUnate |= occurrence.zeros ^ occurrence.ones;
-            }
-            if (anyUnate == 0 && numBinate == 0) {
+            const UnateCount count = FindBinate(m_space, m_stack, part, m_binate);
+            if (!count.hasUnate && count.numBinate == 0) {
                 m_is_tautology = true;
                 return false;
             }
-            if (anyUnate == 0)
-                return !Settle(part, numBinate);
+            if (!count.hasUnate)
+                return !Settle(part, count.numBinate);
             DropUnate(m_stack, part, m_binate, nullptr);
         }
     }

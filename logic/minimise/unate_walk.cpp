@@ -43,6 +43,21 @@ void CountAbsent(const CubeList& stack, StackPart part, size_t word, uint64_t as
 
 } // namespace
 
+UnateCount FindBinate(const CubeSpace& space, const CubeList& stack, StackPart part,
+                      std::vector<uint64_t>& binate)
+{
+    UnateCount count;
+    uint64_t anyUnate = 0;
+    for (size_t word = 0; word < binate.size(); ++word) {
+        const Occurrence occurrence = FindOccurrence(space, stack, part, word);
+        binate[word] = occurrence.zeros & occurrence.ones;
+        count.numBinate += CountBits(binate[word]);
+        anyUnate |= occurrence.zeros ^ occurrence.ones;
+    }
+    count.hasUnate = anyUnate != 0;
+    return count;
+}
+
 size_t ChooseInput(const CubeSpace& space, const CubeList& stack, StackPart part,
                    const uint64_t* candidates, std::vector<uint32_t>& counts)
 {

@@ -31,6 +31,17 @@ inline Occurrence FindOccurrence(const CubeSpace& space, const CubeList& stack, 
     return {~all >> 1 & space.InputLow(word), ~all & space.InputLow(word)};
 }
 
+// How many inputs of a part occur in both ways, and whether others occur in one.
+struct UnateCount {
+    size_t numBinate = 0;
+    bool hasUnate = false;
+};
+
+// Counts them; 'binate' gets the low bits of those that occur in both ways.
+// Requires: 'binate' has a word for each of the space's.
+UnateCount FindBinate(const CubeSpace& space, const CubeList& stack, StackPart part,
+                      std::vector<uint64_t>& binate);
+
 inline bool IsUniversal(const uint64_t* inputs, size_t numWords)
 {
     uint64_t all = ~uint64_t(0);

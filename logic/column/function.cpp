@@ -68,13 +68,6 @@ Function Function::Over(const std::vector<std::string>& inputs) const
     return {inputs, PermuteInputs(std::move(rows), order)};
 }
 
-Function Function::Reversed() const
-{
-    Function result = Over(std::vector<std::string>(m_inputs.rbegin(), m_inputs.rend()));
-    result.m_inputs = m_inputs;
-    return result;
-}
-
 uint64_t Function::FirstDifference(const Function& other) const
 {
     return booleq::FirstDifference(m_rows, other.m_rows);

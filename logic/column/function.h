@@ -48,9 +48,6 @@ class Function {
     // Requires: every own input is among them; none twice; at most kMaxFunctionInputs.
     // Cost: O(n * 2^n / 64).
     Function Over(const std::vector<std::string>& inputs) const;
-    // The same function with its inputs in opposite order: how somebody reads it who takes the
-    // first input for bit 0 of the row number.
-    Function Reversed() const;
 
     // The first row that differs, kNoRow when none does.
     // Requires: as many inputs; that they are the same is the caller's matter.

@@ -342,6 +342,16 @@ Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order)
     return rows;
 }
 
+Rows ReverseInputs(Rows rows)
+{
+    for (unsigned int input = 0; input < rows.NumInputs() / 2; ++input) {
+        if (rows.Size() >= kWatchedWords)
+            Watch();
+        rows = SwapInputs(std::move(rows), input, rows.NumInputs() - 1 - input);
+    }
+    return rows;
+}
+
 Rows Restrict(Rows rows, const std::vector<unsigned int>& inputs)
 {
     assert(std::is_sorted(inputs.begin(), inputs.end()));

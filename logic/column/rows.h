@@ -133,6 +133,8 @@ Rows InvertInput(Rows rows, unsigned int input);
 // Input k of the result is input order[k] of 'rows'.
 // Requires: order is a permutation of all inputs.  Cost: O(inputs * words).
 Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order);
+// Input k of the result is input numInputs - 1 - k: rows counted from the other end.
+Rows ReverseInputs(Rows rows);
 // Over the inputs 'inputs' alone.  Requires: they are ascending and hold the support.
 // Cost: O(inputs * words).
 Rows Restrict(Rows rows, const std::vector<unsigned int>& inputs);

@@ -51,14 +51,6 @@ Rows ReverseGroups(const Rows& rows, uint64_t group)
         rows, [=](uint64_t row) { return (numGroups - 1 - row / group) * group + row % group; });
 }
 
-Rows ReverseInputs(const Rows& rows)
-{
-    std::vector<unsigned int> order(rows.NumInputs());
-    for (unsigned int input = 0; input < order.size(); ++input)
-        order[input] = static_cast<unsigned int>(order.size()) - 1 - input;
-    return PermuteInputs(rows, order);
-}
-
 void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun,
                     std::vector<InitFault>& faults)
 {

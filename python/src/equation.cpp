@@ -275,15 +275,15 @@ py::object MakeEquation(const py::object& text, const py::object& inputs,
     return ReadEquation(plain, given, RequireFlag(lsbFirst, "lsb_first"));
 }
 
-booleq::Rows RowsOf(const Equation& equation)
+booleq::Rows RowsOf(const Equation& equation, bool isReversed)
 {
     if (equation.NumInputs() > booleq::kMaxFunctionInputs)
         throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
     const SharedContent content = equation.Shared();
-    return Run(equation.GetLength(), [content] {
+    return Run(equation.GetLength(), [content, isReversed] {
         booleq::Rows rows;
         booleq::RowsOf(content->equation, rows);
-        return rows;
+        return isReversed ? ReverseInputs(std::move(rows)) : rows;
     });
 }
 

@@ -119,8 +119,9 @@ const Equation& RequireEquation(const py::handle& value, const char* what);
 // An equation, or a text, 0 or 1 as one.  Fails: null for another type; booleq.ParseError.
 py::object ToEquation(const py::handle& value);
 
+// The results; 'isReversed' takes the first input for bit 0 of the row's number.
 // Fails: ValueError for more than 30 inputs; what a signal's handler raises.
-booleq::Rows RowsOf(const Equation& equation);
+booleq::Rows RowsOf(const Equation& equation, bool isReversed = false);
 kq_logic::Function FunctionOf(const Equation& equation);
 
 // 'value' as 0 or 1.  Fails: TypeError, ValueError, what its __index__ raises.

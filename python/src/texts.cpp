@@ -102,19 +102,7 @@ booleq::Rows RequireRows(const Equation& equation, const py::object& isLsbFirst)
     const bool lsbFirst = RequireFlag(isLsbFirst, "lsb_first");
     if (equation.NumInputs() == 0)
         throw py::value_error("an equation without inputs has no init value");
-    if (!lsbFirst)
-        return RowsOf(equation);
-    if (equation.NumInputs() > booleq::kMaxFunctionInputs)
-        throw py::value_error(booleq::NoFunctionReason(equation.NumInputs()));
-    const SharedContent content = equation.Shared();
-    return Run(equation.GetLength(), [content] {
-        booleq::Rows rows;
-        booleq::RowsOf(content->equation, rows);
-        std::vector<unsigned int> order(rows.NumInputs());
-        for (unsigned int input = 0; input < rows.NumInputs(); ++input)
-            order[input] = rows.NumInputs() - 1 - input;
-        return PermuteInputs(std::move(rows), order);
-    });
+    return RowsOf(equation, lsbFirst);
 }
 
 py::str HexInit(const py::object& self, const py::object& lsbFirst)

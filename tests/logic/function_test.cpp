@@ -61,7 +61,7 @@ TEST(Function, AnotherOrderOfInputsIsTheSameFunctionRowByRow)
             ASSERT_EQ(inputs, other.Inputs());
             for (uint64_t row = 0; row < other.NumRows(); ++row)
                 ASSERT_EQ(ValueFor(function, inputs, row), other.At(row)) << numInputs;
-            ASSERT_EQ(other, other.Reversed().Reversed());
+            ASSERT_EQ(other.GetRows(), ReverseInputs(ReverseInputs(other.GetRows())));
         }
     }
 }
@@ -132,7 +132,7 @@ TEST(Function, TwentyFourInputsFromDigitsAndBack)
         text += "0123456789abcdef"[random() % 16];
     const Function function = FromInit(text, Names(24));
     EXPECT_EQ(text, function.Hex());
-    EXPECT_EQ(function, function.Reversed().Reversed());
+    EXPECT_EQ(function.GetRows(), ReverseInputs(ReverseInputs(function.GetRows())));
 }
 
 } // namespace

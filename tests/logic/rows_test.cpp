@@ -135,6 +135,9 @@ TEST(Rows, InputsMoveAndAreInverted)
         std::vector<unsigned int> order(numInputs);
         std::iota(order.begin(), order.end(), 0u);
         std::shuffle(order.begin(), order.end(), random);
+        std::vector<unsigned int> opposite(numInputs);
+        std::iota(opposite.rbegin(), opposite.rend(), 0u);
+        ASSERT_EQ(ReverseInputs(rows), PermuteInputs(rows, opposite));
         const Rows permuted = PermuteInputs(rows, order);
         ExpectPadding(permuted);
         for (size_t row = 0; row < rows.NumRows(); ++row) {

@@ -189,10 +189,7 @@ class Lister {
         std::pair<std::string, std::string>& known = m_inits[init];
         if (known.first.empty()) {
             const Rows rows = TableRows(m_design, m_design.inits[init]);
-            std::vector<unsigned int> reversed(rows.NumInputs());
-            for (unsigned int input = 0; input < reversed.size(); ++input)
-                reversed[input] = rows.NumInputs() - 1 - input;
-            known = {HexOf(rows), HexOf(PermuteInputs(rows, reversed))};
+            known = {HexOf(rows), HexOf(ReverseInputs(rows))};
         }
         listed.init = known.first;
         listed.lsbInit = known.second;

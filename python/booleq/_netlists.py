@@ -155,7 +155,7 @@ class NetlistFinding(NamedTuple):
 
 
 class LoneTable(NamedTuple):
-    """A table of one netlist only; wire says what it passes if it is no more than a wire."""
+    """A table of one netlist only; wire says what it passes if it is only a wire."""
 
     path: str
     net: str
@@ -473,7 +473,8 @@ def read_netlist(source: Source, *, key: Optional[str] = None,
     read by the program yosys. key is an attribute of cells that diff() can match tables by, cells a
     file with more types of cells, top the module that is the design where the file does not say so.
 
-    Fails with an OSError for a file that cannot be opened, with NetlistError for what is no netlist.
+    Fails with an OSError for a file that cannot be opened, with NetlistError for one that is not
+    a netlist.
 
     >>> import io, booleq
     >>> text = ".model m\n.inputs a b\n.outputs y\n.names a b y\n11 1\n.end\n"

@@ -1,5 +1,7 @@
 """What the tests share."""
+import concurrent.futures
 import random
+import time
 from typing import Callable, Iterator
 
 import pytest
@@ -22,3 +24,21 @@ def parity_of_products() -> Callable[[int, int], str]:
         return "(" + " & ".join(generator.choice(["", "~"]) + f"x{k}" for k in chosen) + ")"
 
     return lambda num_inputs, count: " ^ ".join(product(num_inputs) for _ in range(count))
+
+
+@pytest.fixture
+def longest_pause() -> Callable[[Callable[[], object]], float]:
+    """How long this thread stood still, at most, in seconds while another one did the work."""
+
+    def measure(work: Callable[[], object]) -> float:
+        with concurrent.futures.ThreadPoolExecutor(1) as other:
+            done = other.submit(work)
+            longest, last = 0.0, time.monotonic()
+            while not done.done():
+                now = time.monotonic()
+                longest, last = max(longest, now - last), now
+                time.sleep(0.001)
+            done.result()
+            return longest
+
+    return measure

@@ -17,26 +17,16 @@ SECONDS_AFTER = 0.5  # on a machine that does much else; it is some hundredths a
 HARD = "".join(f"(x{k} & x{(k * 7 + 3) % 20} | x{(k * 5 + 1) % 20}) ^ " for k in range(20)) + "x0"
 
 
-def test_the_lock_is_given_up() -> None:
+def test_the_lock_is_given_up(longest_pause: Callable[[Callable[[], object]], float]) -> None:
     """While a column is made, this thread counts on."""
     equation = Equation(" ^ ".join(f"(x{k} & x{(k * 11 + 5) % 29} & x{(k * 3 + 1) % 29})"
                                    for k in range(29)))
-    done = threading.Event()
 
     def work() -> None:
         equation.packed_column()
         equation.binary_init()
-        done.set()
 
-    thread = threading.Thread(target=work)
-    thread.start()
-    longest, last = 0.0, time.monotonic()
-    while not done.is_set():
-        now = time.monotonic()
-        longest, last = max(longest, now - last), now
-        time.sleep(0.001)
-    thread.join()
-    assert longest < 0.5
+    assert longest_pause(work) < 0.5
 
 
 def test_answers_of_threads_are_those_of_one() -> None:

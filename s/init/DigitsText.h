@@ -41,7 +41,7 @@ class KqDigitsText {
     {
     }
 
-    // The column of 1 to 6 variables.  One variable has two rows, which are one hexadecimal digit.
+    // The column of 1 to 6 variables.
     void AppendFewRows(uint64_t word, unsigned int numVariables);
 
     // Makes room for the digits of so many words, where the host's string can.
@@ -54,6 +54,7 @@ class KqDigitsText {
     void AppendWords(const uint64_t* words, size_t numWords);
 
   private:
+    char GetDigit(uint64_t value) const;
     void WriteWords(const uint64_t* words, size_t numWords, char* text) const;
 
     KQ_BASE m_base;

@@ -58,6 +58,49 @@ enum KqBelow : unsigned int {
     KQ_END = 8 // the whole walk
 };
 
+// For visitors that never return to a place.
+struct KqPreOrder {
+    template <class Place>
+    bool Between(Place&, Place&)
+    {
+        return true;
+    }
+    template <class Place>
+    void Leave(Place&)
+    {
+    }
+};
+
+// What is to be done with a place that waits.
+enum KqStage : unsigned int { KQ_TO_ENTER, KQ_AFTER_FIRST, KQ_AFTER_LAST };
+
+template <class Place, bool kIsPreOrder>
+struct KqWaiting {
+    KqStage GetStage() const { return stage; }
+    void Set(const Place& newPlace, KqStage newStage)
+    {
+        place = newPlace;
+        stage = newStage;
+    }
+
+    Place place;
+    KqStage stage;
+};
+
+// A visitor that never returns leaves but places to enter: half the memory of pointers.
+template <class Place>
+struct KqWaiting<Place, true> {
+    static KqStage GetStage() { return KQ_TO_ENTER; }
+    void Set(const Place& newPlace, KqStage newStage)
+    {
+        assert(newStage == KQ_TO_ENTER);
+        (void)newStage;
+        place = newPlace;
+    }
+
+    Place place;
+};
+
 // Walks a tree from 'place' down, in pre-order and, where the visitor asks for it, in post-order.
 // A place is whatever the visitor needs to know of a node, a plain value: a pointer, a pair, a
 // pointer with a depth or a result. The visitor has
@@ -72,11 +115,7 @@ enum KqBelow : unsigned int {
 template <class Place, class Visitor>
 void KqWalk(Place place, Visitor&& visitor)
 {
-    enum STAGE : unsigned int { TO_ENTER, AFTER_FIRST, AFTER_LAST };
-    struct Waiting {
-        Place place; // for TO_ENTER the second one below the place that is done
-        STAGE stage;
-    };
+    typedef KqWaiting<Place, std::is_base_of_v<KqPreOrder, std::decay_t<Visitor>>> Waiting;
     KqStack<Waiting, 64> waiting;
     for (;;) {
         Place first = place;
@@ -84,15 +123,10 @@ void KqWalk(Place place, Visitor&& visitor)
         const unsigned int below = visitor.Enter(place, first, second);
         if ((below & KQ_END) != 0)
             return;
-        if ((below & KQ_RETURN) != 0) {
-            Waiting& top = waiting.Add();
-            top.place = place;
-            top.stage = (below & KQ_BOTH) != 0 ? AFTER_FIRST : AFTER_LAST;
-        } else if ((below & KQ_BOTH) != 0) {
-            Waiting& top = waiting.Add();
-            top.place = second;
-            top.stage = TO_ENTER;
-        }
+        if ((below & KQ_RETURN) != 0)
+            waiting.Add().Set(place, (below & KQ_BOTH) != 0 ? KQ_AFTER_FIRST : KQ_AFTER_LAST);
+        else if ((below & KQ_BOTH) != 0)
+            waiting.Add().Set(second, KQ_TO_ENTER);
         if ((below & (KQ_ONE | KQ_BOTH)) != 0) {
             place = first;
             continue;
@@ -101,17 +135,17 @@ void KqWalk(Place place, Visitor&& visitor)
             if (waiting.IsEmpty())
                 return;
             Waiting& top = waiting.Top();
-            if (top.stage == AFTER_LAST) {
+            if (top.GetStage() == KQ_AFTER_LAST) {
                 visitor.Leave(top.place);
                 waiting.Pop();
                 continue;
             }
             place = top.place;
-            if (top.stage == TO_ENTER) {
+            if (top.GetStage() == KQ_TO_ENTER) {
                 waiting.Pop();
                 break;
             }
-            top.stage = AFTER_LAST;
+            top.Set(place, KQ_AFTER_LAST);
             if (visitor.Between(top.place, place))
                 break;
             visitor.Leave(top.place);
@@ -119,18 +153,5 @@ void KqWalk(Place place, Visitor&& visitor)
         }
     }
 }
-
-// For visitors that never return to a place.
-struct KqPreOrder {
-    template <class Place>
-    bool Between(Place&, Place&)
-    {
-        return true;
-    }
-    template <class Place>
-    void Leave(Place&)
-    {
-    }
-};
 
 #endif

@@ -43,7 +43,7 @@ TARGETS = (
     Target("6 variables set, 20 operators evaluated", "pair", "eval/set_6_and_20_operators/", 5.0),
     Target("200 operators over 30 variables evaluated", "pair", "eval/200_operators/", 8.0),
     Target("12 tokens set", "pair", "set/12_tokens/", 2.0),
-    Target("100 tokens set", "pair", "set/100_tokens/", 2.0),
+    Target("100 tokens set", "pair", "set/100_tokens/", 1.7),
     Target("init value, 6 variables, set and rendered", "pair", "read/round_trip/", 12.0),
     Target("the same, set and evaluated 64 times", "pair", "read/evaluated/", 2.0),
     Target("init value, 16 variables, a digit", "item", "read_back/n=16/", 1.0),

@@ -4,6 +4,7 @@
 
 #include <cassert>
 #include <cstdint>
+#include <cstring>
 #include <utility>
 #include <vector>
 
@@ -11,9 +12,10 @@
 
 constexpr size_t kKqNotFound = SIZE_MAX;
 
-// Few names are searched one by one, by their hashes; more get a hash table of positions, at most
-// half full, so that setting an equation of many names stays in step with its text.
-// Invariant: m_hashes has the hash of every name that was added, in the order of the table.
+// A hash table of positions, so that setting an equation of many names stays in step with its text.
+// For few names it is inside the object, and a position is a byte.
+// Invariants: 1. A table shows the position of every name that was added, and is at most half full.
+// 2. The hashes of all names are in m_first or, once they are too many for it, in m_hashes.
 class KqNameIndex {
   public:
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
@@ -21,6 +23,7 @@ class KqNameIndex {
     // Knows the names that the table has now; those that follow are added one by one.
     explicit KqNameIndex(const std::vector<Variable>& variables) : m_variables(variables)
     {
+        std::memset(m_few, kFree, sizeof m_few);
         for (const Variable& variable : variables)
             Add(KqHashText(variable.first.c_str(), variable.first.length()));
     }
@@ -30,25 +33,31 @@ class KqNameIndex {
     {
         if (!m_slots.empty())
             return m_slots[SlotOf(name, hash)];
-        for (size_t position = 0; position < m_size; ++position) {
-            if (IsAt(position, name, hash))
-                return position;
-        }
-        return kKqNotFound;
+        size_t slot = hash % kFewSlots;
+        while (m_few[slot] != kFree && !IsAt(m_few[slot], name, hash))
+            slot = (slot + 1) % kFewSlots;
+        return m_few[slot] == kFree ? kKqNotFound : m_few[slot];
     }
 
     // The table's next name, which is new.  Fails: std::bad_alloc.
     void Add(uint64_t hash)
     {
-        if (m_size < kInline)
+        if (m_size < kInline) {
             m_first[m_size] = hash;
-        else
+            size_t slot = hash % kFewSlots;
+            while (m_few[slot] != kFree)
+                slot = (slot + 1) % kFewSlots;
+            m_few[slot] = static_cast<uint8_t>(m_size);
+        } else {
             AddToHeap(hash);
+        }
         ++m_size;
     }
 
   private:
     static constexpr size_t kInline = 16;
+    static constexpr size_t kFewSlots = 64;
+    static constexpr uint8_t kFree = 0xff;
 
     bool IsAt(size_t position, const Port::StringBase<char>& name, uint64_t hash) const
     {
@@ -92,6 +101,7 @@ class KqNameIndex {
 
     const std::vector<Variable>& m_variables;
     size_t m_size = 0;
+    uint8_t m_few[kFewSlots]; // no longer looked at once there is a table on the heap
     uint64_t m_first[kInline];
     std::vector<uint64_t> m_hashes; // of all names, once they are too many for m_first
     std::vector<size_t> m_slots;

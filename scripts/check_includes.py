@@ -4,11 +4,9 @@
 usage: check_includes.py ROOT
 
 Checked: the floors (who may include whom), the own header first, no include of a .cpp file, sizes of
-files and functions, plain ASCII, the names of the rooms' headers and in the host's folders, macros,
-foreign declarations, where a test model may look. Exit status: 1 when something was found.
-
-clang-tidy has checks of function sizes and macros too. They count constant tables, see only what one
-compiler is given under one set of conditions, and take minutes; this reads every file in a second.
+files, plain ASCII, the names of the rooms' headers and in the host's folders, foreign declarations,
+where a test model may look. clang-tidy checks functions' sizes, macros and names ('./dev check').
+Exit status: 1 when something was found.
 """
 import pathlib
 import re
@@ -26,11 +24,8 @@ SYSTEM_HEADERS = {"sys/mman.h"}  # large pages for large texts, where the system
 
 MAX_HEADER_LINES = 199
 MAX_SOURCE_LINES = 399
-MAX_FUNCTION_LINES = 59
 
 INCLUDE = re.compile(r'^\s*#\s*include\s*([<"])([^>"]+)[>"]')
-DEFINE = re.compile(r"^\s*#\s*define\s+(\w+)")
-ALLOWED_MACRO = re.compile(r"KQ_EXPORT|KQ_(\w+_)?EMIT|PORT_PRINTF")
 FOREIGN = re.compile(r'^\s*extern\b(?!\s*template)')
 MAIN = re.compile(r"^int main\(")
 
@@ -101,32 +96,11 @@ def check_sizes(path, lines, report):
     if len(counted) > limit:
         report.add(path, 1, f"{len(counted)} lines that are not blank, the limit is {limit}")
 
-    # A brace alone on its line opens a function; the next one alone with the same indent ends it.
-    start, indent = None, ""
-    for index, line in enumerate(lines):
-        if start is None and line.strip() == "{":
-            start, indent = index, line[:line.index("{")]
-        elif start is not None and line == indent + "}":
-            length = sum(1 for at in range(start + 1, index) if at not in tables)
-            if length > MAX_FUNCTION_LINES:
-                report.add(path, start + 1, f"function of {length} lines, "
-                                            f"the limit is {MAX_FUNCTION_LINES}")
-            start = None
-
 
 def check_ascii(path, report):
     for number, line in enumerate(path.read_bytes().split(b"\n"), 1):
         if any(byte > 126 or (byte < 32 and byte != 9) for byte in line):
             report.add(path, number, "not plain ASCII")
-
-
-def check_macros(path, lines, report):
-    guard = re.sub(r"\W", "_", path.name).upper()
-    guards = {guard, "KQ_" + guard}
-    for number, line in enumerate(lines, 1):
-        match = DEFINE.match(line)
-        if match and match[1] not in guards and not ALLOWED_MACRO.fullmatch(match[1]):
-            report.add(path, number, f"macro {match[1]}: only export, assert and diagnostics")
 
 
 def check_library_text(path, lines, report):
@@ -145,7 +119,6 @@ def check_library(root, report):
         check_library_includes(path, lines, report)
         check_own_header(path, lines, report)
         check_sizes(path, lines, report)
-        check_macros(path, lines, report)
         check_library_text(path, lines, report)
 
 
@@ -161,7 +134,6 @@ def check_host(root, report):
                                       and path.suffix == ".cpp"):
                 report.add(path, number, f"may not include {name} here")
         check_sizes(path, lines, report)
-        check_macros(path, lines, report)
 
 
 def check_users(root, report):

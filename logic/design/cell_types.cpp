@@ -326,7 +326,7 @@ bool CellTypes::Add(std::string_view text, const std::string& file, std::string&
 {
     try {
         for (CellType& type : TypeReader().Read(text)) {
-            std::vector<uint32_t>& variants = m_byName[type.name];
+            std::vector<uint32_t>& variants = m_by_name[type.name];
             const auto same = std::find_if(variants.begin(), variants.end(), [&](uint32_t variant) {
                 return HasSamePins(m_types[variant], type);
             });
@@ -359,8 +359,8 @@ bool CellTypes::AddFile(const std::string& file, std::string& fault)
 
 const std::vector<uint32_t>* CellTypes::Find(const std::string& name) const
 {
-    const auto found = m_byName.find(name);
-    return found == m_byName.end() ? nullptr : &found->second;
+    const auto found = m_by_name.find(name);
+    return found == m_by_name.end() ? nullptr : &found->second;
 }
 
 } // namespace booleq

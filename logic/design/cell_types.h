@@ -60,7 +60,7 @@ struct CellType {
     std::string note;            // what it is, of a type that is not read
 };
 
-// Invariant: m_byName leads to all variants of a name; families use one name with other pins.
+// Invariant: m_by_name leads to all variants of a name; families use one name with other pins.
 class CellTypes {
   public:
     // Those that this library knows.
@@ -78,7 +78,7 @@ class CellTypes {
 
   private:
     std::vector<CellType> m_types;
-    std::unordered_map<std::string, std::vector<uint32_t>> m_byName;
+    std::unordered_map<std::string, std::vector<uint32_t>> m_by_name;
 };
 
 } // namespace booleq

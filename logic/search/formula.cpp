@@ -51,7 +51,7 @@ Sides SumInversions(const std::vector<Settled>& operands)
 {
     Sides sums = {0, 0};
     for (const Settled& operand : operands)
-        for (const size_t side : {0, 1})
+        for (const size_t side : {0u, 1u})
             sums[side] += operand.numInversions[side];
     return sums;
 }
@@ -103,7 +103,7 @@ Settled Settle(const Formula& formula)
         return settled;
     }
     const Sides sums = SumInversions(settled.operands);
-    for (const size_t side : {0, 1})
+    for (const size_t side : {0u, 1u})
         settled.numInversions[side] = IsByInversion(sums, side) ? sums[1 - side] + 1 : sums[side];
     return settled;
 }

@@ -18,8 +18,11 @@ namespace booleq_python {
 
 namespace {
 
-struct CoreObject {
+struct CoreHead {
     PyObject_HEAD PyObject* weakReferences;
+};
+
+struct CoreObject : CoreHead {
     Equation value;
 };
 
@@ -263,7 +266,7 @@ PyGetSetDef properties[] = {
     {nullptr, nullptr, nullptr, nullptr, nullptr}};
 
 PyMemberDef members[] = {
-    {"__weaklistoffset__", T_PYSSIZET, offsetof(CoreObject, weakReferences), READONLY, nullptr},
+    {"__weaklistoffset__", T_PYSSIZET, offsetof(CoreHead, weakReferences), READONLY, nullptr},
     {nullptr, 0, 0, 0, nullptr}};
 
 PyType_Slot slots[] = {

@@ -138,7 +138,8 @@ const uint64_t* WordProgram::Run(uint64_t* block, size_t numWords) const
 
 namespace {
 
-// Appends the function of 'rows' over its own inputs, the first of which is input 'first'.
+// Appends the function of 'rows' over its own inputs, the first of which is input 'first'. At most
+// kMaxExpandedInputs deep. NOLINTNEXTLINE(misc-no-recursion)
 uint32_t Expand(const booleq::Rows& rows, uint32_t first, Expression& expression)
 {
     if (booleq::IsZero(rows) || booleq::IsOne(rows))
@@ -169,7 +170,6 @@ uint32_t Expand(const booleq::Rows& rows, uint32_t first, Expression& expression
 
 } // namespace
 
-// Recursive, at most kMaxExpandedInputs deep.
 Expression Expanded(const booleq::Rows& rows)
 {
     assert(rows.NumInputs() <= kMaxExpandedInputs);

@@ -59,8 +59,7 @@ Decision Check(const Expression& expression, Reread& reread, const Limits& limit
 {
     if (reread.isNetwork)
         return DecideEqual(SideOf(expression), SideOf(reread.network, expression.names), limits);
-    reread.expression.names =
-        expression.names; // matched by place: the text spells them differently
+    reread.expression.names = expression.names; // by place: the text spells them differently
     return DecideEqual(expression, reread.expression, limits);
 }
 

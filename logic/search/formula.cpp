@@ -143,8 +143,7 @@ uint32_t Append(const Settled& settled, size_t side, Expression& expression)
     const bool isXor = formula.op == Operator::Xor;
     const bool isInverted = isXor ? own != PlainSide(settled.operands)
                                   : IsByInversion(SumInversions(settled.operands), own);
-    const size_t used =
-        isInverted ? 1 - own : own; // the side of the operands, except for exclusive OR
+    const size_t used = isInverted ? 1 - own : own; // of the operands, except for exclusive OR
     const Operator op = isXor || used == 0 ? formula.op : Dual(formula.op);
     const std::vector<const Settled*> operands = Sorted(settled.operands);
     // With two operands the operator itself is negated.

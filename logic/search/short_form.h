@@ -1,10 +1,4 @@
 // A short expression for a function.
-//
-// Up to four inputs that matter, all expressions are tried (shortest.h), so none is shorter. With
-// more, the function is taken apart. If it is an AND, OR or exclusive OR of functions without a
-// common input, which quantifying over one side shows, it is split into these. Otherwise the best
-// of three is taken: a factored sum of products (cover.h) of the function or of its inversion, and
-// an expansion by one input. That is greedy and may miss the shortest.
 #ifndef BOOLEQ_SEARCH_SHORT_FORM_H
 #define BOOLEQ_SEARCH_SHORT_FORM_H
 
@@ -22,6 +16,11 @@ struct ShortForm {
     size_t numLiterals = 0; // how often inputs are mentioned
 };
 
+// Up to four inputs that matter, all expressions are tried (shortest.h), so none is shorter. With
+// more, the function is taken apart. If it is an AND, OR or exclusive OR of functions without a
+// common input, which quantifying over one side shows, it is split into these. Otherwise the best
+// of three is taken: a factored sum of products (cover.h) of the function or of its inversion, and
+// an expansion by one input. That is greedy and may miss the shortest.
 // The expression is proved equal to the function, row by row, before it is returned.
 // Requires: at most kMaxShortFormInputs inputs.
 ShortForm FindShortForm(const Function& function);

@@ -13,7 +13,7 @@ namespace booleq {
 
 namespace {
 
-constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; a row always has a cube
+constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; the choice always covers
 // Overlapping cubes can have more choices than there are rows; then none is made.
 constexpr uint64_t kChoiceUnits = uint64_t(1) << 23;
 constexpr uint32_t kFixed = UINT32_MAX; // label of cubes that stay

@@ -43,7 +43,7 @@ struct PlaFault {
 };
 
 // Fails: false, with the fault; 'pla' is then unspecified.
-// Cost: in step with the text; memory for about twice the cubes of the rows while it reads.
+// Cost: in step with the text; memory for the cubes of the rows, twice that while it reads.
 bool ReadPla(const std::string& text, Pla& pla, PlaFault& fault);
 
 // Fails: false if a row is both on and off for an output, with the two lines in the fault.

@@ -372,7 +372,7 @@ class PlaReader {
     size_t m_num_outputs = 0;
     size_t m_input_names_line = 0;
     size_t m_output_names_line = 0;
-    std::vector<uint64_t> m_row; // the cube as it is on, free and off
+    std::vector<uint64_t> m_row; // the cubes of the row: on, free and off
     bool m_has_set[3] = {false, false, false};
     size_t m_row_line = 0;
     size_t m_num_digits = 0; // of the row that has begun

@@ -13,8 +13,8 @@ namespace booleq {
 void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,
                  Work& work);
 
-// Removes cubes at the least cost (the number of cubes, then of literals) so that the others and
-// 'free' cover the same rows.
+// Removes cubes so that the rest and 'free' still cover the same rows at the least cost: the number
+// of cubes, then of literals.
 void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free, Work& work);
 
 // Flags the cubes that no other prime can replace.

@@ -25,7 +25,7 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
-constexpr uint64_t kMaxSpentForMore = 14u << 20; // more of a loop that took longer would take long
+constexpr uint64_t kMaxSpentForMore = 14u << 20; // beyond this, going on would take too long
 constexpr size_t kMaxToCompare = 20000;
 constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start with
 constexpr int kPoolRounds = 1;

@@ -1,7 +1,7 @@
 // Tautology and complement of single-output covers by the unate recursive paradigm (R. Brayton, G.
 // Hachtel, C. McMullen, A. Sangiovanni-Vincentelli, Logic Minimization Algorithms for VLSI
-// Synthesis, 1984). A cover is a list of input cubes: NumInputWords() words each, with all bits 1
-// that belong to no input. Recursion is at most as deep as there are inputs.
+// Synthesis, 1984). A cover is a list of input cubes: NumInputWords() words each, in which bits
+// that belong to no input are 1. Recursion is at most as deep as there are inputs.
 #ifndef BOOLEQ_MINIMISE_UNATE_H
 #define BOOLEQ_MINIMISE_UNATE_H
 

@@ -109,7 +109,7 @@ void DropUnate(CubeList& stack, StackPart& part, const std::vector<uint64_t>& bi
             (*labels)[part.first + count] = (*labels)[index];
         CopyCube(stack.At(part.first + count++), cube, numWords);
     }
-    assert(count < part.count); // an input that is not binate occurs
+    assert(count < part.count); // some cube fixes an input that is not binate
     part.count = count;
 }
 

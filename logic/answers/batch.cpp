@@ -15,7 +15,8 @@ namespace booleq {
 
 namespace {
 
-// Above, the library's expression of an init value is too long to be of use: 10,000 characters.
+// With more inputs the library's expression of an init value is too long to be useful: 10,000
+// characters.
 constexpr size_t kMaxWrittenInputs = 10;
 constexpr size_t kMaxShortInputs = 6; // a short form of more takes too long for a table
 
@@ -50,7 +51,7 @@ std::string RowText(const Function& function, uint64_t row)
     return ValuesByName(function.Inputs(), values);
 }
 
-// The first variable that is not listed; null when all are. Those that are come first.
+// The first variable that is not listed; null if all are. Listed variables come first.
 const Port::StringBase<char>* Unlisted(const Kq_BoolEquation& equation, const Reading& reading)
 {
     const size_t numListed = reading.inputs.size();
@@ -58,7 +59,7 @@ const Port::StringBase<char>* Unlisted(const Kq_BoolEquation& equation, const Re
                                                   : nullptr;
 }
 
-// Sets equation and rows from the row's equation over its inputs.
+// Sets 'equation' and 'rows' from the row's equation over its inputs.
 BatchResult ReadEquation(const BatchRow& row, const Listed& listed, Kq_BoolEquation& equation,
                          Rows& rows)
 {
@@ -73,21 +74,21 @@ BatchResult ReadEquation(const BatchRow& row, const Listed& listed, Kq_BoolEquat
     return {};
 }
 
-// Sets the equation from the row's init value over the inputs listed.
+// Sets 'equation' from the row's init value over the listed inputs.
 BatchResult ReadInit(const BatchRow& row, const Listed& listed, Kq_BoolEquation& equation)
 {
     if (row.init.find('\0') != std::string::npos ||
         WidthOfInit(LibraryText(row.init, listed.reading)).numRows == 0 ||
         !Set(equation, row.init, listed))
         return RefuseText("the init value is", row.init, listed.reading);
-    // Read over a name like 'a'+b, an init value has the inputs that its expression has.
+    // Over a name like 'a'+b, an init value has the inputs of the expression that it stands for.
     if (const auto* const name = Unlisted(equation, listed.reading))
         return Fail(BatchOutcome::kDiffers, "the init value has " + Excerpt(ToStd(*name)) +
                                                 ", which is not among the inputs");
     return {};
 }
 
-// A text in the column of init values that is an expression for the library.
+// Refuses a text in the column of init values that the library would read as an expression.
 BatchResult RefuseNoInit(const std::string& text)
 {
     std::string message = "the init value begins neither with 0x or 0b nor with a size";
@@ -128,7 +129,8 @@ BatchResult CompareInit(const BatchRow& row, const Listed& listed, const Rows& r
     return Fail(BatchOutcome::kDiffers, std::move(message));
 }
 
-// The short form up to six inputs, otherwise the one that the library reads the init value as.
+// The short form up to six inputs; otherwise the expression that the library reads the init value
+// as.
 std::string ShortText(const Kq_BoolEquation& equation)
 {
     Function function;
@@ -139,7 +141,7 @@ std::string ShortText(const Kq_BoolEquation& equation)
                              : ToStd(equation.GetEquationAsExpression(true));
 }
 
-// The equation of a row that has an init value and inputs only.
+// Writes the equation of a row that has only an init value and inputs.
 BatchResult WriteEquation(BatchRow& row, const Listed& listed)
 {
     if (!BeginsLikeInit(row.init))

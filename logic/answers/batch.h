@@ -1,5 +1,5 @@
-// One row of a table of functions: inputs, equation and init value, what is missing filled in and
-// what is given compared.
+// One row of a table of functions: inputs, equation and init value. What is missing is filled in,
+// and what is given is compared.
 #ifndef BOOLEQ_ANSWERS_BATCH_H
 #define BOOLEQ_ANSWERS_BATCH_H
 
@@ -15,7 +15,7 @@ namespace booleq {
 
 enum class BatchOutcome {
     kOk,         // all were given and agree
-    kFilled,     // something was missing and is there now
+    kFilled,     // something was missing and has been filled in
     kDiffers,    // what was given does not agree
     kIncomplete, // too little was given, or there is no init value
     kTextRefused // a text was refused
@@ -36,25 +36,25 @@ struct BatchResult {
     std::string message; // for kDiffers, kIncomplete and kTextRefused; one sentence
 };
 
-// Completes rows one after the other. It remembers the lists of inputs that it met lately, as most
-// rows of a table share a few.
-// Threads: any, each with rows and a completer of its own.
+// Completes rows one after another. It remembers recent lists of inputs, because most rows of a
+// table share a few.
+// Threads: any, each with its own rows and its own completer.
 class RowCompleter {
   public:
-    // Fills and compares. Where the outcome is neither kOk nor kFilled, the row is as it was.
-    // An equation without init value gets the hexadecimal one, the binary one over one input,
-    // because that reads back; without inputs it has none. Missing inputs are those of the equation
-    // in order of first occurrence. A missing equation is a short one up to six inputs; above it is
-    // the one the library reads the init value as.
+    // Fills in and compares. Unless the outcome is kOk or kFilled, the row stays as it was.
+    // An equation without an init value gets the hexadecimal one; over one input it gets the binary
+    // one, because that reads back; without inputs it gets none. Missing inputs are those of the
+    // equation in order of first occurrence. A missing equation is a short one up to six inputs;
+    // above that, it is the expression that the library reads the init value as.
     // Cost: that of the column, up to 30 inputs.
     BatchResult Complete(BatchRow& row);
 
-    // Inputs as the library takes them.
+    // Inputs in the form that the library takes.
     struct Listed {
         Reading reading;
         std::vector<Port::StringBase<char>> terms;
-        BatchResult fault;     // of these inputs; kOk for none
-        std::string splitName; // one over which no init value reads back; empty for none
+        BatchResult fault;     // of these inputs; kOk if there is none
+        std::string splitName; // one over which no init value reads back; empty if none
     };
 
   private:

@@ -26,7 +26,7 @@ size_t NumInputsTogether(const Kq_BoolEquation& left, const Kq_BoolEquation& rig
 Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
                          const Limits& limits)
 {
-    // An init value has its rows at hand, and as an expression it may be huge.
+    // An init value has its rows ready, and as an expression it may be huge.
     Function leftColumn;
     Function rightColumn;
     if ((IsInitValue(left) || IsInitValue(right)) &&

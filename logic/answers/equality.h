@@ -1,5 +1,5 @@
-// Whether two equations are one function, and whether one ever has a value: by columns where one is
-// an init value, otherwise by what they say.
+// Whether two equations are the same function, and whether one always has a value: by columns if
+// one is an init value, otherwise by their expressions.
 #ifndef BOOLEQ_ANSWERS_EQUALITY_H
 #define BOOLEQ_ANSWERS_EQUALITY_H
 
@@ -10,11 +10,11 @@
 namespace booleq {
 
 // Requires: both are set.
-// Fails: Undecided as DecideEqual.
+// Fails: Undecided, as in DecideEqual.
 Decision DecideEquations(const Kq_BoolEquation& left, const Kq_BoolEquation& right,
                          const Limits& limits);
 
-// Whether the equation always has the value: Different is an assignment where it has the other.
+// Whether the equation always has the value; Different gives an assignment for which it does not.
 // Requires, Fails: as above.
 Decision DecideValue(const Kq_BoolEquation& equation, bool value, const Limits& limits);
 

@@ -12,7 +12,7 @@ namespace {
 
 constexpr size_t kMaxShortenedInputs = 8;
 
-// The name as this library spells it; empty where it cannot.
+// The name as this library spells it; empty if it cannot.
 std::string OwnName(const std::string& name)
 {
     if (CheckInputs({name}).illegal.empty() && name[0] != '\'')

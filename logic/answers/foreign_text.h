@@ -1,6 +1,7 @@
-// A text of another notation as an expression of this library. In: the text; out: the expression,
-// over names that this library has, or why not.  Fails: fault.
-// Cost: in step with the text; where values are wider than a bit, a search over up to 8 inputs.
+// A text in another notation as an expression of this library.
+// In: the text. Out: the expression, over names that this library has, or why there is none.
+// Fails: fault.  Cost: in step with the text; if values are wider than a bit, a search over up to 8
+// inputs.
 #ifndef BOOLEQ_ANSWERS_FOREIGN_TEXT_H
 #define BOOLEQ_ANSWERS_FOREIGN_TEXT_H
 
@@ -13,16 +14,16 @@
 namespace booleq {
 
 struct ForeignText {
-    std::string fault; // not empty: one sentence, and there is no expression
+    std::string fault; // if not empty: one sentence, and no expression
     Expression expression;
 };
 
 // Names that are not words here, such as "a[0]", get single quotes.
 ForeignText ReadForeignText(const std::string& text, const Notation& notation);
 
-// What the tree says as operators on bits, over its names. Where values are wider than a bit and
-// that shows, a short form of the function.
-// Fails: false, in that case, with more than 8 inputs or where none short enough was found.
+// What the tree means with operators on bits, over its names. If values are wider than a bit and
+// that affects the result, it is a short form of the function.
+// Fails: false in that case, with more than 8 inputs or if no form is short enough.
 bool ToBits(const ForeignTree& tree, const WordFunction& function, Expression& expression);
 
 } // namespace booleq

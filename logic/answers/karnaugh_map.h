@@ -1,4 +1,4 @@
-// How a Karnaugh map lays out the rows of a function: rows and columns stand in Gray code, so
+// How a Karnaugh map arranges the rows of a function: its rows and columns are in Gray code, so
 // neighbours differ in one input.
 #ifndef BOOLEQ_ANSWERS_KARNAUGH_MAP_H
 #define BOOLEQ_ANSWERS_KARNAUGH_MAP_H
@@ -25,7 +25,8 @@ inline std::string GrayBits(size_t value, size_t width)
     return bits;
 }
 
-// The first half of the inputs, rounded down, numbers the rows, the others the columns.
+// The first half of the inputs, rounded down, numbers the map's rows; the others number its
+// columns.
 struct Map {
     explicit Map(const std::vector<std::string>& names)
         : inputs(names), numRowInputs(names.size() / 2),

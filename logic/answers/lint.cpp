@@ -15,7 +15,7 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxNamedInputs = 16;
-constexpr double kMaxCauses = 16; // that lint_reason.h tries
+constexpr double kMaxCauses = 16; // at least as many as lint_reason.h tries
 
 std::string WithoutLineEnd(std::string text)
 {
@@ -24,8 +24,8 @@ std::string WithoutLineEnd(std::string text)
     return text;
 }
 
-// The same names in this library's numbering. A name that the notation folds into another one is
-// that one.
+// Gives the names this library's numbers. A name that the notation does not tell apart from an
+// earlier one becomes that one.
 void Renumber(const Notation& notation, const std::vector<std::string>& names, ForeignTree& tree)
 {
     std::unordered_map<std::string, uint32_t> numbers;
@@ -37,8 +37,8 @@ void Renumber(const Notation& notation, const std::vector<std::string>& names, F
     tree.names = names;
 }
 
-// This library's text for what the other notation reads; empty for a large function that is none of
-// bits.
+// This library's text for what the other notation reads; empty for a large function that operators
+// on bits do not give.
 std::string TextHere(const ForeignTree& tree, const WordFunction& function)
 {
     Expression expression;
@@ -82,7 +82,7 @@ bool IsSameTree(const Expression& left, const Expression& right)
                       });
 }
 
-// Looks for what this library alone is about.
+// Looks for findings that concern this library alone.
 class Linter {
   public:
     Linter(const std::string& text, const Kq_BoolEquation& equation, const Reading& reading,
@@ -120,13 +120,13 @@ class Linter {
         return again.names == m_expression.names;
     }
 
-    // The same tree, with parentheses wherever a reader may doubt.
+    // The same tree, with parentheses wherever a reader could be in doubt.
     std::string ClearText() const
     {
         return WriteOwn(m_expression, OwnSyntax::AsTyped, Parentheses::Clear);
     }
 
-    // "~ |" is an inversion and an operator, "~|" one operator.
+    // "~ |" is an inversion and an operator, "~|" is one operator.
     void CheckBlanks()
     {
         constexpr size_t kMaxPlaces = 20;
@@ -232,7 +232,7 @@ class Linter {
                 Join(unlisted, ", "));
     }
 
-    // Every input at 1 is the last row, which has no digit where some have none.
+    // With every input at 1 it is the last row, which has no digit if any row has none.
     void CheckInitWidth()
     {
         const size_t numInputs = m_expression.names.size();

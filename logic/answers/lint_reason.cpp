@@ -1,5 +1,5 @@
-// A cause is undone by changing the other notation's tree; the causes undone together give this
-// library's function, so the search over sets of them, the small ones first, ends with an answer.
+// A cause is undone by changing the other notation's tree. All causes undone together give this
+// library's function, so a search over sets of causes, small ones first, ends with an answer.
 #include "lint_reason.h"
 
 #include <algorithm>
@@ -11,7 +11,7 @@ namespace booleq {
 
 namespace {
 
-// What can be different there, in the order in which causes are tried and named.
+// What can differ there, in the order in which causes are tried and named.
 enum Cause : unsigned int {
     kGrouping = 1,  // operators have several precedences
     kInversion = 2, // "~" inverts numbers
@@ -36,8 +36,9 @@ Meaning ConstantOf(const ForeignTree& tree, Meaning narrow, Meaning wide)
     return isWide ? wide : narrow;
 }
 
-// This library's grouping of the text with what the notation means by its operators. An operator
-// that is two there ("^~", an exclusive or and an inversion here) keeps this library's meaning.
+// This library's grouping of the text, with the notation's meaning of each operator. What is one
+// operator there and two here ("^~": an exclusive OR and an inversion) keeps this library's
+// meaning.
 ForeignTree Regrouped(const Expression& expression, const ForeignTree& tree)
 {
     const Notation& notation = *tree.notation;
@@ -85,7 +86,7 @@ bool Has(const ForeignTree& tree, Meaning meaning)
         [meaning](const ForeignTree::Node& node) { return node.meaning == meaning; });
 }
 
-// The causes that the text has at all.
+// The causes that can apply to the text.
 unsigned int PossibleCauses(const ForeignTree& tree)
 {
     unsigned int causes = kGrouping;
@@ -114,7 +115,7 @@ unsigned int FindCauses(const Expression& expression, const ForeignTree& tree,
     return possible;
 }
 
-// The binary operators of the text by their level, the tightest first: '"&" binds tighter than "^"
+// Lists the binary operators of the text by level, the tightest first: '"&" binds tighter than "^"
 // there, and "^" tighter than "|"'.
 std::string GroupingReason(const ForeignTree& tree)
 {

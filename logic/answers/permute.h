@@ -10,10 +10,10 @@ namespace booleq {
 
 constexpr size_t kMaxPermuteInputs = 24; // 16 million binary digits
 
-// What keeps 'names' from being an order of inputs: one that is not a name, or is listed twice;
-// empty when nothing does.
+// Why 'names' is not an order of inputs: an entry is not a name, or is listed twice; empty if it is
+// one.
 std::string OrderFault(const std::vector<std::string>& names);
-// The first of 'inputs' that 'order' does not list; empty when it lists all.
+// The first of 'inputs' that 'order' does not list; empty if it lists all.
 std::string FirstUnlisted(const std::vector<std::string>& inputs,
                           const std::vector<std::string>& order);
 

@@ -1,5 +1,5 @@
-// The questions of the public headers about equations: what is decided of them, and how others
-// write them.
+// The questions of the public headers about equations: decisions, and their spelling in other
+// notations.
 #include <kq_logic/convert.h>
 #include <kq_logic/decide.h>
 

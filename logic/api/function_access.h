@@ -1,4 +1,4 @@
-// Between the functions of the public headers and those of the rooms.
+// Converts between the functions of the public headers and those of the rooms.
 #ifndef BOOLEQ_API_FUNCTION_ACCESS_H
 #define BOOLEQ_API_FUNCTION_ACCESS_H
 
@@ -10,7 +10,7 @@
 
 namespace kq_logic {
 
-// Never changed after it was made, so copies share it.
+// It never changes, so copies share it.
 struct Function::Imp {
     booleq::Function function;
 };

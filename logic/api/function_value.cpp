@@ -1,4 +1,4 @@
-// The function of the public headers: a shared one of the rooms.
+// The function of the public headers: it shares a function of the rooms.
 #include <kq_logic/function.h>
 
 #include <set>

@@ -1,4 +1,4 @@
-// Netlists for the public header: designs of the rooms, made into plain values.
+// Netlists for the public header: designs of the rooms, turned into plain values.
 #include <algorithm>
 #include <cassert>
 
@@ -17,7 +17,7 @@ namespace kq_logic {
 
 struct Netlist::Imp {
     booleq::Design design;
-    std::vector<std::string> types; // names of those of the design
+    std::vector<std::string> types; // names of the design's types
 };
 
 struct NetlistAccess {
@@ -26,7 +26,7 @@ struct NetlistAccess {
 
 namespace {
 
-// Fails: false with 'fault', for a file of cell types that cannot be read.
+// Fails: false with 'fault', if a file of cell types cannot be read.
 bool OptionsOf(const NetlistOptions& options, booleq::CellTypes& cellTypes,
                booleq::ReadOptions& own, std::string& fault)
 {
@@ -108,7 +108,7 @@ NetlistFunctionCount ToPublic(const booleq::CountedFunction& counted)
     return count;
 }
 
-// What a design has once its tables are read, beside them.
+// Stores a design that has been read, with the names of its types.
 void Complete(booleq::Design design, Netlist::Imp& imp)
 {
     imp.design = std::move(design);

@@ -1,5 +1,5 @@
-// The questions of the public headers about functions: limits are refused here, the rooms below
-// require them.
+// The questions of the public headers about functions. Limits are checked here, because the rooms
+// below require them.
 #include <cassert>
 #include <utility>
 
@@ -28,7 +28,7 @@ static_assert(kMaxExplainedInputs == booleq::kMaxKindInputs);
 static_assert(kMaxShortFormInputs == booleq::kMaxShortFormInputs);
 static_assert(kMaxMatchedInputs == booleq::kMaxMatchInputs);
 
-// "17 inputs: at most 16 are matched"; empty where there are no more.
+// "17 inputs: at most 16 are matched"; empty if there are no more.
 std::string TooMany(size_t numInputs, size_t maxInputs, const char* done)
 {
     if (numInputs <= maxInputs)
@@ -109,7 +109,7 @@ Matching Match(const Function& first, const Function& second, MatchScope scope,
         matching.sources = found.sources;
         matching.inverted = found.inverted;
         matching.isInverted = found.isInverted;
-        // What is given out is proved, not what the search meant.
+        // This proves what is returned, not what the search meant.
         matching.isFound = Apply(matching, first, second.Inputs()) == second;
         assert(matching.isFound);
         break;

@@ -1,5 +1,5 @@
-// The library dumps the node that broke a tree to the host's message manager; whoever explains a
-// refusal has a better text.
+// Silences the library's messages. The library sends a dump of the node that broke a tree to the
+// host's message manager; callers that explain a refusal have a better text.
 #ifndef BOOLEQ_BASE_MESSAGES_H
 #define BOOLEQ_BASE_MESSAGES_H
 
@@ -14,8 +14,8 @@
 
 namespace booleq {
 
-// Drops the messages of this thread while it lives; those of other threads go on as before.
-// A host whose message manager cannot be redirected keeps its own way.
+// Drops the messages of this thread for as long as the object lives; those of other threads go out
+// as before. If the host's message manager cannot be redirected, nothing changes.
 // Threads: any number of them may be silent, each for as long as it likes.
 template <class Manager, class = void>
 class Silence {
@@ -35,7 +35,7 @@ class Silence<Manager, std::void_t<decltype(Manager::setSink(typename Manager::S
     }
     ~Silence()
     {
-        typename Manager::Sink mine; // destroyed with the mutex free
+        typename Manager::Sink mine; // destroyed after the mutex is released
         Shared& shared = GetShared();
         const std::lock_guard<std::mutex> guard(shared.mutex);
         assert(shared.numSilences > 0 && Depth() > 0);
@@ -47,7 +47,8 @@ class Silence<Manager, std::void_t<decltype(Manager::setSink(typename Manager::S
     Silence& operator=(const Silence&) = delete;
 
   private:
-    // Invariant: our sink is installed while there are silences, 'former' is whose turn it was.
+    // Invariant: our sink is installed while numSilences > 0; 'former' is the sink that it
+    // replaced.
     struct Shared {
         std::mutex mutex;
         size_t numSilences = 0;

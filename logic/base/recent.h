@@ -1,6 +1,6 @@
-// What was made of the keys asked for lately, for work that often meets the same ones again.
+// Keeps the values of recently used keys, for work that often meets the same ones again.
 // In: a key and how to make its value. Out: the value, made once.
-// Fails: as making does; nothing is kept then.
+// Fails: as making the value does; nothing is kept then.
 // Cost: a look-up; memory for kMaxKept values, all of which are dropped when one more comes.
 #ifndef BOOLEQ_BASE_RECENT_H
 #define BOOLEQ_BASE_RECENT_H
@@ -18,7 +18,7 @@ class Recent {
   public:
     static constexpr size_t kMaxKept = 64;
 
-    // The reference holds until the next call.
+    // The reference is valid until the next call.
     template <class Make>
     const Value& Get(const Key& key, const Make& make)
     {

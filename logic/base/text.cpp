@@ -16,18 +16,19 @@ bool IsPrintableByte(char byte)
     return byte >= ' ' && byte <= '~';
 }
 
-// Signs without a picture of their own, some of which turn the direction of the text around them:
-// locales call them printable.
+// Characters without a glyph, which locales call printable all the same. Some of them turn the
+// direction of the text around them.
 bool IsUnseen(uint32_t code)
 {
     return (code >= 0x200b && code <= 0x200f) || (code >= 0x2028 && code <= 0x202e) ||
            (code >= 0x2060 && code <= 0x206f) || code == 0xfeff;
 }
 
-// Bytes of the character of UTF-8 that begins there, and which it is; 0 for none.
+// The length in bytes of the UTF-8 character that begins at 'position', and its code; 0 if there is
+// none.
 size_t ReadCharacter(const std::string& text, size_t position, uint32_t& character)
 {
-    constexpr uint32_t kLowest[] = {0, 0, 0x80, 0x800, 0x10000}; // that takes so many bytes
+    constexpr uint32_t kLowest[] = {0, 0, 0x80, 0x800, 0x10000}; // code for each length
     const auto first = static_cast<unsigned char>(text[position]);
     const size_t length = first < 0xc2   ? 0
                           : first < 0xe0 ? 2
@@ -47,7 +48,7 @@ size_t ReadCharacter(const std::string& text, size_t position, uint32_t& charact
     return character < kLowest[length] || isSurrogate || character > 0x10ffff ? 0 : length;
 }
 
-// Bytes of the printable character that begins there, 0 for none.
+// The length in bytes of the printable character that begins at 'position'; 0 if there is none.
 size_t PrintableLength(const std::string& text, size_t position)
 {
     if (IsPrintableByte(text[position]))
@@ -66,7 +67,7 @@ void ShowUtf8(CharacterTest test)
 
 size_t Width(const std::string& visible)
 {
-    // A character has one byte that does not continue another.
+    // Each character has exactly one byte that is not a continuation byte.
     return static_cast<size_t>(std::count_if(visible.begin(), visible.end(), [](char byte) {
         return (static_cast<unsigned char>(byte) & 0xc0u) != 0x80u;
     }));
@@ -107,7 +108,7 @@ std::string Excerpt(const std::string& text)
 {
     if (text.size() <= kExcerptBytes)
         return Visible(text);
-    size_t length = kExcerptBytes; // and no part of a character
+    size_t length = kExcerptBytes; // or less, so that no character is split
     while (length > kExcerptBytes - 3 &&
            (static_cast<unsigned char>(text[length]) & 0xc0u) == 0x80u)
         --length;

@@ -1,4 +1,4 @@
-// Who watches long work.
+// The watcher of long work, and the threads that do not call it.
 #include "watch.h"
 
 #include <atomic>

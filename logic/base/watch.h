@@ -1,4 +1,4 @@
-// A way out of long work for whoever embeds it: a terminal's interrupt, a deadline.
+// Lets the embedding program stop long work: a terminal's interrupt, a deadline.
 #ifndef BOOLEQ_BASE_WATCH_H
 #define BOOLEQ_BASE_WATCH_H
 
@@ -6,16 +6,16 @@
 
 namespace booleq {
 
-// Called by whatever takes long, columns, comparisons and searches: every few milliseconds, for
-// expressions of over 100,000 operators less often. It may throw, which ends the work; nothing is
-// left half done.  Null: nobody watches, as at first.
+// Called by everything that may take long (columns, comparisons, searches) every few milliseconds;
+// less often for expressions of over 100,000 operators. It may throw, which ends the work; nothing
+// is left half done.  Null, as at first: nobody watches.
 typedef void (*Watcher)();
 void SetWatch(Watcher watcher);
 
 void Watch();
 
-// As long as one lives, Watch() does nothing in its thread: a watcher is called in the thread that
-// a caller waits in, not in those that help it.
+// While one exists, Watch() does nothing in its thread: a watcher is called in the thread in which
+// a caller waits, not in those that help it.
 class WatchPause {
   public:
     WatchPause();
@@ -24,7 +24,7 @@ class WatchPause {
     WatchPause& operator=(const WatchPause&) = delete;
 };
 
-// Every how many words Watch is called where a word's cost is anybody's.
+// Watch is called once in so many words where a word may cost any amount of time.
 constexpr uint64_t kWatchedWords = 16;
 
 // Watch() for Kq_BoolEquation::GetColumn; always true.

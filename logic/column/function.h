@@ -50,7 +50,7 @@ class Function {
     Function Over(const std::vector<std::string>& inputs) const;
 
     // The first row that differs, kNoRow when none does.
-    // Requires: as many inputs; that they are the same is the caller's matter.
+    // Requires: as many inputs; the caller makes sure that they are the same.
     uint64_t FirstDifference(const Function& other) const;
     // Same inputs in the same order and the same rows.
     bool operator==(const Function& other) const;
@@ -61,7 +61,7 @@ class Function {
     Rows m_rows;
 };
 
-// The init value that reads back: hexadecimal, binary over one input.
+// The init value in a form that the library reads back: hexadecimal, binary over one input.
 std::string InitOf(const Rows& rows);
 
 // The names of an equation's variables in their order.

@@ -17,7 +17,7 @@ namespace {
     return (rows.Words()[rows.Size() - 1] & ~RowMask(rows.NumInputs())) == 0;
 }
 
-// The bit of the row number that an input is.
+// The bit of the row number that belongs to an input.
 unsigned int BitOf(const Rows& rows, unsigned int input)
 {
     assert(input < rows.NumInputs());
@@ -236,7 +236,7 @@ bool DependsOn(const Rows& rows, unsigned int input)
     const unsigned int bit = BitOf(rows, input);
     const uint64_t* const words = rows.Words();
     if (bit < 6) {
-        // Beyond the last row a shift brings in zeros only.
+        // A shift brings in only zeros from beyond the last row.
         const uint64_t lower = ~BitPattern(bit) & RowMask(rows.NumInputs());
         return std::any_of(words, words + rows.Size(), [bit, lower](uint64_t word) {
             return ((word ^ (word >> (1u << bit))) & lower) != 0;
@@ -325,7 +325,7 @@ Rows InvertInput(Rows rows, unsigned int input)
 Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order)
 {
     assert(order.size() == rows.NumInputs());
-    // Place by place: what is there moves to where the wanted input comes from.
+    // Place by place: the input that is there moves to where the wanted one comes from.
     std::vector<unsigned int> present(order.size());
     for (unsigned int place = 0; place < present.size(); ++place)
         present[place] = place;
@@ -356,7 +356,7 @@ Rows Restrict(Rows rows, const std::vector<unsigned int>& inputs)
 {
     assert(std::is_sorted(inputs.begin(), inputs.end()));
     assert(inputs.size() <= rows.NumInputs());
-    // The others go in front, where they choose between equal blocks.
+    // The other inputs go to the front, where they choose between equal blocks.
     std::vector<unsigned int> order;
     for (unsigned int input = 0; input < rows.NumInputs(); ++input)
         if (!std::binary_search(inputs.begin(), inputs.end(), input))

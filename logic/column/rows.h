@@ -1,8 +1,8 @@
-// Packed rows, the one form in which functions, covers, matches and short forms hold a column.
-// In: words and a number of inputs. Input 0 is the most significant bit of a row's number, row k is
+// Packed rows: the one form in which functions, covers, matches and short forms hold a column.
+// In: words and a number of inputs. Input 0 is the most significant bit of a row's number; row k is
 // bit k % 64 of word k / 64.
-// Fails: std::bad_alloc only; of up to six inputs nothing is allocated.
-// Cost: each operation is in step with the words, 2^inputs / 64, unless it says otherwise.
+// Fails: std::bad_alloc only; up to six inputs need no allocation.
+// Cost: each operation takes time in step with the words, 2^inputs / 64, unless it says otherwise.
 #ifndef BOOLEQ_COLUMN_ROWS_H
 #define BOOLEQ_COLUMN_ROWS_H
 
@@ -13,21 +13,21 @@
 
 namespace booleq {
 
-constexpr unsigned int kMaxRowInputs = 30; // the library has no column above
+constexpr unsigned int kMaxRowInputs = 30; // the library has no column with more
 
-// Words of a column.  Requires, here and below: at most kMaxRowInputs inputs.
+// Number of words of a column.  Requires, here and below: at most kMaxRowInputs inputs.
 constexpr size_t NumWords(unsigned int numInputs)
 {
     return numInputs <= 6 ? 1 : size_t(1) << (numInputs - 6);
 }
 
-// The bits of every word that are rows.
+// The bits of every word that hold rows.
 constexpr uint64_t RowMask(unsigned int numInputs)
 {
     return numInputs >= 6 ? ~uint64_t(0) : (uint64_t(1) << (1u << numInputs)) - 1;
 }
 
-// The bits of a word whose number has bit 'bit' set.  Requires: bit < 6.
+// The bits of a word whose position in the word has bit 'bit' set.  Requires: bit < 6.
 constexpr uint64_t BitPattern(size_t bit)
 {
     constexpr uint64_t kPatterns[6] = {0xaaaaaaaaaaaaaaaa, 0xcccccccccccccccc, 0xf0f0f0f0f0f0f0f0,
@@ -35,7 +35,7 @@ constexpr uint64_t BitPattern(size_t bit)
     return kPatterns[bit];
 }
 
-// The bits of 'movers' trade places with those 'distance' above them: the delta swap of H. S.
+// The bits of 'movers' trade places with the bits 'distance' above them: the delta swap of H. S.
 // Warren, Hacker's Delight, 2nd edition, section 7-1.
 template <class Word>
 constexpr Word DeltaSwapped(Word word, Word movers, unsigned int distance)
@@ -44,7 +44,7 @@ constexpr Word DeltaSwapped(Word word, Word movers, unsigned int distance)
     return static_cast<Word>(word ^ change ^ (change << distance));
 }
 
-// Word 'word' of the column of input 'input', and beyond the last row, too.
+// Word 'word' of the column of input 'input'. It goes on beyond the last row.
 constexpr uint64_t InputWord(unsigned int numInputs, unsigned int input, uint64_t word)
 {
     const unsigned int bit = numInputs - 1 - input; // of the row number
@@ -71,7 +71,7 @@ class Rows {
     size_t NumRows() const { return size_t(1) << m_num_inputs; } // at most 2^30
     size_t Size() const { return m_num_inputs <= 6 ? 1 : m_words.size(); }
     const uint64_t* Words() const { return m_num_inputs <= 6 ? &m_word : m_words.data(); }
-    // Whoever writes keeps invariant 2.
+    // The caller keeps invariant 2.
     uint64_t* Words() { return m_num_inputs <= 6 ? &m_word : m_words.data(); }
     // Requires: row < NumRows().
     bool At(uint64_t row) const
@@ -82,8 +82,8 @@ class Rows {
 
   private:
     unsigned int m_num_inputs;
-    uint64_t m_word = 0;           // of up to six inputs
-    std::vector<uint64_t> m_words; // of more
+    uint64_t m_word = 0;           // for up to six inputs
+    std::vector<uint64_t> m_words; // for more
 };
 
 bool operator==(const Rows& left, const Rows& right);
@@ -112,7 +112,7 @@ Rows ConstantRows(unsigned int numInputs, bool value);
 // The column of one input.
 Rows InputRows(unsigned int numInputs, unsigned int input);
 
-// The function with an input fixed. It keeps its inputs and does not depend on that one.
+// The function with one input fixed. It keeps all its inputs and does not depend on that one.
 Rows Cofactor(Rows rows, unsigned int input, bool value);
 // Whether any row changes its value when only this input changes.
 bool DependsOn(const Rows& rows, unsigned int input);
@@ -121,21 +121,21 @@ std::vector<unsigned int> Support(const Rows& rows);
 
 // The half in which input 0 is 'isUpper', over the other inputs.  Requires: an input.
 Rows Half(const Rows& rows, bool isUpper);
-// Both halves of a function of one input more.  Requires: as many inputs in both.
+// Both halves joined to a function of one more input.  Requires: as many inputs in both.
 Rows JoinHalves(const Rows& lower, const Rows& upper);
-// Over one input more in front, which has no effect.
+// The function over one more input in front, which has no effect.
 Rows Widen(const Rows& rows);
 
-// Two inputs trade places; the same twice changes nothing.
+// Two inputs trade places; doing it twice changes nothing.
 Rows SwapInputs(Rows rows, unsigned int first, unsigned int second);
-// An input is inverted.
+// Inverts one input.
 Rows InvertInput(Rows rows, unsigned int input);
 // Input k of the result is input order[k] of 'rows'.
 // Requires: order is a permutation of all inputs.  Cost: O(inputs * words).
 Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order);
 // Input k of the result is input numInputs - 1 - k: rows counted from the other end.
 Rows ReverseInputs(Rows rows);
-// Over the inputs 'inputs' alone.  Requires: they are ascending and hold the support.
+// The function over the inputs 'inputs' alone.  Requires: they are ascending and hold the support.
 // Cost: O(inputs * words).
 Rows Restrict(Rows rows, const std::vector<unsigned int>& inputs);
 

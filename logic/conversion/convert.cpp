@@ -26,7 +26,7 @@ void NameEverything(const Expression& expression, const Target& target, const st
     names.unit = namer.NameOther(unit.empty() ? "f" : unit);
 }
 
-// What the file says of names that are not those of the equation.
+// The comments of the file about names that differ from those of the equation.
 std::string NameComments(const Expression& expression, const Target& target,
                          const Conversion& conversion)
 {
@@ -41,7 +41,7 @@ std::string NameComments(const Expression& expression, const Target& target,
     return text;
 }
 
-// Each signal is one edge, however often it is used.
+// Each signal is one edge of the graph, however often it is used.
 Side SideOf(const Network& network, const std::vector<std::string>& names)
 {
     const auto build = [&network](const std::vector<Edge>& inputs, GateGraph& graph) {
@@ -54,12 +54,12 @@ Side SideOf(const Network& network, const std::vector<std::string>& names)
     return {names, build, ToWordFunction(network)};
 }
 
-// Whether what was written says what was meant.
+// Whether the written text says what was meant.
 Decision Check(const Expression& expression, Reread& reread, const Limits& limits)
 {
     if (reread.isNetwork)
         return DecideEqual(SideOf(expression), SideOf(reread.network, expression.names), limits);
-    reread.expression.names = expression.names; // by place: the text spells them in its own way
+    reread.expression.names = expression.names; // by place: the text spells them differently
     return DecideEqual(expression, reread.expression, limits);
 }
 

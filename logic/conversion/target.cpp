@@ -35,7 +35,7 @@ bool ReadOwn(const std::string& text, const Target& /*target*/, const UnitNames&
     return true;
 }
 
-// The tree's names are inputs in the order of the text; the function takes them in their own.
+// The tree's names are inputs in the order of the text; the function takes them in its own order.
 bool ReadForeign(const std::string& text, const Target& target, const UnitNames& names,
                  Reread& reread)
 {
@@ -117,8 +117,8 @@ std::string InCFunction(const std::string& text, const UnitNames& names)
            text + ";\n}\n";
 }
 
-// Inputs are 0 and 1 or truth values; the result is 0 or 1. No name of a built-in function stands
-// there, as an input may have it.
+// Inputs are 0 and 1 or truth values; the result is 0 or 1. The text uses no name of a built-in
+// function, because an input may have that name.
 std::string InPythonFunction(const std::string& text, const UnitNames& names)
 {
     return "def " + names.unit + "(" + Join(names.inputs, ", ") + "):\n    return 1 if " + text +
@@ -134,7 +134,7 @@ std::string InLibertyCell(const std::string& text, const UnitNames& names)
            ") {\n        direction : output;\n        function : \"" + text + "\";\n    }\n}\n";
 }
 
-// Some readers of eqn files stumble over lines of comment.
+// Some readers of eqn files fail on comment lines.
 constexpr const char* kNoComments = nullptr;
 
 constexpr Target kTargets[] = {

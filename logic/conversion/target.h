@@ -1,4 +1,4 @@
-// The table of conversion targets: all that differs from one to the other stands in its row.
+// The table of conversion targets: everything in which they differ is in their rows.
 #ifndef BOOLEQ_CONVERSION_TARGET_H
 #define BOOLEQ_CONVERSION_TARGET_H
 
@@ -11,20 +11,20 @@
 
 namespace booleq {
 
-// Whether a target writes a module, an entity, a function or a cell around the expression when
-// asked, a file in any case, or an expression only.
+// Whether a target never writes a module, an entity, a function or a cell around the expression,
+// writes it when asked, or always writes a whole file.
 enum class Wrapping { Never, Optional, Always };
 
-// What a reading gives, over the inputs of what was written, in their order.
+// What reading a text back gives, over the inputs of what was written, in their order.
 struct Reread {
-    Expression expression; // of a text
-    Network network;       // of a file
+    Expression expression; // from a text
+    Network network;       // from a file
     bool isNetwork = false;
 };
 
 struct Target {
     const char* name;
-    const Notation& (*notation)(); // null: names are the library's, or a file's that takes any
+    const Notation& (*notation)(); // null: names are the library's, or the file takes any
     Wrapping wrapping;
     // Fails: 'fault', for a function that the target cannot hold.
     std::string (*write)(const Expression& expression, const Target& target, const UnitNames& names,
@@ -33,7 +33,7 @@ struct Target {
     bool (*readAgain)(const std::string& text, const Target& target, const UnitNames& names,
                       Reread& reread);
     std::string (*wrap)(const std::string& text, const UnitNames& names); // null: as it is
-    const char* commentStart;                                             // null: without comments
+    const char* commentStart;                                             // null: no comments
     const char* commentEnd;
 };
 
@@ -41,7 +41,7 @@ struct Target {
 const std::vector<Target>& Targets();
 // Null for a word that is not a target.
 const Target* FindTarget(const std::string& name);
-// The target that writes expressions in the notation.  Requires: there is one.
+// The target that writes expressions in the notation.  Requires: there is such a target.
 const Target& TargetOf(const Notation& notation);
 std::vector<std::string> TargetNames();
 

@@ -1,5 +1,5 @@
 // The clauses of an operator are Tseitin's ("On the Complexity of Derivation in Propositional
-// Calculus", 1968), both directions.
+// Calculus", 1968), in both directions.
 #include "cnf.h"
 
 #include <cassert>
@@ -16,7 +16,7 @@ namespace {
 
 constexpr size_t kWatchedNodes = 4096;
 
-// Appends to clauses. A literal is a variable or its negative.
+// Appends to the clauses. A literal is a variable or its negative.
 class CnfWriter {
   public:
     explicit CnfWriter(Cnf& cnf) : m_cnf(cnf)
@@ -82,7 +82,7 @@ class CnfWriter {
     }
 
   private:
-    // A variable that is 1, for constants.
+    // The variable that is always 1, for constants.
     int True()
     {
         if (m_true == 0) {

@@ -1,4 +1,5 @@
-// Whether two columns are one function: for what has rows and no expression, such as init values.
+// Whether two columns are the same function: for functions with rows but no expression, such as
+// init values.
 #ifndef BOOLEQ_DECIDE_COLUMN_DECISION_H
 #define BOOLEQ_DECIDE_COLUMN_DECISION_H
 
@@ -7,8 +8,9 @@
 
 namespace booleq {
 
-// Different at the first row that differs, over the inputs of both; never Undecided.
-// Requires: together at most kMaxFunctionInputs inputs.  Cost: O(n * 2^n / 64) for n of them.
+// The result is Equal, or Different at the first row that differs, over the inputs of both; never
+// Undecided.
+// Requires: at most kMaxFunctionInputs inputs together.  Cost: O(n * 2^n / 64) for n inputs.
 Decision DecideColumns(const Function& left, const Function& right);
 
 } // namespace booleq

@@ -1,4 +1,5 @@
-// The gates that one edge depends on, as a list to evaluate from front to back, 64 rows at a time.
+// The gates that one edge depends on, as a list that is evaluated from front to back, 64 rows at a
+// time.
 #ifndef BOOLEQ_DECIDE_CONE_H
 #define BOOLEQ_DECIDE_CONE_H
 
@@ -9,23 +10,23 @@
 
 namespace booleq {
 
-// Invariants: operands stand before their gates; inputs() are numbers of inputs, ascending.
+// Invariants: operands come before their gates; Inputs() are numbers of inputs, ascending.
 class Cone {
   public:
-    // Cost: O(gates of the graph up to the edge's).
+    // Cost: O(gates of the graph up to the edge's gate).
     Cone(const GateGraph& graph, Edge root);
 
-    // The graph's numbers, ascending, without the constant and the inputs.
+    // Numbers of gates in the graph, ascending, without the constant and the inputs.
     const std::vector<uint32_t>& Gates() const { return m_gates; }
     const std::vector<uint32_t>& Inputs() const { return m_inputs; }
 
-    // The root's values for those of Inputs(). Not for two threads at once.
+    // The root's values for given values of Inputs().  Threads: one at a time.
     uint64_t Evaluate(const std::vector<uint64_t>& inputs);
 
   private:
     struct Step {
         bool isXor;
-        Edge left; // places in the values: the constant, the inputs, the gates
+        Edge left; // as places in m_values: the constant, the inputs, the gates
         Edge right;
     };
     uint64_t ValueOf(Edge edge) const

@@ -1,4 +1,4 @@
-// How long a decision may take: a deadline, and the watcher of whoever embeds it.
+// How long a decision may take: a deadline, and the watcher of the embedding program.
 #ifndef BOOLEQ_DECIDE_DEADLINE_H
 #define BOOLEQ_DECIDE_DEADLINE_H
 
@@ -10,12 +10,12 @@
 namespace booleq {
 
 struct Limits {
-    double seconds = 0; // 0: as long as it takes
+    double seconds = 0; // 0: no limit
 };
 
 class Deadline {
   public:
-    // The time runs from here on.
+    // The time starts here.
     explicit Deadline(const Limits& limits) : m_limits(limits), m_start(Clock::now()) {}
 
     // Calls the watcher, which may throw. Cost: a look at the clock.
@@ -26,7 +26,7 @@ class Deadline {
                std::chrono::duration<double>(Clock::now() - m_start).count() >= m_limits.seconds;
     }
 
-    // The seconds that are left, a little where none are.  Requires: there is a limit.
+    // The seconds that are left; if none are, a tiny positive number.  Requires: there is a limit.
     double Left() const
     {
         const std::chrono::duration<double> passed = Clock::now() - m_start;

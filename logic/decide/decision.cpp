@@ -17,15 +17,15 @@ namespace booleq {
 namespace {
 
 constexpr uint64_t kCheapRowWork = uint64_t(1) << 21; // words computed: some milliseconds
-constexpr uint64_t kFirstRowWork = uint64_t(1) << 24; // to find a first row before asking for it
+constexpr uint64_t kFirstRowWork = uint64_t(1) << 24; // a first row without the solver
 constexpr uint64_t kRandomWork = uint64_t(1) << 20;
 constexpr uint64_t kMinRandomWords = 4;
 constexpr uint64_t kMaxRandomWords = 256;
 constexpr uint64_t kWatchedWork = uint64_t(1) << 16;
-constexpr int kFirstConflicts = 2000; // of one question while gates are joined
+constexpr int kFirstConflicts = 2000; // of one question while gates are merged
 constexpr int kMaxSweepConflicts = 100000;
 
-// One decision: whether an edge, the exclusive or of both expressions, is ever 1.
+// One decision: whether an edge, the exclusive OR of both expressions, is ever 1.
 class Decider {
   public:
     Decider(const Side& left, const Side& right, const Limits& limits)
@@ -94,7 +94,7 @@ class Decider {
         m_decision.isTimeOver = true;
     }
 
-    // Only when the expressions themselves say so, apart from everything that was built of them.
+    // Sets Different only if the expressions themselves differ there, whatever was built from them.
     void SetDifferent(const std::vector<bool>& assignment, Proof proof, bool isFirstRow)
     {
         assert(assignment.size() == m_decision.inputs.size());
@@ -129,7 +129,7 @@ class Decider {
     }
 
     // Inputs that do not matter are 0, so the first row over those that do is the first one.
-    // False when it would be more work, or the time was over before.
+    // Fails: false if it would take more work. True with a verdict, or when the time ran out.
     bool TryAllRows(Cone& cone, uint64_t maxWork)
     {
         const auto numInputs = static_cast<unsigned int>(cone.Inputs().size());
@@ -215,7 +215,7 @@ class Decider {
         }
     }
 
-    // False when the limit on conflicts came first.
+    // False if the limit on conflicts was reached first.
     bool SolveOnce(int maxConflicts)
     {
         Solver solver(Solver::Effort::Thorough, m_deadline);
@@ -242,7 +242,7 @@ class Decider {
         return true;
     }
 
-    // There is a difference; for few inputs the first one is wanted.
+    // There is a difference; with few inputs it must be the first one.
     void FinishDifferent(Cone& cone, const std::vector<bool>& assignment, Proof proof)
     {
         if (m_decision.inputs.size() > kMaxFirstRowInputs) {
@@ -254,7 +254,7 @@ class Decider {
             std::vector<bool> first = assignment;
             const bool isFirst = LowerToFirst(first);
             SetDifferent(first, proof, isFirst);
-        } else if (m_decision.verdict == Verdict::Undecided) { // the time: a later row will do
+        } else if (m_decision.verdict == Verdict::Undecided) { // out of time: a later row will do
             m_decision.reason.clear();
             m_decision.isTimeOver = false;
             SetDifferent(assignment, proof, false);
@@ -262,8 +262,8 @@ class Decider {
         assert(m_decision.verdict != Verdict::Equal);
     }
 
-    // Input by input, the most significant first: 0 where some difference has that, 1 elsewhere.
-    // False when the time was over before; the assignment differs in any case.
+    // Input by input, the most significant first: 0 if some difference has 0 there, otherwise 1.
+    // Fails: false if time runs out first; the assignment is a difference in any case.
     bool LowerToFirst(std::vector<bool>& assignment)
     {
         Solver solver(Solver::Effort::Thorough, m_deadline);
@@ -295,7 +295,7 @@ class Decider {
     const Side& m_right;
     std::vector<uint32_t> m_right_places;
     GateGraph m_graph;
-    Edge m_root = kFalseEdge; // 1 where they differ
+    Edge m_root = kFalseEdge; // 1 if they differ
     Decision m_decision;
 };
 

@@ -1,6 +1,6 @@
-// Gates become clauses of a solver: those that an edge depends on, when it is first asked for.
-// The clauses of a gate are Tseitin's ("On the Complexity of Derivation in Propositional Calculus",
-// 1968), both directions.
+// Gates become clauses of a solver: the gates that an edge depends on, when the edge is first asked
+// for. The clauses of a gate are Tseitin's ("On the Complexity of Derivation in Propositional
+// Calculus", 1968), in both directions.
 #ifndef BOOLEQ_DECIDE_ENCODER_H
 #define BOOLEQ_DECIDE_ENCODER_H
 
@@ -17,10 +17,10 @@ class Encoder {
     // Both outlive the encoder; the graph may grow.
     Encoder(const GateGraph& graph, Solver& solver) : m_graph(graph), m_solver(solver) {}
 
-    // The solver's literal for an edge. Requires: not the constant.
-    // Cost: O(gates that it depends on and that no earlier edge did).
+    // The solver's literal for an edge. Requires: the edge is not the constant.
+    // Cost: O(gates that it depends on and that no earlier edge depended on).
     int LiteralOf(Edge edge);
-    // 0 for an input that nothing depended on so far.
+    // The variable of an input; 0 if nothing has depended on it so far.
     int VariableOf(uint32_t gate) const
     {
         return gate < m_variables.size() ? m_variables[gate] : 0;

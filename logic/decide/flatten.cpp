@@ -10,14 +10,14 @@ namespace {
 
 constexpr size_t kWatchedNodes = 4096;
 
-// What the operator around a node makes of it.
+// How the operator around a node uses it.
 enum class Chain : uint8_t { None, And, Xor };
 struct Context {
-    Chain chain;     // of which the node is an operand
-    bool isInverted; // which takes its inverse
+    Chain chain;     // the chain that the node is an operand of
+    bool isInverted; // the chain takes the inverse of the node
 };
 
-// Every operator as a chain with inversions at its inputs and at its output.
+// Every operator is a chain with inversions at its inputs and at its output.
 struct Shape {
     Chain chain;
     bool invertsInputs;
@@ -55,13 +55,13 @@ bool IsAbsorbed(const Shape& shape, const Context& context)
            (shape.chain == Chain::Xor || shape.invertsOutput == context.isInverted);
 }
 
-// From the root down, by place as evaluation goes: back to front, a node's right operand follows it
-// and the left one comes after all of that.
+// From the root down. Post-order is read from back to front: a node's right operand comes next, and
+// the left one after all of that.
 std::vector<Context> ContextsOf(const Expression& expression)
 {
     std::vector<Context> contexts(expression.nodes.size());
     std::vector<Context> waiting = {
-        {Chain::None, false}}; // those of nodes to come, the next one last
+        {Chain::None, false}}; // contexts of nodes to come, the next one last
     for (size_t index = expression.nodes.size(); index-- > 0;) {
         const Expression::Node& node = expression.nodes[index];
         assert(!waiting.empty());
@@ -72,7 +72,7 @@ std::vector<Context> ContextsOf(const Expression& expression)
         if (!IsBinary(node.op))
             continue;
         const Shape shape = ShapeOf(node.op);
-        // An exclusive or that joins another one hands its inversion to one of its operands.
+        // An exclusive OR that joins another one hands its inversion on to one of its operands.
         const bool handsOn = shape.chain == Chain::Xor && IsAbsorbed(shape, context) &&
                              shape.invertsOutput != context.isInverted;
         waiting.push_back({shape.chain, shape.invertsInputs != handsOn});
@@ -89,14 +89,14 @@ Edge AddExpression(const Expression& expression, const std::vector<Edge>& inputs
     assert(!expression.nodes.empty());
     const std::vector<Context> contexts = ContextsOf(expression);
     std::vector<Edge> operands;
-    std::vector<size_t> counts; // how many of the operands each waiting node has
+    std::vector<size_t> counts; // how many of the operands belong to each waiting node
     for (size_t index = 0; index < expression.nodes.size(); ++index) {
         if (index % kWatchedNodes == 0)
             Watch();
         const Expression::Node& node = expression.nodes[index];
         const bool isInverted = contexts[index].isInverted;
         if (node.op == Operator::Not)
-            continue; // its operand knows
+            continue; // its operand has taken the inversion
         if (!IsBinary(node.op)) {
             const Edge edge = node.op == Operator::Input
                                   ? inputs[node.left]

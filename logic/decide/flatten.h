@@ -1,6 +1,7 @@
-// An expression becomes an edge of a gate graph. Operators that are one associative operator in a
-// row, also across inversions, are one list of operands: so their order and their parentheses
-// leave no trace. Fails: std::bad_alloc, or what the watcher throws. Costs O(n log n) for n nodes.
+// An expression becomes an edge of a gate graph. A run of one associative operator, also across
+// inversions, becomes one list of operands, so the order and the parentheses of operands leave no
+// trace.
+// Fails: std::bad_alloc, or what the watcher throws.  Cost: O(n log n) for n nodes.
 #ifndef BOOLEQ_DECIDE_FLATTEN_H
 #define BOOLEQ_DECIDE_FLATTEN_H
 
@@ -11,7 +12,7 @@
 
 namespace booleq {
 
-// 'inputs' are the edges that the expression's inputs stand for.
+// 'inputs' are the edges for the expression's inputs.
 Edge AddExpression(const Expression& expression, const std::vector<Edge>& inputs, GateGraph& graph);
 
 } // namespace booleq

@@ -1,4 +1,4 @@
-// Folding by what two gates show together: Brummayer, Biere, "Local Two-Level And-Inverter Graph
+// Folding by what two gates together show: Brummayer, Biere, "Local Two-Level And-Inverter Graph
 // Minimization without Blowup", MEMICS 2006.
 #include "gate_graph.h"
 
@@ -38,13 +38,13 @@ GateGraph::GateGraph(uint32_t numInputs) : m_num_inputs(numInputs), m_slots(kFir
         m_gates.push_back({GateKind::Input, input, 0});
 }
 
-// The place of the gate, or the empty one where it would stand.
+// The slot of the gate, or the empty slot where it belongs.
 Edge* GateGraph::Slot(GateKind kind, Edge left, Edge right)
 {
     const size_t mask = m_slots.size() - 1;
     const uint64_t key = uint64_t(left) << 32 | right;
     size_t slot = static_cast<size_t>(Mixed(key + (kind == GateKind::Xor ? 1 : 0))) & mask;
-    while (m_slots[slot] != 0) { // ends: half of the slots are empty
+    while (m_slots[slot] != 0) { // this ends: half of the slots are empty
         const Gate& gate = m_gates[GateOf(m_slots[slot])];
         if (gate.left == left && gate.right == right && gate.kind == kind)
             break;
@@ -82,8 +82,8 @@ Edge GateGraph::FindOrAdd(GateKind kind, Edge left, Edge right)
     return output;
 }
 
-// 'side' may make 'other', a gate of which it is an operand, smaller. True when something was
-// found: the result, or another pair of operands.
+// Uses 'side' to simplify 'other', a gate that has it or its inverse as an operand. True if that
+// gave something: the result, or another pair of operands.
 bool GateGraph::FoldInto(Edge side, Edge& other, Folding& folding) const
 {
     const Gate& gate = m_gates[GateOf(other)];
@@ -120,7 +120,7 @@ bool GateGraph::FoldGates(Edge left, Edge& right, Folding& folding) const
     const Gate& other = m_gates[GateOf(right)];
     if (gate.kind != GateKind::And || other.kind == GateKind::Input)
         return false;
-    if (!IsInverted(left)) { // what holds for an operand holds for both
+    if (!IsInverted(left)) { // what holds for an operand holds for the AND
         for (Edge side : {gate.left, gate.right}) {
             Edge rest = right;
             Folding inner = {false, 0};
@@ -149,7 +149,7 @@ bool GateGraph::FoldGates(Edge left, Edge& right, Folding& folding) const
     return false;
 }
 
-// One step. True when the pair is another one now, or folding.isResult.
+// One step. True if the pair has changed, or if folding.isResult.
 bool GateGraph::FoldPair(Edge& left, Edge& right, Folding& folding) const
 {
     if (left > right)
@@ -166,7 +166,7 @@ bool GateGraph::FoldPair(Edge& left, Edge& right, Folding& folding) const
 Edge GateGraph::And(Edge left, Edge right)
 {
     Folding folding = {false, 0};
-    // Ends: each step without a result replaces an operand by one further down.
+    // This ends: each step without a result replaces an operand by a lower one.
     while (FoldPair(left, right, folding))
         if (folding.isResult)
             return folding.result;
@@ -205,7 +205,7 @@ Edge GateGraph::Xor(Edge left, Edge right)
     return InvertedIf(FindOrAdd(GateKind::Xor, left, right), isInverted);
 }
 
-// Among the sorted operands of an AND, ~(a & b) and ~(~a & ~b) become one exclusive or.
+// Among the sorted operands of an AND, ~(a & b) and ~(~a & ~b) become one exclusive OR.
 Edge* GateGraph::JoinExclusive(Edge* first, Edge* last)
 {
     bool isChanged = false;
@@ -214,7 +214,7 @@ Edge* GateGraph::JoinExclusive(Edge* first, Edge* last)
             continue;
         const Gate gate = m_gates[GateOf(*operand)];
         const Edge twin = Find(GateKind::And, Inverse(gate.left), Inverse(gate.right));
-        if (twin < *operand) // none, or it found this one already
+        if (twin < *operand) // there is none, or it has found this one already
             continue;
         Edge* const found = std::lower_bound(operand, last, Inverse(twin));
         if (found == last || *found != Inverse(twin))

@@ -1,8 +1,8 @@
-// A graph of AND and exclusive-or gates in which no gate stands twice: operands enter, an edge
-// leaves. What is plainly one function becomes one edge while the graph is built, in the manner of
+// A graph of AND and exclusive-OR gates, each of which exists once: operands enter, an edge leaves.
+// Gates that are easily seen to be one function become one edge while the graph is built, as in
 // Kuehlmann, Paruthi, Krohm and Ganai, "Robust Boolean Reasoning for Equivalence Checking and
 // Functional Property Verification", IEEE TCAD 21(12), 2002. Fails: std::bad_alloc only, or an
-// assert above 2^31 gates. Costs constant time a gate.
+// assert above 2^31 gates.  Cost: constant time for each gate.
 #ifndef BOOLEQ_DECIDE_GATE_GRAPH_H
 #define BOOLEQ_DECIDE_GATE_GRAPH_H
 
@@ -12,7 +12,7 @@
 
 namespace booleq {
 
-// A gate's output, or the inverse of it: 2 * gate + (1 when inverted).
+// A gate's output or its inverse: 2 * gate + (1 if inverted).
 typedef uint32_t Edge;
 
 constexpr Edge kFalseEdge = 0; // gate 0 is the constant
@@ -49,9 +49,8 @@ struct Gate {
 
 // Invariants:
 // 1. Gate 0 is the constant 0, gates 1 to NumInputs() are the inputs; any other gate comes after
-//    its operands.
-// 2. Operands of a gate are two different gates, neither the constant, left below right; those of
-//    an exclusive or are not inverted.
+// 2. The operands of a gate are two different gates, neither the constant, left below right; those
+//    of an exclusive OR are not inverted.
 // 3. No two gates have the same kind and operands.
 class GateGraph {
   public:
@@ -66,9 +65,9 @@ class GateGraph {
     Edge Or(Edge left, Edge right) { return Inverse(And(Inverse(left), Inverse(right))); }
     Edge Xor(Edge left, Edge right);
 
-    // One gate after the other over all operands, which come out sorted: the same operands in
-    // another order, or some of them twice, give the same edge. An exclusive or counts how often
-    // each stands there.
+    // A chain of gates over all operands, which are left sorted: the same operands in another
+    // order, or repeated ones, give the same edge. For an exclusive OR it matters how often each
+    // operand occurs.
     // Cost: O(n log n) for n operands.
     Edge AndOfAll(Edge* first, Edge* last);
     Edge XorOfAll(Edge* first, Edge* last);
@@ -81,7 +80,7 @@ class GateGraph {
     bool IsGate(Edge edge, GateKind kind) const { return m_gates[GateOf(edge)].kind == kind; }
     Edge* JoinExclusive(Edge* first, Edge* last);
 
-    // What an AND of two operands is without a gate of its own; see the source.
+    // What an AND of two operands is if it needs no gate; see the source.
     struct Folding {
         bool isResult;
         Edge result;
@@ -92,7 +91,7 @@ class GateGraph {
 
     uint32_t m_num_inputs;
     std::vector<Gate> m_gates;
-    std::vector<Edge> m_slots; // outputs of gates by hash, 0 for none; a power of two of them
+    std::vector<Edge> m_slots; // outputs of gates by hash, 0 if empty; a power of two of them
 };
 
 } // namespace booleq

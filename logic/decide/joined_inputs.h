@@ -8,8 +8,9 @@
 
 namespace booleq {
 
-// Appends to 'inputs' the names of 'right' that it lacks, and returns the place of each in it.
-// Requires: in each list all names are different.
+// Appends to 'inputs' the names of 'right' that it lacks, and returns the place in it of each name
+// of 'right'.
+// Requires: all names in a list are different.
 std::vector<uint32_t> JoinInputs(const std::vector<std::string>& right,
                                  std::vector<std::string>& inputs);
 

@@ -10,7 +10,7 @@ Patterns::Patterns(const GateGraph& graph, const Cone& cone, Edge root)
 {
 }
 
-// In some words, inputs are mostly 0 or mostly 1.
+// In some words the inputs are mostly 0 or mostly 1.
 void Patterns::FillAtRandom(std::vector<uint64_t>& inputs)
 {
     assert(inputs.size() == m_cone.Inputs().size());
@@ -64,7 +64,7 @@ void Patterns::FillAimed(bool aimsAtRoot, std::vector<uint64_t>& inputs)
     }
     for (size_t place = 0; place < inputs.size(); ++place) {
         const Wish& wish = m_wishes[GateOf(m_graph.Input(m_cone.Inputs()[place]))];
-        const uint64_t isFree = ~(wish.one ^ wish.zero); // also where both are wanted
+        const uint64_t isFree = ~(wish.one ^ wish.zero); // also if both are wanted
         inputs[place] = (wish.one & ~isFree) | (m_random() & isFree);
     }
 }

@@ -1,8 +1,8 @@
-// Assignments to tell gates apart, 64 at a time: at random, and so that chosen gates are likely to
-// be 1 or 0. By even chances a gate of many operands would hardly ever change its value. Values are
-// justified backwards from a gate as in test generation: Goel, "An Implicit Enumeration Algorithm
-// to Generate Tests for Combinational Logic Circuits", IEEE TC C-30(3), 1981, but without going
-// back.
+// Assignments that tell gates apart, 64 at a time: random ones, and some that make chosen gates
+// likely to be 1 or 0. With even chances a gate of many operands would hardly ever change its
+// value. Values are justified backwards from a gate as in test generation (Goel, "An Implicit
+// Enumeration Algorithm to Generate Tests for Combinational Logic Circuits", IEEE TC C-30(3),
+// 1981), but without backtracking.
 #ifndef BOOLEQ_DECIDE_PATTERNS_H
 #define BOOLEQ_DECIDE_PATTERNS_H
 
@@ -15,20 +15,21 @@
 
 namespace booleq {
 
-// The same calls give the same values.
+// The same calls always give the same values.
 class Patterns {
   public:
-    // Both outlive the patterns; the cone is one of the graph's.
+    // Both outlive the patterns; the cone belongs to the graph.
     Patterns(const GateGraph& graph, const Cone& cone, Edge root);
 
-    // Values of the cone's inputs, as many.  Cost: O(inputs).
+    // Fills in values of the cone's inputs.  Requires: as many elements.  Cost: O(inputs).
     void FillAtRandom(std::vector<uint64_t>& inputs);
-    // Aimed at the root being 1, when 'aimsAtRoot', and at other gates in the cone.
+    // Aims at making the root 1 if 'aimsAtRoot', otherwise at random values of other gates in the
+    // cone.
     // Cost: O(gates of the cone).
     void FillAimed(bool aimsAtRoot, std::vector<uint64_t>& inputs);
 
   private:
-    // What gates are wanted to be, one assignment in each bit; both for a contradiction.
+    // The values wanted of a gate, one assignment in each bit; both are set for a contradiction.
     struct Wish {
         uint64_t one;
         uint64_t zero;

@@ -1,7 +1,8 @@
 // A solver of clauses. Clauses enter; a satisfying assignment leaves, or that there is none, or
-// that a limit came first. A build without one has the same class and never gets an answer. The
-// search is that of CaDiCaL: Biere, Fazekas, Fleury, Heisinger, "CaDiCaL, Kissat, Paracooba,
-// Plingeling and Treengeling Entering the SAT Competition 2020", University of Helsinki, 2020.
+// that a limit was reached first. A build without a solver has the same class, which never finds an
+// answer. The search is that of CaDiCaL: Biere, Fazekas, Fleury, Heisinger, "CaDiCaL, Kissat,
+// Paracooba, Plingeling and Treengeling Entering the SAT Competition 2020", University of Helsinki,
+// 2020.
 #ifndef BOOLEQ_DECIDE_SOLVER_H
 #define BOOLEQ_DECIDE_SOLVER_H
 
@@ -17,7 +18,7 @@ namespace booleq {
 class Solver {
   public:
     enum class Effort {
-        Quick,   // many small questions: no simplifying between them
+        Quick,   // many small questions: no simplification between them
         Thorough // one hard question
     };
     enum class Answer { Satisfiable, Unsatisfiable, Unknown };
@@ -33,19 +34,19 @@ class Solver {
     // Whether this build has a solver; without one every answer is Unknown.
     static bool IsThere();
 
-    // Writes every step of the search to a file, as text in the format DRAT.
-    // Requires: no clause was added.  Fails: false when the file cannot be opened.
+    // Writes every step of the search to a file, as text in the DRAT format.
+    // Requires: no clause was added.  Fails: false if the file cannot be opened.
     bool TraceTo(const std::string& path);
-    // Closes the file.  Requires: TraceTo succeeded.  Fails: false when something was not written.
+    // Closes the file.  Requires: TraceTo succeeded.  Fails: false if something was not written.
     bool EndTrace();
 
     void Add(std::initializer_list<int> clause);
     // For clauses of any length: literals one by one, then 0.
     void AddLiteral(int literal);
 
-    // With the assumptions, for this question only. The watcher is called meanwhile; what it throws
-    // leaves here, and the solver can be asked again.
-    // Fails: Unknown, after 'maxConflicts' conflicts or when out of time.
+    // The assumptions hold for this question only. The watcher is called meanwhile; what it throws
+    // is passed on, and the solver can be asked again.
+    // Fails: Unknown, after 'maxConflicts' conflicts or when the time has run out.
     Answer Solve(std::initializer_list<int> assumptions, int maxConflicts = kNoLimit);
 
     // Requires: the last answer was Satisfiable.

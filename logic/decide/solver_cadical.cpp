@@ -27,7 +27,7 @@ struct Solver::State : CaDiCaL::Terminator {
     std::exception_ptr thrown;
     Answer lastAnswer = Answer::Unknown;
     std::unique_ptr<FILE, int (*)(FILE*)> trace{nullptr, fclose};
-    CaDiCaL::Solver solver; // last: it goes first
+    CaDiCaL::Solver solver; // last, so that it is destroyed first
 };
 
 Solver::Solver(Effort effort, const Deadline& deadline) : m_state(new State(deadline))

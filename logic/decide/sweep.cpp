@@ -13,8 +13,8 @@ namespace {
 constexpr size_t kManyGates = 100000;
 constexpr size_t kWords = 32;
 constexpr size_t kWordsOfMany = 8;
-constexpr int kMaxVariables = 2000;              // of the solver before it starts afresh
-constexpr size_t kMaxTries = 8;                  // gates that one is compared with
+constexpr int kMaxVariables = 2000;              // of the solver before it starts again
+constexpr size_t kMaxTries = 8;                  // number of gates that one is compared with
 constexpr uint64_t kMaxWork = uint64_t(1) << 31; // about two seconds
 constexpr size_t kWatchedGates = 256;
 
@@ -98,7 +98,7 @@ void Sweep::SimulateNew()
     }
 }
 
-// The same for a gate and its inverse; from random values only, which stay.
+// The same for a gate and its inverse. Only the values that stay are used.
 uint64_t Sweep::SignatureOf(uint32_t gate)
 {
     const uint64_t* const words = WordsOf(gate);
@@ -121,7 +121,8 @@ bool Sweep::MayBeOne(uint32_t gate, uint32_t other)
         [inverts](uint64_t left, uint64_t right) { return left == (right ^ inverts); });
 }
 
-// The edge that a new gate is, an older one or its own; then others may turn out to be this one.
+// The edge for a new gate: an older one's, or its own; then later gates can turn out to be this
+// one.
 Edge Sweep::Merge(uint32_t gate)
 {
     size_t numTries = 0;
@@ -149,7 +150,7 @@ Edge Sweep::Merge(uint32_t gate)
     return OutputOf(gate);
 }
 
-// An assignment for which they do is learnt.
+// If they differ for an assignment, it is learnt.
 Solver::Answer Sweep::AskWhetherTheyDiffer(Edge edge, Edge other)
 {
     if (m_deadline.IsOver())
@@ -176,7 +177,7 @@ Solver::Answer Sweep::AskWhetherTheyDiffer(Edge edge, Edge other)
     return answer;
 }
 
-// The solver's assignment takes the place of the oldest learnt word, with 63 neighbours.
+// The solver's assignment and 63 neighbours replace the oldest learnt word.
 void Sweep::LearnFromModel()
 {
     const size_t word = m_next_learnt++;

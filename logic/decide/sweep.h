@@ -1,8 +1,8 @@
-// Gates that are one function, or inverse ones, become one gate. A graph and an edge of it enter, a
-// smaller graph and edge leave. Which gates may be one is seen from their values for random
-// assignments; a solver proves it, or gives an assignment that tells more gates apart.
-// Mishchenko, Chatterjee, Jiang, Brayton, "FRAIGs: A Unifying Representation for Logic Synthesis
-// and Verification", ERL Technical Report, UC Berkeley, 2005.
+// Gates that are the same function, or inverse ones, become one gate. A graph and an edge of it
+// enter; a smaller graph and an edge leave. Random assignments show which gates may be the same;
+// the solver proves it, or gives an assignment that tells more gates apart. Mishchenko, Chatterjee,
+// Jiang, Brayton, "FRAIGs: A Unifying Representation for Logic Synthesis and Verification", ERL
+// Technical Report, UC Berkeley, 2005.
 #ifndef BOOLEQ_DECIDE_SWEEP_H
 #define BOOLEQ_DECIDE_SWEEP_H
 
@@ -21,15 +21,16 @@ namespace booleq {
 
 class Sweep {
   public:
-    // 'maxConflicts' bounds each question to the solver. Ends early, with gates left alone, when
-    // out of time. The deadline outlives the sweep; the graph may go. Fails: std::bad_alloc,
-    // or what the watcher throws.
+    // 'maxConflicts' limits each question to the solver. When the time runs out, the rest of the
+    // gates stay as they are. The deadline outlives the sweep; the graph need not.
+    // Fails: std::bad_alloc, or what the watcher throws.
     Sweep(const GateGraph& graph, Edge root, int maxConflicts, const Deadline& deadline);
 
-    // Over the same inputs. The root is as the one that entered.
+    // The graph has the same inputs. The root is the same function as the one that entered.
     const GateGraph& Graph() const { return m_graph; }
     Edge Root() const { return m_root; }
-    // Some assignment met on the way makes the root 1. Its values, by input; empty when none does.
+    // The values, by input, of an assignment met on the way that makes the root 1; empty if none
+    // does.
     const std::vector<bool>& Witness() const { return m_witness; }
 
   private:
@@ -51,18 +52,19 @@ class Sweep {
     int m_max_conflicts;
     std::mt19937_64 m_random;
 
-    // Values: m_num_words for each gate, the first half random, the others from the solver.
+    // Values: m_num_words for each gate. The first half stays; the solver's assignments replace the
+    // rest.
     size_t m_num_words;
     size_t m_next_learnt;
     std::vector<uint64_t> m_values;
-    std::unordered_map<uint64_t, uint32_t> m_first; // gates by signature; 0 ends a list
+    std::unordered_map<uint64_t, uint32_t> m_first; // the first gate by signature; 0 ends a list
     std::vector<uint32_t> m_next;
-    std::vector<Edge> m_merged; // what a gate was found to be
+    std::vector<Edge> m_merged; // the edge that each gate was found to be
 
     std::unique_ptr<Solver> m_solver;
     std::unique_ptr<Encoder> m_encoder;
-    bool m_is_asking;    // until a limit is reached
-    uint64_t m_work = 0; // values computed again
+    bool m_is_asking;    // false once a limit is reached
+    uint64_t m_work = 0; // number of values computed again
 };
 
 } // namespace booleq

@@ -13,7 +13,7 @@ namespace {
 
 typedef Kq_BoolEquationImp::Node LibraryNode;
 
-// By operator, from And on; then by style.
+// The rows are the operators from And on; the columns are the styles.
 constexpr const char* kBinarySpellings[][3] = {
     {"&", "*", ".AND."},    {"|", "+", ".OR."},    {"^", "@", ".XOR."},
     {"~&", "~*", ".NAND."}, {"~|", "~+", ".NOR."}, {"~^", "~@", ".NXOR."},
@@ -51,7 +51,8 @@ Operator OperatorOf(LibraryNode::TYPE type)
     return Operator::Zero;
 }
 
-// The first node at or below 'node' that is not a group and no init value; null for an empty group.
+// The first node at or below 'node' that is neither a group nor an init value; null for an empty
+// group.
 const LibraryNode* Inside(const LibraryNode* node)
 {
     while (node && (node->IsLp() || node->GetType() == LibraryNode::TRUTH_TABLE))
@@ -67,8 +68,8 @@ uint32_t Add(Expression& expression, Operator op, uint32_t left, uint32_t right)
     return static_cast<uint32_t>(expression.nodes.size() - 1);
 }
 
-// Appends what stands for 'node', whose operands were appended last; 'operands' are the results
-// that wait for their operator.
+// Appends the node that stands for 'node', whose operands were appended last; 'operands' are the
+// results that wait for their operator.
 void Append(Expression& expression, const LibraryNode* node, std::vector<uint32_t>& operands)
 {
     const Operator op = node ? OperatorOf(node->GetType()) : Operator::Zero;
@@ -123,7 +124,7 @@ Expression ToExpression(const Kq_BoolEquation& equation)
     expression.names = InputNames(equation);
     struct Visit {
         const LibraryNode* node;
-        bool hasOperands; // they were appended
+        bool hasOperands; // they have been appended
     };
     std::vector<uint32_t> operands;
     std::vector<Visit> pending = {{Inside(equation.GetImp()->GetRoot()), false}};

@@ -31,10 +31,11 @@ struct Expression {
         uint32_t right;   // node of a binary operator's second operand
     };
     std::vector<Node> nodes;
-    std::vector<std::string> names; // first is the most significant
+    std::vector<std::string> names; // the first is the most significant
 };
 
-// Appends a node and returns its number. Requires: the operands are where post-order wants them.
+// Each appends a node and returns its number. Requires: the operands are where post-order wants
+// them.
 uint32_t AddInput(Expression& expression, uint32_t input);
 uint32_t AddConstant(Expression& expression, bool value);
 uint32_t AddNot(Expression& expression, uint32_t operand);
@@ -45,13 +46,13 @@ uint32_t AddBinary(Expression& expression, Operator op, uint32_t left, uint32_t 
 // Cost: in step with the equation; no recursion.
 Expression ToExpression(const Kq_BoolEquation& equation);
 
-// The library's spelling of an operator: style 0 writes & | ^ ~, 1 writes * + @, 2 writes .AND.;
-// 4 added writes '!' for '~'. Binary operators and NOT only.
+// The library's spelling of an operator: style 0 writes & | ^ ~, style 1 writes * + @, style 2
+// writes .AND.; adding 4 writes '!' for '~'. Binary operators and NOT only.
 std::string SpellOperator(Operator op, uint8_t style);
-// The style of an operator as it was typed.
+// The style in which an operator was typed.
 uint8_t StyleOf(const std::string& token);
 
-// The value for 64 assignments at once, one for each bit: inputs[k] holds input k's values.
+// The values for 64 assignments at once, one in each bit: inputs[k] holds input k's values.
 // 'stack' is scratch space. Cost: O(nodes).
 uint64_t EvaluateWord(const Expression& expression, const std::vector<uint64_t>& inputs,
                       std::vector<uint64_t>& stack);

@@ -18,7 +18,7 @@ bool IsDigit(char character)
     return character >= '0' && character <= '9';
 }
 
-// 16 for what is not a digit.
+// The value of a hexadecimal digit; 16 for any other character.
 unsigned int HexDigit(char character)
 {
     if (IsDigit(character))
@@ -27,7 +27,7 @@ unsigned int HexDigit(char character)
     return lower >= 'a' && lower <= 'f' ? static_cast<unsigned int>(lower - 'a') + 10 : 16;
 }
 
-// Where the parts of a sized literal stand; quote is npos where the text is none.
+// Where the parts of a sized literal are; quote is npos if the text is not one.
 struct Parts {
     size_t start = 0;
     size_t quote = std::string::npos;
@@ -46,7 +46,7 @@ Parts FindParts(const std::string& text)
         ++position;
     const bool isSized = position > parts.start && position < parts.end && text[position] == '\'' &&
                          position + 1 < parts.end && text[position + 1] != '\'';
-    // A quoted name has a second quote.
+    // A second quote would make it a quoted name.
     if (isSized && text.find('\'', position + 1) == std::string::npos)
         parts.quote = position;
     return parts;
@@ -64,7 +64,7 @@ InitLiteral Refused(const char* code, size_t offset, size_t length, std::string 
     return literal;
 }
 
-// The digits as bits of the base, without what only separates them, and with the zeros left out.
+// The digits in the base, without separators and with the zeros that were left out.
 InitLiteral ReadDigits(const std::string& text, const Parts& parts, uint64_t numRows)
 {
     const bool isHex = (text[parts.quote + 1] | 0x20) == 'h';
@@ -94,7 +94,7 @@ InitLiteral ReadDigits(const std::string& text, const Parts& parts, uint64_t num
     return literal;
 }
 
-// The same digits with the size of the inputs listed, or the inputs for the size.
+// Suggests the same digits with the size of the listed inputs, or the inputs for the size.
 std::string SizeHint(const std::string& text, const Parts& parts, uint64_t numRows)
 {
     const std::string size = text.substr(parts.start, parts.quote - parts.start);
@@ -138,7 +138,7 @@ InitLiteral ReadInitLiteral(const std::string& text, size_t numInputs)
     literal.text = text;
     if (parts.quote != std::string::npos)
         literal = ReadSized(text, parts, numInputs);
-    // The library takes a hexadecimal digit for four rows, and one input has two.
+    // The library reads a hexadecimal digit as four rows, and one input has two.
     const bool isLoneDigit = numInputs == 1 && literal.text.size() == 3 && literal.text[0] == '0' &&
                              (literal.text[1] | 0x20) == 'x' && HexDigit(literal.text[2]) < 4;
     if (isLoneDigit && !literal.code) {

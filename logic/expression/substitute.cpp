@@ -9,7 +9,7 @@ namespace booleq {
 
 namespace {
 
-// Appends the nodes of 'expression', its input k being input places[k]; gives back the root.
+// Appends the nodes of 'expression' with input k renumbered places[k]; returns the root.
 uint32_t AppendAll(const Expression& expression, const std::vector<uint32_t>& places,
                    Expression& result)
 {
@@ -29,8 +29,8 @@ uint32_t AppendAll(const Expression& expression, const std::vector<uint32_t>& pl
     return static_cast<uint32_t>(result.nodes.size() - 1);
 }
 
-// Builds an expression without constants. An operand waits as a constant, or as the nodes from
-// 'start' on, of which the last one is its root.
+// Builds an expression without constants. An operand on the stack is a constant, or the nodes from
+// 'start' on, the last of which is its root.
 class Folder {
   public:
     explicit Folder(Expression& result) : m_result(result) {}
@@ -101,7 +101,7 @@ class Folder {
         const bool constant = left.isConstant ? left.value : right.value;
         const bool isParity = node.op == Operator::Xor || node.op == Operator::Nxor;
         const bool isAnd = node.op == Operator::And || node.op == Operator::Nand;
-        if (left.isConstant) { // and has no nodes, so the right one's are where they belong
+        if (left.isConstant) { // it has no nodes, so the right one's are where they belong
             assert(left.start == right.start);
             left = right;
             if (right.isConstant) {
@@ -132,7 +132,7 @@ Expression Substituted(const Expression& expression, const std::vector<Substitut
     assert(substitutes.size() == expression.names.size());
     Expression result;
     result.names = std::move(names);
-    std::vector<uint32_t> roots; // of what stands for each node
+    std::vector<uint32_t> roots; // of what replaces each node
     roots.reserve(expression.nodes.size());
     for (Expression::Node node : expression.nodes) {
         const Substitute* const substitute =

@@ -29,7 +29,7 @@ std::string DotString(const std::string& text)
 
 } // namespace
 
-// With a stack of its own, as the text decides the depth.
+// Uses an explicit stack, because the text decides the depth.
 TreeList::TreeList(const Kq_BoolEquation& equation)
 {
     struct Pending {

@@ -11,9 +11,9 @@
 
 namespace booleq {
 
-// The nodes in pre-order, left before right; a node's number is its place. A group is one node, its
-// ")" is left out. An init value is shown as the expression that it stands for.
-// Requires: the equation is set, and stays as it is while its list is used.
+// The nodes in pre-order, left before right; a node's number is its place. A group is one node, and
+// its ")" is left out. An init value is shown as the expression that it stands for.
+// Requires: the equation is set, and does not change while its list is used.
 // Cost: in step with the equation; no recursion.
 class TreeList {
   public:
@@ -32,7 +32,7 @@ class TreeList {
     std::string TypeName(size_t index) const;
     // As it was typed; "( )" for a group.
     std::string Token(size_t index) const;
-    // For people: type and token of operators and groups, names and constants as they are.
+    // For people: type and token of operators and groups; names and constants as typed.
     std::string Label(size_t index) const;
     bool IsName(size_t index) const;
 
@@ -41,7 +41,7 @@ class TreeList {
     std::vector<const void*> m_nodes; // the engine's, one for each entry
 };
 
-// The graph piece by piece, as 'put' is called with it.
+// Writes the graph by calling 'put' with one piece after another.
 void PutDot(const TreeList& list, const std::function<void(const std::string&)>& put);
 
 } // namespace booleq

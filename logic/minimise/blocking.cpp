@@ -8,7 +8,7 @@ namespace booleq {
 
 namespace {
 
-// Drops sets that hold another one.
+// Drops sets that contain another one.
 void KeepMinimal(CubeList& sets, Work& work)
 {
     sets.SortAndUnite();
@@ -33,7 +33,8 @@ void KeepMinimal(CubeList& sets, Work& work)
     sets = minimal;
 }
 
-// The parts that alone keep 'cube' from cubes of a block. Requires: it meets none of them.
+// Adds the parts each of which alone keeps 'cube' from a cube of the block.  Requires: 'cube' meets
+// none of the block.
 void AddSingles(const CubeColumns& cubes, size_t block, const ColumnsToMeet& toMeet,
                 uint64_t* singles)
 {
@@ -57,8 +58,8 @@ void AddSingles(const CubeColumns& cubes, size_t block, const ColumnsToMeet& toM
             SetBit(singles, part);
 }
 
-// The sets of one off cube, one for each of its outputs when no output is common, without those
-// that have a part of 'singles'.
+// The sets of one off cube, without those that have a part of 'singles'. There is one for each of
+// its outputs if no output is common, otherwise one.
 void AppendSets(const CubeSpace& space, const uint64_t* off, const uint64_t* cube,
                 const std::vector<uint64_t>& singles, CubeList& sets)
 {
@@ -96,8 +97,8 @@ CubeList FindBlockingSets(const CubeSpace& space, const CubeIndex& off, const ui
     if (!ListColumns(space, cube, toMeet))
         return sets;
     work.Spend(columns.NumBlocks() * (toMeet.inputs.size() + toMeet.outputs.size() + 1));
-    // Sets of one part, from off cubes that are one part away; with one of these in a set that set
-    // says nothing new.
+    // Sets of one part come from off cubes that are one part away. A set that contains one of these
+    // parts says nothing new.
     std::vector<uint64_t> singles(numWords);
     for (size_t block = 0; block < columns.NumBlocks(); ++block)
         AddSingles(columns, block, toMeet, singles.data());
@@ -148,7 +149,7 @@ class HittingSearch {
     {
         Rows uncovered(m_num_row_words);
         for (size_t row = 0; row < m_blocking.Size(); ++row) {
-            bool isOpen = true; // not met by a part that counts as chosen
+            bool isOpen = true; // no part that counts as chosen meets it
             for (size_t word = 0; word < m_space.NumWords(); ++word)
                 isOpen = isOpen && (m_blocking.At(row)[word] & ~parts[word]) == 0;
             if (!isOpen)
@@ -171,7 +172,7 @@ class HittingSearch {
   private:
     typedef std::vector<uint64_t> Rows;
 
-    // Invariant: each chosen part has a row that only it meets (m_critical).
+    // Invariant: for each chosen part there is a row that only this part meets (m_critical).
     bool Find(const Rows& uncovered)
     {
         m_work.Spend(m_num_row_words * (m_critical.size() + 1) + 1);
@@ -222,7 +223,7 @@ class HittingSearch {
         return isAll;
     }
 
-    // The uncovered row with the fewest candidates; false when there is none.
+    // The uncovered row with the fewest candidates. False if there is none.
     bool ChooseRow(const Rows& uncovered, size_t& best) const
     {
         size_t fewest = SIZE_MAX;

@@ -1,5 +1,5 @@
-// Complement by unate recursion. What both halves of a split have is merged again; parts of up to
-// six inputs are covered as a word of rows.
+// Complement by unate recursion. Cubes that both halves of a split have are merged again; parts of
+// up to six inputs are covered as a word of rows.
 #include <algorithm>
 
 #include "cofactors.h"
@@ -12,7 +12,7 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxPairsToLift = size_t(1) << 16; // beyond that only equal cubes are merged
-// A complement that takes more work for each cube it may have is as good as too large.
+// A complement that takes more work than this for each cube that it may have counts as too large.
 constexpr uint64_t kMaxUnitsForCube = 1u << 9;
 
 class ComplementSearch {
@@ -27,7 +27,7 @@ class ComplementSearch {
     {
     }
 
-    // Once IsTooLarge() the result means nothing.  Depth: one level for each input.
+    // After IsTooLarge() the result is meaningless.  Depth: one level for each input.
     CubeList Find(StackPart part)
     {
         CubeList result(m_num_words);
@@ -47,8 +47,8 @@ class ComplementSearch {
     bool IsTooLarge() const { return m_is_too_large; }
 
   private:
-    // Literals that all cubes have: the opposite of each is a cube of the complement, and the cubes
-    // lose them. Returns the cube of these literals.
+    // Handles literals that all cubes have: the opposite of each is a cube of the complement, and
+    // the cubes lose them. Returns the cube of these literals.
     std::vector<uint64_t> TakeOutCommon(StackPart part, CubeList& result)
     {
         std::vector<uint64_t> common(m_num_words);
@@ -127,7 +127,7 @@ class ComplementSearch {
             if (m_is_too_large)
                 return;
         }
-        // A row that is left out where the input covers more is left out for both values.
+        // A row that is left out for the value where more is covered is left out for both values.
         if (!hasZeros)
             Unite(halves[1], halves[0], bit + 1, result);
         else if (!hasOnes)
@@ -136,7 +136,8 @@ class ComplementSearch {
             Merge(halves[0], halves[1], bit, result);
     }
 
-    // 'both' for either value; those of 'one' that do not lie in it for one value only.
+    // Appends 'both' for either value, and the cubes of 'one' that lie in none of these for one
+    // value.
     void Unite(const CubeList& both, const CubeList& one, size_t bitToClear, CubeList& result)
     {
         const std::vector<uint8_t> isIn = FindContained(one, both);
@@ -146,7 +147,7 @@ class ComplementSearch {
                 AppendWithout(one.At(index), bitToClear, result);
     }
 
-    // Which of 'cubes' lie in a cube of 'holders'; where there are many, which are equal to one.
+    // Which of 'cubes' lie in a cube of 'holders'; with many pairs, only which are equal to one.
     std::vector<uint8_t> FindContained(const CubeList& cubes, const CubeList& holders)
     {
         std::vector<uint8_t> isIn(cubes.Size(), 0);
@@ -175,7 +176,7 @@ class ComplementSearch {
         size_t numSlots = 2;
         while (numSlots < 2 * holders.Size())
             numSlots *= 2;
-        std::vector<uint32_t> slots(numSlots, UINT32_MAX); // a holder, or none; half are free
+        std::vector<uint32_t> slots(numSlots, UINT32_MAX); // a holder or none; half are free
         const auto slotOf = [&](const uint64_t* cube) {
             uint64_t hash = 0;
             for (size_t word = 0; word < m_num_words; ++word)

@@ -8,7 +8,7 @@ namespace booleq {
 
 namespace {
 
-// A hash of a set in which a subset's bits are a subset.
+// A hash of a set such that a subset's hash has a subset of the bits.
 uint64_t SignatureOf(const std::vector<uint32_t>& elements)
 {
     uint64_t signature = 0;
@@ -74,7 +74,7 @@ class Reduction {
         }
     }
 
-    // A row goes when another row's columns all cover it.
+    // Drops a row if another row's columns all cover it.
     void DropRows()
     {
         std::vector<uint64_t> signatures;
@@ -97,7 +97,7 @@ class Reduction {
         }
     }
 
-    // A column goes when another one that costs no more covers all of its rows.
+    // Drops a column if another one that costs no more covers all of its rows.
     void DropColumns()
     {
         std::vector<uint64_t> signatures;

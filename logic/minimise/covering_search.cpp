@@ -1,4 +1,4 @@
-// Branch and bound over covering tables, depth first with a stack of its own.
+// Branch and bound over covering tables, depth first with an explicit stack.
 #include <algorithm>
 #include <cassert>
 #include <cmath>
@@ -22,7 +22,7 @@ class CoveringSearch {
         m_open.push_back({std::move(table), {}, 0});
     }
 
-    // Fills m_best, whatever the limits: with them used up it is a cover without a proof.
+    // Fills m_best, whatever the limits: if they are used up, it is a cover without a proof.
     void Begin()
     {
         const CoveringTable& table = m_open.back().table;
@@ -30,7 +30,7 @@ class CoveringSearch {
         Construct(m_open.back(), costs);
     }
 
-    // Throws OutOfWork; m_best and LowerBound() are right whenever it ends.
+    // Throws OutOfWork; m_best and LowerBound() are correct however it ends.
     void Run()
     {
         bool isRoot = true;
@@ -91,8 +91,8 @@ class CoveringSearch {
         }
     }
 
-    // Raises the multipliers; false when the node cannot hold a cheaper cover. Leaves the reduced
-    // costs of the best bound in m_reduced and that bound in m_bound.
+    // Raises the multipliers. False if the node cannot hold a cheaper cover. Leaves the best bound
+    // in m_bound and its reduced costs in m_reduced.
     bool Bound(Node& node, bool isRoot)
     {
         CoveringTable& table = node.table;
@@ -165,7 +165,7 @@ class CoveringSearch {
         return bound;
     }
 
-    // One step along the subgradient; false when it is zero.
+    // One step along the subgradient. False if it is zero.
     bool Climb(const CoveringTable& table, const std::vector<double>& reduced, double bound,
                double step, const Node& node, std::vector<double>& multipliers) const
     {
@@ -189,8 +189,8 @@ class CoveringSearch {
         return true;
     }
 
-    // A cover of the node by columns that cost little for the rows they add; columns that it turns
-    // out not to need go again.
+    // Makes a cover of the node from columns that cost little for the rows they add; columns that
+    // turn out not to be needed are dropped again.
     void Construct(const Node& node, const std::vector<double>& prices)
     {
         const CoveringTable& table = node.table;
@@ -256,7 +256,7 @@ class CoveringSearch {
         Offer(chosen, cost);
     }
 
-    // Columns that reduced costs rule out or in; true when that changed the node.
+    // Takes columns in or out as reduced costs show. True if that changed the node.
     bool Fix(Node& node)
     {
         CoveringTable& table = node.table;
@@ -283,7 +283,7 @@ class CoveringSearch {
         return isChanged;
     }
 
-    // KeepInTable; false when a row would be left without columns.
+    // Calls KeepInTable. False if a row would be left without columns.
     static bool Restrict(CoveringTable& table, const std::vector<uint8_t>& isRow,
                          const std::vector<uint8_t>& isColumn)
     {
@@ -298,7 +298,7 @@ class CoveringSearch {
         return true;
     }
 
-    // With the cheapest column of a shortest row, then without it.
+    // Branches with the cheapest column of a shortest row, then without it.
     void Branch(Node& node)
     {
         const CoveringTable& table = node.table;

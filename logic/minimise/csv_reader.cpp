@@ -1,4 +1,4 @@
-// Truth tables as comma-separated values, each line a row or several, with '-' for either value.
+// Truth tables as comma-separated values. Each line is a row, or several with '-' for either value.
 #include <algorithm>
 #include <unordered_set>
 

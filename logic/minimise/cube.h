@@ -1,7 +1,7 @@
 // Cubes of several-output functions, packed: two bits for each input, one for each output.
-// An input pair is 01 for the value 0, 10 for 1, 11 for either (low bit first: bit 0 admits 0, bit
-// 1 admits 1); a pair 00 makes the cube empty. Inputs come first, outputs follow without a gap,
-// bits above the last output are 0. A pair never lies across two words.
+// An input's pair is 01 for the value 0, 10 for 1, 11 for either (low bit first: bit 0 admits 0,
+// bit 1 admits 1); a pair 00 makes the cube empty. Inputs come first and outputs follow without a
+// gap; bits above the last output are 0. A pair never crosses a word boundary.
 #ifndef BOOLEQ_MINIMISE_CUBE_H
 #define BOOLEQ_MINIMISE_CUBE_H
 
@@ -16,7 +16,7 @@ namespace booleq {
 
 constexpr uint64_t kLowBits = 0x5555555555555555u;
 
-// Not the compiler's own: without a processor option that is a call of its library.
+// Not the compiler's builtin: without a processor option, that calls its library.
 inline size_t CountBits(uint64_t word)
 {
     word -= word >> 1 & kLowBits;
@@ -31,7 +31,7 @@ inline size_t LowestBit(uint64_t word)
     return static_cast<size_t>(__builtin_ctzll(word));
 }
 
-// How many inputs and outputs there are, and which bits of a cube's words are whose.
+// How many inputs and outputs there are, and which bits of a cube's words belong to them.
 class CubeSpace {
   public:
     CubeSpace(size_t numInputs, size_t numOutputs);
@@ -43,7 +43,8 @@ class CubeSpace {
     size_t NumInputWords() const { return m_num_input_words; }
     // The first word that holds an output.
     size_t FirstOutputWord() const { return 2 * m_num_inputs / 64; }
-    // The low bit of each input's pair in a word, the outputs' bits, and all that count.
+    // The low bit of each input's pair in a word; both bits; the outputs' bits; and all bits in
+    // use.
     uint64_t InputLow(size_t word) const { return m_input_low[word]; }
     uint64_t Inputs(size_t word) const { return m_input_low[word] * 3; }
     uint64_t Outputs(size_t word) const { return m_outputs[word]; }
@@ -74,13 +75,13 @@ class CubeList {
     // 'cube' may be a cube of this list.
     void Append(const uint64_t* cube);
     void Append(const CubeList& other);
-    // The cubes that follow the first 'count' go; new ones have all words 0.
+    // Drops the cubes after the first 'count'; new cubes have all words 0.
     void Resize(size_t count) { m_words.resize(count * m_num_words); }
     void Reserve(size_t count) { m_words.reserve(count * m_num_words); }
-    // Those whose flag is 0 go, the others keep their order.
+    // Drops the cubes whose flag is 0; the others keep their order.
     void Keep(const std::vector<uint8_t>& isKept);
     void Reorder(const std::vector<uint32_t>& order);
-    // In ascending order of their words, each cube once.
+    // Sorts the cubes by their words, and keeps one of equal ones.
     void SortAndUnite();
 
   private:
@@ -155,7 +156,7 @@ inline bool IsDisjoint(const CubeSpace& space, const uint64_t* left, const uint6
     return !HasCommonInputs(space, left, right) || !HasCommonOutput(space, left, right);
 }
 
-// How many inputs have no common value, plus one when no output is common.
+// How many inputs have no common value, plus one if there is no common output.
 inline size_t Distance(const CubeSpace& space, const uint64_t* left, const uint64_t* right)
 {
     size_t distance = HasCommonOutput(space, left, right) ? 0 : 1;
@@ -164,9 +165,9 @@ inline size_t Distance(const CubeSpace& space, const uint64_t* left, const uint6
     return distance;
 }
 
-// Negative, 0 or positive: an order of the cubes' inputs.
+// Compares the cubes' inputs: negative, 0 or positive, a total order.
 int CompareInputs(const CubeSpace& space, const uint64_t* left, const uint64_t* right);
-// Inputs that the cube fixes.
+// The number of inputs that the cube fixes.
 size_t CountCubeLiterals(const CubeSpace& space, const uint64_t* cube);
 size_t CountLiterals(const CubeSpace& space, const CubeList& cubes);
 size_t CountOutputs(const CubeSpace& space, const uint64_t* cube);

@@ -1,4 +1,5 @@
-// Turns lists of cubes, 64 by 64 bits at a time, and finds the cubes that are near another one.
+// Transposes lists of cubes, 64 by 64 bits at a time, and finds the cubes that are near another
+// one.
 #include "cube_columns.h"
 
 #include <algorithm>
@@ -9,7 +10,7 @@ namespace {
 
 constexpr size_t kSide = 64;
 
-// Bit k of word i and bit i of word k change places: halves first, then quarters, and so on.
+// Exchanges bit k of word i with bit i of word k: halves first, then quarters, and so on.
 void Transpose(uint64_t* words)
 {
     uint64_t mask = 0x00000000ffffffffu;
@@ -106,7 +107,7 @@ void RemoveContained(const CubeSpace& space, CubeList& cubes, Work& work)
 {
     const CubeColumns columns(space, cubes);
     std::vector<uint8_t> isKept(cubes.Size(), 1);
-    std::vector<uint32_t> parts; // outputs first: few cubes have a given one
+    std::vector<uint32_t> parts; // outputs first: few cubes have a given output
     for (size_t index = 0; index < cubes.Size(); ++index) {
         const uint64_t* cube = cubes.At(index);
         parts.clear();

@@ -33,13 +33,13 @@ void AppendCover(const CubeSpace& space, const Function& function, const Places&
     }
 }
 
-// An exclusive or of n inputs has 2^(n-1) cubes: so many are written down of an operand, and of all
-// that wait to be combined, and that is the work that they may take.
+// An exclusive OR of n inputs has 2^(n-1) cubes. These limit the cubes of one operand, those of all
+// operands that wait to be combined, and the work that they may take.
 constexpr size_t kMaxCubes = size_t(1) << 17;
 constexpr size_t kMaxWaitingCubes = 8 * kMaxCubes;
 constexpr uint64_t kMaxUnits = uint64_t(1) << 32;
 
-// The cubes of an expression's operands, from the leaves up. Throws OutOfWork when they are too
+// The cubes of an expression's operands, from the leaves up. Throws OutOfWork if there are too
 // many.
 class CubesOfExpression {
   public:

@@ -14,7 +14,8 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxColumns = 400000;
-// Rows are moved to harder ones, which costs more for each, when there are so many for each cube.
+// If there are more rows than this for each cube, rows are moved to harder ones. Each then costs
+// more.
 constexpr size_t kHardFactor = 20;
 
 class ExactSearch {
@@ -70,8 +71,8 @@ class ExactSearch {
         return m_goal == Goal::Terms ? m_essential.Size() : CountLiterals(m_space, m_essential);
     }
 
-    // Rows of outputs that no essential prime covers, until the signatures of those found cover
-    // all.
+    // Finds rows of outputs that no essential prime covers, until the signatures of these rows
+    // cover everything.
     void FindRows()
     {
         CubeList known = m_fixed;
@@ -108,7 +109,7 @@ class ExactSearch {
         return row;
     }
 
-    // A row beside this one that is covered by fewer primes, all of which cover this one as well.
+    // Moves to a neighbouring row that fewer primes cover, all of which cover this one as well.
     bool MoveToHarder(Row& row)
     {
         const size_t numBits = 2 * m_space.NumInputs() + m_space.NumOutputs();
@@ -153,7 +154,7 @@ class ExactSearch {
         return m_expander.IsImplicant(point);
     }
 
-    // A row in the signature of another one is covered whenever that one is.
+    // A row in the signature of another one is covered whenever the other one is.
     void DropImpliedRows()
     {
         std::vector<uint8_t> isKept(m_rows.Size(), 1);
@@ -175,7 +176,7 @@ class ExactSearch {
         m_signatures.Keep(isKept);
     }
 
-    // Which pairs of rows a product can hold both of.
+    // Finds the pairs of rows that one product can hold.
     void FindNeighbours()
     {
         const size_t numWords = m_space.NumWords();
@@ -194,7 +195,7 @@ class ExactSearch {
         m_are_neighbours_known = true;
     }
 
-    // The fewest terms. Of the parts only those count that another row could need.
+    // The fewest terms. Only parts count that another row could need.
     void CountTerms()
     {
         CubeList columns(m_space.NumWords());
@@ -251,8 +252,8 @@ class ExactSearch {
         return m_goal == Goal::Terms ? m_result.sum.Size() : CountLiterals(m_space, m_result.sum);
     }
 
-    // Fills the rows of the problem, solves it, takes the sum if it is better. Returns its cost;
-    // the bound is in m_bound.
+    // Fills in the rows of the problem, solves it, and takes the sum if it is better. Returns its
+    // cost; the bound is in m_bound.
     uint64_t Solve(CoveringProblem& problem, const CubeList& columns)
     {
         problem.rows.resize(m_rows.Size());
@@ -281,7 +282,7 @@ class ExactSearch {
         return result.cost;
     }
 
-    // Rows no two of which fit into a product need a term each.
+    // Rows, no two of which fit into one product, need one term each.
     void BoundByStrangers()
     {
         if (!m_are_neighbours_known || m_goal != Goal::Terms)
@@ -314,11 +315,11 @@ class ExactSearch {
     const CubeIndex m_off;
     const CubeList m_no_cubes;
     const OpenCubes m_none;
-    CubeList m_start; // primes; then those that are not essential
+    CubeList m_start; // primes; later only those that are not essential
     CubeList m_essential;
     CubeList m_fixed; // free, and the essential primes
     std::vector<uint64_t> m_point;
-    CubeList m_rows; // one row of one output each
+    CubeList m_rows; // each is one row of one output
     CubeList m_signatures;
     std::vector<CubeList> m_blocking;
     std::vector<std::vector<uint32_t>> m_neighbours;

@@ -10,9 +10,9 @@ namespace booleq {
 
 namespace {
 
-// Candidates at a time, times blocks of off cubes, each of which is asked of them.
+// Limit of candidates asked at a time, times the blocks of off cubes that each is checked against.
 constexpr size_t kMaxAskedBlocks = size_t(1) << 18;
-constexpr size_t kManyCandidates = 16384; // so many are asked with an eighth of that
+constexpr size_t kManyCandidates = 16384; // with more than these, an eighth of that
 
 } // namespace
 
@@ -66,7 +66,7 @@ void Expander::Expand(uint64_t* cube, const uint64_t* allowed, const OpenCubes& 
 void Expander::ListCandidates(const OpenCubes& others)
 {
     const CubeColumns& columns = others.Columns();
-    std::vector<uint32_t> parts; // that keep a cube out
+    std::vector<uint32_t> parts; // parts that keep a cube out
     for (size_t word = 0; word < m_num_words; ++word)
         AppendBits(m_space.All(word) & ~(m_raised[word] | m_free[word]), word, parts);
     m_work.Spend(columns.NumBlocks() * (parts.size() + 1) / 2);
@@ -78,7 +78,7 @@ void Expander::ListCandidates(const OpenCubes& others)
     m_feasible.assign(columns.NumBlocks(), 0);
 }
 
-// Takes in the others one by one, as long as there is one that could be; then heads for them.
+// Takes in the others one by one as long as any is feasible; then grows towards the rest.
 void Expander::CoverOthers(const OpenCubes& others)
 {
     for (;;) {
@@ -92,8 +92,8 @@ void Expander::CoverOthers(const OpenCubes& others)
     }
 }
 
-// Keeps candidates that lie in m_raised and m_free but not in m_raised alone, feasible ones first,
-// and counts the feasible ones.
+// Keeps the candidates that lie in m_raised and m_free together but not in m_raised alone, feasible
+// ones first, and returns the number of feasible ones.
 size_t Expander::FilterCandidates(const CubeList& others)
 {
     m_work.Spend(m_candidates.size());
@@ -112,7 +112,7 @@ size_t Expander::FilterCandidates(const CubeList& others)
     m_candidates.resize(numKept);
     const size_t maxBlocks = numKept > kManyCandidates ? kMaxAskedBlocks / 8 : kMaxAskedBlocks;
     const size_t numAsked = std::min(numKept, maxBlocks / (m_problem.off.Size() / 64 + 1) + 16);
-    if (numKept > numAsked) { // the nearest are asked now, others when the cube has grown
+    if (numKept > numAsked) { // the nearest are asked now, the others after the cube has grown
         const auto isNearer = [&](uint32_t left, uint32_t right) {
             const size_t leftCount = CountRaised(others.At(left));
             const size_t rightCount = CountRaised(others.At(right));
@@ -129,7 +129,7 @@ size_t Expander::FilterCandidates(const CubeList& others)
     return numFeasible;
 }
 
-// How many parts 'cube' would raise.
+// The number of parts that 'cube' would raise.
 size_t Expander::CountRaised(const uint64_t* cube) const
 {
     size_t count = 0;
@@ -138,7 +138,7 @@ size_t Expander::CountRaised(const uint64_t* cube) const
     return count;
 }
 
-// How many candidates could still be taken in, as far as parts that are then lowered at once tell.
+// The number of candidates that could still be taken in, judged by the parts lowered at once.
 size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const uint64_t* with)
 {
     for (size_t word = 0; word < m_num_words; ++word)
@@ -158,7 +158,7 @@ size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const u
 }
 
 // Takes in the feasible candidate after which most others can be taken in; of equal ones the one
-// that raises fewest parts.
+// that raises the fewest parts.
 void Expander::RaiseBest(const OpenCubes& others, size_t numFeasible)
 {
     std::fill(m_feasible.begin(), m_feasible.end(), 0);
@@ -203,7 +203,7 @@ void Expander::Raise(size_t bit)
     Settle();
 }
 
-// Raises the free part that most candidates have.
+// Raises the free part that the most candidates have.
 void Expander::RaiseMostFrequent(const CubeList& others)
 {
     m_counts.assign(64 * m_num_words, 0);
@@ -217,7 +217,7 @@ void Expander::RaiseMostFrequent(const CubeList& others)
     Raise(static_cast<size_t>(best - m_counts.begin()));
 }
 
-// Raises the free part that fewest active cubes ask for.
+// Raises the free part that the fewest active cubes have.
 void Expander::RaiseLeastBlocked()
 {
     m_obstacles.CountFree(m_free.data(), m_counts);
@@ -260,7 +260,7 @@ void KeepInCover(Cover& cover, const std::vector<uint8_t>& isKept)
 
 namespace {
 
-// Primes lie in one another only when they are equal.
+// A prime lies in another prime only if they are equal.
 void DropEqualPrimes(Cover& cover)
 {
     const CubeList& cubes = cover.cubes;
@@ -282,7 +282,7 @@ void DropEqualPrimes(Cover& cover)
 void TakeIn(const CubeSpace& space, const uint64_t* prime, OpenCubes& others,
             std::vector<uint8_t>& isKept, Work& work)
 {
-    std::vector<uint32_t> parts; // that keep a cube out
+    std::vector<uint32_t> parts; // parts that keep a cube out
     for (size_t word = 0; word < space.NumWords(); ++word)
         AppendBits(space.All(word) & ~prime[word], word, parts);
     const CubeColumns& columns = others.Columns();
@@ -304,7 +304,7 @@ void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work&
 {
     CubeList& cubes = cover.cubes;
     std::vector<uint8_t> isKept(cubes.Size(), 1);
-    OpenCubes others(space, cubes, true); // what is yet to be expanded
+    OpenCubes others(space, cubes, true); // cubes that are yet to be expanded
     for (size_t index = 0; index < cubes.Size(); ++index)
         if (cover.isPrime[index] != 0)
             others.Close(index);
@@ -322,7 +322,7 @@ void ExpandCover(const CubeSpace& space, Expander& expander, Cover& cover, Work&
             TakeIn(space, cubes.At(index), others, isKept, work);
         }
     } catch (const OutOfWork&) {
-        finish(); // a cover all the same
+        finish(); // it is still a cover
         throw;
     }
     finish();

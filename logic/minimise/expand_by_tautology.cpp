@@ -1,6 +1,6 @@
-// EXPAND where the off-set is too large to be written down: what a cube gains by a part is asked of
-// what is on and free (R. Brayton, G. Hachtel, C. McMullen, A. Sangiovanni-Vincentelli, Logic
-// Minimization Algorithms for VLSI Synthesis, 1984).
+// EXPAND if the off-set is too large to be written down: whether a cube may have a part is checked
+// against what is on and free (R. Brayton, G. Hachtel, C. McMullen, A. Sangiovanni-Vincentelli,
+// Logic Minimization Algorithms for VLSI Synthesis, 1984).
 #include <algorithm>
 
 #include "expand.h"
@@ -9,12 +9,12 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxCubesToTakeIn = 64; // each asks for a tautology
+constexpr size_t kMaxCubesToTakeIn = 64; // each needs a tautology check
 
 } // namespace
 
-// Parts that the cube cannot have now it cannot have later, so one try of each makes a prime.
-// Requires: m_free has the parts that may be tried, m_candidates the cubes to head for.
+// A part that the cube cannot have now it cannot have later, so trying each once makes a prime.
+// Requires: m_free has the parts that may be tried, m_candidates the cubes to grow towards.
 void Expander::ExpandByTautology(uint64_t* cube, const CubeList& others)
 {
     TakeInNearest(cube, others);
@@ -40,7 +40,7 @@ void Expander::ExpandByTautology(uint64_t* cube, const CubeList& others)
     assert(IsImplicant(cube));
 }
 
-// Takes in those of the candidates that are nearest, as long as the cube stays an implicant.
+// Takes in the nearest of the candidates, as long as the cube stays an implicant.
 void Expander::TakeInNearest(uint64_t* cube, const CubeList& others)
 {
     std::vector<std::pair<size_t, uint32_t>> order; // parts to raise, candidate

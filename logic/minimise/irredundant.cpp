@@ -1,6 +1,5 @@
 // IRREDUNDANT and ESSENTIAL PRIMES. Which cubes a cover can do without is a covering problem: its
-// rows are found where the recursion of a tautology check ends, as sets of cubes one of which must
-// stay.
+// rows are found at the leaves of a tautology check, as sets of cubes one of which must stay.
 #include <algorithm>
 #include <numeric>
 
@@ -14,8 +13,8 @@ namespace booleq {
 
 namespace {
 
-constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; each row has a cube anyway
-// Overlapping cubes can have more choices than there are rows; then there is no choosing.
+constexpr uint64_t kIrredundantUnits = 1u << 20; // to choose cubes in; the choice always covers
+// Overlapping cubes can have more choices than there are rows; then none is made.
 constexpr uint64_t kChoiceUnits = uint64_t(1) << 23;
 constexpr uint32_t kFixed = UINT32_MAX; // label of cubes that stay
 
@@ -28,7 +27,7 @@ class ChoiceSearch {
     {
     }
 
-    // Requires: the cubes cover all rows. Takes them as the walk's stack.
+    // Requires: the cubes cover all rows. They become the stack of the walk.
     void Find(CubeList& cubes, std::vector<uint32_t>& labels)
     {
         assert(cubes.Size() == labels.size());
@@ -47,8 +46,8 @@ class ChoiceSearch {
             count = FindBinate(m_space, m_stack, part, m_binate);
             if (!count.hasUnate)
                 break;
-            // Where an input that is unate has its worse value, fewer cubes are left: the rows
-            // found there imply those elsewhere.
+            // For the worse value of a unate input fewer cubes are left: the rows found there imply
+            // those found elsewhere.
             DropUnate(m_stack, part, m_binate, &m_labels);
             m_stack.Resize(part.first + part.count);
             m_labels.resize(m_stack.Size());
@@ -96,7 +95,7 @@ class ChoiceSearch {
     std::vector<std::vector<uint32_t>>& m_rows;
 };
 
-// The rows of the covering problem whose columns are the cubes of 'choices'; 'fixed' stay.
+// The rows of the covering problem whose columns are the cubes of 'choices'; 'fixed' cubes stay.
 std::vector<std::vector<uint32_t>> FindChoices(const CubeSpace& space, const CubeList& choices,
                                                const CubeList& fixed, Work& work)
 {
@@ -135,7 +134,8 @@ std::vector<std::vector<uint32_t>> FindChoices(const CubeSpace& space, const Cub
     return rows;
 }
 
-// The cubes that are left when those with most literals go first, as long as the others cover them.
+// The cubes that are left when those with the most literals are dropped first, as long as the
+// others cover them.
 std::vector<uint32_t> DropInOrder(const CubeSpace& space, CubeList choices, const CubeList& fixed,
                                   Work& work)
 {
@@ -160,7 +160,7 @@ std::vector<uint32_t> DropInOrder(const CubeSpace& space, CubeList choices, cons
     return kept;
 }
 
-// The choices to keep, so that they and 'fixed' cover what all of them did.
+// The choices to keep so that they and 'fixed' cover what all of the choices covered.
 std::vector<uint32_t> Choose(const CubeSpace& space, const CubeList& choices, const CubeList& fixed,
                              Work& work)
 {
@@ -191,7 +191,7 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
 {
     CubeList& cubes = cover.cubes;
     std::vector<uint8_t> isKept(cubes.Size(), 0);
-    CubeList fixed = free; // and the cubes that have a place of their own
+    CubeList fixed = free; // and the cubes that alone cover some place
     CubeIndex cubeIndex(space, cubes);
     CubeIndex freeIndex(space, free);
     Cofactors ofOthers(space, cubeIndex, freeIndex, work);
@@ -222,8 +222,9 @@ void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free,
 
 namespace {
 
-// The cubes whose part outside 'prime' has a consensus with it: as cofactors with respect to
-// 'prime', with the outputs for which it is one. 'near' has the cubes at most one part away.
+// Appends the consensus of each cube's part outside 'prime' with it, if there is one: as a cofactor
+// with respect to 'prime', with the outputs for which it holds. 'near' lists cubes at most one part
+// away.
 void AppendConsensus(const CubeSpace& space, const CubeList& cubes,
                      const std::vector<uint32_t>& near, size_t left, const uint64_t* prime,
                      CubeList& target)

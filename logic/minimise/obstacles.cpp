@@ -1,4 +1,4 @@
-// Lowering and raising of parts against blocks of off cubes.
+// Lowers and raises parts against blocks of off cubes.
 #include "obstacles.h"
 
 #include <algorithm>
@@ -8,13 +8,13 @@ namespace booleq {
 
 namespace {
 
-// An input's parts are a pair of bits: the other one of the pair.
+// An input has two parts, a pair of bits: this is the other one of the pair.
 constexpr uint32_t Other(uint32_t part)
 {
     return part ^ 1u;
 }
 
-// The pairs of a word of which just one part is there.
+// The parts of a word that are alone in their pair.
 uint64_t Literals(const CubeSpace& space, const uint64_t* cube, size_t word)
 {
     const uint64_t both = cube[word] & cube[word] >> 1 & space.InputLow(word);
@@ -38,7 +38,7 @@ bool Obstacles::IsMet(const uint64_t* cube)
     for (size_t place = 0; place < m_order.size(); ++place) {
         if (MeetingInBlock(m_off, m_order[place], m_to_meet) == 0)
             continue;
-        std::swap(m_order[place], m_order[place / 2]); // those that object come to the front
+        std::swap(m_order[place], m_order[place / 2]); // blocks that object move to the front
         m_work.Spend((place + 1) * numAsked / 2);
         return true;
     }
@@ -79,7 +79,7 @@ void Obstacles::Start(const uint64_t* raised, const uint64_t* free)
     }
 }
 
-// Parts that are free but not in 'with' are open, outputs of both are given.
+// Free parts that 'with' lacks are open; free outputs that 'with' has are given.
 void Obstacles::ListOpen(const uint64_t* free, const uint64_t* with)
 {
     m_inputs.clear();
@@ -113,7 +113,7 @@ void Obstacles::Settle(uint64_t* raised, uint64_t* free)
 }
 
 // The cubes of a block that are one step away from what is raised.
-// Requires: each is a step away or more.
+// Requires: each is at least one step away.
 uint64_t Obstacles::FindNear(const uint64_t* columns, uint64_t common) const
 {
     uint64_t one = ~common;
@@ -126,7 +126,7 @@ uint64_t Obstacles::FindNear(const uint64_t* columns, uint64_t common) const
     return one & ~two;
 }
 
-// One pass over the blocks. True when parts were lowered, so that more cubes may be out of reach.
+// One pass over the blocks. True if parts were lowered, so that more cubes may be out of reach.
 bool Obstacles::LowerAndDrop(uint64_t* free)
 {
     m_work.Spend(m_live.size() * (m_inputs.size() + m_outputs.size() / 4 + 2) / 2);
@@ -141,7 +141,7 @@ bool Obstacles::LowerAndDrop(uint64_t* free)
         const uint64_t near = m_active[block] & FindNear(columns, m_common[block]);
         if (near != 0)
             LowerFor(near, block, free);
-        m_active[block] &= ~near; // not to be met any more
+        m_active[block] &= ~near; // they cannot be met any more
         if (m_active[block] != 0)
             m_live[numLive++] = block;
     }
@@ -155,7 +155,7 @@ bool Obstacles::LowerAndDrop(uint64_t* free)
     return isLowered;
 }
 
-// Drops the cubes of a block that only parts lowered lately could have met.
+// Drops the cubes of a block that only recently lowered parts could have met.
 void Obstacles::DropOutOfReach(size_t block)
 {
     const uint64_t* columns = m_off.Block(block);
@@ -165,7 +165,7 @@ void Obstacles::DropOutOfReach(size_t block)
         m_active[block] &= m_common[block] | AnyColumn(columns, m_outputs);
 }
 
-// Lowers the parts that stand between what is raised and the cubes 'near'.
+// Lowers the parts that separate what is raised from the cubes 'near'.
 void Obstacles::LowerFor(uint64_t near, size_t block, uint64_t* free)
 {
     const uint64_t* columns = m_off.Block(block);
@@ -190,7 +190,7 @@ void Obstacles::LowerFor(uint64_t near, size_t block, uint64_t* free)
     }
 }
 
-// Free parts that would bring no active cube nearer are raised. Leaves them in the lists.
+// Raises the free parts that would bring no active cube nearer, and leaves them in the lists.
 void Obstacles::RaiseUnblocked(uint64_t* raised, uint64_t* free)
 {
     m_work.Spend(m_live.size());
@@ -229,7 +229,7 @@ bool Obstacles::IsFeasible(const uint64_t* free, const uint64_t* with)
             met &= columns[Other(m_inputs[index])];
         if (met == 0 || (met & (m_common[block] | AnyColumn(columns, m_given))) == 0)
             continue;
-        std::swap(m_live[place], m_live[place / 2]); // those that object come to the front
+        std::swap(m_live[place], m_live[place / 2]); // blocks that object move to the front
         m_work.Spend((place + 1) * numAsked / 4);
         return false;
     }

@@ -1,4 +1,4 @@
-// From rows of a PLA file to sets, and back to a file.
+// From the rows of a PLA file to sets, and back to a file.
 #include "pla.h"
 
 #include <algorithm>
@@ -12,7 +12,7 @@ namespace booleq {
 namespace {
 
 constexpr size_t kMaxPairsToTry = 4096;
-// The cubes that a complement may have for each output.
+// The number of cubes that a complement may have for each output.
 constexpr size_t kManyCubes = size_t(1) << 17;
 constexpr size_t kMaxCubes = size_t(1) << 20;
 
@@ -69,7 +69,7 @@ class MeetingSearch {
         return false;
     }
 
-    // The input that most cubes of both lists fix. False when none fixes one.
+    // The input that most cubes of both lists fix. False if none fixes any.
     bool ChooseInput(const std::vector<uint32_t>& left, const std::vector<uint32_t>& right,
                      size_t& input)
     {
@@ -134,8 +134,8 @@ bool FindMeeting(const CubeSpace& space, const CubeList& left, const CubeList& r
 
 namespace {
 
-// Adds to problem.free the rows that the file calls free, without those that are off. Fails: false
-// when that takes too many cubes.
+// Adds to problem.free the rows that the file calls free, except those that are off.
+// Fails: false if that takes too many cubes.
 bool AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
 {
     const CubeList none(pla.space.NumWords());
@@ -163,7 +163,8 @@ bool AppendFree(const Pla& pla, TwoLevelProblem& problem, Work& work)
 
 void SetOff(TwoLevelProblem& problem, Work& work)
 {
-    // Growing a cube looks at all off cubes, or asks the other lists as often as there are inputs.
+    // Growing a cube either goes through all off cubes, or asks the other lists once for each
+    // input.
     const size_t numGiven = problem.on.Size() + problem.free.Size();
     const size_t maxCubes =
         std::min(kMaxCubes, std::max(kManyCubes, numGiven * problem.space.NumInputs()));
@@ -203,7 +204,7 @@ bool ToProblem(const Pla& pla, TwoLevelProblem& problem, PlaFault& fault, Work& 
         return true;
     }
     problem.off = pla.off;
-    // Free is what is neither on nor off, and what is said to be free as long as it is not off.
+    // Free is what is neither on nor off, and what is called free unless it is off.
     if (FindComplement(pla.space, pla.on, pla.off, kMaxCubes, work, problem.free) &&
         (pla.free.IsEmpty() || AppendFree(pla, problem, work)))
         return true;

@@ -1,5 +1,6 @@
-// Reads PLA files. Rows may run over several lines and directives stand in any order, as long as .i
-// and .o come before the first row; so only a row's end tells whether its width was right.
+// Reads PLA files. Rows may extend over several lines and directives may come in any order, as long
+// as .i and .o come before the first row; so only the end of a row shows whether its width was
+// right.
 #include <algorithm>
 #include <unordered_set>
 
@@ -81,7 +82,7 @@ class PlaReader {
             return IsRowWhole() && ReadDirective(WordsOf(begin, end));
         if (m_has_inputs && m_has_outputs)
             return ReadDigits(begin, end);
-        // A title may stand before everything else; what looks like a row is one too early.
+        // A title may come before everything else; what looks like a row comes too early.
         if (std::all_of(begin, end, [](char c) { return IsRowCharacter(c); }))
             return Fail(m_line, "a row before " + std::string(m_has_inputs ? ".o" : ".i"),
                         "write .i and .o, the numbers of inputs and outputs, before the first row");
@@ -122,7 +123,7 @@ class PlaReader {
         if (name == ".o")
             return ReadCount(words, kMaxPlaOutputs, m_has_outputs, m_num_outputs);
         if (name == ".p")
-            return true; // how many rows there are is counted, not believed
+            return true; // rows are counted; the number given is ignored
         if (name == ".type")
             return ReadType(words);
         if (name == ".ilb")
@@ -158,7 +159,7 @@ class PlaReader {
     void Begin()
     {
         if (m_row.size() == m_pla.space.NumWords() * 3 && !m_row.empty())
-            return; // the same numbers once more
+            return; // the same numbers again
         m_pla.space = CubeSpace(m_num_inputs, m_num_outputs);
         const size_t numWords = m_pla.space.NumWords();
         m_pla.on = m_pla.free = m_pla.off = CubeList(numWords);
@@ -199,7 +200,7 @@ class PlaReader {
     {
         const bool isAtStart = m_num_digits == 0;
         const size_t width = m_num_inputs + m_num_outputs;
-        const char* blank = nullptr; // the first one that digits precede and follow
+        const char* blank = nullptr; // the last one; used if the line has no other run of blanks
         size_t numBlanks = 0;
         size_t digitsBeforeBlank = 0;
         if (isAtStart)
@@ -345,7 +346,7 @@ class PlaReader {
         return true;
     }
 
-    // Names of the file, or made-up ones: i0, i1, ..., o0, o1, ...
+    // Names from the file, or made-up ones: i0, i1, ..., o0, o1, ...
     bool CheckNames(const char* what, const char* directive, size_t line, size_t count,
                     std::vector<std::string>& names)
     {
@@ -371,7 +372,7 @@ class PlaReader {
     size_t m_num_outputs = 0;
     size_t m_input_names_line = 0;
     size_t m_output_names_line = 0;
-    std::vector<uint64_t> m_row; // the cube as it is on, free and off
+    std::vector<uint64_t> m_row; // the cubes of the row: on, free and off
     bool m_has_set[3] = {false, false, false};
     size_t m_row_line = 0;
     size_t m_num_digits = 0; // of the row that has begun

@@ -1,4 +1,4 @@
-// Proof by rows where they can be listed, by tautologies elsewhere.
+// Proof by rows if they can be listed, otherwise by tautologies.
 #include "proof.h"
 
 #include "cofactors.h"
@@ -9,21 +9,21 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kManyCubes = 1000; // their rows are faster
+constexpr size_t kManyCubes = 1000; // with more, checking rows is faster
 
-// Cubes that are looked up by their inputs: whether one of a list holds another one as it stands.
+// Cubes that can be looked up by their inputs: whether one cube of a list contains a given one.
 class LookUp {
   public:
     LookUp(const CubeSpace& space, const CubeList& cubes) : m_space(space), m_cubes(cubes)
     {
-        UniteOutputs(space, m_cubes); // which leaves them in order
+        UniteOutputs(space, m_cubes); // this also sorts them
     }
 
     bool Holds(const uint64_t* cube) const
     {
         size_t first = 0;
         size_t count = m_cubes.Size();
-        while (count > 0) { // the first that is not less
+        while (count > 0) { // finds the first that is not less
             const size_t half = count / 2;
             if (CompareInputs(m_space, m_cubes.At(first + half), cube) < 0) {
                 first += half + 1;
@@ -52,7 +52,8 @@ bool DoCoverAll(const CubeSpace& space, const CubeList& cubes, CubeIndex& first,
     return true;
 }
 
-// What is on lies in the sum; the free cubes, which may be many, are asked where it does not.
+// Whether what is on lies in the sum; the free cubes, which may be many, are used only if it does
+// not.
 bool IsOnCovered(const Pla& table, CubeIndex& sum, CubeIndex& free, Work& work)
 {
     const CubeList none(table.space.NumWords());
@@ -83,7 +84,7 @@ bool IsSumRight(const Pla& table, const CubeList& sum, Work& work)
     return DoCoverAll(space, sum, onIndex, freeIndex, work); // everything else is off
 }
 
-// The inverted sum: 1 on every row that nothing is said of or that is off; 0 where on and not free.
+// The inverted sum must be 1 on every row that is off or not mentioned, and 0 if on and not free.
 bool IsInversionRight(const Pla& table, const CubeList& sum, Work& work)
 {
     const CubeSpace& space = table.space;

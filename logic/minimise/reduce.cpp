@@ -1,4 +1,4 @@
-// REDUCE, LAST GASP, and what takes literals out of a finished cover.
+// REDUCE, LAST GASP, and what removes literals from a finished cover.
 #include "reduce.h"
 
 #include <algorithm>
@@ -11,8 +11,9 @@ namespace booleq {
 
 namespace {
 
-// The smallest cube that has what neither the other cubes nor the free ones cover of cube 'index',
-// which the two lists of 'cofactors' hold. All words 0 when nothing is left.
+// The smallest cube that contains the rows of cube 'index' that neither the other cubes nor the
+// free ones cover. The two lists of 'cofactors' hold all of these. All words are 0 if no row is
+// left.
 void ReduceCube(const CubeSpace& space, const CubeList& cubes, size_t index, Cofactors& cofactors,
                 Work& work, uint64_t* reduced)
 {
@@ -114,7 +115,7 @@ size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, con
         reduced.Resize(reduced.Size() + 1);
         ReduceCube(space, cover.cubes, index, cofactors, work, reduced.At(reduced.Size() - 1));
         if (IsSameCube(reduced.At(reduced.Size() - 1), cover.cubes.At(index), numWords))
-            reduced.Resize(reduced.Size() - 1); // a prime that nothing shrinks takes in no other
+            reduced.Resize(reduced.Size() - 1); // a prime that does not shrink takes in no other
     }
     const OpenCubes others(space, reduced, true);
     std::vector<uint64_t> cube(numWords);
@@ -139,7 +140,7 @@ void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const 
                 Work& work)
 {
     CubeList& cubes = cover.cubes;
-    // Cubes with many literals lose outputs first: to keep them there costs most.
+    // Cubes with many literals lose outputs first: they cost the most to keep.
     std::vector<uint32_t> order(cubes.Size());
     std::iota(order.begin(), order.end(), 0u);
     std::stable_sort(order.begin(), order.end(), [&](uint32_t left, uint32_t right) {

@@ -8,26 +8,27 @@
 
 namespace booleq {
 
-// Each cube in turn becomes as small as the others, as they are then, let it be. 'isBySize': the
-// largest first; otherwise the one that is largest and then those that are nearest to it.
+// Each cube in turn becomes as small as the others, in their current state, allow. If 'isBySize',
+// the largest come first; otherwise the largest one and then the cubes nearest to it.
 void ReduceCover(const CubeSpace& space, Cover& cover, const CubeList& free, bool isBySize,
                  Work& work);
 
-// Takes out cubes so that the others and 'free' cover the same, at the least cost: the number of
-// cubes, then of literals.
+// Removes cubes so that the rest and 'free' still cover the same rows at the least cost: the number
+// of cubes, then of literals.
 void MakeIrredundant(const CubeSpace& space, Cover& cover, const CubeList& free, Work& work);
 
-// Flags the cubes that no other prime could replace.
+// Flags the cubes that no other prime can replace.
 // Requires: all cubes are primes; cubes and 'free' cover what is on and not free, and nothing off.
 std::vector<uint8_t> FindEssential(const CubeSpace& space, const CubeList& cubes,
                                    const CubeList& free, Work& work);
 
-// Appends primes that each cover two cubes of the cover after each has been reduced as if the
-// others stayed as they are; returns how many.
+// Appends primes each of which covers two cubes of the cover after each has been reduced as if the
+// others stayed as they are; returns their number.
 size_t AddLastGasp(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
                    Work& work);
 
-// Outputs of cubes that others cover go, then inputs grow as far as the outputs left let them.
+// Removes outputs of cubes that others cover, then grows inputs as far as the remaining outputs
+// allow.
 void MakeSparse(const CubeSpace& space, Expander& expander, Cover& cover, const CubeList& free,
                 Work& work);
 

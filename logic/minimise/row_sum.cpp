@@ -1,5 +1,5 @@
 // Expand, irredundant and reduce by rows. Rows that can grow least are covered first, because they
-// leave least choice (S. J. Hong, R. Cain, D. Ostapko, MINI: a heuristic approach for logic
+// leave the least choice (S. J. Hong, R. Cain, D. Ostapko, MINI: a heuristic approach for logic
 // minimization, 1974).
 #include "row_sum.h"
 
@@ -10,7 +10,7 @@ namespace booleq {
 
 namespace {
 
-// Turns go on until one takes out less than a 512th of the terms, or until so much is spent.
+// Turns go on until one removes less than a 512th of the terms, or until so much work is spent.
 constexpr size_t kMinGain = 512;
 constexpr uint64_t kTurnUnits = uint64_t(96) << 20;
 
@@ -25,7 +25,7 @@ class RowSumSearch {
     std::vector<RowCube> Run()
     {
         const Work::Clock::time_point deadline = m_work.Deadline();
-        m_work.SetDeadline(Work::Clock::time_point::max()); // there is to be an answer
+        m_work.SetDeadline(Work::Clock::time_point::max()); // there must be an answer
         Cover();
         DropRedundant();
         const uint64_t limit = m_work.Spent() + kTurnUnits;
@@ -48,7 +48,7 @@ class RowSumSearch {
     void Add(const RowCube& cube) { Count(cube, 1); }
     void Remove(const RowCube& cube) { Count(cube, UINT32_MAX); }
 
-    // 'step' more cubes cover what the cube has; keeps m_open and m_single.
+    // Adds 'step' to the number of cubes that cover what the cube has; keeps m_open and m_single.
     void Count(const RowCube& cube, uint32_t step)
     {
         m_work.Spend(NumRowsOf(cube));
@@ -63,7 +63,7 @@ class RowSumSearch {
         });
     }
 
-    // Pairs of row and output, those first whose row has fewest neighbours with the output.
+    // Pairs of row and output; rows with the fewest neighbours that may have the output come first.
     std::vector<uint32_t> OrderPairs() const
     {
         const size_t numOutputs = m_rows.numOutputs;
@@ -101,7 +101,7 @@ class RowSumSearch {
         }
     }
 
-    // The outputs that a cube may have.
+    // The outputs that the cube may have.
     uint64_t AllowedOf(const RowCube& cube) const
     {
         uint64_t allowed = ~uint64_t(0);
@@ -109,8 +109,9 @@ class RowSumSearch {
         return allowed;
     }
 
-    // Grows a cube so that it takes in as much as it can of 'worth': first wherever that leaves it
-    // the outputs it has, to the place where it was worth most, then wherever it keeps those.
+    // Grows a cube to take in as much of 'worth' as it can: first wherever it keeps the outputs of
+    // 'cube', back to the stage at which it was worth most, then wherever it keeps its outputs of
+    // that stage.
     RowCube Expand(const RowCube& cube, const std::vector<uint64_t>& worth)
     {
         RowCube grown = cube;
@@ -142,8 +143,8 @@ class RowSumSearch {
         return total;
     }
 
-    // Opens the input after which the cube is worth most and still has 'outputs'. Those that it
-    // cannot open leave 'candidates'. False when none is left.
+    // Opens the input that makes the cube worth most and leaves it 'outputs'. Inputs that cannot be
+    // opened leave 'candidates'. False if none is left.
     bool GrowOnce(RowCube& cube, uint64_t outputs, const std::vector<uint64_t>& worth,
                   uint32_t& candidates, size_t& bestWorth)
     {
@@ -153,7 +154,7 @@ class RowSumSearch {
         const size_t ownWorth = WorthOf(cube, worth);
         for (uint32_t rest = candidates; rest != 0; rest &= rest - 1) {
             const uint32_t bit = rest & (~rest + 1);
-            RowCube half = cube; // that it would gain
+            RowCube half = cube; // what it would gain
             half.values ^= bit;
             half.outputs &= AllowedOf(half);
             m_work.Spend(numRows);
@@ -177,7 +178,8 @@ class RowSumSearch {
         return true;
     }
 
-    // What only this cube of the cover has, as the smallest cube. No outputs when that is nothing.
+    // The smallest cube with everything that only this cube of the cover has. No outputs if that is
+    // nothing.
     RowCube Reduced(const RowCube& cube) const
     {
         uint32_t ones = 0;
@@ -194,7 +196,7 @@ class RowSumSearch {
         return {ones & zeros, ones & ~zeros, outputs};
     }
 
-    // The cubes that have least to themselves first.
+    // The order that puts first the cubes that alone cover the least.
     std::vector<uint32_t> OrderByOwn()
     {
         std::vector<uint32_t> order(m_cubes.size());
@@ -226,7 +228,8 @@ class RowSumSearch {
         m_cubes.erase(std::remove_if(m_cubes.begin(), m_cubes.end(), isEmpty), m_cubes.end());
     }
 
-    // Each cube becomes as small as the others let it be, then grows over what others have alone.
+    // Each cube becomes as small as the others allow, then grows over what only one other cube
+    // covers.
     void Turn()
     {
         for (const uint32_t index : OrderByOwn()) {
@@ -242,14 +245,14 @@ class RowSumSearch {
         DropEmpty();
     }
 
-    // Outputs that others cover go, then inputs that the outputs left do not need.
+    // Removes outputs that others cover, then inputs that the remaining outputs do not need.
     void MakeSparse()
     {
         for (RowCube& cube : m_cubes) {
             const RowCube reduced = Reduced(cube);
             Remove(cube);
             cube.outputs = reduced.outputs;
-            if (reduced.outputs == 0) // one that grew before took it in
+            if (reduced.outputs == 0) // a cube that grew earlier has taken it in
                 continue;
             uint32_t candidates = AllInputs() & ~cube.open;
             size_t worth = 0;
@@ -264,9 +267,9 @@ class RowSumSearch {
     Work& m_work;
     size_t m_num_inputs;
     std::vector<RowCube> m_cubes;
-    std::vector<uint32_t> m_counts; // of cubes that have an output of a row and are needed there
-    std::vector<uint64_t> m_open;   // needed and in no cube
-    std::vector<uint64_t> m_single; // needed and in one cube at most
+    std::vector<uint32_t> m_counts; // cubes that have an output of a row, if it is needed there
+    std::vector<uint64_t> m_open;   // needed, in no cube
+    std::vector<uint64_t> m_single; // needed, in at most one cube
 };
 
 } // namespace

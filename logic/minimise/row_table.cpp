@@ -10,9 +10,9 @@ namespace {
 constexpr size_t kFewInputs = 16;
 constexpr size_t kMaxRowInputs = 20;
 constexpr size_t kMaxRowsForCube = 128;
-constexpr size_t kMaxOutputs = 64;            // of a mask
-constexpr size_t kMaxPairs = size_t(1) << 24; // of rows and outputs
-constexpr double kMaxVisits = 64;             // of each row
+constexpr size_t kMaxOutputs = 64;            // bits of a mask
+constexpr size_t kMaxPairs = size_t(1) << 24; // pairs of row and output
+constexpr double kMaxVisits = 64;             // to each row, on average
 
 double CountRows(const CubeSpace& space, const CubeList& cubes)
 {

@@ -1,5 +1,5 @@
-// Tables of so few inputs, or so many rows, that each row can be gone through: for each row a mask
-// of outputs. What cubes ask of one another is then a look at the rows that they hold.
+// Tables with so few inputs that each row can be visited: for each row a mask of outputs. A
+// question between cubes then becomes a look at the rows that they hold.
 #ifndef BOOLEQ_MINIMISE_ROW_TABLE_H
 #define BOOLEQ_MINIMISE_ROW_TABLE_H
 
@@ -13,18 +13,19 @@ struct RowTable {
     size_t numInputs = 0;
     size_t numOutputs = 0;
     std::vector<uint64_t> needed;  // the outputs that must be 1
-    std::vector<uint64_t> allowed; // those that may be 1
+    std::vector<uint64_t> allowed; // the outputs that may be 1
 };
 
-// Whether the rows are few, or few for the cubes that the table has: up to 16 inputs, or up to 20
-// and no more than 128 rows for a cube. So rows never cost more than the text did by much.
+// Whether the rows are few enough, in all or for the number of cubes in the table: up to 16 inputs,
+// or up to 20 and no more than 128 rows for each cube. So rows never cost much more than the text
+// did.
 bool CanListRows(const Pla& table);
 
-// The rows of a table that does not contradict itself; 'isInverted': of the inverted functions.
-// Requires: CanListRows(table).  Cost: each cube's rows.
+// The rows of a table that does not contradict itself; if 'isInverted', of the inverted functions.
+// Requires: CanListRows(table).  Cost: the rows of each cube.
 RowTable ListRows(const Pla& table, bool isInverted, Work& work);
 
-// Inputs that are open, values of the others, outputs.
+// A cube as its open inputs, the values of the others, and its outputs.
 struct RowCube {
     uint32_t open;
     uint32_t values; // 0 where an input is open
@@ -50,7 +51,7 @@ void ForEachRow(const RowCube& cube, const Visit& visit)
     } while (part != 0);
 }
 
-// Whether the sum has all rows that it needs and none that it may not have.
+// Whether the sum has all rows that it needs and only rows that it may have.
 bool IsSumOfRows(const CubeSpace& space, const RowTable& rows, const CubeList& sum, Work& work);
 
 } // namespace booleq

@@ -19,7 +19,7 @@ uint64_t Upper(uint64_t rows, size_t input)
     return half | half >> (size_t(1) << input);
 }
 
-// Covers 'needed' and nothing outside 'allowed'; returns what is covered. Depth: 'numInputs'.
+// Covers 'needed' and nothing outside 'allowed'; returns the rows covered. Depth: 'numInputs'.
 uint64_t Cover(uint64_t needed, uint64_t allowed, size_t numInputs, SmallCube prefix,
                std::vector<SmallCube>& cubes)
 {
@@ -32,7 +32,7 @@ uint64_t Cover(uint64_t needed, uint64_t allowed, size_t numInputs, SmallCube pr
     }
     size_t input = numInputs;
     do {
-        assert(input > 0); // something that is neither 0 nor 1 depends on an input
+        assert(input > 0); // rows that are neither all 0 nor all 1 depend on an input
         --input;
     } while (Lower(needed, input) == Upper(needed, input) &&
              Lower(allowed, input) == Upper(allowed, input));

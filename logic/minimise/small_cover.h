@@ -12,7 +12,7 @@
 
 namespace booleq {
 
-constexpr size_t kWordInputs = 6; // inputs whose rows fit a word
+constexpr size_t kWordInputs = 6; // the rows of so many inputs fit a word
 
 // Bit k of 'zeros' or 'ones' says that the product needs input k to be 0 or 1.
 struct SmallCube {
@@ -20,7 +20,7 @@ struct SmallCube {
     uint8_t ones;
 };
 
-// Appends an irredundant cover of primes of the rows; inputs from 'numInputs' on must not matter.
+// Appends an irredundant cover of 'rows' by primes; inputs from 'numInputs' on must not matter.
 void FindSmallCover(uint64_t rows, size_t numInputs, std::vector<SmallCube>& cubes);
 
 } // namespace booleq

@@ -12,12 +12,12 @@ namespace booleq {
 
 namespace {
 
-// Without --exact an exact search is tried with as much work as the heuristic took, and a
-// little; where that was much it would need far more, so there is a limit.
+// Without --exact an exact search may take as much work as the heuristic did, and a little more.
+// There is a limit, because after a lot of work it would need far more.
 constexpr uint64_t kTrialShare = 1;
 constexpr uint64_t kTrialUnits = 1u << 20;
 constexpr uint64_t kMaxTrialUnits = 3u << 20;
-constexpr size_t kManyPairs = 20000; // of cubes and outputs that are on
+constexpr size_t kManyPairs = 20000; // pairs of a cube and an output that it has on
 constexpr size_t kManyCubes = 16384;
 
 void SetSeconds(double seconds, Work& work)
@@ -27,9 +27,9 @@ void SetSeconds(double seconds, Work& work)
                                                   std::chrono::duration<double>(seconds)));
 }
 
-// Where nothing is known of the off-set an exact search has no rows to start from, but a sum of
-// essential primes has no rival: each has a row that no other prime covers, so each sum has a term
-// within it for that row, with no fewer literals.
+// If the off-set is not known, an exact search has no rows to start from. But no other sum beats
+// one of essential primes: each has a row that no other prime covers, so each sum has a term inside
+// that prime for the row, with no fewer literals.
 void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work& work)
 {
     const CubeSpace& space = problem.space;
@@ -43,7 +43,7 @@ void ProveByEssential(const TwoLevelProblem& problem, Goal goal, Sum& sum, Work&
     primes.cubes.Keep(isEssential);
     ShedOutputs(problem, sum.cubes, work);
     sum.cost = CostOf(space, sum.cubes);
-    assert(primes.cubes.Size() <= sum.cost.numTerms); // a cover has them all
+    assert(primes.cubes.Size() <= sum.cost.numTerms); // a cover contains all of them
     const bool areAllEssential = primes.cubes.Size() == sum.cost.numTerms;
     if (goal == Goal::Terms) {
         sum.lowerBound = primes.cubes.Size();
@@ -91,7 +91,7 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
 
 namespace {
 
-// So many rows that growing cube by cube against what is off would take seconds.
+// Whether there are so many rows that growing cube by cube against the off-set would take seconds.
 bool IsLong(const Pla& table)
 {
     const size_t numCubes = table.on.Size() + table.free.Size() + table.off.Size();
@@ -101,7 +101,7 @@ bool IsLong(const Pla& table)
     return numPairs > kManyPairs && CanListRows(table);
 }
 
-// The sum by rows, if that is cheaper than the one there is.
+// Takes the sum by rows if it is cheaper than the present one.
 void TakeSumOfRows(const Pla& table, const SumOptions& options, Sum& sum, Work& work)
 {
     const RowTable rows = ListRows(table, options.isInverted, work);

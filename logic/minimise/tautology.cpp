@@ -1,5 +1,5 @@
-// Tautology: does a cover leave no row out. A cover that is unate in an input is a tautology only
-// if the cubes without that input are one; six inputs or fewer are settled by a word of rows.
+// Tautology: whether a cover leaves no row out. A cover that is unate in an input is a tautology
+// only if the cubes without that input are one; a word of rows settles six inputs or fewer.
 #include "small_cover.h"
 #include "unate.h"
 #include "unate_walk.h"
@@ -34,7 +34,7 @@ class TautologyCheck {
     }
 
   private:
-    // Drops cubes that cannot help. False when the answer is known, in m_is_tautology; otherwise
+    // Drops cubes that cannot help. False if the answer is known and in m_is_tautology; otherwise
     // m_binate holds the inputs that occur.
     bool Reduce(StackPart& part)
     {
@@ -54,7 +54,7 @@ class TautologyCheck {
         }
     }
 
-    // True when the answer is known: a cube without literals, too few rows, or few inputs.
+    // True if the answer is known: a cube without literals, too few rows, or few inputs.
     bool Settle(StackPart part, size_t numBinate)
     {
         double share = 0; // of all rows, counted as if no two cubes met
@@ -69,7 +69,7 @@ class TautologyCheck {
             share +=
                 numLiterals < 64 ? 1.0 / static_cast<double>(uint64_t(1) << numLiterals) : 1e-19;
         }
-        if (share < 0.999) // short of 1 by more than rounding can take
+        if (share < 0.999) // further below 1 than rounding can explain
             return true;
         if (numBinate > kWordInputs)
             return false;

@@ -1,5 +1,5 @@
-// The classical loop: expand, irredundant, essential primes set aside, then reduce, expand and
-// irredundant as long as that gains, then last gasp.
+// The classical loop: expand, irredundant, set essential primes aside; then reduce, expand and
+// irredundant as long as that gains; then last gasp.
 #include "two_level.h"
 
 #include <algorithm>
@@ -25,9 +25,9 @@ bool IsCheaper(const CoverCost& left, const CoverCost& right)
 namespace {
 
 constexpr uint64_t kPoolShare = 1;
-constexpr uint64_t kMaxSpentForMore = 14u << 20; // where the loop took longer, more of it would too
+constexpr uint64_t kMaxSpentForMore = 14u << 20; // beyond this, going on would take too long
 constexpr size_t kMaxToCompare = 20000;
-constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start from
+constexpr size_t kMaxSplit = 50000; // cubes of one output each, to start with
 constexpr int kPoolRounds = 1;
 constexpr int kPoolTurns = 3;
 constexpr uint64_t kMaxUnits = uint64_t(1) << 31; // several seconds
@@ -68,7 +68,7 @@ class SmallSumSearch {
     }
 
   private:
-    // False when it ended early. m_best is a cover then too, with m_essential.
+    // False if it ended early. m_best together with m_essential is a cover then too.
     bool Search(const CubeList& on)
     {
         bool isFirstDone = false;
@@ -110,8 +110,8 @@ class SmallSumSearch {
         m_cover.isPrime.assign(m_cover.cubes.Size(), 1);
     }
 
-    // A cube that several outputs share is a choice that the search might not make: it starts from
-    // a cube for each output, unless these are too many.
+    // Starts from a cube for each output, unless these are too many: a cube that several outputs
+    // share is a choice that the search might not make.
     CubeList SplitOutputs(const CubeList& on) const
     {
         CubeList united = on;
@@ -136,7 +136,7 @@ class SmallSumSearch {
     void StartFrom(CubeList cubes)
     {
         m_cover.cubes = std::move(cubes);
-        if (m_cover.cubes.Size() <= kMaxToCompare) // expansion takes contained cubes in as well
+        if (m_cover.cubes.Size() <= kMaxToCompare) // expansion also takes in contained cubes
             RemoveContained(m_space, m_cover.cubes, m_work);
         m_cover.isPrime.assign(m_cover.cubes.Size(), 0);
         ExpandCover(m_space, m_expander, m_cover, m_work);
@@ -144,8 +144,8 @@ class SmallSumSearch {
         MakeIrredundant(m_space, m_cover, m_free, m_work);
     }
 
-    // Turns and last gasps as long as they gain, from m_cover; m_best is the better of what it was
-    // and what that comes to.
+    // Turns and last gasps from m_cover, as long as they gain; m_best becomes the better of what it
+    // was and the result.
     void Descend()
     {
         do
@@ -153,7 +153,7 @@ class SmallSumSearch {
         while (GainByLastGasp());
     }
 
-    // Whether a cube has several outputs; otherwise both starts are one.
+    // Whether a cube has several outputs; if not, both starts are the same.
     bool IsShared(const CubeList& on) const
     {
         CubeList united = on;
@@ -164,7 +164,7 @@ class SmallSumSearch {
         return false;
     }
 
-    // The other start: products that outputs share as they are given.
+    // The other start: products shared by outputs, as given.
     void DescendFromUnited(const CubeList& on)
     {
         const Cover best = m_best;
@@ -197,7 +197,7 @@ class SmallSumSearch {
         m_cover = m_best;
     }
 
-    // Reduce, expand, irredundant. The primes on the way are remembered.
+    // Reduce, expand, irredundant. Primes found on the way are remembered.
     void Turn(bool isBySize)
     {
         ReduceCover(m_space, m_cover, m_free, isBySize, m_work);
@@ -206,7 +206,7 @@ class SmallSumSearch {
         MakeIrredundant(m_space, m_cover, m_free, m_work);
     }
 
-    // The best cover by any of the primes seen so far; more turns bring more of them. Spends at
+    // The best cover by any of the primes seen so far; further turns find more of them. Spends at
     // most a share of what has been spent before.
     void ChooseFromPool()
     {
@@ -258,7 +258,7 @@ class SmallSumSearch {
     Expander m_expander;
     Cover m_cover;
     Cover m_best;
-    CubeList m_pool; // primes, some more than once
+    CubeList m_pool; // primes; some occur more than once
     CubeList m_essential;
 };
 

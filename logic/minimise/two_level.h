@@ -1,7 +1,6 @@
 // Sums of products for several outputs at once: the problem, and the heuristic search for a small
-// answer. Input: what is on, what is free, what is off, as cubes. Output: a cover with as few
-// terms, then as few literals, as the search finds; every answer is proved right by Prove before it
-// leaves.
+// answer. Input: what is on, free and off, as cubes. Output: a cover with as few terms, then as few
+// literals, as the search finds. It is not proved here; Minimise (sum.h) proves every answer.
 #ifndef BOOLEQ_MINIMISE_TWO_LEVEL_H
 #define BOOLEQ_MINIMISE_TWO_LEVEL_H
 
@@ -11,8 +10,8 @@
 namespace booleq {
 
 // Invariants: for each output every row is in 'on', 'free' or 'off'; 'off' meets neither of the
-// others; rows in both 'on' and 'free' are free. Without 'hasOff', 'off' is empty and off is
-// whatever is in neither of the others.
+// others; rows in both 'on' and 'free' are free. Without 'hasOff', the list 'off' is empty, and a
+// row is off if it is in neither of the others.
 struct TwoLevelProblem {
     explicit TwoLevelProblem(const CubeSpace& itsSpace)
         : space(itsSpace), on(space.NumWords()), free(space.NumWords()), off(space.NumWords())
@@ -34,13 +33,13 @@ CoverCost CostOf(const CubeSpace& space, const CubeList& cubes);
 bool IsCheaper(const CoverCost& left, const CoverCost& right);
 
 // A cover by the classical loop. Repeatable: the same problem gives the same cover, unless the work
-// has a deadline. True when the loop came to its end; then the cover is irredundant. Otherwise, by
-// a deadline or because the problem is too large, it is what had been reached, which may have cubes
-// as they were given.
+// has a deadline. True if the loop reached its end; then the cover is irredundant. Otherwise,
+// because of a deadline or because the problem is too large, it is the cover reached so far, in
+// which cubes may be as given.
 bool FindSmallSum(const TwoLevelProblem& problem, Work& work, CubeList& sum);
 
-// Outputs that other cubes cover go, then inputs that are not needed for those left: fewer literals
-// for the same terms.
+// Removes outputs that other cubes cover, then inputs that the remaining outputs do not need: fewer
+// literals for the same terms.
 void ShedOutputs(const TwoLevelProblem& problem, CubeList& cubes, Work& work);
 
 } // namespace booleq

@@ -1,4 +1,4 @@
-// Choice of the input to split by, and cofactors on the stack.
+// The choice of an input to split by, and cofactors on the stack.
 #include "unate_walk.h"
 
 #include <algorithm>
@@ -7,7 +7,7 @@ namespace booleq {
 
 namespace {
 
-// Adds two words to a plane of counts; returns what they carry to the next plane.
+// Adds two words to a plane of counts; returns the carry to the next plane.
 inline uint64_t AddTwo(uint64_t& plane, uint64_t left, uint64_t right)
 {
     const uint64_t different = plane ^ left;
@@ -16,8 +16,8 @@ inline uint64_t AddTwo(uint64_t& plane, uint64_t left, uint64_t right)
     return carry;
 }
 
-// How many cubes lack each bit of 'asked', four cubes at a time. The counts of a word grow side by
-// side: bit k of planes[p] is bit p of the count of bit k.
+// Counts how many cubes lack each bit of 'asked', four cubes at a time. The counts of a word grow
+// side by side: bit k of planes[p] is bit p of the count for bit k.
 void CountAbsent(const CubeList& stack, StackPart part, size_t word, uint64_t asked,
                  uint32_t* counts)
 {
@@ -109,7 +109,7 @@ void DropUnate(CubeList& stack, StackPart& part, const std::vector<uint64_t>& bi
             (*labels)[part.first + count] = (*labels)[index];
         CopyCube(stack.At(part.first + count++), cube, numWords);
     }
-    assert(count < part.count); // an input that is not binate occurs
+    assert(count < part.count); // some cube fixes an input that is not binate
     part.count = count;
 }
 

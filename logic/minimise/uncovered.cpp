@@ -1,5 +1,5 @@
-// What rows that a cover leaves out have in common: the supercube of the complement, without the
-// complement. A subtree is entered only for parts that have not been found yet.
+// What the rows that a cover leaves out have in common: the supercube of the complement, without
+// the complement itself. A subtree is entered only for parts that have not been found yet.
 #include "small_cover.h"
 #include "unate.h"
 #include "unate_walk.h"
@@ -52,7 +52,7 @@ class UncoveredSearch {
     }
 
   private:
-    // Whether rows on this path could have a part that is not found yet.
+    // Whether rows on this path could have a part that has not been found yet.
     bool HasNews() const
     {
         for (size_t word = 0; word < m_num_words; ++word)
@@ -76,8 +76,8 @@ class UncoveredSearch {
         Enter(part, lowBit, true);
     }
 
-    // Rows that are left out where the input covers more are left out for its other value too: all
-    // that they can add is that value of the input itself.
+    // Rows that are left out for the value where more is covered are left out for the other value
+    // too: all that they can add is that value of the input itself.
     void SplitUnate(StackPart part, size_t lowBit, bool isOne)
     {
         Enter(part, lowBit, !isOne);
@@ -95,7 +95,7 @@ class UncoveredSearch {
 
     void AddRows(StackPart part)
     {
-        std::vector<uint64_t>& inputs = m_binate; // not needed any more
+        std::vector<uint64_t>& inputs = m_binate; // no longer needed
         for (size_t word = 0; word < m_num_words; ++word)
             inputs[word] |= m_unate[word];
         WordRows rows;
@@ -103,7 +103,7 @@ class UncoveredSearch {
         const uint64_t covered = rows.Covered(m_stack, part);
         if (covered == ~uint64_t(0))
             return;
-        std::vector<uint64_t>& parts = m_unate; // nor this
+        std::vector<uint64_t>& parts = m_unate; // nor is this
         parts = m_path;
         for (size_t place = 0; place < rows.NumInputs(); ++place) {
             if ((~covered & BitPattern(place)) == 0)
@@ -120,7 +120,7 @@ class UncoveredSearch {
     Work& m_work;
     size_t m_num_words;
     uint64_t* m_found;
-    std::vector<uint64_t> m_path; // parts that the inputs fixed so far leave
+    std::vector<uint64_t> m_path; // parts left by the inputs fixed so far
     std::vector<uint64_t> m_binate;
     std::vector<uint64_t> m_unate;
     std::vector<uint32_t> m_counts;

@@ -15,8 +15,8 @@ class RowSearch {
     {
     }
 
-    // Narrows m_row to values that leave a row out; the inputs it still leaves open then do not
-    // matter. Depth: one level for each input.
+    // Narrows m_row to values for which a row is left out; inputs that it still leaves open do not
+    // matter.  Fails: false if no row is left out.  Depth: one level for each input.
     bool Find(StackPart part)
     {
         const std::vector<uint64_t> before(m_row, m_row + m_num_words);
@@ -97,7 +97,7 @@ void UncoveredRows::Cover(const uint64_t* cube)
     AppendCofactor(m_space, cube, m_cube.data(), m_meeting);
     if (m_output == m_space.NumOutputs() || !GetBit(cube, m_space.OutputBit(m_output)))
         return;
-    m_of_output.Append(m_meeting.At(m_meeting.Size() - 1)); // as far as its inputs go
+    m_of_output.Append(m_meeting.At(m_meeting.Size() - 1)); // only its inputs
     uint64_t* const inputs = m_of_output.At(m_of_output.Size() - 1);
     for (size_t word = 0; word < m_space.NumInputWords(); ++word)
         inputs[word] |= ~m_space.Inputs(word);
@@ -108,7 +108,7 @@ bool UncoveredRows::Next(uint64_t* row)
     for (; m_output < m_space.NumOutputs(); ++m_output, ListOutput()) {
         for (size_t word = 0; word < m_space.NumWords(); ++word)
             row[word] = m_cube[word] & m_space.Inputs(word);
-        CubeList stack = m_of_output; // the search drops cubes of its own
+        CubeList stack = m_of_output; // the search drops cubes from it
         if (!RowSearch(m_space, stack, m_work, row).Find({0, stack.Size()}))
             continue;
         for (size_t input = 0; input < m_space.NumInputs(); ++input)

@@ -1,4 +1,4 @@
-// Limits of searches.
+// The limits of searches.
 #include "work.h"
 
 #include <algorithm>

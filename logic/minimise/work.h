@@ -1,6 +1,6 @@
-// What a search has spent, in words of cubes looked at; it ends by exception when that is too much,
-// when time is up or when whoever watches throws. The unit is the same on every machine, so limits
-// given in it leave results repeatable.
+// The work that a search has spent, in words of cubes looked at. Spend throws if that is too much,
+// if time is up, or if the watcher throws. The unit is the same on every machine, so limits in it
+// keep results repeatable.
 #ifndef BOOLEQ_MINIMISE_WORK_H
 #define BOOLEQ_MINIMISE_WORK_H
 
@@ -9,9 +9,9 @@
 
 namespace booleq {
 
-// Thrown by Work::Spend; searches catch it where they have something to fall back on.
+// Thrown by Work::Spend; searches catch it if they have a result to fall back on.
 struct OutOfWork {
-    bool isTime; // else the limit of units
+    bool isTime; // otherwise the limit of units
 };
 
 class Work {
@@ -26,7 +26,7 @@ class Work {
             Check();
     }
     uint64_t Spent() const { return m_spent; }
-    // Spend throws from 'spent' on; UINT64_MAX: never.
+    // Spend throws from 'spent' units on; UINT64_MAX: never.
     void SetLimit(uint64_t spent);
     uint64_t Limit() const { return m_limit; }
     void SetDeadline(Clock::time_point deadline) { m_deadline = deadline; }

@@ -18,7 +18,7 @@ struct Spelling {
     const char* own;
 };
 
-// Longer ones before those that they begin with.
+// A longer spelling comes before those that it begins with.
 constexpr Spelling kOperators[] = {
     {"===", "~^"},         {"!==", "^"},          {"==", "~^"},          {"!=", "^"},
     {"~=", "^"},           {"<->", "~^"},         {"<=>", "~^"},         {"\xc2\xac", "~"},
@@ -56,7 +56,7 @@ class Place {
         return position <= m_text.size() &&
                m_text.compare(position, std::strlen(wanted), wanted) == 0;
     }
-    // The characters of a name at and before the place.
+    // Where the name around a position starts and ends; the position itself if there is no name.
     size_t NameStart(size_t position) const
     {
         while (position > 0 && IsNamePart(m_text[position - 1]))
@@ -108,7 +108,7 @@ class Place {
     size_t m_offset;
 };
 
-// The place may be the second character of "!=", as "!" alone is an operator.
+// The place may be the second character of "!=", because "!" alone is an operator.
 std::string Place::OperatorHint() const
 {
     for (const Spelling& spelling : kOperators)
@@ -155,7 +155,7 @@ std::string Place::ImplicationHint() const
     return isArrow ? "write (~x | y) for x implies y" : "";
 }
 
-// "6 " for a size of 64 rows, nothing for one that is not a number of rows.
+// "6 " for a size of 64 rows; empty for one input, or if the size is not a number of rows.
 std::string NumInputsOf(const std::string& literal)
 {
     for (size_t numInputs = 1; numInputs <= kMaxFunctionInputs; ++numInputs)
@@ -164,7 +164,7 @@ std::string NumInputsOf(const std::string& literal)
     return std::string();
 }
 
-// N'... as a whole text is an init value, as an operand it may be a constant.
+// N'... is an init value if it is the whole text; as an operand it may be a constant.
 std::string Place::SizedHint(size_t start, size_t end, const Reading& reading) const
 {
     const std::string literal = m_text.substr(start, end - start);
@@ -184,7 +184,7 @@ std::string Place::SizedHint(size_t start, size_t end, const Reading& reading) c
     return "the only constants are 0 and 1, without a size";
 }
 
-// "16hcaca", the quote forgotten.
+// "16hcaca": the quote was forgotten.
 std::string Place::UnquotedHint(size_t start, size_t end, const Reading& reading) const
 {
     size_t base = start;

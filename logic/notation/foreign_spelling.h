@@ -1,6 +1,7 @@
-// Spellings of other languages where a text is refused, and what this library's syntax has for
-// them. In: a text and the place of its refusal; out: what to write instead.  Cost: a look around
-// the place.
+// Spellings of other languages in a text that is refused, and what to write for them in this
+// library's syntax.
+// In: a text and the place of its refusal. Out: what to write instead.
+// Cost: a look around the place.
 #ifndef BOOLEQ_NOTATION_FOREIGN_SPELLING_H
 #define BOOLEQ_NOTATION_FOREIGN_SPELLING_H
 
@@ -11,7 +12,7 @@
 
 namespace booleq {
 
-// Empty where nothing known stands at the place.
+// Empty if there is no known spelling at the place.
 std::string HintForForeign(const std::string& text, size_t offset, const Reading& reading);
 
 } // namespace booleq

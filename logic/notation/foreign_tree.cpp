@@ -1,5 +1,5 @@
-// An operator-precedence reader: operands go to the tree at once, operators wait on a stack until
-// one that binds no tighter, a closing parenthesis or the end of the text releases them.
+// An operator-precedence reader: operands go to the tree at once; operators wait on a stack until
+// an operator that binds no tighter, a closing parenthesis or the end of the text releases them.
 #include "foreign_tree.h"
 
 #include <algorithm>
@@ -86,12 +86,12 @@ class Reader {
         const size_t length = std::strlen(text);
         if (m_text.compare(m_position, length, text) != 0)
             return false;
-        // A word does not go on.
+        // A word must end here.
         return !IsNameCharacter(text[length - 1]) || m_position + length >= m_text.size() ||
                !IsNameCharacter(m_text[m_position + length]);
     }
 
-    // The longest of the forms that stands here; null for none.
+    // The longest of the forms that matches here; null if none does.
     const OperatorForm* Match(const std::vector<OperatorForm>& forms) const
     {
         const OperatorForm* longest = nullptr;
@@ -198,7 +198,7 @@ bool Reader::ReadConstant(bool& isThere)
     const char character = m_text[m_position];
     if (character < '0' || character > '9')
         return true;
-    // A plain number where constants are written otherwise: Verilog's are 32 bits wide.
+    // A plain number in a notation that writes constants differently: Verilog's are 32 bits wide.
     const bool isLone =
         m_position + 1 >= m_text.size() ||
         (!IsNameCharacter(m_text[m_position + 1]) && m_text[m_position + 1] != '\'');

@@ -1,4 +1,4 @@
-// A text read as another notation would read it: its tree, and what that says bit by bit.
+// A text read as another notation would read it: its tree, and what that means bit by bit.
 #ifndef BOOLEQ_NOTATION_FOREIGN_TREE_H
 #define BOOLEQ_NOTATION_FOREIGN_TREE_H
 
@@ -21,30 +21,30 @@ struct ForeignTree {
     };
     const Notation* notation = nullptr;
     std::vector<Node> nodes;
-    std::vector<std::string> names; // as the notation knows them: escapes and case taken away
+    std::vector<std::string> names; // as the notation tells them apart: without escapes and case
 };
 
-// Reads 'text'. Names are added to tree.names as they come.
-// Fails: false for a text that the notation does not have; 'fault' says why, in one sentence.
+// Reads 'text'. New names are added to tree.names.
+// Fails: false for a text that is not in the notation; 'fault' says why, in one sentence.
 // Cost: in step with the text, and with the number of names; no recursion.
 bool Read(const std::string& text, const Notation& notation, ForeignTree& tree, std::string& fault);
 
-// What ForeignTree::names holds for a name as a target spells it.
+// The name in ForeignTree::names for a name as a target spells it.
 std::string CanonicalName(const Notation& notation, const std::string& spelled);
 
-// The same function as operators on bits, over the tree's names.
-// Fails: false where values are wider than a bit and that shows in the result.
+// The same function with operators on bits, over the tree's names.
+// Fails: false if values are wider than a bit and that affects the result.
 bool ToExpression(const ForeignTree& tree, Expression& expression);
 
-// The function of the tree for inputs 0 or 1, exact also where values are wider. inputs[k] belongs
+// The function of the tree for inputs 0 or 1; it is exact for wider values too. inputs[k] belongs
 // to tree name k.  Requires: the tree outlives the function.
 WordFunction ToWordFunction(const ForeignTree& tree);
 
-// The same function to be decided about, exact in the same way.
+// The same function as a side of a decision, exact in the same way.
 // Requires: the tree outlives the side.
 Side SideOf(const ForeignTree& tree);
 
-// With parentheses around every operation, in the notation's own operators.
+// The tree with parentheses around every operation, in the notation's own operators.
 std::string WriteWhole(const ForeignTree& tree, const std::vector<std::string>& names);
 
 } // namespace booleq

@@ -1,5 +1,5 @@
-// What a tree of another notation says: as operators on bits where that is exact, otherwise by
-// computing with values as wide as the notation has them.
+// What a tree of another notation means: with operators on bits if that is exact, otherwise by
+// computing with values as wide as the notation makes them.
 #include "foreign_tree.h"
 
 #include <algorithm>
@@ -23,8 +23,8 @@ bool IsLeaf(Meaning meaning)
     return meaning <= Meaning::Input;
 }
 
-// Node k's width in bits, given by its own operands: 1, or 32 where a number is among them. An
-// inversion to a truth value is one bit whatever is inside.
+// Whether node k's own operands make it 32 bits wide, because one of them is a number; otherwise it
+// is one bit wide. An inversion to a truth value is always one bit.
 std::vector<bool> FindWide(const ForeignTree& tree)
 {
     std::vector<bool> isWide(tree.nodes.size());
@@ -40,8 +40,8 @@ std::vector<bool> FindWide(const ForeignTree& tree)
     return isWide;
 }
 
-// In vectors the lowest bit of a result depends on the lowest bits of operands alone, but for an
-// inversion to a truth value, which asks for all bits.
+// In vectors the lowest bit of a result depends only on the lowest bits of the operands, except for
+// an inversion to a truth value, which depends on all bits.
 bool IsExactInBits(const ForeignTree& tree)
 {
     if (tree.notation->values == Values::Bits)
@@ -92,8 +92,8 @@ constexpr uint64_t kBitMask = 1;
 constexpr uint64_t kNumberMask = 0xffffffff;
 constexpr uint64_t kIntMask = ~uint64_t(0);
 
-// The bits of each node's value. In vectors an operator works in the width of its context: from the
-// root, or the truth value above, down.
+// A mask of the bits of each node's value. In vectors an operator works in the width of its
+// context, which the root or the nearest truth value above sets.
 std::vector<uint64_t> MasksOf(const ForeignTree& tree)
 {
     if (tree.notation->values != Values::Vector)
@@ -115,8 +115,8 @@ std::vector<uint64_t> MasksOf(const ForeignTree& tree)
     return masks;
 }
 
-// Computes with the values of one assignment, as wide as they are. Sums and products of bits stay
-// far below 64 bits in any text that people write; beyond, they wrap.
+// Computes with the values of one assignment in their full width. Sums and products of bits stay
+// far below 64 bits in any text that people write; larger ones wrap.
 class ValueMachine {
   public:
     explicit ValueMachine(const ForeignTree& tree)
@@ -245,7 +245,8 @@ class GateMachine {
         return Inverse(m_graph.AndOfAll(bits.data(), bits.data() + bits.size()));
     }
 
-    // Before the inversion that some operators end with. Both have the same width.
+    // The result before the inversion that some operators end with. Requires: both have the same
+    // width.
     Bus Binary(Meaning meaning, const Bus& left, const Bus& right)
     {
         assert(left.size() == right.size());

@@ -16,8 +16,8 @@ std::string Content(const std::string& name)
     return isQuoted ? name.substr(1, name.size() - 2) : name;
 }
 
-// Letters, digits and "_", beginning with a letter and without two "_" side by side, which every
-// target takes.
+// Letters, digits and "_", beginning with a letter and without two "_" side by side: every target
+// accepts such names.
 std::string Sanitized(const std::string& content)
 {
     std::string name;

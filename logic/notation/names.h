@@ -11,17 +11,17 @@
 
 namespace booleq {
 
-// Gives out names that a target takes and that nobody else has.
+// Gives out names that the target accepts and that are not in use yet.
 class TargetNamer {
   public:
-    // Null for files of gates, whose names are free but for a few characters.
+    // 'notation' is null for files of gates, whose names may have all but a few characters.
     explicit TargetNamer(const Notation* notation) : m_notation(notation) {}
 
-    // One name for each input. A quoted name loses its quotes; what is then no plain name is
-    // escaped, or its other characters become "_". Plain names of other inputs come first, so
+    // One name for each input. A quoted name loses its quotes; if the rest is not a plain name, it
+    // is escaped, or its other characters become "_". Plain names of other inputs come first, so
     // that A stays A and 'A' becomes A_1.
     std::vector<std::string> NameInputs(const std::vector<std::string>& inputs);
-    // 'wanted', or with a number after it.
+    // 'wanted', with a number after it if it is in use.
     std::string NameOther(const std::string& wanted);
 
   private:
@@ -31,7 +31,7 @@ class TargetNamer {
 
     const Notation* m_notation;
     std::set<std::string> m_used;                 // as the target tells names apart
-    std::map<std::string, size_t> m_last_numbers; // put after a wanted name
+    std::map<std::string, size_t> m_last_numbers; // added to a wanted name
 };
 
 } // namespace booleq

@@ -42,7 +42,7 @@ bool IsVerilogIdentifier(const std::string& name)
     return IsIdentifier(name, "$");
 }
 
-// Names that C keeps for itself are no input's: "__x", "_X".
+// C reserves some names, so an input cannot have them: "__x", "_X".
 bool IsCIdentifier(const std::string& name)
 {
     const bool isReserved =
@@ -50,7 +50,6 @@ bool IsCIdentifier(const std::string& name)
     return IsIdentifier(name, "") && !isReserved;
 }
 
-// Python changes names with two leading underscores in classes only, so these are plain.
 bool IsVhdlIdentifier(const std::string& name)
 {
     return IsIdentifier(name, "") && name[0] != '_' && name.back() != '_' &&
@@ -64,8 +63,8 @@ bool IsAllBetween(const std::string& text, char first, char last)
     });
 }
 
-// The blank ends the name. Before they know of escaped names, readers replace what follows a "`"
-// and take a "#" for the start of a directive.
+// The blank ends the name. Readers replace what follows a "`" and read a "#" as the start of a
+// directive before they look for escaped names, so these two cannot be escaped.
 std::string EscapeForVerilog(const std::string& name)
 {
     return IsAllBetween(name, '!', '~') && name.find_first_of("`#") == std::string::npos
@@ -85,8 +84,8 @@ std::string EscapeForVhdl(const std::string& name)
 
 constexpr const char* kNoKeywords[] = {nullptr};
 
-// Verilog and SystemVerilog: a file may be read as either. Some readers also keep "bool", "wone"
-// and "wreal" for themselves.
+// Verilog and SystemVerilog: a file may be read as either. Some readers also reserve "bool", "wone"
+// and "wreal".
 constexpr const char* kVerilogKeywords[] = {"accept_on",
                                             "alias",
                                             "always",
@@ -340,7 +339,7 @@ constexpr const char* kVerilogKeywords[] = {"accept_on",
                                             "xor",
                                             nullptr};
 
-// VHDL up to 2008; in small letters, as case does not count.
+// VHDL up to 2008, in lower case because case does not count.
 constexpr const char* kVhdlKeywords[] = {
     "abs", "access", "after", "alias", "all", "and", "architecture", "array", "assert", "assume",
     "assume_guarantee", "attribute", "begin", "block", "body", "buffer", "bus", "case", "component",
@@ -379,7 +378,7 @@ constexpr const char* kPythonKeywords[] = {
     "lambda",  "nonlocal", "not",      "or",        "pass", "raise",  "return", "try",
     "while",   "with",     "yield",    "__debug__", nullptr};
 
-// Two inversions side by side are no expression of the language, though some tools take them.
+// Two inversions side by side are not an expression of the language, though some tools accept them.
 const Notation kVerilog = {"Verilog",
                            Values::Vector,
                            "1'b0",
@@ -449,8 +448,9 @@ const Notation kC = {"C",
                      kCKeywords,
                      nullptr};
 
-// "and", "or", "!=" and "==" are for values 0 and 1, which is what the writer has them for; no text
-// of this library's syntax contains them.
+// "and", "or", "!=" and "==" are meant for values 0 and 1, which is how the writer uses them; no
+// text in this library's syntax contains them. Python changes names with two leading underscores in
+// classes only, so they are plain.
 const Notation kPython = {"Python",
                           Values::Int,
                           "0",
@@ -497,7 +497,7 @@ const Notation kLiberty = {"Liberty",
                            kNoKeywords,
                            nullptr};
 
-// Readers of this format differ about two inversions side by side.
+// Readers of this format disagree about two inversions side by side.
 const Notation kEqn = {
     "eqn",
     Values::Bits,

@@ -1,5 +1,5 @@
-// Notations of expressions as tables: what an operator is called there, how tightly it binds, which
-// names there are. One writer and one reader go by these tables.
+// Notations of expressions as tables: what an operator is called, how tightly it binds, which names
+// exist. One writer and one reader use these tables.
 #ifndef BOOLEQ_NOTATION_NOTATION_H
 #define BOOLEQ_NOTATION_NOTATION_H
 
@@ -34,11 +34,11 @@ enum class Meaning : uint8_t {
 // What this library means by an operator.
 Meaning MeaningOf(Operator op);
 
-// What values are, and so what the whole text says.
+// What a value is, and so what the whole text means.
 enum class Values : uint8_t {
     Bits,   // one bit each
-    Vector, // as wide as the operands of the context, a number 32 bits; bit 0 of the result counts
-    Int     // of 32 bits in C, of any width in Python; the result counts as 1 unless it is 0
+    Vector, // as wide as the operands of the context, numbers 32 bits; the result is bit 0
+    Int     // 32 bits in C, any width in Python; the result is 1 unless the value is 0
 };
 
 // Which operators of one level may follow each other without parentheses.
@@ -49,7 +49,7 @@ struct OperatorForm {
     Meaning meaning;
     uint8_t level; // higher binds tighter
     Chain chain;
-    bool isWritten; // by the writer; others are only read
+    bool isWritten; // the writer uses it; others are only read
 };
 
 struct Notation {
@@ -62,12 +62,12 @@ struct Notation {
     bool prefixesNest; // two may follow each other
     std::vector<OperatorForm> postfixes;
     std::vector<OperatorForm> binaries;
-    bool mixesInParentheses; // the writer never mixes operators without: compilers warn
+    bool mixesInParentheses; // the writer always separates different operators: compilers warn
     bool hasAdjacentAnd;     // operands side by side are joined like "&"
     bool ignoresCase;
-    bool (*isPlainName)(const std::string& name); // a name as it may stand, keywords apart
+    bool (*isPlainName)(const std::string& name); // can stand as it is, if not a keyword
     const char* const* keywords;                  // ended by null
-    std::string (*escape)(const std::string&); // any other name, empty when it cannot be; or null
+    std::string (*escape)(const std::string&); // spells any other name; empty if it cannot; or null
 };
 
 const Notation& VerilogNotation();
@@ -77,12 +77,12 @@ const Notation& PythonNotation();
 const Notation& LibertyNotation();
 const Notation& EqnNotation();
 
-// Those that a text of this library's own syntax may be taken for.
+// The notations that a text in this library's own syntax may be mistaken for.
 const std::vector<const Notation*>& ForeignNotations();
 
-// A name as it may stand in the notation, being no keyword either.
+// Whether the name can stand in the notation as it is; a keyword cannot.
 bool IsPlain(const Notation& notation, const std::string& name);
-// A name for what reads networks of gates: what all of these readers take.
+// Whether all readers of networks of gates accept the name.
 bool IsNetName(const std::string& name);
 
 } // namespace booleq

@@ -25,7 +25,7 @@ class Syntax {
     virtual bool Has(Operator op) const = 0;
     // Two inversions may follow each other.
     virtual bool InversionsNest() const { return true; }
-    // Compilers warn of "!a & (b | c)", lest "!(a & ...)" was meant.
+    // Compilers warn about "!a & (b | c)", because "!(a & ...)" may have been meant.
     virtual bool DoubtsInversions() const { return false; }
     // Every operation gets parentheses.
     virtual bool IsWhole() const { return false; }
@@ -116,7 +116,7 @@ class LibrarySyntax : public Syntax {
     Parentheses m_parentheses;
 };
 
-// The operator inside an inversion, for those that have one.
+// The operator that a negated operator inverts.
 Operator Inner(Operator op)
 {
     if (op == Operator::Nand)
@@ -152,7 +152,7 @@ class Writer {
     }
 
   private:
-    // A text, or a node still to be written.
+    // A text, or a node that is still to be written.
     struct Piece {
         std::string text;
         Expression::Node node;
@@ -169,7 +169,7 @@ class Writer {
             PushText("(");
     }
 
-    // A NAND of a syntax without one is an inversion of an AND, and counts as that.
+    // In a syntax without NAND, a NAND is an inversion of an AND and is treated as one.
     bool IsInversion(const Expression::Node& node) const
     {
         return node.op == Operator::Not || (IsBinary(node.op) && !m_syntax.Has(node.op));
@@ -208,7 +208,7 @@ class Writer {
         return !chains || form.chain == Chain::None;
     }
 
-    // Pieces are pushed from the last to the first.
+    // Pushes the pieces from the last to the first.
     void Expand(const Expression::Node& node)
     {
         assert(!IsBinary(node.op) || (node.left < m_nodes.size() && node.right < m_nodes.size()));

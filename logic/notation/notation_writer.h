@@ -15,19 +15,18 @@ enum class OwnSyntax { AsTyped, First, Second, Third };
 
 enum class Parentheses {
     Needed, // for this library
-    Clear,  // wherever two operators meet that are not one associative one
+    Clear,  // wherever two operators meet, unless both are the same associative one
     Whole   // around every operation
 };
 
 // 'names' are those of the target, one for each input.
-// Every operator that the notation lacks is written with those that it has: a NAND as the
-// inversion of an AND.  Cost: in step with the expression; no recursion.
+// An operator that the notation lacks is written with those that it has: a NAND as the inversion of
+// an AND.  Cost: in step with the expression; no recursion.
 std::string Write(const Expression& expression, const Notation& notation,
                   const std::vector<std::string>& names);
 
-// In a syntax of the library. A
-// text of three or more characters never starts with "0", which would be read as an init value
-// where inputs are listed.
+// Writes in a syntax of the library. A text of three or more characters never starts with "0",
+// because it would be read as an init value if inputs are listed.
 std::string WriteOwn(const Expression& expression, OwnSyntax syntax, Parentheses parentheses);
 
 } // namespace booleq

@@ -34,7 +34,7 @@ std::string Quoted(const std::string& text)
     return "'" + Excerpt(text) + "'";
 }
 
-// The refused text around its place.
+// The refused text around the place of the refusal.
 class Context {
   public:
     Context(const std::string& text, const Refusal& refusal) : m_text(text), m_refusal(refusal)
@@ -44,14 +44,14 @@ class Context {
     }
 
     std::string Token() const { return m_text.substr(m_refusal.offset, m_refusal.length); }
-    // The character so far after the token's first one, NUL outside the text.
+    // The character 'distance' bytes after the start of the token; NUL outside the text.
     char At(size_t distance) const
     {
         const size_t position = m_refusal.offset + distance;
         return position < m_text.size() ? m_text[position] : '\0';
     }
     char Before() const { return m_refusal.offset > 0 ? m_text[m_refusal.offset - 1] : '\0'; }
-    // The name that ends right before the place.
+    // The name that ends directly before the place.
     std::string NameBefore() const
     {
         size_t start = m_refusal.offset;
@@ -59,14 +59,14 @@ class Context {
             --start;
         return m_text.substr(start, m_refusal.offset - start);
     }
-    // The operator character after a lone negation and blanks, NUL when there is none.
+    // The operator character that blanks separate from a negation; NUL if there is none.
     char OperatorBehindNegation() const
     {
         const size_t next = m_text.find_first_not_of(" \t\n", m_refusal.offset + 1);
         const bool isSplit = next != std::string::npos && next > m_refusal.offset + 1;
         return isSplit && IsOneOf(kOperators, m_text[next]) ? m_text[next] : '\0';
     }
-    // Name and all that follows up to a blank, an operator or a parenthesis: "A[0]", "3B".
+    // The name and everything after it up to a blank, an operator or a parenthesis: "A[0]", "3B".
     std::string WholeName() const
     {
         const std::string before = NameBefore();
@@ -82,7 +82,7 @@ class Context {
     const Refusal& m_refusal;
 };
 
-// The token's byte, with those after it where all are one character that can be shown.
+// The token's byte, with the bytes after it if they all make one character that can be shown.
 std::string WholeCharacter(const Context& context)
 {
     constexpr size_t kMaxBytes = 4;
@@ -284,20 +284,20 @@ void ExplainCode(const std::string& text, const Reading& reading, const Refusal&
     }
 }
 
-// Refusals where another language's spelling can be the cause.
+// Refusals that a spelling of another language may have caused.
 bool MayBeForeign(Refusal::CODE code)
 {
     return code == Refusal::CHARACTER || code == Refusal::WORD || code == Refusal::QUOTE ||
            code == Refusal::OPERAND;
 }
 
-// The hint is an operator of this library.
+// Whether the hint is an operator of this library.
 bool IsCorrected(const RefusalReport& report)
 {
     return report.hint.compare(0, 7, "write .") == 0;
 }
 
-// A sized init value over listed inputs never reaches the library when it is wrong.
+// Explains a wrong sized init value over listed inputs, which never reaches the library.
 bool ExplainLiteral(const std::string& text, const Reading& reading, RefusalReport& report)
 {
     if (!reading.hasInputs || !IsSizedLiteral(text))
@@ -318,7 +318,7 @@ bool ExplainLiteral(const std::string& text, const Reading& reading, RefusalRepo
 RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
 {
     RefusalReport report;
-    // The library takes a NUL byte for the end of the text and would answer for what precedes it.
+    // The library reads a NUL byte as the end of the text and would answer for what precedes it.
     const size_t nul = text.find('\0');
     if (nul != std::string::npos) {
         report.code = "nul-byte";
@@ -341,7 +341,8 @@ RefusalReport ExplainRefusal(const std::string& text, const Reading& reading)
     assert((refusal.code == Refusal::NONE) == report.reason.empty());
     if (MayBeForeign(refusal.code)) {
         const std::string hint = HintForForeign(text, refusal.offset, reading);
-        // A word between dots that this library has in capital letters is not part of a name.
+        // If the library has the word between the dots in capital letters, it is not part of a
+        // name.
         if (!hint.empty() && !(refusal.code == Refusal::WORD && IsCorrected(report)))
             report.hint = hint;
     }

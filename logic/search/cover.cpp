@@ -13,7 +13,7 @@ namespace {
 
 constexpr unsigned int kMaxWordInputs = 6;
 
-// Products that are kept, or only counted.
+// Where the products go: they are kept, or only their literals are counted.
 struct CubeKeeper {
     void Add(Cube cube) { cubes.push_back(cube); }
     std::vector<Cube> cubes;
@@ -23,8 +23,8 @@ struct LiteralCounter {
     size_t count = 0;
 };
 
-// What the search finds of the last inputs, by what is needed and allowed of their rows: most of
-// its steps would be there.
+// A table of what the search finds for the last inputs, by the rows needed and allowed: most of its
+// steps would be there.
 constexpr unsigned int kNumLastInputs = 2;
 constexpr size_t kNumLastFunctions = 16;
 struct LastCover {
@@ -43,9 +43,9 @@ class CoverSearch {
     {
     }
 
-    // Takes the first input off, again and again: adds products over the inputs left that cover
-    // 'needed' and nothing outside 'allowed', each with what 'prefix' says of the inputs before.
-    // Gives back what they cover. The depth is the number of inputs.
+    // Takes off the first input, again and again: adds products over the inputs left that cover
+    // 'needed' and nothing outside 'allowed', each joined with the literals in 'prefix'. Returns
+    // the rows that they cover. The depth is the number of inputs.
     Rows Find(const Rows& needed, const Rows& allowed, Cube prefix)
     {
         Watch();
@@ -74,7 +74,7 @@ class CoverSearch {
         return JoinHalves(covered0 | both, covered1 | both);
     }
 
-    // The same in one word: 'numInputs' inputs are left.
+    // The same within one word: 'numInputs' inputs are left.
     uint64_t FindInWord(uint64_t needed, uint64_t allowed, unsigned int numInputs, Cube prefix)
     {
         assert((needed & ~allowed) == 0);

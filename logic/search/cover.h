@@ -1,6 +1,6 @@
 // Functions as sums of products, found by Minato's and Morreale's recursion: each product is a
-// prime and none can be left out. That is not always the fewest products, but it is found at once,
-// and for a function that no input makes both rise and fall it is the only such sum.
+// prime, and none can be left out. It is fast, but does not always find the fewest products. If no
+// input makes the function both rise and fall, there is only one such sum.
 #ifndef BOOLEQ_SEARCH_COVER_H
 #define BOOLEQ_SEARCH_COVER_H
 
@@ -11,8 +11,8 @@
 
 namespace booleq {
 
-// A product of inputs: input k takes part where bit k of 'used' is set, and must then have the
-// value of bit k of 'values'.
+// A product of inputs: input k takes part if bit k of 'used' is set, and must then have the value
+// of bit k of 'values'.
 struct Cube {
     uint32_t used;
     uint32_t values;
@@ -20,7 +20,7 @@ struct Cube {
 
 constexpr unsigned int kMaxCoverInputs = 16;
 
-// None for the constant 0; one without inputs for the constant 1.
+// No product for the constant 0; one product without inputs for the constant 1.
 // Requires: at most kMaxCoverInputs inputs.
 std::vector<Cube> FindCover(const Rows& function);
 // CountLiterals(FindCover(function)), without the products.  Requires: as above.

@@ -29,19 +29,19 @@ Formula Around(Operator op, Formula operand)
     return Plain(op, std::move(operands));
 }
 
-// How many inversions a formula (side 0) and its inversion (side 1) need, placed so that they are
-// fewest; and what is needed to write either.
+// The least number of inversions that a formula (side 0) and its inversion (side 1) need, and what
+// is needed to write either.
 typedef std::array<size_t, 2> Sides;
 struct Settled {
-    const Formula* formula = nullptr; // not a Not
-    bool isFlipped = false;           // side 0 is that formula's inversion
-    uint32_t firstInput = UINT32_MAX; // the least it mentions
+    const Formula* formula = nullptr; // never a Not
+    bool isFlipped = false;           // side 0 is the inversion of that formula
+    uint32_t firstInput = UINT32_MAX; // the least that it mentions
     Sides numInversions = {0, 0};
     std::vector<Settled> operands;
 };
 
-// AND of the operands is the inversion of the OR of their inversions, and the other way round.
-// Whether a side is written so.
+// Whether a side is written as the inversion of the other: the AND of operands is the inversion of
+// the OR of their inversions, and the other way round.
 bool IsByInversion(const Sides& sums, size_t side)
 {
     return sums[1 - side] + 1 < sums[side];
@@ -56,7 +56,7 @@ Sides SumInversions(const std::vector<Settled>& operands)
     return sums;
 }
 
-// The side of an operand of an exclusive OR that needs fewer.
+// The side of an exclusive OR's operand that needs fewer inversions.
 size_t BetterSide(const Settled& settled)
 {
     return settled.numInversions[1] < settled.numInversions[0] ? 1 : 0;
@@ -115,7 +115,7 @@ std::vector<const Settled*> Sorted(const std::vector<Settled>& operands)
     sorted.reserve(operands.size());
     for (const Settled& operand : operands)
         sorted.push_back(&operand);
-    // As they were where that is the same: they stand in one array.
+    // Equal ones keep their order: they are elements of one array.
     std::sort(sorted.begin(), sorted.end(), [](const Settled* left, const Settled* right) {
         return left->firstInput != right->firstInput ? left->firstInput < right->firstInput
                                                      : left < right;
@@ -129,10 +129,10 @@ Operator Negated(Operator op)
                                : (op == Operator::Or ? Operator::Nor : Operator::Nxor);
 }
 
-// Adds the formula, or for side 1 its inversion, with inversions where they were settled.
+// Adds the formula, or for side 1 its inversion, with inversions where Settle put them.
 uint32_t Append(const Settled& settled, size_t side, Expression& expression)
 {
-    const size_t own = settled.isFlipped ? 1 - side : side; // of the formula that is pointed to
+    const size_t own = settled.isFlipped ? 1 - side : side; // the side of the formula pointed to
     const Formula& formula = *settled.formula;
     if (formula.op == Operator::Input) {
         const uint32_t node = AddInput(expression, formula.input);
@@ -143,10 +143,10 @@ uint32_t Append(const Settled& settled, size_t side, Expression& expression)
     const bool isXor = formula.op == Operator::Xor;
     const bool isInverted = isXor ? own != PlainSide(settled.operands)
                                   : IsByInversion(SumInversions(settled.operands), own);
-    const size_t used = isInverted ? 1 - own : own; // of the operands, but for exclusive OR
+    const size_t used = isInverted ? 1 - own : own; // of the operands, except for exclusive OR
     const Operator op = isXor || used == 0 ? formula.op : Dual(formula.op);
     const std::vector<const Settled*> operands = Sorted(settled.operands);
-    // Of two operands the operator itself is negated.
+    // With two operands the operator itself is negated.
     const bool isNegated = isInverted && operands.size() == 2;
     uint32_t node = 0;
     for (size_t place = 0; place < operands.size(); ++place) {

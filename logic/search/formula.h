@@ -1,5 +1,5 @@
-// Small expressions while they are searched for: operators take any number of operands, inversions
-// stand anywhere, and only at the end it is settled how that is written best.
+// Small expressions during a search: operators take any number of operands, and inversions can be
+// anywhere. Only the conversion at the end decides how that is written best.
 #ifndef BOOLEQ_SEARCH_FORMULA_H
 #define BOOLEQ_SEARCH_FORMULA_H
 
@@ -19,12 +19,13 @@ struct Formula {
 
 Formula MakeConstant(bool value);
 Formula MakeInput(uint32_t input);
-// The inversion; constants and inversions of inversions are taken away.
+// The inversion; constants and double inversions are simplified.
 Formula MakeNot(Formula operand);
-// And, Or or Xor of two formulas that are no constants; a chain of one operator becomes one.
+// And, Or or Xor of two formulas that are not constants; a chain of one operator becomes one
+// operator.
 Formula Join(Operator op, Formula left, Formula right);
 
-// Inputs as they are written, repeated ones counted again.
+// How often inputs are written; repeated ones are counted again.
 size_t CountLiterals(const Formula& formula);
 
 // The formula written for people: with the fewest inversions (a NAND counts as one), operands in

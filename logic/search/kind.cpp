@@ -42,7 +42,7 @@ class Explainer {
         return (isInverted ? "~" : "") + m_names[input];
     }
 
-    // The cofactor for one assignment of the inputs of 'inputs'; bit k of 'values' is the k-th's.
+    // The cofactor for one assignment to the inputs of 'inputs'; bit k of 'values' is for the k-th.
     Rows FixTo(const std::vector<unsigned int>& inputs, uint32_t values) const
     {
         Rows result(m_rows);
@@ -51,7 +51,7 @@ class Explainer {
         return result;
     }
 
-    // Fails: false for a function that is not a single literal.
+    // Fails: false if the function is not a single literal.
     bool AsLiteral(const Rows& rows, unsigned int& input, std::string& literal) const
     {
         const std::vector<unsigned int> support = Support(rows);
@@ -62,7 +62,7 @@ class Explainer {
         return true;
     }
 
-    // The value with all inputs at 0 but those that 'inverted' turns.
+    // A constant, or a single input or its inversion.
     bool FindConstant()
     {
         if (m_support.empty())
@@ -75,7 +75,7 @@ class Explainer {
                    (isInverter ? "inverter of " : "buffer of ") + name);
     }
 
-    // One row of those that matter is 1, or one is 0.
+    // Exactly one row over the inputs that matter is 1, or exactly one is 0.
     bool FindProduct()
     {
         const std::vector<Cube> cover = FindCover(m_rows);
@@ -158,8 +158,8 @@ class Explainer {
                    "multiplexer, select " + Join(names, ", ") + ": " + Join(choices, "; "));
     }
 
-    // For each input that matters, whether it has to be inverted for the function to rise with it.
-    // Fails: false when some input makes it both rise and fall.
+    // For each input that matters, whether it must be inverted for the function to rise with it.
+    // Fails: false if some input makes the function both rise and fall.
     bool FindDirections(uint32_t& inverted) const
     {
         inverted = 0;
@@ -174,8 +174,8 @@ class Explainer {
         return true;
     }
 
-    // By the number of literals that are 1, whether the function is 1; empty when it does not
-    // depend on the number alone.
+    // Element k: whether the function is 1 when k literals are 1. Empty if it does not depend on
+    // that number alone.
     std::vector<int> ByCount(uint32_t inverted) const
     {
         std::vector<int> values(m_support.size() + 1, -1);
@@ -230,7 +230,8 @@ class Explainer {
                                     " is " + Join(counts, " or "));
     }
 
-    // Products without a common input, summed: and-or; the other three forms are its inversions.
+    // An and-or is a sum of products without a common input; the other three forms are inversions
+    // of it.
     bool FindAndOr()
     {
         return IsAndOr(FindCover(m_rows), false) || IsAndOr(FindCover(~m_rows), true);
@@ -246,7 +247,8 @@ class Explainer {
             used |= cube.used;
             numPlain += static_cast<size_t>(__builtin_popcount(cube.values));
         }
-        // Mostly inverted literals: the sum is the inversion of a product of sums of plain ones.
+        // If most literals are inverted, the sum is the inversion of a product of sums of plain
+        // ones.
         const bool isOrAnd = 2 * numPlain < CountLiterals(cover);
         const bool hasInvertedOutput = isInverse != isOrAnd;
         std::vector<std::pair<size_t, std::string>> groups;

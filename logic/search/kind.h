@@ -12,8 +12,8 @@ namespace booleq {
 struct FunctionKind {
     std::vector<std::string> mattering;
     std::vector<std::string> idle; // inputs that change nothing
-    std::string kind;              // "multiplexer", "AND", ...; empty for one without a name
-    std::string text;              // the kind with its inputs, an inverted one as "~A"
+    std::string kind;              // "multiplexer", "AND", ...; empty if it has no name
+    std::string text;              // the kind with its inputs; an inverted one is "~A"
 };
 
 // Requires: at most kMaxKindInputs inputs.

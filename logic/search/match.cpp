@@ -1,7 +1,8 @@
 // Inputs are coloured by the spectra's numbers of all sets that they are in, again and again as the
-// colours of the others in these sets become known; where some stay alike, one is singled out on
-// both sides. This is how isomorphisms of graphs are found: McKay and Piperno, Practical Graph
-// Isomorphism II, 2014. Inversions are not tried: the signs of the spectra give them, by equations.
+// colours of the other inputs in these sets become known. If some still look alike, one is singled
+// out on both sides. Isomorphisms of graphs are found in this way: McKay and Piperno, Practical
+// Graph Isomorphism II, 2014. Inversions are not tried: equations over the signs of the spectra
+// give them.
 #include "match.h"
 
 #include <algorithm>
@@ -26,10 +27,10 @@ uint64_t Mix(uint64_t value)
     return value ^ value >> 31;
 }
 
-// Equations between bits: the exclusive or of the bits of a set is a value.
+// Equations between bits: the exclusive OR of the bits of a set has a given value.
 class ParityEquations {
   public:
-    // Fails: false for one that contradicts the others.
+    // Fails: false if it contradicts the others.
     bool Add(uint32_t set, bool value)
     {
         for (unsigned int bit = 0; bit < m_rows.size() && set != 0; ++bit) {
@@ -45,7 +46,7 @@ class ParityEquations {
         return !value;
     }
 
-    // A solution; bits that are free are 0.
+    // A solution; free bits are 0.
     uint32_t Solve() const
     {
         uint32_t solution = 0;
@@ -65,8 +66,8 @@ class ParityEquations {
     std::array<Row, kMaxMatchInputs + 1> m_rows;
 };
 
-// One of the two functions: its spectrum, and a number for each set of inputs that the changes
-// allowed leave alone.
+// One of the two functions: its spectrum, and a number for each set of inputs that the allowed
+// changes do not change.
 struct Side {
     Side(const Rows& rows, bool allowInversions) : spectrum(WalshSpectrum(rows))
     {
@@ -79,7 +80,7 @@ struct Side {
         }
     }
 
-    // The colours told apart by one more look at all sets.
+    // The colours after one more look at all sets.
     Colours Refined(const Colours& colours, std::vector<uint64_t>& scratch) const
     {
         scratch.resize(marks.size());
@@ -134,7 +135,7 @@ class MatchSearch {
         return Find(Colours(m_num_inputs), Colours(m_num_inputs));
     }
 
-    // For each bit of the second's row number the bit of the first's.
+    // For each bit of the second's row number, the bit of the first's.
     const std::vector<unsigned int>& Map() const { return m_map; }
     // Bit k: the second's input at bit k is inverted; bit numInputs: the output is.
     uint32_t Inversions() const { return m_inversions; }
@@ -147,7 +148,7 @@ class MatchSearch {
         return m_seconds > 0 && passed.count() >= m_seconds;
     }
 
-    // Tells apart what can be told apart.  Fails: false where the two sides differ.
+    // Tells apart all inputs that colours can tell apart.  Fails: false if the two sides differ.
     bool Refine(Colours& first, Colours& second)
     {
         for (size_t numColours = 0; numColours != CountColours(first);) {
@@ -174,7 +175,7 @@ class MatchSearch {
         second[pivot] = kSingledOut;
         std::vector<unsigned int> failed;
         for (unsigned int turn = 0; turn < m_num_inputs; ++turn) {
-            const unsigned int candidate = (pivot + turn) % m_num_inputs; // itself first
+            const unsigned int candidate = (pivot + turn) % m_num_inputs; // the same input first
             if (first[candidate] != colour || IsLikeOneOf(failed, candidate))
                 continue;
             Colours singled(first);
@@ -187,8 +188,8 @@ class MatchSearch {
         return Outcome::kNone;
     }
 
-    // The first input of the smallest group of one colour, of two at least; the number of inputs
-    // when every input has its own.
+    // The first input of the smallest group of two or more inputs with one colour; the number of
+    // inputs if every input has a colour of its own.
     unsigned int SmallestGroup(const Colours& colours) const
     {
         std::ptrdiff_t least = PTRDIFF_MAX;
@@ -203,8 +204,8 @@ class MatchSearch {
         return pivot;
     }
 
-    // Whether the inputs that have a colour of their own, mapped by it, agree in all their sets;
-    // keeps map and inversions.
+    // Maps the inputs that have a colour of their own by that colour. Whether they agree in all
+    // their sets; keeps map and inversions.
     bool HoldsForSingles(const Colours& first, const Colours& second)
     {
         std::vector<unsigned int> singles;
@@ -219,8 +220,8 @@ class MatchSearch {
         return Holds(m_second, singles, m_map, m_inversions);
     }
 
-    // Whether the sets of 'inputs' of 'side' have the first side's values of the sets mapped, and
-    // the signs follow from inversions.
+    // Whether the sets of 'inputs' of 'side' have the same values as the mapped sets of the first
+    // side, with signs that inversions explain.
     bool Holds(const Side& side, const std::vector<unsigned int>& inputs,
                const std::vector<unsigned int>& map, uint32_t& inversions) const
     {
@@ -248,7 +249,8 @@ class MatchSearch {
         return true;
     }
 
-    // Whether the first function stays itself when the candidate and one of these trade places.
+    // Whether the first function stays the same when the candidate trades places with one of
+    // 'others'.
     bool IsLikeOneOf(const std::vector<unsigned int>& others, unsigned int candidate) const
     {
         return std::any_of(others.begin(), others.end(), [&](unsigned int other) {

@@ -1,5 +1,5 @@
-// Whether two functions are one up to the order of inputs, up to inversions, and but for inputs
-// without effect.
+// Whether two functions are the same apart from the order of inputs, from inversions, and from
+// inputs without effect.
 #ifndef BOOLEQ_SEARCH_MATCH_H
 #define BOOLEQ_SEARCH_MATCH_H
 
@@ -19,23 +19,23 @@ struct Matching {
     std::vector<unsigned int> sources;
     std::vector<bool> inverted;
     bool isInverted = false;
-    bool isDecided = true; // false: the time was up first, and nothing is found
+    bool isDecided = true; // false: the time ran out, and nothing was found
 };
 
-constexpr size_t kMaxMatchInputs = 16; // that have an effect
+constexpr size_t kMaxMatchInputs = 16; // inputs with an effect
 
 // The positions of the inputs that have an effect, ascending.
 std::vector<unsigned int> EffectiveInputs(const Function& function);
 
-// A search that tells inputs apart by what neither order nor inversions change, and tries only
-// those that it cannot tell apart. 'seconds' bounds it; 0 means no limit.
+// The search tells inputs apart by what neither order nor inversions change, and tries only those
+// that it cannot tell apart. 'seconds' limits it; 0 means no limit.
 // Requires: at most kMaxMatchInputs inputs with an effect in each.
-// Cost: some milliseconds for 16 inputs as a rule; functions that are all but alike, without being
-// symmetric, can take as many tries as there are orders.
+// Cost: usually some milliseconds for 16 inputs; for functions that are almost symmetric it can
+// take as many tries as there are orders.
 Matching Match(const Function& first, const Function& second, bool allowInversions,
                double seconds = 0);
 
-// What a matching says of the first function, over the second's inputs: to prove it.
+// What a matching makes of the first function, over the second's inputs: to prove the matching.
 Function Apply(const Matching& matching, const Function& first,
                const std::vector<std::string>& inputs);
 

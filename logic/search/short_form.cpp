@@ -16,15 +16,15 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxProducts = 1000;         // more are no expression for people
-constexpr unsigned int kMaxSplitInputs = 10;  // two sets of these are tried each way
-constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of these are compared
+constexpr size_t kMaxProducts = 1000;        // longer expressions are not for people
+constexpr unsigned int kMaxSplitInputs = 10; // every split of so many inputs into two sets is tried
+constexpr unsigned int kMaxExpandInputs = 10; // expansions by each of so many inputs are compared
 
 // Sets of inputs: bit k is input k.
 typedef uint32_t InputSet;
 
-// What is left of a function when inputs are taken from it: Some is 1 where any values of theirs
-// make it 1, All where all do, Fixed where they are 0.
+// What is left of a function when inputs are removed: Some is 1 if some of their values make it 1,
+// All if all values do, and Fixed sets the inputs to 0.
 class Parts {
   public:
     explicit Parts(const Rows& function) : m_function(function) {}
@@ -57,7 +57,8 @@ class Parts {
     const Rows& m_function;
 };
 
-// The same of a function in one word, made for all sets at once: each of one with an input less.
+// The same for a function in one word, made for all sets at once: each from a set with one input
+// less.
 class WordParts {
   public:
     static constexpr unsigned int kMaxInputs = 6;
@@ -100,8 +101,8 @@ class WordParts {
     OfSets m_fixed;
 };
 
-// Brings the products with the literal that most share to the front, and takes it out of them.
-// Gives back the end of those; 'begin' when the products have no literals.
+// Moves the products with the most frequent literal to the front and takes it out of them. Returns
+// the end of those products; 'begin' if the products have no literals.
 Cube* TakeOutLiteral(Cube* begin, Cube* end, Cube& literal)
 {
     std::array<std::array<uint16_t, 2>, kMaxCoverInputs> counts = {}; // at most kMaxProducts
@@ -134,7 +135,7 @@ Cube* TakeOutLiteral(Cube* begin, Cube* end, Cube& literal)
     return rest;
 }
 
-// Takes out the literal that most products share, again and again. The products are changed.
+// Takes out the most frequent literal, again and again. The products are changed.
 // The depth is at most the number of products and literals.
 Formula Factor(Cube* begin, Cube* end)
 {
@@ -165,7 +166,7 @@ size_t CountFactored(Cube* begin, Cube* end)
 
 class Search {
   public:
-    // False when a cover is too long. The depth is at most the number of inputs.
+    // Fails: false if a cover is too long. The depth is at most the number of inputs.
     bool Find(const Rows& function, Formula& formula)
     {
         const std::vector<unsigned int> support = Support(function);
@@ -264,7 +265,7 @@ class Search {
                Set(formula, Join(op, std::move(leftFormula), std::move(rightFormula)));
     }
 
-    // The shortest of the factored covers and an expansion.
+    // The shortest of the two factored covers and an expansion.
     bool FindBest(const Rows& function, const std::vector<unsigned int>& support, Formula& formula)
     {
         size_t leastLiterals = SIZE_MAX;
@@ -292,13 +293,14 @@ class Search {
         return Set(formula, isInverted ? MakeNot(std::move(factored)) : std::move(factored));
     }
 
-    // An expansion by one input: a multiplexer, or one part that the input turns into the other.
+    // An expansion by one input: a multiplexer, or the exclusive OR of one part with the product of
+    // the input and the change to the other part.
     struct Expansion {
         unsigned int input = 0;
-        int kind = 0; // 0: a multiplexer; 1, 2: the part where the input is 0, or 1, is turned
+        int kind = 0; // 0: a multiplexer; 1, 2: changes the part where the input is 0, or 1
     };
 
-    // That whose parts have the shortest covers.
+    // The expansion whose parts have the shortest covers.
     static Expansion ChooseExpansion(const Rows& function, const std::vector<unsigned int>& support)
     {
         size_t leastLiterals = SIZE_MAX;
@@ -322,7 +324,7 @@ class Search {
         return best;
     }
 
-    // True, and 'formula' is set, where an expansion has fewer literals than 'leastLiterals'.
+    // True, with 'formula' set, if an expansion has fewer literals than 'leastLiterals'.
     bool Expand(const Rows& function, const std::vector<unsigned int>& support,
                 size_t leastLiterals, Formula& formula)
     {
@@ -367,11 +369,11 @@ ShortForm FindShortForm(const Function& function)
     if (!Search().Find(rows, formula))
         return result;
     result.expression = ToExpression(formula, function.Inputs());
-    // What is printed is proved, not what was meant to be written.
+    // This proves what is printed, not what was meant to be written.
     result.isFound = ToFunction(result.expression) == function;
     const size_t numMattering = Support(rows).size();
     result.numLiterals = CountLiterals(formula);
-    // Every input that matters must be mentioned, so once each is the least there is.
+    // Every input that matters must be mentioned, so mentioning each once is the least possible.
     result.isMinimal = numMattering <= kMaxShortestInputs || result.numLiterals == numMattering;
     return result;
 }

@@ -1,10 +1,4 @@
 // A short expression for a function.
-//
-// Up to four inputs that matter, all expressions are tried (shortest.h), so nothing is shorter.
-// With more, the function is taken apart: where it is an AND, OR or exclusive OR of functions
-// without a common input, by these, which is found by quantifying over one side; otherwise by the
-// best of a factored sum of products (cover.h) of it or its inversion and an expansion by one
-// input. That is greedy, and need not end at the shortest.
 #ifndef BOOLEQ_SEARCH_SHORT_FORM_H
 #define BOOLEQ_SEARCH_SHORT_FORM_H
 
@@ -22,7 +16,12 @@ struct ShortForm {
     size_t numLiterals = 0; // how often inputs are mentioned
 };
 
-// Proved equal to the function, row by row, before it is given out.
+// Up to four inputs that matter, all expressions are tried (shortest.h), so none is shorter. With
+// more, the function is taken apart. If it is an AND, OR or exclusive OR of functions without a
+// common input, which quantifying over one side shows, it is split into these. Otherwise the best
+// of three is taken: a factored sum of products (cover.h) of the function or of its inversion, and
+// an expansion by one input. That is greedy and may miss the shortest.
+// The expression is proved equal to the function, row by row, before it is returned.
 // Requires: at most kMaxShortFormInputs inputs.
 ShortForm FindShortForm(const Function& function);
 

@@ -11,8 +11,8 @@ namespace booleq {
 
 namespace {
 
-// The rows of four inputs as the number of a function; the one whose row 0 is 0 stands for its
-// inversion too.
+// The four-input rows of a function, used as its number; a function whose row 0 is 0 also stands
+// for its inversion.
 typedef uint16_t Column;
 
 constexpr size_t kNumColumns = 65536;
@@ -28,15 +28,15 @@ Column Normal(Column column)
     return static_cast<Column>(column & 1u ? ~column : column);
 }
 
-// What a formula weighs: literals first, then exclusive ORs, which are harder to read. Both add up
-// over operands, and a formula has fewer exclusive ORs than literals.
+// The weight of a formula: literals first, then exclusive ORs, which are harder to read. Both add
+// up over operands, and a formula has fewer exclusive ORs than literals.
 constexpr size_t kLiteralWeight = 32;
 constexpr size_t kXorWeight = 1;
 
-// How a column was found first, which is with the least weight.
+// How a column was first found, which is with the least weight.
 struct Origin {
     Operator op = Operator::Zero; // Zero: not found yet
-    Column left = 0;              // as they are joined, so perhaps inverted
+    Column left = 0;              // as joined, so it may be inverted
     Column right = 0;
 };
 
@@ -53,13 +53,13 @@ class ShortestTable {
     }
 
     bool Has(Column column) const { return m_origins[Normal(column)].op != Operator::Zero; }
-    // Requires: not a constant.
+    // Requires: the column is not a constant.
     void Add(Column column)
     {
         while (!Has(column))
             AddWeight();
     }
-    // The depth is at most the number of literals.  Requires: it has it.
+    // The depth is at most the number of literals.  Requires: Has(column).
     Formula Make(Column column) const
     {
         const Column normal = Normal(column);
@@ -77,7 +77,7 @@ class ShortestTable {
     }
 
   private:
-    // All columns whose least weight is the next one; none when that is interrupted.
+    // Adds all columns whose least weight is the next one; none if an exception ends it.
     void AddWeight()
     {
         m_by_weight.emplace_back();
@@ -104,7 +104,7 @@ class ShortestTable {
     {
         if (rightWeight < leftWeight || rightWeight >= m_by_weight.size())
             return;
-        // The last list grows, but it is not an operand's: operands weigh less.
+        // The last list grows, but no operand is in it: operands weigh less.
         for (const Column left : m_by_weight[leftWeight]) {
             Watch();
             for (const Column right : m_by_weight[rightWeight]) {
@@ -136,7 +136,7 @@ class ShortestTable {
     std::vector<std::vector<Column>> m_by_weight;
 };
 
-// The inputs of four become those that matter.
+// Replaces the four inputs by those that matter.
 void Renumber(Formula& formula, const std::vector<unsigned int>& support)
 {
     if (formula.op == Operator::Input)
@@ -163,7 +163,7 @@ Formula FindShortest(const Rows& function)
         order.push_back((place + numIdle) % kMaxShortestInputs);
     const auto column = static_cast<Column>(PermuteInputs(std::move(rows), order).Words()[0]);
     static std::shared_mutex mutex; // guards the table
-    static ShortestTable table;     // it grows as far as it was asked for
+    static ShortestTable table;     // grows as far as needed
     std::shared_lock<std::shared_mutex> reading(mutex);
     if (!table.Has(column)) {
         reading.unlock();

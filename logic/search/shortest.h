@@ -9,10 +9,10 @@ namespace booleq {
 
 constexpr unsigned int kMaxShortestInputs = 4;
 
-// A formula of AND, OR, exclusive OR and inversions with as few literals as there can be.
-// Functions of 1, 2, 3, ... literals are made of all pairs of shorter ones until this one is there;
-// with as many literals, fewer exclusive ORs come first. Inversions are free, so a function and its
-// inversion are one.
+// A formula of AND, OR, exclusive OR and inversions with as few literals as possible.
+// Functions of 1, 2, 3, ... literals are made from all pairs of shorter ones until this one is
+// found; with equally many literals, fewer exclusive ORs come first. Inversions are free, so a
+// function and its inversion count as one.
 // Requires: at most kMaxShortestInputs inputs matter.  Threads: any; they share one table.
 Formula FindShortest(const Rows& function);
 

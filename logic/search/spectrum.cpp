@@ -1,5 +1,5 @@
-// The fast transform of Hadamard's matrix; see Hurst, Miller and Muzio, Spectral Techniques in
-// Digital Logic, 1985, which also shows what inversions and orders of inputs do to it.
+// The fast transform by Hadamard's matrix; see Hurst, Miller and Muzio, Spectral Techniques in
+// Digital Logic, 1985, which also shows how inversions and orders of inputs change it.
 #include "spectrum.h"
 
 #include <cassert>
@@ -12,14 +12,15 @@ namespace {
 
 constexpr unsigned int kWordBits = 6;
 
-// Differences by ever more inputs, from the highest bit of the row number down. A difference by one
-// of the upper bits halves the words; one by the lower six keeps the rows where that bit is 0.
+// Differences by more and more inputs, from the highest bit of the row number down. A difference by
+// one of the upper bits halves the words; one by the lower six keeps the rows in which that bit is
+// 0.
 class Derivatives {
   public:
     explicit Derivatives(std::vector<uint32_t>& weights) : m_weights(weights) {}
 
-    // 'words' is differenced by 'set'; inputs below bit 'end' are to come. The depth is the number
-    // of inputs.
+    // 'words' are differenced by 'set'; inputs below bit 'end' are still to come. The depth is the
+    // number of inputs.
     void Run(const std::vector<uint64_t>& words, uint64_t rows, size_t set, unsigned int end)
     {
         if (set != 0)

@@ -248,8 +248,8 @@ class PlaReader {
     {
         const bool isInput = m_num_digits < m_num_inputs;
         return Fail(m_line,
-                    "no digit of an " + std::string(isInput ? "input" : "output") + ": " +
-                        Shown(std::string(1, digit)) + " at character " +
+                    Shown(std::string(1, digit)) + " is not a digit of an " +
+                        std::string(isInput ? "input" : "output") + ", at character " +
                         std::to_string(column + 1) + " of the row",
                     isInput ? "inputs are 0, 1 or - (also 2, x)"
                             : "outputs are 0, 1 (also 4), - (also 2, x) or ~ (also 3)");

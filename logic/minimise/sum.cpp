@@ -87,10 +87,6 @@ void Improve(const TwoLevelProblem& problem, const SumOptions& options, Sum& sum
            (options.goal == Goal::Terms ? sum.cost.numTerms : sum.cost.numLiterals));
 }
 
-} // namespace
-
-namespace {
-
 // Whether there are so many rows that growing cube by cube against the off-set would take seconds.
 bool IsLong(const Pla& table)
 {

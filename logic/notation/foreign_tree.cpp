@@ -38,7 +38,7 @@ class Reader {
     {
         SkipBlanks();
         while (m_position < m_text.size()) {
-            if (!(m_wants_operand ? ReadOperand() : ReadBehindOperand()))
+            if (!(m_wants_operand ? ReadOperand() : ReadAfterOperand()))
                 return false;
             SkipBlanks();
         }
@@ -135,7 +135,7 @@ class Reader {
     bool ReadPrefix(const OperatorForm& form);
     bool ReadConstant(bool& isThere);
     bool ReadName();
-    bool ReadBehindOperand();
+    bool ReadAfterOperand();
     bool ReadBinary(const OperatorForm& form);
     bool ReadClosing();
     bool AddName(const std::string& name);
@@ -249,7 +249,7 @@ bool Reader::AddName(const std::string& name)
     return true;
 }
 
-bool Reader::ReadBehindOperand()
+bool Reader::ReadAfterOperand()
 {
     if (m_text[m_position] == ')')
         return ReadClosing();

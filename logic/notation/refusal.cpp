@@ -60,7 +60,7 @@ class Context {
         return m_text.substr(start, m_refusal.offset - start);
     }
     // The operator character that blanks separate from a negation; NUL if there is none.
-    char OperatorBehindNegation() const
+    char OperatorAfterNegation() const
     {
         const size_t next = m_text.find_first_not_of(" \t\n", m_refusal.offset + 1);
         const bool isSplit = next != std::string::npos && next > m_refusal.offset + 1;
@@ -149,12 +149,12 @@ void ExplainOperand(const Context& context, const std::string& text, const Readi
     report.reason = "expected an operator before " + Quoted(token);
     const bool looksLikeInit = text.size() > 2 && text[0] == '0' && IsOneOf("xXbB", text[1]) &&
                                report.offset == 1 && !reading.hasInputs;
-    const char behindNegation = context.OperatorBehindNegation();
+    const char afterNegation = context.OperatorAfterNegation();
     if (looksLikeInit)
         report.hint = std::string("to give an init value, list its inputs with ") +
                       reading.inputsName + ", the most significant first";
-    else if (IsOneOf("~!", token[0]) && behindNegation != '\0')
-        report.hint = "write '" + token + behindNegation + "' without a blank in it";
+    else if (IsOneOf("~!", token[0]) && afterNegation != '\0')
+        report.hint = "write '" + token + afterNegation + "' without a blank in it";
     else if (token[0] == '\'' && !context.NameBefore().empty())
         report.hint = "write ~" + context.NameBefore() + " for not " + context.NameBefore();
     else

@@ -417,7 +417,7 @@ TEST(PlaReader, NamesTheLineOfAFault)
     EXPECT_EQ(FaultOf(".i 2\n.o 2\n1 111\n"), "3: 1 digit before the blank, but .i is 2");
     EXPECT_EQ(FaultOf(".i 2\n.o 1\n.phase 1\n"), "3: unknown directive '.phase'");
     EXPECT_EQ(FaultOf(".i 2\n.o 1\n1a 1\n"),
-              "3: no digit of an input: 'a' at character 2 of the row");
+              "3: 'a' is not a digit of an input, at character 2 of the row");
     EXPECT_EQ(FaultOf(".i 2\n.o 2\n.ob f f\n"), "3: the output 'f' is named twice");
     EXPECT_EQ(FaultOf(".i 2\n.o 2\n.ob f\n"), "3: .ob has 1 name for 2 outputs");
     EXPECT_EQ(FaultOf(".i 2\n.i 3\n"), "2: .i is 3 here and was 2 before");

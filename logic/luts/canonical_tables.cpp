@@ -4,6 +4,7 @@
 #include <array>
 #include <cassert>
 #include <mutex>
+#include <numeric>
 
 #include "rows.h"
 
@@ -40,12 +41,16 @@ std::vector<BlockTransformation> AllTransformations(unsigned int numInputs, Cano
     const unsigned int numInversions = scope == CanonicalScope::Order ? 1u : 1u << numInputs;
     std::vector<BlockTransformation> all;
     LutTransformation meaning;
+    std::vector<unsigned int> order(numInputs);
+    std::iota(order.begin(), order.end(), 0u);
     do {
+        for (unsigned int place = 0; place < numInputs; ++place)
+            meaning.order[place] = static_cast<uint8_t>(order[place]);
         for (unsigned int inverted = 0; inverted < numInversions; ++inverted) {
             meaning.invertedInputs = static_cast<uint8_t>(inverted);
             all.push_back(Prepare(meaning, numInputs));
         }
-    } while (std::next_permutation(meaning.order, meaning.order + numInputs));
+    } while (std::next_permutation(order.begin(), order.end()));
     return all;
 }
 

@@ -56,7 +56,7 @@ def draw(kind, num_variables, num_operators, seed):
         operands = [rng.randrange(num_variables)]
         while len(operands) <= num_operators:
             operand = rng.randrange(num_variables)
-            # Never the one before: "... & x1 | x1" would make all that stands before it needless.
+            # Never the previous one: "... & x1 | x1" would make everything before it redundant.
             if operand != operands[-1]:
                 operands.append(operand)
         return draw_chain(rng, num_operators, lambda position: ("id", operands[position]))

@@ -22,7 +22,7 @@ bench::Body TimeSetting(const std::string& text)
     };
 }
 
-// Whether both give the same value for all assignments, but for at most 4096 of them.
+// Whether both give the same value for all assignments, or for 4096 of them if there are more.
 bool AreEqual(Kq_BoolEquation& equation, bench::PlainEquation& plain)
 {
     const size_t numVariables = plain.GetVariables().size();

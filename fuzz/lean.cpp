@@ -153,7 +153,7 @@ std::string CheckReading(const Equation& equation, const Column& words)
     return "";
 }
 
-// The object is empty, and the reason lies within the text.
+// The object is empty, and the place of the fault is within the text.
 std::string CheckRefused(const Equation& equation, const std::string& input, const String& text)
 {
     if (equation.GetNumVariables() != 0 || equation.Eval() != 0 || equation.GetImp()->GetRoot())

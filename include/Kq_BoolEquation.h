@@ -39,7 +39,7 @@ class KQ_EXPORT Kq_BoolEquation {
     Kq_BoolEquation(const Kq_BoolEquation& other); // the same equation, variables and values
     ~Kq_BoolEquation(); // frees the engine object; nodes go with the last copy that shares them
 
-    // Three names for a copy of everything.  Fails: std::bad_alloc; this object stays as it is.
+    // Three names for copying all of the other.  Fails: std::bad_alloc; this object stays as it is.
     Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
     void Copy(const Kq_BoolEquation& other);
     void SetEquationFromEquation(const Kq_BoolEquation& other);

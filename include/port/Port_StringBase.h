@@ -51,7 +51,7 @@ class StringBase<char> {
         return *this;
     }
 
-    // Makes room for a text of so many bytes. A host's class need not have it; where it exists,
+    // Makes room for a text of this many bytes. A host's class need not have it; where it exists,
     // long texts are written once instead of being moved each time they double.
     void reserve(std::size_t length) { m_text.reserve(length); }
 

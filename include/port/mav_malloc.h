@@ -4,7 +4,7 @@
 
 #include <cstddef>
 
-// Threads: any may call at any time, and may give back what another one got.
+// Threads: any may call at any time, and may free what another one allocated.
 
 // 'size' bytes aligned for every type, or null when no memory is left.
 void* mav_malloc(std::size_t size);

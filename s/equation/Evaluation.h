@@ -22,7 +22,7 @@ class KqEvaluation {
     KqEvaluation(const KqEvaluation&) = delete;
     KqEvaluation& operator=(const KqEvaluation&) = delete;
 
-    // Whether the column over so many variables is at hand.
+    // Whether the column over this many variables is at hand.
     bool HasWord(size_t numVariables) const
     {
         return numVariables == m_num_word_variables.load(std::memory_order_acquire);

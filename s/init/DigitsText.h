@@ -44,7 +44,7 @@ class KqDigitsText {
     // The column of 1 to 6 variables.
     void AppendFewRows(uint64_t word, unsigned int numVariables);
 
-    // Makes room for the digits of so many words, if the host's string can.
+    // Makes room for the digits of this many words, if the host's string can.
     void Reserve(uint64_t numWords)
     {
         KqReserve(m_text, m_text.length() + static_cast<size_t>(numWords * 64 / m_base));

@@ -21,7 +21,7 @@ class KqNodeBlock {
     KqNodeBlock(const KqNodeBlock&) = delete;
     KqNodeBlock& operator=(const KqNodeBlock&) = delete;
 
-    // Makes room for so many nodes.  Requires: none so far.  Fails: std::bad_alloc.
+    // Makes room for this many nodes.  Requires: none so far.  Fails: std::bad_alloc.
     void Allocate(size_t numNodes);
 
     // Requires: room.  Fails: std::bad_alloc, and no node is made.

@@ -250,7 +250,7 @@ Answered AnswerLines(const Lines& lines, const Request& request, const TableForm
     return answered;
 }
 
-// Only so many groups of lines are in work at once, so memory does not grow with the table.
+// Limits the groups of lines in work at once, so memory does not grow with the table.
 void RunTogether(const Request& request, unsigned int numJobs, TableReader& reader,
                  Answers& answers)
 {

@@ -63,7 +63,7 @@ uint64_t RowOf(const kq_logic::Decision& decision);
 // "not decided in 10 seconds"
 std::string NotDecidedIn(double seconds);
 // The same, or "not decided: " and the reason.
-// Requires: the decision is undecided, and so many seconds were allowed.
+// Requires: the decision is undecided, and this many seconds were allowed.
 std::string UndecidedText(const kq_logic::Decision& decision, double seconds);
 // Name and value of each input.
 Json AssignmentJson(const std::vector<std::string>& inputs, const std::vector<bool>& values);

@@ -19,7 +19,7 @@ constexpr size_t kMaxJsonInputs = 24;
 // One of the two bit orders. The digits are made only when they are written: with 30 inputs they
 // are 256 MB and 1 GB.
 struct Order {
-    const kq_logic::Function& column; // as somebody sees it who counts this way
+    const kq_logic::Function& column; // as seen by somebody who counts this way
     bool lsbFirst;
 };
 

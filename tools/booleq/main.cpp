@@ -11,7 +11,7 @@
 #include <io.h>
 
 extern "C" int _dowildcard;
-int _dowildcard = 0; // an argument is an equation: a * in it stands for no files
+int _dowildcard = 0; // an argument is an equation: a * in it is not a wildcard
 #else
 #include <clocale>
 #include <cstring>

@@ -163,7 +163,7 @@ std::string HelpFor(const std::vector<std::string>& arguments)
                      (nearest ? std::string("; the nearest is '") + nearest->name + "'" : ""));
 }
 
-// A word that only begins the names of commands: which of them is meant is not said.
+// A word that only begins the names of commands, without saying which of them.
 bool AnswerForGroup(const std::vector<std::string>& arguments, std::string& answer)
 {
     if (arguments.empty() || CommandsOfGroup(arguments.front()).empty())

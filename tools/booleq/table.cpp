@@ -29,7 +29,7 @@ RowFormat ParseFormat(const Request& request)
     throw UsageError("--format is text, markdown, csv or json, not '" + Visible(format) + "'");
 }
 
-// Nobody should fill a disk unawares.
+// Announces a large table, so that nobody fills a disk by accident.
 void AnnounceSize(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format,
                   Output& output)
 {

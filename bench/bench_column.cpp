@@ -95,7 +95,7 @@ bench::Case MakeTerms(unsigned int numVariables, unsigned int seed, bool asExpre
     return made;
 }
 
-// Shapes that the compiled formulas leave out; checked against single evaluations.
+// Shapes that the compiled formulas do not have; checked against single evaluations.
 bench::Case MakeText(const std::string& text)
 {
     const EquationPointer equation = std::make_shared<Kq_BoolEquation>(text.c_str());

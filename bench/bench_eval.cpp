@@ -48,7 +48,7 @@ bool IsSameFunction(Kq_BoolEquation& equation, const Handles& handles, bench::Fu
     return true;
 }
 
-// All variables are set by handle, then the equation is evaluated.
+// Sets all variables by handle, then evaluates the equation.
 bench::Case MakeSetAll(const bench::Formula& formula)
 {
     const EquationPointer equation = std::make_shared<Kq_BoolEquation>();
@@ -79,8 +79,8 @@ bench::Case MakeSetAll(const bench::Formula& formula)
     return made;
 }
 
-// One variable is set, so that no value can be kept from the call before, and the equation is
-// evaluated.
+// Sets one variable, so that no value can be kept from the previous call, and then evaluates the
+// equation.
 bench::Case MakeSetOne(const bench::Formula& formula)
 {
     const EquationPointer equation = std::make_shared<Kq_BoolEquation>();
@@ -111,7 +111,7 @@ bench::Case MakeSetOne(const bench::Formula& formula)
 
 bool IsSameText(Kq_BoolEquation& equation, const Handles& handles, const std::string& text)
 {
-    // Our parser in the benchmark calls itself for each group, so the deepest text is left out.
+    // The benchmark's own parser calls itself for each group, so the deepest text is left out.
     bench::PlainEquation plain;
     if (text.compare(0, 2, "~(") == 0 && text.length() > 100000)
         return true;

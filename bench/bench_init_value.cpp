@@ -39,8 +39,8 @@ bool HasDigits(const std::vector<uint64_t>& words, const Kq_BoolEquation& equati
            equation.GetEquationAsHexInitValue(false).c_str();
 }
 
-// Gives the pages within a text that nobody reads again back to the system, so that whoever writes
-// there next pays for new ones, whichever block that gets.
+// Gives the pages within a text that will not be read again back to the system, so that the next
+// use of that memory pays for new pages, whichever block gets it.
 void DropPages(const char* text, size_t length)
 {
     constexpr uintptr_t kPage = 4096;
@@ -50,7 +50,7 @@ void DropPages(const char* text, size_t length)
         madvise(reinterpret_cast<void*>(begin), end - begin, MADV_DONTNEED);
 }
 
-// A long text, against writing as many bytes into memory that is fresh each time.
+// A long text, compared with writing as many bytes into memory that is fresh each time.
 bench::Case MakeLong(const bench::Formula& formula)
 {
     const EquationPointer equation = MakeEquation(formula);
@@ -105,7 +105,7 @@ bench::Case MakePeak(const bench::Formula& formula)
     return made;
 }
 
-// The text of a small equation, against one evaluation of its tree.
+// The text of a small equation, compared with one evaluation of its tree.
 bench::Case MakeSmall(const bench::Formula& formula)
 {
     const EquationPointer equation = MakeEquation(formula);

@@ -1,6 +1,6 @@
-// Arrays of six-input look-up tables: one thread against a loop over the rows of each table, two
-// threads by the clock; canonical forms against every transformation, and of functions that few
-// things tell apart; texts.
+// Arrays of six-input look-up tables: one thread against a loop over the rows of each table, and
+// two threads by the clock; canonical forms against every transformation, also for functions whose
+// inputs are hard to tell apart; texts.
 #include <algorithm>
 #include <array>
 #include <chrono>
@@ -52,7 +52,7 @@ Bytes RandomOrders(size_t count)
     return orders;
 }
 
-// The loops that a program has without the library.
+// The loops that a program would have without the library.
 uint64_t PermutePlainly(uint64_t table, const uint8_t* order)
 {
     uint64_t result = 0;
@@ -83,8 +83,8 @@ uint8_t CountPlainly(uint64_t table)
     return static_cast<uint8_t>(count);
 }
 
-// Every order by exchanging two inputs, for each every inversion by inverting one more (a Gray
-// code).
+// Every order by exchanging two inputs and, for each, every inversion by inverting one more input
+// (a Gray code).
 uint64_t TryAll(uint64_t table)
 {
     uint64_t least = UINT64_MAX;
@@ -102,7 +102,7 @@ uint64_t TryAll(uint64_t table)
     return least;
 }
 
-// 'work' fills results from tables in one or two threads, 'plain' from one table and its place.
+// 'work' fills results from tables in one or two threads, 'plain' from one table and its position.
 template <class Result>
 struct Operation {
     std::function<void(const LutArray&, Result*, const LutWork&)> work;
@@ -119,7 +119,7 @@ bool IsAsPlain(const Operation<Result>& operation, const Tables& tables,
     return true;
 }
 
-// The plain loop is taken for, and the answer compared with, the first 'numPlain' tables.
+// The plain loop and the check of the answer cover only the first 'numPlain' tables.
 template <class Result>
 void AddOperation(const std::string& name, const Operation<Result>& operation, size_t numPlain)
 {
@@ -193,7 +193,7 @@ void FindForms(const LutArray& luts, uint64_t* forms, const LutWork& work)
     FindCanonicals(luts, CanonicalScope::OrderAndInversions, forms, nullptr, work);
 }
 
-// Functions whose inputs are much alike, and where no choice is better than others at first.
+// Functions with very similar inputs, and where at first no choice is better than the others.
 Tables HardTables()
 {
     Tables tables = {0x6996966996696996,  // all six inputs differ from each other
@@ -230,7 +230,7 @@ bench::Case MakeTexts()
 {
     static const std::vector<std::string> inputs = {"A", "B", "C", "D", "E", "F"};
     bench::Case made;
-    made.isRight = [] { // texts are proved where they are made; here each table has one
+    made.isRight = [] { // texts are proved where they are made; here each table must have one
         const LutTexts found = DescribeLuts(LutsOf(RandomTables(kNumTexts), kNumInputs), inputs);
         return found.texts.size() == kNumTexts &&
                std::all_of(found.texts.begin(), found.texts.end(),

@@ -1,4 +1,4 @@
-// Init values read: from digits over listed inputs to an equation, to values, back to digits.
+// Reading init values: from digits over listed inputs to an equation, to values, back to digits.
 #include <malloc.h>
 
 #include <cstdlib>
@@ -34,7 +34,7 @@ struct Value {
     }
 };
 
-// The same by hand: digits to a word, the word to digits, each text a string of its own.
+// The same by hand: digits to a word, the word to digits, each text in its own string.
 std::string ConvertByHand(const std::string& digits)
 {
     const std::string text = digits;
@@ -54,7 +54,7 @@ std::string ConvertByHand(const std::string& digits)
     return result;
 }
 
-// Whether setting and rendering leaves less memory in use than the nodes of one term take.
+// Whether setting and rendering leave less memory in use than the nodes of one term take.
 bool IsSetWithoutNodes(const Value& value)
 {
     const String digits(value.text.c_str());
@@ -112,7 +112,7 @@ bench::Case MakeRoundTrip(unsigned int numVariables)
     return made;
 }
 
-// The largest value there is: set, evaluated once, rendered back.
+// The largest possible value: set, evaluated once, rendered back.
 bench::Case MakeLongest()
 {
     const std::shared_ptr<Value> value = std::make_shared<Value>(30);
@@ -130,7 +130,7 @@ bench::Case MakeLongest()
     return made;
 }
 
-// Not a time: 'peak' is the number of bytes that one byte of text takes, its own byte included.
+// Not a time: 'peak' is the number of bytes that one byte of text takes, including that byte.
 bench::Case MakePeak(unsigned int numVariables)
 {
     const std::shared_ptr<Value> value = std::make_shared<Value>(numVariables);
@@ -173,8 +173,8 @@ uint64_t EvaluateAll(Kq_BoolEquation& equation, const Handles& handles)
     return column;
 }
 
-// A value is read and every assignment is evaluated, with handles that are kept from one value to
-// the next; against an expression that is there already and evaluated in the same way.
+// Reads a value and evaluates every assignment, with handles that are kept from one value to the
+// next; compared with an expression that exists already and is evaluated in the same way.
 bench::Case MakeEvaluated(const bench::Formula& formula)
 {
     const std::shared_ptr<Kq_BoolEquation> expression = std::make_shared<Kq_BoolEquation>();

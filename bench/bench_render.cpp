@@ -26,8 +26,8 @@ bench::Case MakeRendering(const std::string& text, Render render, bool spaces)
     const EquationPointer equation = std::make_shared<Kq_BoolEquation>(text.c_str());
     const double numTokens = double(bench::CountNodes(equation->GetImp()->GetRoot()));
     bench::Case made;
-    // Without blanks "~ |" would close up to "~|", but no text here has a negation before an
-    // operator, so what is written reads back the same.
+    // Without blanks "~ |" would become "~|", but no text here has a negation before an operator,
+    // so what is written reads back the same.
     made.isRight = [=] {
         const Kq_BoolEquation again((*equation.*render)(spaces));
         return bool(again) && again == *equation;

@@ -1,5 +1,5 @@
-// The whole road: from text to init value or to one value, and from init value to the text of an
-// expression. The object is made and destroyed each time.
+// The whole road: from text to an init value or to one value, and from an init value to the text of
+// an expression. The object is made and destroyed each time.
 #include <Kq_BoolEquationImp.h>
 
 #include "support/cases.h"
@@ -30,7 +30,7 @@ bench::Case MakeToInitValue(const std::string& text, unsigned int numVariables)
     return made;
 }
 
-// One value only: whatever is prepared for evaluation is paid for here.
+// Only one value: whatever is prepared for evaluation is paid for here.
 bench::Case MakeToValue(const std::string& text)
 {
     bench::Case made;

@@ -22,7 +22,7 @@ bench::Body TimeSetting(const std::string& text)
     };
 }
 
-// Do both give the same value for all assignments, at most for 4096 of them?
+// Whether both give the same value for all assignments, or for 4096 of them if there are more.
 bool AreEqual(Kq_BoolEquation& equation, bench::PlainEquation& plain)
 {
     const size_t numVariables = plain.GetVariables().size();
@@ -62,7 +62,7 @@ bench::Case MakePair(const std::string& text, size_t numTokens)
     return made;
 }
 
-// Too long for a check by evaluation; the tree gives the text back.
+// Too long to check by evaluation; the tree gives the text back.
 bench::Case MakeLong(const std::string& text)
 {
     bench::Case made;

@@ -1,6 +1,6 @@
-// One thread, and two at the same time, each with objects of its own: how much more two get done.
+// One thread, then two at the same time, each with its own objects: how much more two get done.
 // A repetition times one thread and two in turn by the clock, from a common start to the end of the
-// last; its ratio is the work done in the same time, 2 where threads do not get in each other's
+// last. Its ratio is the work done in the same time: 2 where threads do not get in each other's
 // way.
 #include <algorithm>
 #include <atomic>
@@ -23,8 +23,8 @@ const size_t kNumKnownNames = 1000;
 const size_t kNumTexts = 1000;
 const double kMinSeconds = 0.01; // of one thread's work in one measurement
 
-// What a thread does 'numUnits' times. It is made in the thread, before the clock starts, with all
-// that it works on.
+// What a thread does 'numUnits' times. It is made in the thread, before the clock starts, with
+// everything that it works on.
 typedef std::function<void()> Run;
 typedef std::function<Run(size_t thread, size_t numUnits)> MakeRun;
 
@@ -51,7 +51,7 @@ double Measure(const MakeRun& makeRun, size_t numThreads, size_t numUnits)
     std::vector<Clock::time_point> ends(numThreads);
     InThreads(numThreads, [&](size_t thread) {
         const Run run = makeRun(thread, numUnits);
-        for (++numReady; numReady < numThreads;) // on two cores nobody waits for long
+        for (++numReady; numReady < numThreads;) // on two cores no thread waits for long
             ;
         starts[thread] = Clock::now();
         run();
@@ -90,7 +90,7 @@ bench::Case MakeCase(const Work& work)
         double one = 0.0;
         double two = 0.0;
         for (auto _ : state) {
-            // In turn, and the other way round: a moment in which the machine is slow hits both.
+            // In turn and in both orders, so that a moment in which the machine is slow hits both.
             const double before = one + two;
             one += Measure(work.makeRun, 1, *numUnits);
             two += Measure(work.makeRun, 2, *numUnits);
@@ -107,7 +107,7 @@ bench::Case MakeCase(const Work& work)
     return made;
 }
 
-// Texts of 12 tokens over a thousand names, other ones for each thread.
+// Texts of 12 tokens over a thousand names, different ones for each thread.
 std::vector<String> MakeKnownTexts(size_t thread)
 {
     std::vector<String> texts;
@@ -118,7 +118,7 @@ std::vector<String> MakeKnownTexts(size_t thread)
     return texts;
 }
 
-// The same with names that nobody has used in this process.
+// The same with names that are new in this process.
 std::vector<String> MakeNewTexts(size_t numTexts)
 {
     static std::atomic<size_t> numMade{0};
@@ -144,7 +144,7 @@ std::string WithoutBlanks(const String& text)
     return closed;
 }
 
-// Each text comes back from the tree, and has as many tokens as it is said to have.
+// Each text comes back from the tree, and has as many tokens as it should have.
 bool AreSetRightly(const std::vector<String>& texts)
 {
     return std::all_of(texts.begin(), texts.end(), [](const String& text) {
@@ -182,7 +182,7 @@ Work MakeSettingNew()
 
 typedef std::shared_ptr<Kq_BoolEquation> EquationPointer;
 
-// All names of a text of 'numOperators' over 'numVariables' occur.
+// All names of a text with 'numOperators' over 'numVariables' occur.
 EquationPointer MakeEquation(size_t numVariables, size_t numOperators)
 {
     return std::make_shared<Kq_BoolEquation>(

@@ -21,7 +21,7 @@ struct PlainRow {
 };
 static_assert(sizeof(PlainRow) == sizeof(EngineTable::Row), "the same layout");
 
-// A row laid out like the public one, which hides what it holds behind a pointer.
+// A row laid out like the public one, which hides its contents behind a pointer.
 class PlainPublicRow {
   public:
     PlainPublicRow(const std::vector<unsigned int>& values, unsigned int result)
@@ -52,8 +52,8 @@ void Increment(std::vector<unsigned int>& values)
         values[column - 1] = 1;
 }
 
-// The plain loops: one reservation, each vector with one allocation, results taken from bits that
-// are there already.
+// The plain loops: one reservation, one allocation for each vector, results taken from bits that
+// exist already.
 std::vector<PlainRow> MakePlainRows(const std::vector<uint64_t>& words, size_t numVariables)
 {
     std::vector<PlainRow> rows;
@@ -151,7 +151,7 @@ bench::Case MakePublicRows(const bench::Formula& formula)
     return made;
 }
 
-// The public table of a text, made and destroyed.
+// The public table of a text, made and destroyed each time.
 bench::Case MakePublicTable(const std::string& text, size_t numVariables)
 {
     const EquationPointer equation = std::make_shared<Kq_BoolEquation>(text.c_str());
@@ -172,7 +172,7 @@ bench::Case MakePublicTable(const std::string& text, size_t numVariables)
     return made;
 }
 
-// Two equal tables, which takes a look at every row.
+// Two equal tables, so that every row is compared.
 bench::Case MakeComparison(const bench::Formula& formula)
 {
     const EquationPointer equation = MakeEquation(formula);

@@ -3,13 +3,13 @@
 
 usage: formulas.py DIRECTORY
 
-Into DIRECTORY go column_formulas.inc (words of 64 rows, for the column kernels),
-eval_formulas.inc (one value at a time, for the compiled functions) and formula_table.inc (texts).
+Writes column_formulas.inc (words of 64 rows, for the column kernels), eval_formulas.inc (one value
+at a time, for the compiled functions) and formula_table.inc (texts) into DIRECTORY.
 The seeds are fixed, so every build measures the same formulas.
 
 Kinds: 'order' combines neighbours in order, x0 op x1 op x2 ..., from the left, starting again at x0
-after the last; 'chain' groups from the left too but draws its operands; 'tree' is a random tree
-written with parentheses, its operands drawn, some of them negated, every variable among them.
+after the last; 'chain' groups from the left too but draws its operands at random; 'tree' is a random
+tree written with parentheses, with random operands, some negated; every variable occurs.
 """
 import pathlib
 import random
@@ -56,7 +56,7 @@ def draw(kind, num_variables, num_operators, seed):
         operands = [rng.randrange(num_variables)]
         while len(operands) <= num_operators:
             operand = rng.randrange(num_variables)
-            # Never the one before: "... & x1 | x1" would make all that stands before it needless.
+            # Never the previous one: "... & x1 | x1" would make everything before it redundant.
             if operand != operands[-1]:
                 operands.append(operand)
         return draw_chain(rng, num_operators, lambda position: ("id", operands[position]))

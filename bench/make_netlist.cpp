@@ -1,8 +1,8 @@
-// Writes a netlist of six-input tables to standard output, as synthesis writes one: few functions
-// stand often. The frequencies follow those of 22,542 tables of mapped arithmetic and control
-// circuits: the function of rank k has a share in step with 1 / (k + 8)^1.2, and a million tables
-// some 20,000. usage: make_netlist json|blif|edif TABLES [SEED [shuffled]] 'shuffled' gives the
-// same functions of the same nets with the pins of each table in another order.
+// Writes a netlist of six-input tables to standard output, like one from synthesis: a few functions
+// occur often. As in 22,542 tables of mapped arithmetic and control circuits, the function of rank
+// k has a share in step with 1 / (k + 8)^1.2; a million tables have some 20,000 functions.
+// usage: make_netlist json|blif|edif TABLES [SEED [shuffled]]
+// 'shuffled' gives the same functions of the same nets, with each table's pins in another order.
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -18,7 +18,7 @@ namespace {
 constexpr unsigned int kInputs = 6;
 constexpr size_t kFunctions = 20000;
 constexpr size_t kPrimaryInputs = 256;
-constexpr size_t kWindow = 5000; // a table takes most inputs from those shortly before it
+constexpr size_t kWindow = 5000; // most inputs of a table come from those shortly before it
 constexpr uint64_t kPatterns[kInputs] = {0xaaaaaaaaaaaaaaaa, 0xcccccccccccccccc,
                                          0xf0f0f0f0f0f0f0f0, 0xff00ff00ff00ff00,
                                          0xffff0000ffff0000, 0xffffffff00000000};
@@ -30,7 +30,7 @@ struct Table {
     std::array<uint32_t, kInputs> inputs; // net numbers, the least significant pin first
 };
 
-// The result does not depend on the library, unlike std::uniform_int_distribution's.
+// Unlike std::uniform_int_distribution, the result does not depend on the standard library.
 size_t Below(Random& random, size_t end)
 {
     return static_cast<size_t>(random() % end);
@@ -44,7 +44,7 @@ bool DependsOnAll(uint64_t function)
     return true;
 }
 
-// A formula in which each input stands once or twice: what a mapper puts into a table.
+// A formula in which each input occurs once or twice: what a mapper puts into a table.
 uint64_t MakeFunction(Random& random)
 {
     std::vector<uint64_t> terms;
@@ -79,7 +79,7 @@ std::vector<uint64_t> MakeFunctions(Random& random)
     return functions;
 }
 
-// The sums of the shares up to each rank.
+// For each rank, the sum of the shares up to it.
 std::vector<double> MakeShares()
 {
     std::vector<double> shares;
@@ -223,7 +223,7 @@ void WriteBlif(const std::vector<Table>& tables)
         " out\n1 1\n.end\n");
 }
 
-// Nets say which pins they join, so the pins are gathered by net.
+// Nets list the pins that they join, so the pins are gathered by net.
 void WriteEdif(const std::vector<Table>& tables)
 {
     Put("(edif top\n  (edifVersion 2 0 0)\n  (edifLevel 0)\n  (keywordMap (keywordLevel 0))\n"

@@ -50,8 +50,8 @@ set_target_properties(Kq::Port PROPERTIES
       COMPONENT development)
 endif()
 
-# The pkg-config file finds its prefix from its own place. A blank there is escaped by pkg-config
-# as long as the value is written without quotes; a fixed path needs them.
+# The pkg-config file finds its prefix from its own place. pkg-config escapes a blank there as long
+# as the value is written without quotes; a fixed path needs them.
 set(kq_pc_dir "${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig")
 file(RELATIVE_PATH kq_pc_prefix "${kq_pc_dir}" "${CMAKE_INSTALL_PREFIX}")
 string(REGEX REPLACE "/$" "" kq_pc_prefix "${kq_pc_prefix}")

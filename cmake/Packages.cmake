@@ -1,6 +1,6 @@
 # Debian packages, one for each component that was installed above. './dev packages' makes them, or
 # cpack in the build tree of the preset 'debian'. packages/stage.cmake and packages/finish.cmake do
-# what CPack of Debian 12 (3.25) leaves undone.
+# what Debian 12's CPack (3.25) does not.
 set(kq_library_package libkq-boolequation${PROJECT_VERSION_MAJOR})
 set(kq_about "Boolean equations such as 'A & ~B' are parsed, evaluated, written in four
 syntaxes, tabulated, and converted to and from init values of look-up tables.")
@@ -15,7 +15,7 @@ set(CPACK_STRIP_FILES ON)
 set(CPACK_PRE_BUILD_SCRIPTS "${CMAKE_CURRENT_LIST_DIR}/packages/stage.cmake")
 set(CPACK_POST_BUILD_SCRIPTS "${CMAKE_CURRENT_LIST_DIR}/packages/finish.cmake")
 
-# What the solver is linked into; its authors are named there.
+# The files that the solver is linked into; the copyright of their packages names its authors.
 get_property(kq_has_solver GLOBAL PROPERTY KQ_HAS_SOLVER)
 if(kq_has_solver)
   set(CPACK_KQ_SOLVER_FILES_logic "lib/*/libkq_logic.so.*")
@@ -30,8 +30,8 @@ set(CPACK_DEBIAN_COMPRESSION_TYPE xz)
 set(CPACK_DEBIAN_PACKAGE_PRIORITY optional)
 set(CPACK_DEBIAN_PACKAGE_SOURCE kq-boolequation)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
-# Dependencies are found by dpkg-shlibdeps. Our own library is not installed then, so it is looked
-# for in the build tree, and who needs it names it.
+# dpkg-shlibdeps finds the dependencies. The project's own library is not installed at that time, so
+# it is looked for in the build tree, and packages that need it name it.
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS
     "${PROJECT_BINARY_DIR}" "${PROJECT_BINARY_DIR}/port")
@@ -39,8 +39,8 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_NAME ${kq_library_package})
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SECTION libs)
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_MULTIARCH same)
-# Versions only add to the interface as long as the number after .so stays, so what was built
-# against one works with it and all later ones.
+# As long as the number after .so stays, versions only add to the interface, so what was built
+# against one version works with it and all later ones.
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS_POLICY ">=")
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_CONTROL_EXTRA "${CMAKE_CURRENT_LIST_DIR}/packages/triggers")

@@ -1,4 +1,5 @@
-// An input read byte by byte; after its end there are zeros, so every input stands for something.
+// An input read byte by byte; beyond its end it reads as zeros, so every input stands for
+// something.
 #ifndef FUZZ_BYTES_H
 #define FUZZ_BYTES_H
 

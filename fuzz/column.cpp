@@ -1,6 +1,6 @@
 // The input is an expression over up to 17 variables, and pieces of its column. The whole column,
-// the pieces, every kernel and evaluation, by nodes and compiled, give what plain operations on
-// columns of bits give while the expression is written.
+// the pieces, every kernel and evaluation, by nodes and compiled, must give what plain operations
+// on columns of bits give while the expression is written.
 #include <algorithm>
 #include <array>
 
@@ -17,7 +17,7 @@ namespace {
 
 typedef std::vector<uint64_t> Column;
 
-// Blocks above the rows of 14 variables are split.
+// Blocks with more rows than those of 14 variables are split.
 const unsigned int kMaxVariables = 17;
 // A kernel works on tiles of 64 words, the rows of 12 variables.
 const unsigned int kMinKernelVariables = 12;
@@ -39,7 +39,7 @@ struct Case {
     unsigned int numVariables;
     Operand expression;
     std::vector<Piece> pieces;
-    size_t firstRow; // of those that are evaluated
+    size_t firstRow; // the first of those that are evaluated
 };
 
 size_t NumWords(unsigned int numVariables)
@@ -47,8 +47,8 @@ size_t NumWords(unsigned int numVariables)
     return numVariables > 6 ? size_t(1) << (numVariables - 6) : 1;
 }
 
-// Bit k is the value of the variable in row k; the first variable is the highest bit of k. Fewer
-// than six variables repeat up to the end of the word.
+// Bit k is the value of the variable in row k; the first variable is the highest bit of k. With
+// fewer than six variables the rows repeat up to the end of the word.
 Operand Variable(unsigned int variable, unsigned int numVariables)
 {
     static const uint64_t kPatterns[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu,
@@ -87,7 +87,7 @@ Operand ReadOperand(Bytes& bytes, unsigned int numVariables)
 {
     const size_t choice = bytes.Next();
     if (choice < 0xf0) {
-        // Few variables or all: what repeats and what does not go different ways.
+        // A few variables or all: columns that repeat and those that do not take different paths.
         const unsigned int usual = choice < 0xc0 || numVariables < 3 ? numVariables : 3;
         return Variable(static_cast<unsigned int>(choice) % usual, numVariables);
     }
@@ -102,7 +102,7 @@ void Complement(Operand& operand)
         word = ~word;
 }
 
-// The last two operands become one.
+// Combines the last two operands into one.
 void Combine(size_t operation, std::vector<Operand>& stack)
 {
     static const char* const kSpellings[] = {"&", "|", "^", "~&", "~|", "~^"};
@@ -114,8 +114,8 @@ void Combine(size_t operation, std::vector<Operand>& stack)
         left.column[word] = Combined(operation, left.column[word], right.column[word]);
 }
 
-// Postfix: bytes that put an operand on a stack, bytes that combine the upper two, and bytes that
-// do both. What is left at the end is combined too.
+// Postfix: bytes that put an operand on a stack, bytes that combine the top two, and bytes that do
+// both. What is left at the end is combined too.
 Operand ReadExpression(Bytes& bytes, unsigned int numVariables)
 {
     std::vector<Operand> stack = {ReadOperand(bytes, numVariables)};

@@ -1,4 +1,4 @@
-// A target under libFuzzer: whatever is wrong ends the process, with the input told in words.
+// A target under libFuzzer: any fault ends the process, with the input described in words.
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>

@@ -1,6 +1,6 @@
 // The input is an init value over up to 10 names, set plainly or with explicit terms, then
 // questions and changes in any order to the object and to copies made before and after. The digits
-// are the results, so they are what answers are compared with; up to 5 names the model is asked as
+// are the results, so answers are compared with them; with up to 5 names the model is asked as
 // well.
 #include <algorithm>
 #include <array>
@@ -54,7 +54,7 @@ const char* const kActionNames[] = {
 struct Step {
     Action action;
     size_t object;
-    size_t value; // of what the action needs: another object, a variable, a syntax
+    size_t value; // chooses what the action needs: another object, a variable, a syntax
 };
 
 struct Case {
@@ -71,7 +71,7 @@ size_t NumRows(size_t numNames)
     return size_t(1) << numNames;
 }
 
-// As many digits as the names ask for; now and then another number, or a sign that is not a digit.
+// As many digits as the names need; now and then another number, or a sign that is not a digit.
 std::string Digits(Bytes& bytes, bool isHex, size_t numRows)
 {
     const std::string alphabet = isHex ? "0123456789abcdefABCDEF" : "01";
@@ -84,7 +84,7 @@ std::string Digits(Bytes& bytes, bool isHex, size_t numRows)
     const std::string pattern = bytes.Raw(numDigits);
     std::string digits;
     while (digits.size() < numDigits && !pattern.empty()) {
-        // A short pattern repeats, turned a little each time.
+        // A short pattern repeats, shifted a little each time.
         const size_t turn = digits.size() / pattern.size();
         const char byte = pattern[(digits.size() + turn / 3) % pattern.size()];
         digits += alphabet[static_cast<unsigned char>(byte) % alphabet.size()];
@@ -105,7 +105,7 @@ Case Read(const std::string& input)
     given.isReversed = form / 4 % 2 != 0;
     const bool isHex = form / 8 % 2 != 0;
     const bool isUpper = form / 16 % 2 != 0;
-    // Few names more often: each one more takes twice the time.
+    // Few names are more frequent: each further one takes twice the time.
     const size_t choice = bytes.Next();
     const size_t numNames = choice % (choice < 0xc0 ? kMaxModelNames + 1 : kMaxNames + 1);
     for (size_t count = 0; count < numNames; ++count)
@@ -160,8 +160,8 @@ std::string Bits(const std::string& text)
 }
 
 // The result of each row over all variables; those beyond the init value's own change nothing.
-// Rows beyond the digits follow from which digit is rarer: the ones are listed or the zeros, and
-// what is not listed is the other.
+// Rows beyond the digits: the rarer digit, one or zero, is listed, and rows that are not listed
+// have the other.
 std::vector<unsigned int> Expected::Column() const
 {
     const size_t numOwn = ownNames.size();
@@ -191,7 +191,7 @@ unsigned int Expected::Eval() const
     return Column()[row];
 }
 
-// Syntax 2, which the expression of an init value is written in, as another syntax.
+// Rewrites syntax 2, in which the expression of an init value is written, in another syntax.
 std::string InSyntax(size_t syntax, const std::string& text)
 {
     static const char* const kSpellings[3][2] = {{"&", "|"}, {"*", "+"}, {".AND.", ".OR."}};
@@ -207,7 +207,7 @@ std::string InSyntax(size_t syntax, const std::string& text)
     return result;
 }
 
-// The objects of one case: 0 is the one that is set, 1 is a copy of what it was before.
+// The objects of one case: 0 is the one that is set, 1 is a copy of it from before that.
 class Objects {
   public:
     // Requires: an init value over at least one name.
@@ -474,7 +474,7 @@ std::string Check(const std::string& input)
     const Case given = Read(input);
     const bool isInitValue =
         !reference::ReadInitValue(given.text, DefinedNames(given), FirstIsLowest(given)).empty();
-    // What is not an init value, or one over no names, only the model can tell.
+    // Only the model can judge what is not an init value, or one over no names.
     if (!isInitValue || given.names.size() <= kMaxModelNames) {
         const std::string difference = CompareWithModel(given);
         if (!difference.empty())

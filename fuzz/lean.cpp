@@ -1,6 +1,6 @@
-// The input is a text, and everything is asked of the library alone: what it answers in one way
-// must agree with what it answers in another. Without a model, so that a core gets through many
-// thousands of inputs a second.
+// The input is a text, and only the library is asked: its answers in one way must agree with its
+// answers in another. There is no model, so one core gets through many thousands of inputs a
+// second.
 #include <Kq_BoolEquation.h>
 #include <Kq_BoolEquationImpNode.h>
 
@@ -16,21 +16,22 @@ typedef Kq_BoolEquationImp::Node Node;
 typedef Port::StringBase<char> String;
 typedef std::vector<uint64_t> Column;
 
-// Every row up to here, so many rows above; no column at all of more than the second.
+// Every row up to this many variables, so many rows above; no column at all beyond the second
+// limit.
 const unsigned int kMaxEvaluated = 6;
 const unsigned int kMaxTabulated = 10;
 const size_t kNumEvaluatedRows = 64;
 
-// Failure dumps of refused texts go nowhere.
+// Failure dumps of refused texts are discarded.
 const bool s_isQuiet = [] {
     Port_MsgManData::setSink([](const char*, const char*, int, const char*, const char*) {});
     return true;
 }();
 
-// Does every negation stand before what it negates, a name, a constant, a group or another
-// negation? Only one apart from its operator ("X ~ & Y") hangs over an operator without
-// parentheses. Rendering writes none of its own, so such a text may read back as another. 'pending'
-// is a stack to use.
+// Whether every negation stands before what it negates: a name, a constant, a group or another
+// negation. Only a negation apart from its operator ("X ~ & Y") hangs over an operator without
+// parentheses. Rendering adds none, so such a text may read back as another equation. 'pending' is
+// a stack to use.
 bool KeepsItsMeaning(const Node* root, std::vector<const Node*>& pending)
 {
     pending.assign(1, root);
@@ -49,8 +50,8 @@ bool KeepsItsMeaning(const Node* root, std::vector<const Node*>& pending)
     return true;
 }
 
-// Where rendering keeps the meaning the text is accepted and has the same tree and value; that of
-// an init value over no inputs ("0b1") has the same value. Any other one may be refused.
+// Where rendering keeps the meaning, the text is accepted and has the same tree and value; that of
+// an init value over no inputs ("0b1") has the same value. Any other text may be refused.
 std::string CheckRendering(const Equation& equation, const String& text, bool isKept)
 {
     const Equation again(text);
@@ -68,7 +69,7 @@ std::string CheckRendering(const Equation& equation, const String& text, bool is
     return "the rendering " + (difference + support::Printable(support::ToStd(text)));
 }
 
-// As typed, and in one of the fixed syntaxes; which one, and with which blanks, 'choice' says.
+// As typed, and in one of the fixed syntaxes; 'choice' says in which one, and with which blanks.
 std::string CheckRenderings(const Equation& equation, size_t choice)
 {
     typedef String (Equation::*Render)(bool) const;
@@ -123,8 +124,9 @@ std::string CheckRows(Equation& equation, const Column& words)
     return "";
 }
 
-// The digits, read back over the same inputs, are the same and have the same column, and so has the
-// expression that is made of them. Hexadecimal ones, but of one input: a digit has too many rows.
+// The digits, read back over the same inputs, are the same and have the same column, and so does
+// the expression made from them. They are hexadecimal, except for one input: a digit has too many
+// rows.
 std::string CheckReading(const Equation& equation, const Column& words)
 {
     static std::vector<String> names;
@@ -151,7 +153,7 @@ std::string CheckReading(const Equation& equation, const Column& words)
     return "";
 }
 
-// The object is empty, and the reason lies within the text.
+// The object is empty, and the place of the fault is within the text.
 std::string CheckRefused(const Equation& equation, const std::string& input, const String& text)
 {
     if (equation.GetNumVariables() != 0 || equation.Eval() != 0 || equation.GetImp()->GetRoot())

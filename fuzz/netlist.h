@@ -1,4 +1,4 @@
-// What the targets of the formats of netlists share.
+// What the targets of the netlist formats share.
 #ifndef FUZZ_NETLIST_H
 #define FUZZ_NETLIST_H
 
@@ -12,7 +12,7 @@ inline std::string DescribeNetlist(const std::string& input, const std::string& 
     return format + " of " + std::to_string(input.size()) + " bytes:\n" + input + "\n";
 }
 
-// A text that is of another format is not this target's; Verilog would go to another program.
+// A text in another format is not this target's; Verilog would go to another program.
 inline std::string CheckNetlist(const std::string& input, const std::string& format)
 {
     const char first = format == "BLIF" ? '.' : format == "EDIF" ? '(' : '{';

@@ -1,5 +1,5 @@
-// The input is a netlist in the form BLIF: read or refused with a reason, and every invariant
-// holds.
+// The input is a netlist in the BLIF format: it is read or refused with a reason, and every
+// invariant holds.
 #include "fuzz/netlist.h"
 
 namespace fuzz {

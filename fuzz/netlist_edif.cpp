@@ -1,5 +1,5 @@
-// The input is a netlist in the form EDIF: read or refused with a reason, and every invariant
-// holds.
+// The input is a netlist in the EDIF format: it is read or refused with a reason, and every
+// invariant holds.
 #include "fuzz/netlist.h"
 
 namespace fuzz {

@@ -1,5 +1,5 @@
-// The input is a netlist in the form Yosys JSON: read or refused with a reason, and every invariant
-// holds.
+// The input is a netlist in the Yosys JSON format: it is read or refused with a reason, and every
+// invariant holds.
 #include "fuzz/netlist.h"
 
 namespace fuzz {

@@ -1,5 +1,5 @@
-// The input is a PLA file: read, minimised and compared row by row with what its digits say. A file
-// of more rows than can be gone through is only read.
+// The input is a PLA file: it is read, minimised and compared row by row with what its digits say.
+// A file with more rows than can be gone through is only read.
 #include "fuzz/target.h"
 #include "sum.h"
 

@@ -1,7 +1,7 @@
-// A target without a fuzzer: checks every input that lies in some folders or files.
+// A target without a fuzzer: checks every input in the given folders or files.
 // usage: replay_TARGET [--describe] PATH...
-// With --describe the inputs are told in words and not checked.
-// Exit status: 1 when an input is treated wrongly, 2 when there is none to check.
+// With --describe the inputs are described in words and not checked.
+// Exit status: 1 when an input is handled wrongly, 2 when there is none to check.
 #include <cstdio>
 #include <cstring>
 #include <filesystem>

@@ -1,5 +1,6 @@
-// The input is a script: steps over a few objects that share nodes, on engine or facade, against
-// the model. The first byte says which side, and whether the objects are looked at after each step.
+// The input is a script: steps over a few objects that share nodes, on the engine or the facade,
+// compared with the model. The first byte says on which, and whether the objects are inspected
+// after each step.
 #include <algorithm>
 
 #include "fuzz/bytes.h"
@@ -37,7 +38,7 @@ std::string Name(Bytes& bytes)
     return choice >= 0xf0 ? bytes.Raw(choice - 0xf0) : usual[choice % usual.size()];
 }
 
-// As many digits as the variables ask for, or, seldom, any number.
+// As many digits as the variables need or, rarely, any number.
 std::string InitValue(Bytes& bytes, size_t numVariables)
 {
     const size_t form = bytes.Next();
@@ -78,7 +79,7 @@ std::string EquationText(Bytes& bytes, size_t numVariables)
     return InitValue(bytes, numVariables);
 }
 
-// An init value over variables that are there: clear, define, set.
+// An init value over variables that exist: clear, define, set.
 void AppendInitValue(Bytes& bytes, Step step, std::vector<Step>& steps)
 {
     const size_t numVariables = bytes.Below(kMaxInitVariables + 1);

@@ -1,5 +1,5 @@
-// The input is a text: set, and asked everything, against the model. Short texts once more in debug
-// mode, where what is traced and dumped has to agree too.
+// The input is a text: it is set, asked everything, and compared with the model. Short texts are
+// tried again in debug mode, where traces and dumps have to agree too.
 #include "fuzz/target.h"
 #include "support/equation_compare.h"
 #include "support/text_compare.h"

@@ -25,9 +25,9 @@ class Kq_BoolEquationImp;
 class Kq_PtrTester; // never defined: a pointer to it is only for testing in a condition
 
 // One equation with its variables, each 0 or 1. Copies share parsed nodes, never variable values.
-// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
-// Threads: different objects at once; const members of one at once; changing one wants it alone.
-// Invariant: m_imp is the engine object, of its class's own operator new, and nobody else owns it.
+// Fails: bad input gives false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
+// Threads: objects are independent; const members may run at once; changes need exclusive access.
+// Invariant: m_imp is the engine object, made by its class's operator new; nobody else owns it.
 class KQ_EXPORT Kq_BoolEquation {
   public:
     class Handle;
@@ -39,7 +39,7 @@ class KQ_EXPORT Kq_BoolEquation {
     Kq_BoolEquation(const Kq_BoolEquation& other); // the same equation, variables and values
     ~Kq_BoolEquation(); // frees the engine object; nodes go with the last copy that shares them
 
-    // Three names for taking all of the other.  Fails: std::bad_alloc; this object stays as it is.
+    // Three names for copying all of the other.  Fails: std::bad_alloc; this object stays as it is.
     Kq_BoolEquation& operator=(const Kq_BoolEquation& other);
     void Copy(const Kq_BoolEquation& other);
     void SetEquationFromEquation(const Kq_BoolEquation& other);
@@ -49,8 +49,8 @@ class KQ_EXPORT Kq_BoolEquation {
     // from an init value ("0x8", "0b1000") over the variables defined now, the first being the most
     // significant. All start at 0.  Fails: false, and the object is empty.  Cost: O(text).
     bool SetEquation(const Port::StringBase<char>& equation);
-    // Sets the equation over the inputs 'terms', the first being the first variable. Other names
-    // in the text follow them. A term that is not a legal name or stands twice is skipped.
+    // Sets the equation over the inputs 'terms', the first being the first variable. Other names in
+    // the text follow them. A term that is not a legal name or occurs twice is skipped.
     // For an init value only: 'termOrderFlag' gives the first variable the lowest bit of the row
     // number, not the highest; 'reverseTerms' defines terms from the last.  Fails: as SetEquation.
     bool SetEquationWithExplicitTerms(const std::vector<Port::StringBase<char>>& terms,
@@ -58,7 +58,7 @@ class KQ_EXPORT Kq_BoolEquation {
                                       bool reverseTerms);
 
     // Why and where SetEquation on an object without variables, or SetEquationWithExplicitTerms
-    // over 'terms' as they stand, refuses the text. Sets and dumps nothing.  Cost: that of setting.
+    // over 'terms' as given, refuses the text. Sets and dumps nothing.  Cost: that of setting.
     static Refusal FindRefusal(const Port::StringBase<char>& text,
                                const std::vector<Port::StringBase<char>>* terms = nullptr);
 
@@ -79,31 +79,31 @@ class KQ_EXPORT Kq_BoolEquation {
     Port::StringBase<char> GetEquationAsExpression(bool spaces) const;
 
     // The result column of n = 1 to 30 variables as one number, row 2^n-1 first, zeros kept: "0x"
-    // and a digit ('upperCase': A to F) for four rows, one for n = 1; "0b" and a digit for each.
+    // and a digit ('upperCase': A to F) for every four rows or all of n = 1; "0b" and one for each.
     // Deliberate: without a truth table (a constant, no equation, over 30 variables) the texts are
     // "0x0" and "0b", for the constant 1 as well.  Cost: O(nodes * 2^n / 64).
     Port::StringBase<char> GetEquationAsHexInitValue(bool upperCase) const;
     Port::StringBase<char> GetEquationAsBinaryInitValue() const;
     Port::StringBase<char> GetInitValueTermEquation() const; // all names, the last first: "B+A"
-    // The result column: row k is bit k % 64 of word k / 64; bits beyond the last row are 0. One
-    // row without variables; never traced. goOn(context), unless null, is asked every few
-    // milliseconds, less often of over 100,000 operators; it may throw, change or destroy this.
+    // The result column: row k is bit k % 64 of word k / 64; bits after the last row are 0. One row
+    // without variables; never traced. goOn(context), unless null, is called every few
+    // milliseconds, less often with over 100,000 operators; it may throw, change or destroy this.
     // Fails: false, and no words: no equation, n over 30, goOn false.  Cost: O(nodes * 2^n / 64).
     bool GetColumn(std::vector<uint64_t>& words) const;
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
-    bool operator!() const;         // is there no equation
+    bool operator!() const;         // whether there is no equation
     operator Kq_PtrTester*() const; // null without an equation, else a value only for testing
-    // Are operators, groups and names the same, however spelled; are they not. Values do not count.
+    // Whether operators, groups and names agree, however spelled, or differ. Values do not count.
     bool operator==(const Kq_BoolEquation& other) const;
     bool operator!=(const Kq_BoolEquation& other) const;
 
     // The result, 0 or 1, for the current variable values; 0 without an equation.
     unsigned int Eval() const;
     // Adds a variable after the others; 'value' counts as 1 unless 0. A name is letters, digits and
-    // '_', no digit first, or starts with ' and has a second '.  Fails: false unless new and legal.
+    // '_', not a digit first, or starts with ' and has a second '.  Fails: false unless new, legal.
     bool DefineVariable(const Port::StringBase<char>& name, unsigned int value);
-    // Is there a variable of this name; one with the index that the handle holds.
+    // Whether there is a variable of this name, or one with the index that the handle holds.
     bool IsVariableDefined(const Port::StringBase<char>& name) const;
     bool IsVariableDefined(const Handle& handle) const;
     // Gives the variable the value 1, or 0 for 0.  Fails: false when there is no such variable.
@@ -126,23 +126,23 @@ class KQ_EXPORT Kq_BoolEquation {
     Kq_BoolEquationImp* m_imp;
 };
 
-// The place where tokenizer, builder or init value gave up, and why. Bytes are counted from 0.
+// Where and why the tokenizer, builder or init value reader gave up. Bytes are counted from 0.
 struct Kq_BoolEquation::Refusal {
     enum CODE : unsigned int { // what is wrong there; the numbers are fixed
         NONE = 0,              // nothing: the text is accepted
-        EMPTY = 1,             // there is no token in it
+        EMPTY = 1,             // the text has no tokens
         CHARACTER = 2,         // this character begins no token
         WORD = 3,    // it stands between dots and is not an operator, or lacks the second dot
         QUOTE = 4,   // this quote has no second one
-        PAREN = 5,   // this parenthesis has no other one
+        PAREN = 5,   // this parenthesis has no partner
         OPERAND = 6, // an operand where an operator must stand
         NO_LEFT_OPERAND = 7,   // nothing on the left of this operator
         NO_RIGHT_OPERAND = 8,  // nothing on the right of this operator
         NO_OPERAND = 9,        // nothing after this negation
         NEGATED_OPERATOR = 10, // a negation apart from its operator, with no operand to take
-        INIT_DIGIT = 11,       // over terms: no digit of its base, or no x or b after a first 0
-        INIT_WIDTH = 12,       // over terms: so many digits are for another number of variables
-        INIT_NAME = 13 // over terms: one's name is not a single token, and what it makes is refused
+        INIT_DIGIT = 11,       // over terms: not a digit of its base, or no x or b after the 0
+        INIT_WIDTH = 12, // over terms: the number of digits is for another number of variables
+        INIT_NAME = 13   // over terms: a name is not a single token, and its expression is refused
     };
     CODE code = NONE;  // why the text is refused
     size_t offset = 0; // where: the first byte
@@ -151,16 +151,16 @@ struct Kq_BoolEquation::Refusal {
 
 // A variable found once by name. Element 0 is the variable index, the others are the positions of
 // the nodes with that name in the pre-order list, ascending. Empty: no such variable.
-// Deliberate: it is a cached index. Any equation with so many variables honours it, by that alone.
+// Deliberate: it is a cached index, which any equation with enough variables accepts as its own.
 class KQ_EXPORT Kq_BoolEquation::Handle {
   public:
-    // Empty; or a value: each copy has elements of its own.
+    // Empty, or a copy with its own elements.
     Handle();
     Handle(const Handle& other);
     ~Handle();
     Handle& operator=(const Handle& other);
 
-    // The first element, and after the last one; valid until the handle is set or destroyed.
+    // The first element, and one past the last; valid until the handle is set or destroyed.
     unsigned int* begin() { return m_values.data(); }
     const unsigned int* begin() const { return m_values.data(); }
     unsigned int* end() { return m_values.data() + m_values.size(); }
@@ -184,17 +184,17 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
     class Row;
 
     TruthTable(); // empty
-    // A value: a deep copy, or the table of an equation as its GetTruthTable gives it.
+    // A deep copy, or the table of an equation as its GetTruthTable returns it.
     TruthTable(const TruthTable& other);
     TruthTable(const Kq_BoolEquation& equation);
     ~TruthTable();
     TruthTable& operator=(const TruthTable& other);
     TruthTable& operator=(const Kq_BoolEquation& equation);
 
-    // Are names, in order, and rows the same; are they not. The text is not compared.
+    // Whether the names, in order, and the rows agree or differ. The text is not compared.
     bool operator==(const TruthTable& other) const;
     bool operator!=(const TruthTable& other) const;
-    bool operator!() const;         // is the table empty
+    bool operator!() const;         // whether the table is empty
     operator Kq_PtrTester*() const; // null if it is, else a value only for testing
 
     std::vector<Port::StringBase<char>> GetVariableNames() const; // copies, in column order
@@ -210,7 +210,7 @@ class KQ_EXPORT Kq_BoolEquation::TruthTable {
 
 class KQ_EXPORT Kq_BoolEquation::TruthTable::Row { // one assignment and its result
   public:
-    // A value: result and variable values as given, or a deep copy.
+    // Result and variable values as given, or a deep copy.
     Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
     Row(const Row& other);
     ~Row();

@@ -13,24 +13,24 @@
 
 #include <Kq_BoolEquation.h>
 
-// Inside the library: the tokens of a text, an init value as read, what an equation holds, and the
-// pool's table of names.
+// Inside the library: the tokens of a text, its tree, an init value as read, what an equation
+// holds, and the pool's table of names.
 class KqDigits;
 class KqNamePool;
 class KqStore;
 class KqTokens;
 struct KqTree;
 
-// One equation: nodes that its copies share, and a variable table of its own.
+// One equation: nodes that its copies share, and its own variable table.
 // Text becomes nodes (TokenizeNodes), a tree (BuildTree), values (Eval), columns and text again.
-// Fails: bad input answers false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
+// Fails: bad input gives false, 0 or empty; only std::bad_alloc is thrown, or what a sink throws.
 // Threads: different objects are independent, whatever they share inside; const members of one
-// object may run at once; changing an object wants it alone. Static members at any time.
+// object may run at once; changing an object needs exclusive access. Static members at any time.
 // Invariants:
 // 1. m_store is never null; its count is the number of engine objects that point at it.
 // 2. Variable names are unique; a variable's position is its index, its value is 0 or 1.
-// 3. The list of a set equation is its tree in pre-order, and every ID node's value is the index
-//    of the variable with its name.
+// 3. The list of a set equation is its tree in pre-order, and every ID node's value is the index of
+//    the variable with its name.
 class KQ_EXPORT Kq_BoolEquationImp {
   public:
     class Node;
@@ -41,7 +41,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
     // Shares the other's nodes, copies its variables.
     Kq_BoolEquationImp(const Kq_BoolEquationImp& other);
     ~Kq_BoolEquationImp(); // the last object that shares the nodes frees them
-    // Two names for the same.  Fails: std::bad_alloc, and this object is as it was.
+    // Two names for the same.  Fails: std::bad_alloc; this object stays as it is.
     Kq_BoolEquationImp& operator=(const Kq_BoolEquationImp& other);
     void Copy(const Kq_BoolEquationImp& other);
 
@@ -57,13 +57,13 @@ class KQ_EXPORT Kq_BoolEquationImp {
                 const std::vector<Port::StringBase<char>>* terms = nullptr);
     unsigned int Eval() const;
 
-    // Are the lists equal in length and the trees node by node; are they not. Variables do not
+    // Whether the lists have the same length and the trees the same nodes, or not. Variables do not
     // count.
     bool operator==(const Kq_BoolEquationImp& other) const;
     bool operator!=(const Kq_BoolEquationImp& other) const;
-    bool operator!() const;         // is there no equation
+    bool operator!() const;         // whether there is no equation
     operator Kq_PtrTester*() const; // null without an equation, else a value only for testing
-    bool IsExpression() const;      // is there an equation, and not of an init value
+    bool IsExpression() const;      // whether there is an equation that is not an init value
 
     // Appends one node for each token of 'text' to the empty list; links nothing. Does nothing for
     // a null or empty text or a list that is not empty. A text that is refused clears the object.
@@ -105,15 +105,15 @@ class KQ_EXPORT Kq_BoolEquationImp {
     bool GetColumn(std::vector<uint64_t>& words, bool (*goOn)(void*), void* context) const;
 
     // The root of the tree, null without an equation. Only for reading: results are kept of the
-    // nodes, which live until the object, and every copy, is set, cleared or destroyed. Of an init
-    // value the nodes are made on the first call, which can be many.  Fails: std::bad_alloc.
+    // nodes, which live until this object and every copy are set, cleared or destroyed. The nodes
+    // of an init value are made on the first call and may be many.  Fails: std::bad_alloc.
     const Node* GetRoot() const;
 
     void Dbg() const; // writes texts, variables, nodes and truth table to the message manager
 
-    // Exactly the size of an engine object comes from the class allocator.
-    // Deliberate: another size is served by mav_malloc with the size of one engine object, so a
-    // derived class that adds members must bring operators of its own.
+    // A request for the size of an engine object goes to the class allocator.
+    // Deliberate: for any other size mav_malloc gives the size of one engine object, so a derived
+    // class that adds members must bring its own operators.
     // Fails: std::bad_alloc.
     static void* operator new(size_t size);
     static void operator delete(void* memory, size_t size);
@@ -151,7 +151,7 @@ class KQ_EXPORT Kq_BoolEquationImp {
 };
 
 // The process-wide pool of names: each distinct name is kept once, until unload. It only grows.
-// Threads: all at any time, but for the destructor.
+// Threads: all at any time, except the destructor.
 class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
   public:
     StringMgr();  // no names
@@ -165,7 +165,7 @@ class KQ_EXPORT Kq_BoolEquationImp::StringMgr {
     // Cost: in step with the name's length, whatever the number of names.
     const Port::StringBase<char>& find(const char* name);
 
-    struct StringMgrNode; // what the names are kept in; completed inside the library
+    struct StringMgrNode; // holds the names; completed inside the library
 
   private:
     friend class Kq_BoolEquationImp;
@@ -182,7 +182,7 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
     class Row;
 
     TruthTable(); // empty
-    // A value: the table of the equation as Build makes it, or a copy.
+    // The table of the equation as Build makes it, or a copy.
     TruthTable(const Kq_BoolEquationImp& equation);
     TruthTable(const TruthTable& other);
     ~TruthTable();
@@ -200,10 +200,10 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
     // Row k at index k; the reference is valid until the table is set or destroyed.
     const std::vector<Row>& GetRows() const;
 
-    // Are names, in order, and rows the same; are they not. The text is not compared.
+    // Whether the names, in order, and the rows agree or differ. The text is not compared.
     bool operator==(const TruthTable& other) const;
     bool operator!=(const TruthTable& other) const;
-    bool operator!() const;         // are there no names
+    bool operator!() const;         // whether there are no names
     operator Kq_PtrTester*() const; // null without names, else a value only for testing
     void Dbg() const;               // writes the table to the message manager
 
@@ -215,7 +215,7 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable {
 
 class KQ_EXPORT Kq_BoolEquationImp::TruthTable::Row { // one assignment and its result
   public:
-    // A value: result and variable values as given, or a copy.
+    // Result and variable values as given, or a copy.
     Row(unsigned int resultValue, const std::vector<unsigned int>& variableValues);
     Row(const Row& other);
     ~Row();
@@ -225,7 +225,7 @@ class KQ_EXPORT Kq_BoolEquationImp::TruthTable::Row { // one assignment and its 
     // 0 or 1 for each name of the table, in their order; valid as long as the row.
     const std::vector<unsigned int>& GetVariableValues() const;
 
-    // Are result and variable values the same; are they not.
+    // Whether result and variable values agree or differ.
     bool operator==(const Row& other) const;
     bool operator!=(const Row& other) const;
     void Dbg() const; // writes the row to the message manager

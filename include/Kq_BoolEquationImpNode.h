@@ -5,7 +5,7 @@
 //     std::cout << root->GetTypeName().c_str() << '\n'; // AND
 //     std::cout << root->GetLeftChild()->GetToken().c_str() << '\n'; // A
 //     std::cout << root->GetRightChild()->GetTypeName().c_str() << '\n'; // NOT
-// The accessors stand in the header because every step of the library goes through them.
+// The accessors are in the header because every step of the library goes through them.
 
 #ifndef KQ_BOOLEQUATIONIMPNODE_H
 #define KQ_BOOLEQUATIONIMPNODE_H
@@ -14,14 +14,14 @@
 
 #include <Kq_BoolEquationImp.h>
 
-// One node of an equation: a token of the text first, an element of its tree later.
+// One node of an equation: first a token of the text, later an element of its tree.
 // Links between nodes own nothing; the equation's node store owns the nodes.
 // Shapes in a built tree:
 // 1. A binary operator has its first operand left and its second right.
 // 2. NOT and TRUTH_TABLE have their operand left and nothing right.
 // 3. A group is an LP with the enclosed expression left (null for "()") and its RP right.
 // 4. ID, ZERO, ONE and RP are leaves.
-// 5. A node's parent has it as a child, but for the top NOT of a negated operator inside something
+// 5. A node's parent has it as a child, except the top NOT of a negated operator inside something
 //    ("P & X ~ | Y"): that link deliberately stays at the operator's first operand X.
 class KQ_EXPORT Kq_BoolEquationImp::Node {
   public:
@@ -75,7 +75,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     }
 
     void SetType(TYPE type) { m_type = type; } // the type alone
-    TYPE GetType() const { return m_type; }    // the type as set, a corrupt one too
+    TYPE GetType() const { return m_type; }    // the type as set, even a corrupt one
     // The token as it was parsed: an operator's spelling, an ID's name, an init value as given.
     void SetToken(const Port::StringBase<char>& token) { m_token = token; }
     const Port::StringBase<char>& GetToken() const { return m_token; }
@@ -91,7 +91,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     void SetValue(unsigned int value) { m_value.store(value, std::memory_order_relaxed); }
     unsigned int GetValue() const { return m_value.load(std::memory_order_relaxed); }
 
-    // Is the node of this type, or of one of these types.
+    // Whether the node has this type, or one of these types.
     bool Is0() const { return m_type == ZERO; }
     bool Is1() const { return m_type == ONE; }
     bool IsConst() const { return Is0() || Is1(); }
@@ -106,22 +106,23 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     bool IsNOr() const { return m_type == NOR; }
     bool IsNXor() const { return m_type == NXOR; }
     // Deliberate: anything but LP, RP, ID, NOT and SENTINEL, so constants, TRUTH_TABLE and corrupt
-    // types answer true.
+    // types give true.
     bool IsBinOp() const { return !IsLp() && !IsRp() && !IsId() && !IsNot() && m_type != SENTINEL; }
 
-    // The node that parent links lead to. Where they run in a circle (shape 5), the first node on
-    // the way whose parent has it as neither child.
+    // The node that parent links lead up to. Where they run in a circle (shape 5), the first node
+    // on the way that is not a child of its parent.
     Node* GetTopParent() const;
 
     // "AND", "0", "ID", ...; "UNKNOWN" for a corrupt type. Valid until unload, like all spellings.
     const Port::StringBase<char>& GetTypeName() const;
-    // The type's spelling in syntax 1 (&), 2 (*) and 3 (.AND.); the own token for ID and
+    // The type's spelling in syntax 1 (&), 2 (*) and 3 (.AND.); the node's own token for ID and
     // TRUTH_TABLE, "?" for a SENTINEL, "??" for a corrupt type.
     const Port::StringBase<char>& GetTokenAlt1() const;
     const Port::StringBase<char>& GetTokenAlt2() const;
     const Port::StringBase<char>& GetTokenAlt3() const;
 
-    // Are type, places of links, and of ID and TRUTH_TABLE the token, the same; are they not.
+    // Whether the type, which links are null and, for ID and TRUTH_TABLE, the token agree or
+    // differ.
     bool operator==(const Node& other) const;
     bool operator!=(const Node& other) const;
 
@@ -136,7 +137,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
     // Writes the subtree to the message manager, one line for each node.
     void Dbg() const;
 
-    // Exactly the size of a Node comes from the class allocator, another size from mav_malloc.
+    // A request for the size of a Node goes to the class allocator, any other size to mav_malloc.
     // Fails: std::bad_alloc.
     static void* operator new(size_t size);
     static void operator delete(void* memory, size_t size);
@@ -146,7 +147,7 @@ class KQ_EXPORT Kq_BoolEquationImp::Node {
   private:
     friend class Kq_BoolEquationImp;
 
-    // Dbg for the node that broke a build: bounded, as a whole text can hang below it.
+    // Dbg for the node that broke a build; bounded, because a whole text can hang below it.
     void DbgFailure() const;
     void DbgLine(int depth) const;
     size_t CountDbgBytes(int depth) const;

@@ -21,9 +21,9 @@ struct Installed {
     Installed* next; // in the list of those replaced
 };
 
-// All that threads share.
+// What threads share.
 // Invariants: 1. Everything is read and changed only by the thread that has the lock.
-// 2. 'depth' is how often that thread has it: a sink may issue messages and exchange the sink.
+// 2. 'depth' is how many times that thread has it: a sink may issue messages and exchange the sink.
 // 3. A sink that was replaced lives until the thread that has the lock gives it up.
 struct Host {
     std::recursive_mutex lock;
@@ -39,8 +39,8 @@ Host& GetHost()
     return *host;
 }
 
-// The lock, for as long as it lives. Whoever gives it up in the end frees the sinks that were
-// replaced, with the lock free again: what a sink has captured may do anything when it goes.
+// Holds the lock while it exists. The last one to give it up frees the sinks that were replaced,
+// after unlocking, because what a sink has captured may do anything when it is destroyed.
 class Turn {
   public:
     explicit Turn(Host& host) : m_host(host)

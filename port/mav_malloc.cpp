@@ -5,7 +5,7 @@
 
 void* mav_malloc(std::size_t size)
 {
-    // malloc(0) may answer null, which would read as "no memory".
+    // malloc(0) may return null, which would read as "no memory".
     return std::malloc(size ? size : 1);
 }
 

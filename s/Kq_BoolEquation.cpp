@@ -8,7 +8,7 @@
 
 typedef Port::StringBase<char> String;
 
-// The handle dump stands in this file because its messages carry this file's lines.
+// The handle dump is in this file because its messages carry this file's lines.
 #define KQ_FACADE_EMIT(...) KQ_EMIT(kKqFacadeModule, __LINE__, __VA_ARGS__)
 
 namespace {
@@ -34,7 +34,7 @@ Kq_BoolEquation::Kq_BoolEquation() : m_imp(new Kq_BoolEquationImp) {}
 
 Kq_BoolEquation::Kq_BoolEquation(const String& equation) : Kq_BoolEquation()
 {
-    // A refused text leaves a constructed object; operator! tells.
+    // A refused text still gives an object; operator! tells that it is empty.
     m_imp->SetEquation(equation);
 }
 

@@ -1,5 +1,5 @@
 // The engine object: life, sharing of nodes, evaluation, renderings, dumps.
-// Statics with a run-time initialiser stand here, in the order that they need.
+// Statics with a run-time initialiser are defined here, in the order that they need.
 // Fails: false or 0; std::bad_alloc.
 #include <Kq_BoolEquationImp.h>
 
@@ -29,8 +29,8 @@ Port_MsgManInit s_msgManInit;
 InstanceTableInit s_instanceTableInit;
 FactoryInit s_factoryInit;
 
-// The pool of names, from load to unload. With it the spellings of nodes are made, so that they
-// outlive every equation, also one that is a static object elsewhere.
+// The pool of names, from load to unload. The spellings of nodes are made with it, so that they
+// outlive every equation, even one that is a static object elsewhere.
 struct NamePool {
     NamePool() { KqGetSpelling(0); }
     Kq_BoolEquationImp::StringMgr m_names;
@@ -39,7 +39,7 @@ NamePool s_namePool;
 
 } // namespace
 
-// Any value counts, an empty one too; read at load and never again.
+// Any value counts, even an empty one; read at load and never again.
 std::atomic<bool> KqDebugMode::s_isOn{Port_Env::GetEnv("MAV_KQ_BOOL_EQUATION_DEBUG") != nullptr};
 
 // Chosen now, so that the environment is read at load and never again.
@@ -60,7 +60,7 @@ Kq_BoolEquationImp::~Kq_BoolEquationImp()
     ReplaceStore(nullptr);
 }
 
-// Lets the store go, and tells whoever watches.
+// Lets the old store go and tells its watchers.
 void Kq_BoolEquationImp::ReplaceStore(KqStore* fresh) noexcept
 {
     KqStore* const old = m_store;
@@ -99,7 +99,7 @@ unsigned int Kq_BoolEquationImp::Eval() const
 {
     if (!KqDebugMode::IsOn())
         return m_store->Eval(m_variables);
-    // Node by node, because the trace is output. Of a copy, because the receiver of the messages
+    // Node by node, because the trace is output. On a copy, because the receiver of the messages
     // may set, clear or destroy this object.
     const Kq_BoolEquationImp held(*this);
     const Node* const root = held.GetRoot();
@@ -203,7 +203,7 @@ String Kq_BoolEquationImp::GetEquation(bool spaces) const
     return initValue ? *initValue : KqRender(m_store->GetRoot(), &Node::GetToken, spaces);
 }
 
-// Deliberate: of an init value the fixed syntaxes show the expression that it stands for, the
+// Deliberate: for an init value, the fixed syntaxes show the expression that it stands for; the
 // primary one shows the value as given.
 const Node* Kq_BoolEquationImp::GetExpressionRoot() const
 {
@@ -231,7 +231,7 @@ String Kq_BoolEquationImp::GetEquationAsExpression(bool spaces) const
     return IsExpression() ? GetEquation(spaces) : GetEquationAlt1(spaces);
 }
 
-// The dumps stand in this file because their messages carry its lines.
+// The dumps are in this file because their messages carry its lines.
 #define KQ_ENGINE_EMIT(...) KQ_EMIT(kKqEngineModule, __LINE__, __VA_ARGS__)
 
 namespace {
@@ -285,7 +285,7 @@ void DumpNodes(const KqStore& store)
 
 } // namespace
 
-// Of a copy, because the receiver of the messages may set, clear or destroy this object.
+// On a copy, because the receiver of the messages may set, clear or destroy this object.
 void Kq_BoolEquationImp::Dbg() const
 {
     const Kq_BoolEquationImp held(*this);

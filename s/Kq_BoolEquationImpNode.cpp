@@ -31,7 +31,7 @@ bool HasAsChild(const Node& parent, const Node& node)
 Node* Node::GetTopParent() const
 {
     // The mark moves up to the walker whenever the distance has doubled, so a walker that runs in a
-    // circle meets it, and the walk ends after a few times the way's length.
+    // circle meets it, and the walk ends after a few times the length of the path.
     const Node* node = this;
     const Node* mark = this;
     size_t numSteps = 0;
@@ -48,8 +48,8 @@ Node* Node::GetTopParent() const
     }
     if (!node->m_parent)
         return const_cast<Node*>(node);
-    // A circle: the first node that its parent does not have. The bound is for circles of true
-    // links, which no builder makes.
+    // A circle: finds the first node that is not a child of its parent. The bound is for circles of
+    // correct links, which no builder makes.
     node = this;
     while (numSteps-- > 0 && HasAsChild(*node->m_parent, *node))
         node = node->m_parent;
@@ -80,7 +80,7 @@ bool Node::operator==(const Node& other) const
 {
     if (m_type != other.m_type)
         return false;
-    // Only presence of links counts, never what they point at.
+    // Only whether links are present counts, never what they point at.
     if (!m_left_child != !other.m_left_child || !m_right_child != !other.m_right_child ||
         !m_parent != !other.m_parent)
         return false;

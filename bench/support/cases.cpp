@@ -1,4 +1,4 @@
-// Registration, the check before the clock, and main.
+// Registration, the check before the timing, and main.
 #include "cases.h"
 
 #include <memory>
@@ -10,7 +10,7 @@ namespace {
 
 bool allRight = true;
 
-// A case that is made and checked when it is first asked for.
+// A case that is made and checked when it is first needed.
 struct Lazy {
     std::function<Case()> make;
     Case made;
@@ -71,8 +71,8 @@ void SetItems(benchmark::State& state, double numItems, const char* unit)
 
 } // namespace bench
 
-// Repetitions are the default and run in a random order, so that a slow moment of the machine does
-// not hit one side of a pair only. Options on the command line come later and win.
+// By default, repetitions run in a random order, so that a slow moment of the machine does not hit
+// only one side of a pair. Options on the command line come later and take precedence.
 int main(int argc, char** argv)
 {
     std::vector<std::string> options = {

@@ -1,5 +1,5 @@
-// Cases of a benchmark executable: what is timed, what it is measured against, and the check of
-// the answer that comes before both.
+// Cases of a benchmark executable: what is timed, what it is compared with, and the check of the
+// answer that comes before both.
 #ifndef BENCH_CASES_H
 #define BENCH_CASES_H
 
@@ -23,14 +23,14 @@ struct Case {
 void AddPair(const std::string& name, std::function<Case()> make);
 // Registers NAME/ours alone.
 void AddSingle(const std::string& name, std::function<Case()> make);
-// Registers NAME/by_clock alone, whose 'ours' tells each iteration's time itself: work of several
-// threads, which processor time cannot measure.
+// Registers NAME/by_clock alone, whose 'ours' reports each iteration's time itself: for work of
+// several threads, which processor time cannot measure.
 void AddByClock(const std::string& name, std::function<Case()> make);
 
-// Reports the work of one iteration, so that time per item can be told: 'unit' is "token", "row".
+// Reports the work of one iteration, so that time per item can be given: 'unit' is "token", "row".
 void SetItems(benchmark::State& state, double numItems, const char* unit);
 
-// Each executable defines it: adds all its cases.
+// Defined by each executable: adds all its cases.
 void AddCases();
 
 } // namespace bench

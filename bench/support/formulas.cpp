@@ -57,7 +57,7 @@ std::vector<Target> GetTargets()
     return targets;
 }
 
-// Shortest of several runs, in nanoseconds.
+// The shortest of several runs, in nanoseconds.
 double TimeKernel(Kernel kernel, uint64_t numWords, uint64_t* words)
 {
     typedef std::chrono::steady_clock Clock;

@@ -1,5 +1,5 @@
-// The formulas of formulas.py: text, compiled function and column kernels written out by hand.
-// Kernels and functions are what the library is measured against, so they are as fast as C++ gets.
+// The formulas of formulas.py: text, compiled function and hand-written column kernels.
+// Kernels and functions are what the library is compared with, so they are as fast as C++ gets.
 #ifndef BENCH_FORMULAS_H
 #define BENCH_FORMULAS_H
 
@@ -21,7 +21,7 @@ typedef unsigned int (*Function)(const unsigned int* values);
 struct Formula {
     const char* kind;
     unsigned int seed;
-    unsigned int numVariables; // x0, x1, ...; not all need to occur
+    unsigned int numVariables; // x0, x1, ...; not all of them need to occur
     unsigned int numOperators;
     const char* text;
     size_t index; // among those with a kernel, or among those with a function
@@ -39,14 +39,14 @@ std::vector<Formula> GetEvalFormulas(unsigned int numVariables);
 
 Function GetFunction(const Formula& formula);
 
-// The kernel that fills 'words' in the shortest time: of those for the instruction sets that this
-// processor has, and for several block sizes. 'name' tells which one it is.
+// The kernel that fills 'words' in the shortest time, among those for this processor's instruction
+// sets and for several block sizes. 'name' says which one it is.
 Kernel FindFastestKernel(const Formula& formula, uint64_t* words, std::string* name);
 
 // Sets 'equation' to the formula over all its variables, x0 first.
 void SetFormula(const Formula& formula, Kq_BoolEquation& equation);
 
-// The result column by 2^n evaluations: no kernel and no column takes part.
+// The result column by 2^n evaluations, without any kernel or column.
 std::vector<uint64_t> EvaluateColumn(const Kq_BoolEquation& equation);
 
 } // namespace bench

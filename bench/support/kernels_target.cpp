@@ -1,7 +1,8 @@
 // Hand-written column kernels: each formula as one C++ expression over words of 64 rows, in blocks
-// that stay in the cache. Compiled once for each instruction set, BENCH_TARGET being its namespace.
-// Nothing of the standard library is called here: an inline function compiled for the newest
-// processor could otherwise be the one that the linker keeps for all.
+// that stay in the cache. Compiled once for each instruction set, with BENCH_TARGET as its
+// namespace.
+// Nothing of the standard library is called here: otherwise the linker might keep, for all
+// processors, an inline function that was compiled for the newest one.
 #include "kernels.h"
 
 namespace {
@@ -26,7 +27,7 @@ constexpr BlockMasks kBlockMasks;
 // Where an expression finds its variables: bit 'kBit' of the row number.
 template <unsigned int kBlockBits>
 struct Operands {
-    const uint64_t* leading; // columns of the variables that are the same all over the block
+    const uint64_t* leading; // columns of the variables that stay the same throughout the block
     uint64_t word;
 
     template <unsigned int kBit>

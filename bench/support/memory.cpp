@@ -1,4 +1,4 @@
-// Peak memory, told by the kernel: the high-water mark is reset, then read again.
+// Peak memory as the kernel reports it: the high-water mark is reset, then read again.
 #include "memory.h"
 
 #include <cstdio>
@@ -34,8 +34,8 @@ bool ResetPeak()
 
 double MeasureHere(const std::function<void()>& work)
 {
-    // As in a process that has done nothing else: what others have freed would hide what the work
-    // takes, and large blocks would no longer be given back at once.
+    // As in a process that has done nothing else: memory that others have freed would hide what the
+    // work takes, and large blocks would no longer be given back at once.
     malloc_trim(0);
     mallopt(M_MMAP_THRESHOLD, 128 * 1024);
     if (!ResetPeak())

@@ -7,7 +7,7 @@
 namespace bench {
 
 // Bytes of resident memory that 'work' adds at its peak to what the process had before. The work
-// runs in a child process, so that nothing of it stays behind; 0 when it cannot be measured.
+// runs in a child process, so it leaves nothing behind; 0 when it cannot be measured.
 double MeasurePeak(const std::function<void()>& work);
 
 } // namespace bench

@@ -79,7 +79,7 @@ uint32_t PlainEquation::ParseName()
     return Add('x', FindVariable(name, size_t(m_next - name)), 0);
 }
 
-// The operator at the next character, which it passes; 0 when there is none.
+// Reads the operator at the next character and moves past it; 0 when there is none.
 uint32_t PlainEquation::ReadOperator()
 {
     m_next = SkipBlanks(m_next);
@@ -110,7 +110,7 @@ uint32_t PlainEquation::FindVariable(const char* name, size_t length)
 
 unsigned int PlainEquation::Eval() const
 {
-    // An operator stands after its operands, and the root is last.
+    // An operator comes after its operands, and the root is last.
     std::vector<unsigned int> values;
     values.reserve(m_nodes.size());
     for (const PlainNode& node : m_nodes) {

@@ -1,4 +1,4 @@
-// What setting an equation is measured against: a small recursive-descent parser for the same
+// What setting an equation is compared with: a small recursive-descent parser for the same
 // operators, without any of the checks on depth that a library needs.
 #ifndef BENCH_PLAIN_PARSER_H
 #define BENCH_PLAIN_PARSER_H
@@ -23,7 +23,7 @@ static_assert(sizeof(PlainNode) == 16, "the size that the comparison is about");
 class PlainEquation {
   public:
     bool Parse(const char* text);
-    // The value for the variables' present values.  Requires: a text that was accepted.
+    // The value for the current values of the variables.  Requires: a text that was accepted.
     unsigned int Eval() const;
     std::vector<std::pair<std::string, unsigned int>>& GetVariables() { return m_variables; }
 

@@ -14,14 +14,14 @@ std::string MakeName(size_t index)
     return "x" + std::to_string(index);
 }
 
-// A number below 'limit'. Written out, because the library's distributions may differ between
-// makers of it, and the texts must not.
+// A number below 'limit'. Written by hand, because the distributions of standard libraries may
+// differ, and the texts must not.
 size_t Draw(std::mt19937& random, size_t limit)
 {
     return random() % limit;
 }
 
-// May fall short of 'numTokens' by one, which no further operator and operand can make up for.
+// May fall one short of 'numTokens': one token is too few for an operator and an operand.
 std::string DrawTypical(size_t numTokens, size_t numNames, std::mt19937& random, size_t* numDrawn)
 {
     std::string text;

@@ -11,11 +11,11 @@
 
 namespace bench {
 
-// Wide: x0 & x1 | x2 ..., the operators in turn, the names starting again after 'numNames'.
+// Wide: x0 & x1 | x2 ..., with the operators in turn and the names repeating after 'numNames'.
 std::string MakeWide(size_t numTokens, size_t numNames);
-// Deep, the groups in the right operand: ~(x0 & ~(x1 | ~(x2 ...
+// Deep, with the groups in the right operand: ~(x0 & ~(x1 | ~(x2 ...
 std::string MakeDeep(size_t numTokens, size_t numNames);
-// Deep, the groups in the left operand: ((((x0 & x1) | x2) ^ x3) ...
+// Deep, with the groups in the left operand: ((((x0 & x1) | x2) ^ x3) ...
 std::string MakeDeepLeft(size_t numTokens, size_t numNames);
 // A random text of exactly 'numTokens' tokens with groups and negations, over at most 'numNames'
 // names.
@@ -38,7 +38,7 @@ std::vector<uint64_t> ReadInitValue(const std::string& text);
 // The digits of a column over at least two variables, as "0x...".
 std::string WriteInitValue(const std::vector<uint64_t>& words, unsigned int numVariables);
 
-// Nodes of the tree, groups and their ends included: as many as the text has tokens.
+// Nodes of the tree, including groups and their ends: as many as the text has tokens.
 size_t CountNodes(const Kq_BoolEquationImp::Node* root);
 
 } // namespace bench

@@ -1,3 +1,3 @@
-# CLI11 for another machine: only headers, so those of this machine serve.
+# CLI11 for another machine: it has only headers, so those of this machine will do.
 include("${CMAKE_CURRENT_LIST_DIR}/headers.cmake")
 kq_headers_of_this_machine(CLI11 CLI11::CLI11 CLI)

@@ -1,5 +1,5 @@
-# A target for one folder of headers in /usr/include. A link shows it alone: the other headers there
-# belong to this machine's C library.
+# A target for one folder of headers in /usr/include. A link makes only that folder visible: the
+# other headers there belong to this machine's C library.
 function(kq_headers_of_this_machine package target folder)
   if(NOT IS_DIRECTORY "/usr/include/${folder}")
     set(${package}_FOUND FALSE PARENT_SCOPE)

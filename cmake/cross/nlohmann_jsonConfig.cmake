@@ -1,3 +1,3 @@
-# nlohmann-json for another machine: only headers, so those of this machine serve.
+# nlohmann-json for another machine: it has only headers, so those of this machine will do.
 include("${CMAKE_CURRENT_LIST_DIR}/headers.cmake")
 kq_headers_of_this_machine(nlohmann_json nlohmann_json::nlohmann_json nlohmann)

@@ -1,5 +1,5 @@
 # 64-bit Windows by MinGW-w64, with POSIX threads because std::mutex needs them there. Programs and
-# libraries lie in one folder, where Windows looks for libraries; they run under Wine.
+# libraries are in one folder, where Windows looks for libraries; they run under Wine.
 set(CMAKE_SYSTEM_NAME Windows)
 set(CMAKE_SYSTEM_PROCESSOR x86_64)
 set(CMAKE_C_COMPILER x86_64-w64-mingw32-gcc-posix)

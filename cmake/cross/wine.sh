@@ -1,7 +1,7 @@
 #!/bin/sh
-# Runs a Windows program under Wine, with a Wine folder of its own and the compiler's libraries.
+# Runs a Windows program under Wine, with its own Wine folder and the compiler's libraries.
 # usage: wine.sh FOLDER PROGRAM [ARGUMENT...], or FOLDER --start or --stop: makes the folder, and keeps
-# Wine's services running from one program to the next, so that none is started in a test
+# Wine's services running from one program to the next, so that no test has to start them
 set -eu
 export WINEPREFIX="$1" WINEDEBUG=-all WINEDLLOVERRIDES='mscoree,mshtml='
 shift

@@ -1,6 +1,6 @@
 # CPack runs this when the packages are made. Each is unpacked, fixed and packed again:
-#   - The field Multi-Arch is added; CPack knows it from 3.31 on.
-#   - Scripts that call ldconfig go: policy wants the trigger, which the library's package has.
+#   - The field Multi-Arch is added; CPack has it only from 3.31 on.
+#   - Scripts that call ldconfig are removed: policy wants the trigger in the library's package.
 cmake_minimum_required(VERSION 3.25)
 
 function(kq_run)
@@ -32,7 +32,7 @@ foreach(file IN LISTS CPACK_PACKAGE_FILES)
     endif()
   endforeach()
 
-  # One thread, because the number of threads shows in the compressed bytes.
+  # One thread, because the number of threads affects the compressed bytes.
   kq_run(dpkg-deb --root-owner-group --threads-max=1 --build "${tree}" "${file}")
   file(REMOVE_RECURSE "${tree}")
 endforeach()

@@ -1,5 +1,5 @@
-# CPack runs this when the files of all components are in place and no package is made yet. Each
-# component gets what policy wants of every package: /usr/share/doc/PACKAGE/copyright, made of the
+# CPack runs this when the files of all components are in place and no package has been made. Each
+# component gets what policy wants of every package: /usr/share/doc/PACKAGE/copyright, made from the
 # licence, and changelog.gz; man pages are compressed.
 cmake_minimum_required(VERSION 3.25)
 
@@ -9,14 +9,14 @@ if("$ENV{SOURCE_DATE_EPOCH}" STREQUAL "")
                       "SOURCE_DATE_EPOCH=$(git log -1 --format=%ct)")
 endif()
 
-# Compresses a file without the name and the time of the original.
+# Compresses a file, leaving out the name and time of the original.
 function(kq_gzip file)
   execute_process(COMMAND gzip -9nf "${file}" COMMAND_ERROR_IS_FATAL ANY)
 endfunction()
 
-# The licence as a copyright file that machines can read. Its first line is its name, then comes
-# the line of the copyright, then the terms. What others made is in COMPONENT.copyright, under the
-# same terms, and so is the solver where it is linked into a component's files.
+# The licence as a machine-readable copyright file. Its first line is its name, then comes the
+# copyright line, then the terms. What others made is in COMPONENT.copyright, under the same terms;
+# so is the solver where it is linked into a component's files.
 function(kq_copyright variable component)
   file(READ "${CPACK_RESOURCE_FILE_LICENSE}" text)
   if(NOT text MATCHES "^MIT License\n\nCopyright (\\(c\\) )?([0-9][^\n]*)\n\n(.*[^\n])\n*$")

@@ -1,12 +1,12 @@
 #!/usr/bin/env python3
-"""From Verilog to a bitstream and back, and whether every look-up table is what it was.
+"""From Verilog to a bitstream and back: is every look-up table still what it was?
 
 usage: demo.py BOOLEQ DIRECTORY
 
 Runs yosys, nextpnr-ice40 and the programs of fpga-icestorm on processor.v, in DIRECTORY, and compares
-with booleq: what was synthesised with what was placed, what was placed with what the bitstream says.
-Then each fault of put_fault.py is put into the bitstream, and the comparison must name it. Ends with
-status 1 when anything is not as it should be.
+with booleq: the synthesised netlist with the placed one, and the placed one with the bitstream.
+Then each fault of put_fault.py is put into the bitstream, and the comparison must name it. Exits
+with status 1 when anything is not as it should be.
 """
 import pathlib
 import shlex
@@ -14,7 +14,7 @@ import subprocess
 import sys
 
 HERE = pathlib.Path(__file__).resolve().parent
-# What the comparison says of each fault.
+# What the comparison says about each fault.
 CAUSES = {
     "pins-swapped": "pins swapped without the init value",
     "digit-flipped": "one digit of the init value changed",
@@ -31,7 +31,7 @@ class Demonstration:
         self.failed = []
 
     def run(self, *command, status=0):
-        """Runs a command, shows it and what it says, and gives that back."""
+        """Runs a command, shows it and its output, and returns the output."""
         shown = [pathlib.Path(word).name if word in (self.booleq, *self.scripts()) else word
                  for word in command]
         print("$", " ".join(shlex.quote(word) for word in shown), flush=True)

@@ -1,5 +1,5 @@
-// A processor of eight bits: an accumulator, four registers, a program of sixteen instructions in
-// look-up tables. It counts the primes below 256 and shows the last one that it found.
+// An eight-bit processor: an accumulator, four registers, and a program of sixteen instructions in
+// look-up tables. It looks for the primes below 256 and shows the last one that it found.
 module processor(input clk, input reset, input [3:0] keys, output reg [7:0] shown, output busy);
     localparam LOAD = 3'd0, ADD = 3'd1, SUBTRACT = 3'd2, STORE = 3'd3;
     localparam JUMP_CARRY = 3'd4, JUMP_ZERO = 3'd5, JUMP = 3'd6, SHOW = 3'd7;

@@ -4,8 +4,8 @@
 usage: put_fault.py FAULT BITSTREAM.asc FAULTY.asc
 
 FAULT is pins-swapped, digit-flipped, halves-exchanged, mask-shortened or output-inverted. The table
-is one whose four pins are all routed and whose function looks different after each of the faults, so
-that it can be told which of them it was. Prints the place, the init value and what it became.
+is one whose four pins are all routed and whose function looks different after each fault, so that
+the fault can be identified. Prints the table's place, its init value and the faulty one.
 """
 import itertools
 import sys
@@ -13,10 +13,10 @@ import sys
 sys.path.append("/usr/share/fpga-icestorm/python")
 import icebox  # noqa: E402
 
-# Where row k of a table stands among the bits of its logic cell, as icebox.get_lutff_lut_bits reads.
+# Where row k of a table is among the bits of its logic cell, as icebox.get_lutff_lut_bits reads.
 BIT_OF_ROW = (4, 14, 15, 5, 6, 16, 17, 7, 3, 13, 12, 2, 1, 11, 10, 0)
-FIRST_COLUMN = 36  # of a tile, that holds bits of logic cells
-ROW_BITS = 10      # of a logic cell, in each of its two lines
+FIRST_COLUMN = 36  # the first one of a tile with bits of logic cells
+ROW_BITS = 10      # of a logic cell, in each of its two rows of bits
 
 
 def with_pins(table, order):
@@ -36,7 +36,7 @@ FAULTS = {
 
 
 def tells_faults_apart(table):
-    """No order of pins makes the result of one fault that of another one, or the table itself."""
+    """Whether no order of pins turns one fault's result into another's or into the table."""
     orders = list(itertools.permutations(range(4)))
     seen = {tuple(with_pins(table, order)) for order in orders}
     if len(seen) != len(orders):

@@ -3,10 +3,10 @@
 
 usage: read_bitstream.py BITSTREAM.asc NETLIST.json
 
-Takes the text form of a bitstream (iceunpack), and of fpga-icestorm its description of the chip,
-which says what each bit is and which wires a routed net consists of. Gives one cell for each logic
-cell that holds a table or a flip-flop, with its place as the attribute NEXTPNR_BEL, as the placed netlist has it. Names are gone: nets
-are numbered.
+Reads the text form of a bitstream (iceunpack) and fpga-icestorm's description of the chip, which
+says what each bit is and which wires a routed net consists of. Writes one cell for each logic cell
+that holds a table or a flip-flop, with its place in the attribute NEXTPNR_BEL, as in the placed
+netlist. Names are lost: nets are numbered.
 """
 import json
 import re
@@ -25,10 +25,10 @@ def read_chip(path):
 
 
 def wires_to_nets(chip):
-    """The number of the net of each wire; a net is the wires that switches join."""
+    """The net number of each wire; a net is the set of wires that switches join."""
     nets = {}
-    # The logic cells' outputs are there before a switch joins them to anything. 0 and 1 are the
-    # numbers that a netlist in this format does not use.
+    # The outputs of logic cells are nets even before a switch joins them to anything. This format
+    # does not use the numbers 0 and 1 for nets.
     for number, wires in enumerate(sorted(chip.group_segments()), start=2):
         for wire in wires:
             nets[wire] = number
@@ -41,9 +41,9 @@ def is_used(table, settings, wires, nets):
 
 
 def cell_at(chip, nets, column, row, index):
-    """The logic cell's table, null where the cell holds nothing."""
+    """The logic cell's table, None when the cell holds nothing."""
     tile = chip.logic_tiles[(column, row)]
-    table = icebox.get_lutff_lut_bits(tile, index)     # the row of all zeros first
+    table = icebox.get_lutff_lut_bits(tile, index)     # starts with the row of all zeros
     settings = icebox.get_lutff_seq_bits(tile, index)  # carry, flip-flop, set, asynchronous
 
     def wire(name):

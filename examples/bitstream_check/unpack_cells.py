@@ -4,14 +4,14 @@
 usage: unpack_cells.py SYNTHESISED.json PLACED.json NETLIST.json RENAMES
 
 A logic cell of a placed netlist is a table, a flip-flop and a carry. Where the flip-flop is used, the
-net between both has no name any more; it gets one. Cells without a table of the design are left out:
-those that only pass a net to their flip-flop, those that are there for their carry, constants.
-RENAMES are the nets that placement calls otherwise: these, and those between pads and logic.
+net between table and flip-flop has lost its name; it gets one. Cells without a table of the design
+are left out: those that only pass a net to their flip-flop or serve their carry, and constants.
+RENAMES are the nets that placement renames: these, and those between pads and logic.
 """
 import json
 import sys
 
-SUFFIX = "_LC"  # what nextpnr puts after the name of a table
+SUFFIX = "_LC"  # nextpnr puts this after the name of a table
 TO_FLIP_FLOP = "$to_flip_flop"
 INPUTS = ("I0", "I1", "I2", "I3")
 
@@ -28,7 +28,7 @@ def is_table(name, cell):
 
 
 def constants_of(module):
-    """The digit that each net of a constant cell is."""
+    """The constant digit of each net that a constant cell drives."""
     digits = {}
     for name, cell in module["cells"].items():
         if name.startswith("$PACKER_"):
@@ -61,7 +61,7 @@ def unpack(module):
 
 
 def net_names(module):
-    """A name of each net, as booleq calls bits of wider ones."""
+    """A name for each net; bits of wider ones are named as booleq names them."""
     names = {}
     for name, net in module["netnames"].items():
         for place, bit in enumerate(net["bits"]):
@@ -70,7 +70,7 @@ def net_names(module):
 
 
 def renames(synthesised, unpacked):
-    """What placement calls the nets of pads, and those from a table to its flip-flop."""
+    """The names after placement of the nets of pads, and of those from tables to flip-flops."""
     for name, port in synthesised["ports"].items():
         suffix = "$SB_IO_IN" if port["direction"] == "input" else "$SB_IO_OUT"
         for place in range(len(port["bits"])):

@@ -11,7 +11,7 @@ Diagnostics::Diagnostics(size_t maxLines)
 
 Diagnostics::~Diagnostics()
 {
-    // An exception must not leave a destructor; without memory for it the sink before is lost.
+    // No exception may leave a destructor; if memory runs out here, the previous sink is lost.
     try {
         Port_MsgManData::setSink(m_before);
     } catch (const std::bad_alloc&) {

@@ -1,4 +1,4 @@
-// The library's messages, collected for the program's own log; the debug mode for a while.
+// The library's messages, collected for the program's own log, and debug mode for a while.
 #ifndef EMBEDDING_DIAGNOSTICS_H
 #define EMBEDDING_DIAGNOSTICS_H
 
@@ -8,14 +8,15 @@
 
 #include <port/Port_MsgManData.h>
 
-// Collects what the library says while it lives; then the sink before is back, whatever happened.
-// The library's messages are pieces of lines, so a line is whole when its line end has come.
+// While it exists, collects what the library says; after that the previous sink is back, whatever
+// happened. The library's messages are pieces of lines, so a line is complete when its line end has
+// arrived.
 class Diagnostics {
   public:
-    // What the sink throws at one line more than 'maxLines'. It comes out of the library's member
-    // that was at work; every object stays safe to use. An Eval that is cut has changed nothing
-    // and can be repeated. A SetEquation that is cut has not set anything, and no one knows whether
-    // the text would have been refused; so there the limit is not used.
+    // Thrown by the sink at the first line beyond 'maxLines'. It comes out of the library's member
+    // that was running; every object stays safe to use. An Eval that is cut short has changed
+    // nothing and can be repeated. A SetEquation that is cut short has set nothing, and nobody
+    // knows whether the text would have been refused; so the limit is not used there.
     struct TooMany : std::runtime_error {
         using std::runtime_error::runtime_error;
     };
@@ -36,7 +37,7 @@ class Diagnostics {
     Port_MsgManData::Sink m_before;
 };
 
-// The debug mode is one switch for the whole process: on while this lives, then as before.
+// Debug mode is one switch for the whole process: it is on while this exists, then as before.
 class DebugMode {
   public:
     DebugMode();

@@ -1,4 +1,4 @@
-// The interlocks of a machine: rules are equations over its signals, and all must hold.
+// The interlocks of a machine: rules are equations over its signals, and all of them must hold.
 // usage: embedding RULES [--trace NAME] [--trace-lines COUNT] [SIGNAL=0|1...]
 // RULES has lines "name = equation". Writes one log: each rule's value, the signals that decide it,
 // refused texts with the library's own diagnostics, and the trace of the rule NAME.
@@ -15,7 +15,7 @@
 
 namespace {
 
-// Lines of the library about a refused text that are worth a place in the log.
+// The number of library lines about a refused text that the log shows.
 constexpr size_t kMaxDiagnostics = 20;
 
 struct Options {
@@ -73,8 +73,8 @@ bool ReadOptions(int argc, char** argv, Options& options)
     return !options.file.empty();
 }
 
-// Sets the rule's equation. A refused text is logged with its place, and below it what the library
-// said meanwhile: most refusals are silent, a wrong structure shows the node to blame.
+// Sets the rule's equation. A refused text is logged with its position, and below it what the
+// library said: most refusals are silent, but a wrong structure shows the node to blame.
 bool ReadEquation(Rule& rule, const std::string& place, const std::string& text, size_t column)
 {
     const Diagnostics diagnostics(std::numeric_limits<size_t>::max());
@@ -94,7 +94,7 @@ bool ReadEquation(Rule& rule, const std::string& place, const std::string& text,
     return false;
 }
 
-// Evaluates with the debug mode on, which makes the library say each step.
+// Evaluates in debug mode, in which the library reports each step.
 void Trace(const Rule& rule, const std::string& place, size_t maxLines)
 {
     const Diagnostics diagnostics(maxLines);
@@ -111,7 +111,7 @@ void Trace(const Rule& rule, const std::string& place, size_t maxLines)
         Log("warning", place + "trace cut: " + cut);
 }
 
-// Logs all there is to say about the rule; returns its value.
+// Logs everything there is to say about the rule; returns its value.
 bool Report(const Rule& rule, const std::string& place, const std::vector<std::string>& missing)
 {
     if (!missing.empty())
@@ -148,7 +148,7 @@ int Run(const Options& options)
         rule.name = Trimmed(text.substr(0, sign));
         const size_t column = std::min(text.find_first_not_of(" \t\r", sign + 1), text.size());
         if (!ReadEquation(rule, place, Trimmed(text.substr(column)), column)) {
-            status = 2; // the other rules are still looked at
+            status = 2; // the other rules are still checked
             continue;
         }
         const std::vector<std::string> missing = SetSignals(rule, options.signals);

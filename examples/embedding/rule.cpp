@@ -18,7 +18,7 @@ std::vector<std::string> FindDeciding(const Rule& rule)
     const unsigned int value = rule.equation.Eval();
     std::vector<std::string> deciding;
     for (const auto& variable : rule.equation.GetVariables()) {
-        Kq_BoolEquation changed(rule.equation); // nothing is read again
+        Kq_BoolEquation changed(rule.equation); // nothing is parsed again
         changed.SetVariable(variable.first, 1 - variable.second);
         if (changed.Eval() != value)
             deciding.emplace_back(variable.first.c_str());

@@ -15,11 +15,11 @@ struct Rule {
     Kq_BoolEquation equation; // its variables have the values of the signals
 };
 
-// A rule with the values of 'signals'; returns the names that have no value there, and are 0.
+// Gives a rule the values of 'signals'; returns the names without a value, which are set to 0.
 std::vector<std::string> SetSignals(Rule& rule, const Signals& signals);
 
-// The signals that change the rule's value when they alone change.
-// Each is tried on a copy: copies share the equation and have values of their own.
+// The signals that change the rule's value when only they change.
+// Each is tried on a copy: copies share the equation and have their own values.
 std::vector<std::string> FindDeciding(const Rule& rule);
 
 #endif

@@ -1,8 +1,7 @@
 // Reports what the look-up tables of a design compute: for each its name among engineers, inputs
-// without effect, a short expression, and an earlier table that could stand in for it.
-//
+// without effect, a short expression, and an earlier table that could replace it.
 // usage: lut_report FILE
-// A line of FILE is a name, inputs with commas between (the most significant first) and an init
+// A line of FILE is a name, inputs separated by commas (the most significant first) and an init
 // value; # begins a comment. Exit status: 0 done, 1 a line was refused, 2 there is no such file.
 #include <algorithm>
 #include <fstream>

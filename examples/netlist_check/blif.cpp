@@ -6,7 +6,7 @@
 
 namespace {
 
-// Tables of more inputs are no look-up tables of a device, and their digits fill the memory.
+// Tables with more inputs are not look-up tables of a device, and their digits would fill memory.
 constexpr size_t kMaxInputs = 16;
 
 struct Row {
@@ -14,7 +14,7 @@ struct Row {
     size_t line;
 };
 
-// A .names block as written: patterns of its on-set, or all of its off-set.
+// A .names block as written: patterns of its on-set, or only of its off-set.
 struct Block {
     size_t line = 0;
     std::vector<std::string> signals; // the output last
@@ -53,8 +53,7 @@ class Reader {
         Fail(m_network.file, m_line, what);
     }
 
-    // The words of the next line that has some; a '\' at its end continues it, '#' begins a
-    // comment.
+    // The words of the next line that has any; a '\' at its end continues it, '#' begins a comment.
     bool ReadWords(std::vector<std::string>& words)
     {
         words.clear();
@@ -174,7 +173,7 @@ class Reader {
         m_block = Block();
     }
 
-    // The block's digits, row 2^n-1 first, are an init value, and the library reads those.
+    // The block's digits, row 2^n-1 first, are an init value, which the library reads.
     void SetFromInitValue(Table& table) const
     {
         const size_t numInputs = table.inputs.size();
@@ -231,7 +230,7 @@ class Reader {
     }
 
     std::ifstream m_stream;
-    size_t m_line = 0; // where the words read last begin
+    size_t m_line = 0; // where the last words read begin
     size_t m_next_line = 1;
     bool m_has_model = false;
     Block m_block;

@@ -5,7 +5,7 @@
 
 #include "network.h"
 
-// Each block becomes a table whose equation was read from the block's init value.
+// Each block becomes a table whose equation is read from the block's init value.
 // Fails: Fault with file, line, what is wrong and what to do about it.
 Network ReadBlif(const std::string& path);
 

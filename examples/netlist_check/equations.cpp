@@ -22,7 +22,7 @@ bool Contains(const std::vector<std::string>& names, const std::string& name)
     return std::find(names.begin(), names.end(), name) != names.end();
 }
 
-// The table of one definition. 'known' are the names that it may use.
+// The table of one definition. 'known' has the names that it may use.
 Table ReadDefinition(const std::string& file, size_t lineNumber, const std::string& line,
                      const std::vector<std::string>& known)
 {

@@ -11,7 +11,7 @@
 
 namespace {
 
-// Every assignment is tried, so their number is bounded.
+// Every assignment is tried, so their number is limited.
 constexpr size_t kMaxInputs = 24;
 
 std::string Joined(const std::vector<std::string>& names)
@@ -22,7 +22,7 @@ std::string Joined(const std::vector<std::string>& names)
     return text;
 }
 
-// Prints the table. False when its expression, read again, is another function.
+// Prints the table. False when its expression, read back, is another function.
 bool CheckTable(const Table& table)
 {
     const bool isConstant = table.inputs.empty();

@@ -19,7 +19,7 @@ std::string ToName(const std::string& signal)
 
 namespace {
 
-// Says why none of the tables that are left can be computed from the signals that are 'done'.
+// Says why none of the remaining tables can be computed from the signals that are 'done'.
 [[noreturn]] void FailUndriven(const std::string& file, const std::vector<Table>& left,
                                const std::set<std::string>& done)
 {
@@ -54,7 +54,7 @@ void SortTables(Network& network)
             Fail(network.file, lines[input],
                  input + " is an input of the model and cannot be driven");
 
-    // Takes the tables whose inputs are there, until none is left or none can be taken.
+    // Takes the tables whose inputs are available, until none is left or none can be taken.
     std::set<std::string> done(network.inputs.begin(), network.inputs.end());
     std::vector<Table> left = std::move(network.tables);
     network.tables.clear();
@@ -76,7 +76,7 @@ void SortTables(Network& network)
 
 Evaluator::Evaluator(const Network& network, const std::string& output)
 {
-    // What is needed, from the output backwards; a table stands after those that it reads.
+    // What is needed, from the output backwards; a table comes after those that it reads.
     std::set<std::string> needed = {output};
     std::vector<const Table*> tables;
     for (auto table = network.tables.rbegin(); table != network.tables.rend(); ++table) {

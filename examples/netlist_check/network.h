@@ -19,16 +19,16 @@ struct Fault : std::runtime_error {
 };
 [[noreturn]] void Fail(const std::string& file, size_t line, const std::string& what);
 
-// One signal as a function of others, the first input the most significant.
+// One signal as a function of others, with the first input as the most significant.
 struct Table {
     std::string output;
     std::vector<std::string> inputs;
     Kq_BoolEquation equation;
     std::vector<uint64_t> column; // the equation's: row k is bit k % 64 of word k / 64
-    size_t line = 0;              // of the file that it comes from
+    size_t line = 0;              // of the file that the table comes from
 };
 
-// Invariant: a table reads the network's inputs and outputs of tables before it, nothing else.
+// Invariant: a table reads only the network's inputs and the outputs of earlier tables.
 struct Network {
     std::string file;
     std::vector<std::string> inputs;
@@ -39,8 +39,8 @@ struct Network {
 // The name of a signal as the library reads it: between quotes unless it is a plain one.
 std::string ToName(const std::string& signal);
 
-// Establishes the invariant.  Fails: Fault for a signal that nothing or more than one drives, and
-// for tables in a circle.
+// Establishes the invariant.  Fails: Fault for a signal that is driven by nothing or more than
+// once, and for tables in a circle.
 void SortTables(Network& network);
 
 // Computes one output of a network, assignment by assignment, from the tables that it needs.
@@ -48,7 +48,7 @@ class Evaluator {
   public:
     Evaluator(const Network& network, const std::string& output);
 
-    // Network inputs that the output depends on by its structure.
+    // The network inputs that the output depends on structurally.
     const std::vector<std::string>& GetInputs() const { return m_inputs; }
     // 'values' has at least these inputs.
     bool Evaluate(const std::map<std::string, bool>& values);
@@ -59,7 +59,7 @@ class Evaluator {
         std::vector<size_t> inputs; // places in m_values
     };
     std::vector<std::string> m_inputs;
-    std::vector<Step> m_steps; // each puts its result after the values there are
+    std::vector<Step> m_steps; // each appends its result to the values so far
     std::vector<unsigned char> m_values;
     size_t m_output = 0;
 };

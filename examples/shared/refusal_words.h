@@ -44,7 +44,7 @@ inline std::string Words(const Kq_BoolEquation::Refusal& refusal, const std::str
     case Refusal::INIT_NAME:
         return "the name of an input makes the init value impossible to read";
     }
-    return "refused, code " + std::to_string(refusal.code); // of a newer library
+    return "refused, code " + std::to_string(refusal.code); // from a newer library
 }
 
 } // namespace examples

@@ -7,14 +7,14 @@ namespace Port {
 
 class FileInit { // start-up object of files
   public:
-    // The service is set up while an object lives; the default host's needs nothing.
+    // The service is set up while an object exists; the default host has nothing to set up.
     FileInit();
     ~FileInit();
 };
 
 class PathListInit { // start-up object of lists of paths
   public:
-    // The service is set up while an object lives; the default host's needs nothing.
+    // The service is set up while an object exists; the default host has nothing to set up.
     PathListInit();
     ~PathListInit();
 };
@@ -23,21 +23,21 @@ class PathListInit { // start-up object of lists of paths
 
 class Port_MsgManInit { // start-up object of the message manager
   public:
-    // The service is set up while an object lives; the default host's needs nothing.
+    // The service is set up while an object exists; the default host has nothing to set up.
     Port_MsgManInit();
     ~Port_MsgManInit();
 };
 
 class InstanceTableInit { // start-up object of the table of instances
   public:
-    // The service is set up while an object lives; the default host's needs nothing.
+    // The service is set up while an object exists; the default host has nothing to set up.
     InstanceTableInit();
     ~InstanceTableInit();
 };
 
 class FactoryInit { // start-up object of factories
   public:
-    // The service is set up while an object lives; the default host's needs nothing.
+    // The service is set up while an object exists; the default host has nothing to set up.
     FactoryInit();
     ~FactoryInit();
 };

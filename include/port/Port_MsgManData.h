@@ -4,8 +4,8 @@
 
 #include <functional>
 
-// Lets the compiler compare a format with the arguments after it; positions count from 2 in a
-// member, as the object is number 1.
+// Lets the compiler compare a format with the arguments after it. In a member, positions count from
+// 2, because the object is number 1.
 #if defined(__GNUC__)
 #define PORT_PRINTF(formatIndex, firstIndex)                                                       \
     __attribute__((__format__(__printf__, formatIndex, firstIndex)))
@@ -15,27 +15,27 @@
 
 // One report: where it comes from, and its text.
 // Threads: any may report, and exchange the sink, at any time. Texts arrive whole and one at a
-// time: a sink needs no lock of its own against other reports. While it runs, other threads that
-// report or exchange the sink wait; its own thread does not, so that it may use whatever reports,
-// issue messages, which reach it before the one at hand is done, exchange the sink and throw. It
-// must not wait for a thread that may report.
+// time, so a sink needs no lock against other reports. While it runs, other threads that report or
+// exchange the sink wait. Its own thread does not: the sink may use code that reports, issue
+// messages (which reach it before the current one is done), exchange the sink and throw. It must
+// not wait for a thread that may report.
 class Port_MsgManData {
   public:
     // Where texts go: message id, source path, source line, revision text, the formatted text.
-    // All pointers are valid during the call only; the text has no line end but its own.
+    // All pointers are valid during the call only; no line end is added to the text.
     typedef std::function<void(const char* id, const char* file, int line, const char* revision,
                                const char* text)>
         Sink;
 
-    // Installs 'sink' for all later messages and returns the one before. An empty sink stands for
-    // the default, which writes each text as it comes to standard error. What the sink throws
-    // reaches whoever issued the message. The former sink runs in no other thread once this
-    // returns, so what it refers to may go; itself it is destroyed when no report is under way.
+    // Installs 'sink' for all later messages and returns the previous one. An empty sink stands for
+    // the default, which writes each text unchanged to standard error. What the sink throws reaches
+    // the code that issued the message. Once this returns, the former sink runs in no other thread,
+    // so what it refers to may go; the sink itself is destroyed when no report is under way.
     static Sink setSink(Sink sink);
 
-    // The message object for the calling thread's next report. It is one object for each thread,
-    // valid until the thread ends or the library is unloaded, and only for that thread; the four
-    // values are copied pointers, so they must outlive the issueStatus call.
+    // The message object for the calling thread's next report. Each thread has one object, valid
+    // until the thread ends or the library is unloaded, and only for that thread. The four values
+    // are copied pointers, so they must outlive the issueStatus call.
     static Port_MsgManData& createObject(const char* id, const char* file, int line,
                                          const char* revision);
 

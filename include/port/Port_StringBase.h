@@ -12,7 +12,7 @@ namespace Port {
 template <class CharT>
 class StringBase; // only for char
 
-// A byte string of any length; bytes of value 0 may stand in it.
+// A byte string of any length; it may contain bytes of value 0.
 // A null 'const char*' counts as the empty text.  Fails: std::bad_alloc only.
 // Threads: different strings are independent; const members of one string may run at once.
 template <>
@@ -21,7 +21,7 @@ class StringBase<char> {
     StringBase() = default; // the empty text
     // The bytes before the first 0; implicit, so that a literal can be passed for a string.
     StringBase(const char* text) : m_text(text ? text : "") {}
-    // A value: takes the other's bytes; one that is moved from may hold any text.
+    // Copies or takes the other's bytes; a string that was moved from may hold any text.
     StringBase(const StringBase& other) = default;
     StringBase(StringBase&& other) noexcept = default;
     ~StringBase() = default;
@@ -51,11 +51,11 @@ class StringBase<char> {
         return *this;
     }
 
-    // Makes room for a text of so many bytes. A host's class need not have it: where it is there,
-    // long texts are written once instead of being moved each time they have doubled.
+    // Makes room for a text of this many bytes. A host's class need not have it; where it exists,
+    // long texts are written once instead of being moved each time they double.
     void reserve(std::size_t length) { m_text.reserve(length); }
 
-    // Number of bytes, a terminating 0 not counted.
+    // Number of bytes, not counting a terminating 0.
     std::size_t length() const { return m_text.length(); }
     // The bytes, followed by a 0; valid until the string changes.
     const char* c_str() const { return m_text.c_str(); }

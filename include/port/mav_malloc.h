@@ -4,9 +4,9 @@
 
 #include <cstddef>
 
-// Threads: any may ask and give back at any time, what another one got as well.
+// Threads: any may call at any time, and may free what another one allocated.
 
-// 'size' bytes aligned for every type, or null when there are none to be had.
+// 'size' bytes aligned for every type, or null when no memory is left.
 void* mav_malloc(std::size_t size);
 
 // Gives back what mav_malloc returned; null is allowed.

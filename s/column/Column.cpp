@@ -1,6 +1,6 @@
 // Tree in, packed result column out. The leading variables are fixed one after another until the
-// rest is a constant, has been written before, or is small enough for a kernel, which then runs it
-// in a block that stays in the cache.
+// rest is a constant, has been written before, or is small enough for a kernel, which then computes
+// it in a block that stays in the cache.
 #include "Column.h"
 
 #include <algorithm>
@@ -23,7 +23,7 @@ constexpr unsigned int kKernelLevel = 14;
 // Larger blocks are not copied but expanded again: their first copy has left the cache.
 constexpr unsigned int kMaxCopyLevel = 20;
 
-// Operations on words that take some milliseconds.
+// So many operations on words take some milliseconds.
 constexpr uint64_t kPieceOperations = uint64_t(1) << 24;
 
 size_t NumWords(unsigned int level)
@@ -156,7 +156,7 @@ void KqColumn::Fill(uint64_t firstWord, size_t numWords, uint64_t* words)
     }
 }
 
-// Fixes the variables above the piece as its place says. The piece before shares most of them.
+// Fixes the variables above the piece as its position says, mostly as for the previous piece.
 void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words)
 {
     ForgetWritten();
@@ -176,7 +176,7 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
         m_path_length = depth;
     }
     assert(depth <= sizeof m_path / sizeof m_path[0]);
-    // What the piece before had fixed below this depth is overwritten now.
+    // What the previous piece had fixed below this depth is overwritten now.
     m_path_length = depth;
     m_num_codes = rest.first + rest.numCodes;
     Expand(rest, level, words);
@@ -190,7 +190,7 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
         return;
     }
     assert(rest.variables >> level == 0);
-    // The block repeats from the highest variable on that it has.
+    // Above its own highest variable, the block repeats.
     const unsigned int ownLevel = std::max(HighestVariable(rest.variables) + 1, 6u);
     if (ownLevel <= kKernelLevel) {
         if (CopyWritten(rest, ownLevel, words))
@@ -208,7 +208,7 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
 void KqColumn::ExpandHalves(const Rest& rest, unsigned int level, uint64_t* words)
 {
     assert(level > kKernelLevel);
-    // What is left stays in m_codes while it may be met again, up to a few times the program.
+    // Rests stay in m_codes because they may come up again, up to a few times the program's size.
     const size_t limit = rest.first + rest.numCodes + 4 * m_whole.numCodes + 16384;
     for (const bool value : {false, true}) {
         if (m_num_codes > limit) {

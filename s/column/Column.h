@@ -13,7 +13,7 @@
 // Deliberate: 30 variables are tabulated, 31 are not; row numbers stay within 32 bits.
 constexpr unsigned int kKqMaxColumnVariables = 30;
 
-// Words that every kernel may work on at a time; a column in pieces of a multiple of it is best.
+// Words that every kernel can process at a time; pieces of a column should be a multiple of it.
 constexpr size_t kKqTileWords = 64;
 
 // A kernel computes 'numWords' words of the column of a program whose variables are numbered by the
@@ -34,11 +34,11 @@ struct KqNamedKernel {
 // All kernels of this build, the plain one first, each faster than those before it.
 const KqNamedKernel* KqGetKernels(size_t* numKernels);
 
-// The kernel of this name, or the fastest one when 'name' is null, is not in the table, or names
-// one that this processor lacks.
+// The kernel of this name; the fastest one when 'name' is null, is not in the table, or names a
+// kernel that this processor lacks.
 const KqNamedKernel& KqChooseKernel(const char* name);
 
-// The kernel of all columns: that of the name in the environment variable
+// The kernel for all columns: the one named by the environment variable
 // MAV_KQ_BOOL_EQUATION_KERNEL, so that a fault seen on one processor can be repeated on another.
 // Chosen once, when the library is loaded.
 const KqNamedKernel& KqGetKernel();
@@ -47,8 +47,9 @@ const KqNamedKernel& KqGetKernel();
 // numVariables-1 of k, the last is bit 0. With fewer than six variables the one word repeats the
 // column's 2^numVariables bits up to its end.
 //
-// The column is split by fixing its first variable, then the next: what is left of the program is
-// shorter each time, and often a constant or what was left before, whose words are copied.
+// The column is split by fixing its first variable, then the next. What is left of the program gets
+// shorter each time, and is often a constant or the same as an earlier rest, whose words are
+// copied.
 class KqColumn {
   public:
     // Compiles the tree at 'root', which may be null and then counts as 0.
@@ -59,8 +60,8 @@ class KqColumn {
     // 2^numVariables / 64, at least 1.
     size_t GetNumWords() const { return m_num_words; }
 
-    // Words of a piece that is filled within some milliseconds, or, with over 100,000 operators, of
-    // the smallest that is worth fixing variables for. A power of two that divides GetNumWords().
+    // Words of a piece that is filled within some milliseconds or, with over 100,000 operators, of
+    // the smallest piece worth fixing variables for. A power of two that divides GetNumWords().
     size_t GetNumPieceWords() const;
 
     // Writes words firstWord .. firstWord+numWords-1 of the column to 'words'. Pieces in sequence,
@@ -109,7 +110,7 @@ class KqColumn {
     KqKernel m_kernel;
     KqJoiner m_joiner;
     std::vector<KqCode> m_codes; // the program, then what is left of it
-    size_t m_num_codes = 0;      // of m_codes that are in use
+    size_t m_num_codes = 0;      // how many of m_codes are in use
     Rest m_whole;
     Fixed m_path[32]; // of m_path_length variables
     size_t m_path_length = 0;

@@ -7,13 +7,13 @@
 
 namespace {
 
-// Values on the way are kept while they fit the processor's own cache.
+// Intermediate values are kept while they fit in the processor's own cache.
 constexpr size_t kMaxWords = size_t(1) << 15;
 
-// What joins may cost, in granules: all but the last one together twice the block, and more for
-// each value that is stacked, since trees gain little when their variables are fixed instead.
-// Getting ready for a join costs as much as some granules. Of the sizes tried with bench_column
-// these are the best: trees of 20 to 28 variables take 2 to 8 times as long without joins.
+// What joins may cost, in granules: all but the last one together at most twice the block, and more
+// for each stacked value, since trees gain little when their variables are fixed instead.
+// Preparing a join costs as much as some granules. Of the sizes tried with bench_column these are
+// the best: without joins, trees of 20 to 28 variables take 2 to 8 times as long.
 constexpr size_t kMaxFactor = 2;
 constexpr size_t kStackedGranules = 64;
 constexpr size_t kJoinGranules = 8;
@@ -23,7 +23,7 @@ uint32_t AboveGranule(uint32_t variable)
     return variable < kKqGranuleLevel ? 0 : 1u << (variable - kKqGranuleLevel);
 }
 
-// The strides of a value for each of the variables of a result.
+// The strides of a value for each variable of a result.
 void SetStrides(uint32_t variables, size_t stride, uint32_t resultVariables, size_t* strides)
 {
     for (; resultVariables != 0; resultVariables >>= 1, variables >>= 1) {
@@ -74,7 +74,7 @@ bool KqJoiner::IsWorthwhile(const KqCode* codes, size_t numCodes, unsigned int l
         if (cost > limit + last || numWords > kMaxWords)
             return false;
     }
-    return !isChain; // a chain comes down to few rests when its variables are fixed
+    return !isChain; // a chain leaves few different rests when its variables are fixed
 }
 
 void KqJoiner::Join(KqCode kind, const Value& lower, const Value& upper, uint32_t variables,

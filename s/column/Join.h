@@ -1,5 +1,5 @@
-// A block of the result column by values of different size: a value takes as many rows as the
-// variables below it tell apart, and two values are joined to one over the variables of both.
+// A block of the result column from values of different sizes: a value takes as many rows as the
+// variables below it tell apart, and two values are joined into one over the variables of both.
 // For trees, whose operands share few variables, nearly all of the work is the last join.
 #ifndef KQ_JOIN_H
 #define KQ_JOIN_H
@@ -10,23 +10,25 @@
 
 #include "Program.h"
 
-// The variables below this one tell rows of a granule apart, which every value has at least.
+// The variables below this one tell the rows of a granule apart; every value has at least one
+// granule.
 constexpr unsigned int kKqGranuleLevel = 9;
 constexpr size_t kKqGranuleWords = size_t(1) << (kKqGranuleLevel - 6);
 
 // Variables above the granule, at most.
 constexpr unsigned int kKqMaxJoinLevels = 20;
 
-// One operand of a join: where its granules are. 'strides' are the words from a granule to the one
-// whose number has one bit more, 0 where the value does not have the variable of that bit.
+// One operand of a join: where its granules are. 'strides' are the distances, in words, from a
+// granule to the one whose number has one more bit set; 0 where the value lacks that bit's
+// variable.
 struct KqJoinOperand {
     const uint64_t* words;
     uint64_t inversion; // all ones when the complement is taken, else 0
     size_t strides[kKqMaxJoinLevels];
 };
 
-// The words of 2^numLevels granules, one after another: both operands anded or, for 'isXor',
-// exclusively ored; complemented when 'inversion' is all ones.
+// The words of 2^numLevels granules, one after another: the AND of both operands or, for 'isXor',
+// their exclusive or; complemented when 'inversion' is all ones.
 struct KqJoin {
     bool isXor;
     uint64_t inversion;
@@ -42,11 +44,11 @@ class KqJoiner {
     explicit KqJoiner(KqJoinKernel kernel) : m_kernel(kernel) {}
 
     // Writes the block of 2^level rows of a program whose variables are numbered by the bit of the
-    // row number that is their value. False, and nothing is written, when the values are so large
+    // row number that is their value. False, with nothing written, when the values are so large
     // that other ways cost less.
     // Requires: a step; variables below 'level'; kKqGranuleLevel <= level.
-    // Fails: std::bad_alloc.  Cost: O(steps) to refuse, a few times the block, and more
-    // for each value that is stacked, to write.
+    // Fails: std::bad_alloc.  Cost: O(steps) to refuse; to write, a few times the block, and more
+    // for each stacked value.
     bool Fill(const KqCode* codes, size_t numCodes, bool isInverted, unsigned int level,
               uint64_t* words);
 
@@ -65,7 +67,7 @@ class KqJoiner {
     static Value VariableValue(uint32_t variable);
 
     KqJoinKernel m_kernel;
-    std::unique_ptr<uint64_t[]> m_words; // of the values on the way, unset at first
+    std::unique_ptr<uint64_t[]> m_words; // of the intermediate values, unset at first
     size_t m_num_words = 0;
 };
 

@@ -47,7 +47,7 @@ inline __attribute__((always_inline)) void JoinGranule(const Inversions<V>& inve
     }
 }
 
-// How far an operand moves when the granule number's bits below a level turn over.
+// How far an operand moves when the bits of the granule number below a level wrap around.
 inline void SetSteps(const KqJoinOperand& operand, unsigned int firstLevel, unsigned int numLevels,
                      ptrdiff_t* steps)
 {

@@ -1,6 +1,6 @@
 // The kernel of the result column, for vectors of any width: each source that includes this is
 // compiled for one kind of processor. Everything has internal linkage and calls nothing from
-// elsewhere, so that no code of a wider kind is shared with sources of a narrower one.
+// elsewhere, so sources for a narrower kind never share code that was compiled for a wider one.
 #ifndef KQ_KERNEL_H
 #define KQ_KERNEL_H
 
@@ -49,14 +49,14 @@ struct Vectors {
 
     static constexpr unsigned int kWords = kBytes / sizeof(uint64_t);
 
-    // Copied, because a type of smaller alignment is not one to every compiler when it is an
+    // Copied, because not every compiler keeps a type's smaller alignment when the type is an
     // operand. By reference, because without vector registers there is no agreed way to pass a
     // vector.
     static void Load(const uint64_t* words, Value& value) { std::memcpy(&value, words, kBytes); }
     static void Store(const Value& value, uint64_t* words) { std::memcpy(words, &value, kBytes); }
 };
 
-// Combines each value with the vector of the operand.
+// Combines each value with the corresponding vector of the operand.
 template <class V, unsigned int kNum, class Combine>
 inline __attribute__((always_inline)) void ForEach(const uint64_t* operand,
                                                    typename V::Value* values, Combine combine)
@@ -122,7 +122,7 @@ RunStrip(const KqCode* codes, size_t numCodes, bool isInverted, const uint64_t* 
     }
 }
 
-// The kernel: tile after tile, and in each as many vectors at a time as registers hold.
+// The kernel: tile after tile, each with as many vectors at a time as the registers hold.
 template <class V, unsigned int kNum>
 inline __attribute__((always_inline)) void RunTiles(const KqCode* codes, size_t numCodes,
                                                     bool isInverted, size_t numWords,

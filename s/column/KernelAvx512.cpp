@@ -1,5 +1,5 @@
 // The kernels of the result column for processors with AVX-512: 512 rows to a vector. Compiled for
-// them, so nothing here may be called before the processor is known to be one.
+// such processors, so nothing here may be called before the processor is known to be one.
 #include "Kernel.h"
 
 #include "JoinKernel.h"

@@ -1,5 +1,5 @@
-// What the nodes of a tree mean to whoever computes with bits: operators as kinds of one machine,
-// and what merely hands a value on left out.
+// What the nodes of a tree mean to code that computes with bits: operators as kinds of one
+// machine's steps, leaving out nodes that merely pass a value on.
 #ifndef KQ_OPERATORS_H
 #define KQ_OPERATORS_H
 
@@ -13,7 +13,7 @@ struct KqOperand {
     bool isOperator;
 };
 
-// The operand at or below 'node': groups and init values hand theirs on, a NOT inverts it.
+// The operand at or below 'node': groups and init values pass theirs on, a NOT inverts it.
 inline KqOperand KqFindOperand(const Kq_BoolEquationImp::Node* node)
 {
     uint32_t inversion = 0;

@@ -59,14 +59,14 @@ class Compiler {
     KqWriter m_writer;
 };
 
-// The operator's result for lower and upper value, bit lower + 2 * upper, by kind.
+// By kind: the operator's result for a lower and an upper value is bit lower + 2 * upper.
 constexpr uint8_t kTables[8] = {0x6, 0, 0, 0, 0x8, 0x4, 0x2, 0x1};
 
-// Compiles operands as they stand, but a leaf after an operand that is an operator, and gives up
-// when that stacks too many values. A walk's step costs more than a leaf's code, so leaves are
-// written with their operator.
+// Compiles operands in their order, except that a leaf goes after an operand that is an operator.
+// Gives up when that stacks too many values. A step of the walk costs more than a leaf's code, so
+// leaves are written with their operator.
 struct CompilerAsItStands {
-    // An operator, its child that is put last, and the value of the other one once that is written.
+    // An operator, its child that is put last, and the value of the other one once it is written.
     struct Place {
         const Node* node;
         const Node* last;
@@ -94,7 +94,7 @@ struct CompilerAsItStands {
     {
         place.last = place.node->GetRightChild();
         KqOperand operand = KqFindOperand(place.node->GetLeftChild());
-        // The right child may be far away in memory: it is looked at when it is needed.
+        // The right child may be far away in memory, so it is read only when it is needed.
         if (!operand.isOperator) {
             place.last = place.node->GetLeftChild();
             operand = KqFindOperand(place.node->GetRightChild());
@@ -135,7 +135,7 @@ struct CompilerAsItStands {
     size_t maxStacked = 0;
 };
 
-// An operator or a leaf of the tree, for a walk that must know all before it starts.
+// An operator or a leaf of the tree, for a walk that must know them all before it starts.
 struct Item {
     KqOperand operand;
     uint32_t left; // positions of the operands; 0 when there are none
@@ -159,7 +159,7 @@ std::vector<Item> ListItems(const Node* root)
         items[position].right = static_cast<uint32_t>(items.size());
         items.push_back({KqFindOperand(operand.node->GetRightChild()), 0, 0, 1});
     }
-    // Operands stand after their operator, so a walk backwards knows what they need.
+    // Operands come after their operator, so a backward pass knows what they need.
     for (size_t position = items.size(); position-- > 0;) {
         Item& item = items[position];
         if (item.left == 0)

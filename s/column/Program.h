@@ -10,11 +10,11 @@
 #include <Kq_BoolEquationImpNode.h>
 
 // One step of a machine that keeps the last value at hand. TAKE stacks that value and takes a
-// variable's; COMBINE makes a new one of it, as the lower value, and a variable, as the upper one;
-// UNSTACK makes it of it, as the lower value, and one off the stack, as the upper one. Inversions
-// are part of the AND that takes the value, so four forms of AND and one XOR are all there is;
-// what is left of an inversion at the very end is the program's own.
-// The lowest three bits are the operator's kind, the next two the action, the others a variable.
+// variable's instead. COMBINE makes a new value from the one at hand, as the lower value, and a
+// variable, as the upper one. UNSTACK makes it from the one at hand, as the lower value, and one
+// off the stack, as the upper one. Inversions are part of the AND that takes the value, so four
+// forms of AND and one XOR are enough; an inversion left at the very end belongs to the program.
+// The lowest three bits are the operator's kind, the next two the action, the rest a variable.
 typedef uint32_t KqCode;
 
 constexpr KqCode kKqXor = 0;
@@ -44,15 +44,15 @@ inline uint32_t KqVariableOf(KqCode code)
     return code >> kKqVariableShift;
 }
 
-// A whole program: the first codes of a list, none for a constant, and whether it is complemented.
+// A whole program: the first codes of a list, none for a constant, and whether it is inverted.
 struct KqProgram {
     std::vector<KqCode> codes;
     size_t numCodes = 0;
     bool isInverted = false;
 };
 
-// How many values the machine ever stacks, at most. Operands are written as they stand while that
-// is enough, and otherwise the one that needs more first: then n operands need log2(n) + 1 values.
+// The most values that the machine ever stacks. Operands are written in their order while this is
+// enough; otherwise the one that needs more goes first: then n operands need log2(n) + 1 values.
 constexpr size_t kKqMaxStack = 48;
 
 // As many as a step can name.
@@ -70,7 +70,7 @@ unsigned int
 KqRunProgram(const KqProgram& program,
              const std::vector<std::pair<Port::StringBase<char>, unsigned int>>& variables);
 
-// How many variables a table must have for the program: 1 more than the highest it takes.
+// How many variables a table must have for the program: 1 more than the highest one it uses.
 // Requires: a program of variables numbered by their index.
 size_t KqCountVariables(const KqProgram& program);
 

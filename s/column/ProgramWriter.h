@@ -1,4 +1,4 @@
-// Writes programs, from a tree or from a program of which a variable is fixed, in short form.
+// Writes programs in short form, from a tree or from a program in which a variable is fixed.
 #ifndef KQ_PROGRAMWRITER_H
 #define KQ_PROGRAMWRITER_H
 
@@ -6,8 +6,8 @@
 
 #include "Program.h"
 
-// A value that the machine holds: a constant, or what the steps from a start on compute;
-// complemented or not. One word, as programs are rewritten many times.
+// A value that the machine holds: a constant, or what the steps from a given start compute;
+// complemented or not. One word, because programs are rewritten many times.
 class KqValue {
   public:
     static KqValue Computed(uint32_t start) { return KqValue(start << 2); }
@@ -33,7 +33,7 @@ class KqValue {
 };
 
 // Writes a program into a list after 'first' codes, one value after another. Keeps the rules that
-// make programs short: no constant stands in them, and what a constant decides is taken out again.
+// make programs short: they contain no constants, and what a constant decides is removed again.
 // The steps of a value leave the machine's stack one higher, whatever they simplify to.
 // Requires: room in the list for each step put; fewer than 2^30 of them.
 class KqWriter {
@@ -42,7 +42,7 @@ class KqWriter {
 
     // The number of codes in the list that are in use.
     size_t GetEnd() const { return m_end; }
-    // The list has moved.
+    // To be called when the list has moved.
     void SetCodes(KqCode* codes) { m_codes = codes; }
 
     KqValue PutConstant(bool isOne) { return KqValue::Constant(m_end, isOne); }
@@ -53,7 +53,7 @@ class KqWriter {
         return KqValue::Computed(m_end++);
     }
 
-    // The value at hand, put last, with a variable as the upper value.
+    // Combines the value at hand, which was put last, with a variable as the upper value.
     KqValue PutCombine(KqCode kind, KqValue lower, uint32_t variable)
     {
         const uint32_t isAnd = kind >> 2;
@@ -75,7 +75,7 @@ class KqWriter {
         return KqValue::Computed(lower.GetStart()).Invert(inversions & (isAnd ^ 1u));
     }
 
-    // The value at hand with a constant as the upper value.
+    // Combines the value at hand with a constant as the upper value.
     KqValue PutConstantOperand(KqCode kind, KqValue lower, bool isOne)
     {
         const uint32_t isAnd = kind >> 2;
@@ -85,7 +85,7 @@ class KqWriter {
         return value != 0 ? lower.Invert(kind & 1u) : Drop(lower, false);
     }
 
-    // The value at hand with the one that was put right before it as the upper value.
+    // Combines the value at hand with the one put directly before it, as the upper value.
     KqValue PutUnstack(KqCode kind, KqValue lower, KqValue upper)
     {
         assert(upper.GetStart() <= lower.GetStart());
@@ -100,7 +100,7 @@ class KqWriter {
             return constant.GetInversion() != 0 ? other : Drop(upper, false);
         }
         if (m_end - lower.GetStart() == 1) {
-            // A variable alone need not be taken: the value stacked is at hand instead.
+            // A single variable need not be taken: what it would stack stays at hand instead.
             const uint32_t variable = KqVariableOf(m_codes[--m_end]);
             if (isAnd == 0)
                 return PutCombine(kKqXor, upper.Invert(lower.GetInversion()), variable);

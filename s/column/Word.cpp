@@ -25,12 +25,12 @@ uint64_t ApplyToWords(Node::TYPE type, uint64_t left, uint64_t right)
     const KqOperator found = KqOperatorOf(type);
     if (found.kind == kKqXor)
         return left ^ right ^ AllBits(found.inversion);
-    // Both operands are complemented or none is.
+    // Both operands are complemented or neither is.
     const uint64_t inverted = AllBits(found.kind & kKqInvertLower);
     return ((left ^ inverted) & (right ^ inverted)) ^ AllBits(found.inversion);
 }
 
-// Keeps the word of the subtree left last.
+// Keeps the word of the subtree that was left last.
 struct WordOfTree {
     explicit WordOfTree(unsigned int number) : numVariables(number) {}
 
@@ -54,7 +54,7 @@ struct WordOfTree {
         word = ApplyToWords(place.node->GetType(), place.left, word) ^ AllBits(place.inversion);
     }
 
-    // Goes to the operator at or below the place; false for a leaf, whose word is known then.
+    // Goes to the operator at or below the place; false for a leaf, whose word is then known.
     bool ResolveOperator(Place& place)
     {
         const KqOperand operand = KqFindOperand(place.node);

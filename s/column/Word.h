@@ -6,14 +6,13 @@
 
 #include <Kq_BoolEquationImpNode.h>
 
-// The rows of a word whose number has bit 'index' set, for each bit that tells rows of a word
-// apart.
+// For each bit that tells rows of a word apart, the rows whose number has that bit set.
 constexpr uint64_t kKqRowsWithBit[6] = {0xaaaaaaaaaaaaaaaau, 0xccccccccccccccccu,
                                         0xf0f0f0f0f0f0f0f0u, 0xff00ff00ff00ff00u,
                                         0xffff0000ffff0000u, 0xffffffff00000000u};
 
-// How many bits are set, by adding up halves. The compiler's built-in is a call for processors that
-// need not have the instruction, and takes longer.
+// How many bits are set, by adding up halves. Where the processor need not have the instruction,
+// the compiler's built-in is a function call, which takes longer.
 inline unsigned int KqCountBits(uint64_t bits)
 {
     bits -= bits >> 1 & 0x5555555555555555u;
@@ -23,7 +22,8 @@ inline unsigned int KqCountBits(uint64_t bits)
 }
 
 // The column of the tree at 'root' over up to six variables as one word, repeated up to its end.
-// An ID whose index is not below 'numVariables' counts as 0; 'isComplete' is whether there is none.
+// An ID whose index is not below 'numVariables' counts as 0; 'isComplete' tells whether there is
+// none.
 // Requires: a checked tree, null counting as 0.  Fails: std::bad_alloc.
 // Cost: O(nodes), less than compiling.
 uint64_t KqComputeWord(const Kq_BoolEquationImp::Node* root, unsigned int numVariables,

@@ -1,4 +1,4 @@
-// The result column of an equation: packed, and as the digits of an init value; and the equation
+// The result column of an equation, packed and as the digits of an init value, and the equation
 // that lists an init value's inputs.
 // Fails: std::bad_alloc.  Cost: O(nodes * 2^n / 64) for the column, O(2^n) for the text.
 #include <Kq_BoolEquationImp.h>
@@ -48,7 +48,7 @@ void AppendDigits(const Kq_BoolEquationImp& equation, const KqStore& store, KqDi
     if (!equation || numVariables == 0 || numVariables > kKqMaxColumnVariables)
         return;
     if (KqDebugMode::IsOn()) {
-        // The table evaluates node by node, because there the trace is output.
+        // The table evaluates node by node, because in debug mode the trace is output.
         const std::vector<uint64_t> words = PackRows(equation.GetTruthTable().GetRows());
         if (numVariables <= 6)
             digits.AppendFewRows(words[0], numVariables);
@@ -122,7 +122,7 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(vo
     const unsigned int numVariables = GetNumVariables();
     if (!m_store->HasEquation() || numVariables > kKqMaxColumnVariables)
         return false;
-    // What is called may set, clear or destroy this object.
+    // goOn may set, clear or destroy this object.
     KqStore& store = *m_store;
     std::optional<KqStoreHold> hold;
     if (goOn)
@@ -130,7 +130,7 @@ bool Kq_BoolEquationImp::GetColumn(std::vector<uint64_t>& words, bool (*goOn)(vo
     if (numVariables <= 6) {
         if (goOn && !goOn(context))
             return false;
-        // The one word repeats the rows.
+        // The one word repeats the rows; the repetitions are cleared.
         const uint64_t rows = numVariables == 6 ? 0 : uint64_t(1) << (1u << numVariables);
         words.assign(1, store.GetWord(numVariables) & (rows - 1));
         return true;

@@ -1,4 +1,4 @@
-// A tree and a table of values in, a value out, by what was kept of the tree or by its nodes.
+// A tree and a table of values in, a value out, from what was kept of the tree or from its nodes.
 // Fails: std::bad_alloc, with nothing kept that was not kept before.
 #include "Evaluation.h"
 
@@ -52,7 +52,7 @@ unsigned int KqEvaluation::Eval(const Node& root, const Variables& variables)
     return KqRunProgram(kept->program, variables);
 }
 
-// Copies of an equation may have tables of different size. Variables after those of the word make
+// Copies of an equation may have tables of different sizes. Variables after those of the word make
 // no difference, and those that a table lacks count as 0.
 unsigned int KqEvaluation::EvalKeptWord(size_t numWordVariables, const Variables& variables) const
 {
@@ -73,7 +73,7 @@ uint64_t KqEvaluation::GetWord(const Node& root, unsigned int numVariables)
     return word;
 }
 
-// Keeps the word of the first that asks.
+// Keeps the word of the first thread that comes.
 void KqEvaluation::PublishWord(uint64_t word, unsigned int numVariables)
 {
     assert(numVariables <= kMaxWordVariables);
@@ -86,7 +86,7 @@ void KqEvaluation::PublishWord(uint64_t word, unsigned int numVariables)
     m_num_word_variables.compare_exchange_strong(state, numVariables, std::memory_order_release);
 }
 
-// The program of the tree, null when none is to be kept.
+// The program of the tree; null when nothing more may be kept.
 const KqEvaluation::Kept* KqEvaluation::GetKept(const Node& root)
 {
     if (m_num_word_variables.load(std::memory_order_acquire) == kAbandoned)

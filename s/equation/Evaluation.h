@@ -1,5 +1,5 @@
 // What is kept of a tree for evaluation: the column of up to six variables as a word, or a program
-// for more. Derived from the nodes and their variable indices, and gone when they change.
+// for more. It is derived from the nodes and their variable indices, and not used once they change.
 #ifndef KQ_EVALUATION_H
 #define KQ_EVALUATION_H
 
@@ -10,8 +10,8 @@
 #include "Program.h"
 
 // Made when it pays: the word at once, a program at the second evaluation.
-// Threads: Eval and GetWord at any time. What one of them makes is published once, complete; a
-// thread that loses the race throws its own away. Drop and SetWord want the equation alone.
+// Threads: Eval and GetWord at any time. What either of them makes is published once, complete; a
+// thread that loses the race frees its own. Drop and SetWord need exclusive access.
 class KqEvaluation {
   public:
     typedef Kq_BoolEquationImp::Node Node;
@@ -22,7 +22,7 @@ class KqEvaluation {
     KqEvaluation(const KqEvaluation&) = delete;
     KqEvaluation& operator=(const KqEvaluation&) = delete;
 
-    // Whether the column over so many variables is at hand.
+    // Whether the column over this many variables is at hand.
     bool HasWord(size_t numVariables) const
     {
         return numVariables == m_num_word_variables.load(std::memory_order_acquire);
@@ -38,14 +38,14 @@ class KqEvaluation {
     }
 
     // The value of the tree at 'root' for a table of values 0 or 1.
-    // Fails: std::bad_alloc.  Cost: O(nodes); for up to six variables O(variables) but for the
-    // first time.
+    // Fails: std::bad_alloc.  Cost: O(nodes); for up to six variables O(variables) except the first
+    // time.
     unsigned int Eval(const Node& root, const Variables& variables);
 
     // The column of the tree at 'root' over up to six variables, repeated up to the word's end.
     uint64_t GetWord(const Node& root, unsigned int numVariables);
 
-    // Takes a column that is known.  Requires: numVariables <= 6.
+    // Takes a known column.  Requires: numVariables <= 6.
     void SetWord(uint64_t word, unsigned int numVariables)
     {
         assert(numVariables <= 6);
@@ -56,7 +56,7 @@ class KqEvaluation {
     // Forgets everything.
     void Drop() noexcept;
     // Keeps nothing from now on, because indices change that other objects may be reading: their
-    // threads may still be at work with what was kept, so it stays until the end.
+    // threads may still be using what was kept, so it is freed only at the end.
     void Abandon() noexcept;
 
   private:

@@ -1,4 +1,4 @@
-// Where the names of a growing variable table stand, for as long as an equation is being set.
+// Where each name of a growing variable table is, for as long as an equation is being set.
 #ifndef KQ_NAMEINDEX_H
 #define KQ_NAMEINDEX_H
 
@@ -12,15 +12,15 @@
 
 constexpr size_t kKqNotFound = SIZE_MAX;
 
-// A hash table of positions, so that setting an equation of many names stays in step with its text.
-// For few names it is inside the object, and a position is a byte.
+// A hash table of positions, so that the time to set an equation with many names stays in step with
+// its text. For few names it is inside the object, and a position is a byte.
 // Invariants: 1. A table shows the position of every name that was added, and is at most half full.
 // 2. The hashes of all names are in m_first or, once they are too many for it, in m_hashes.
 class KqNameIndex {
   public:
     typedef std::pair<Port::StringBase<char>, unsigned int> Variable;
 
-    // Knows the names that the table has now; those that follow are added one by one.
+    // Knows the names that the table has now; later ones are added one by one.
     explicit KqNameIndex(const std::vector<Variable>& variables) : m_variables(variables)
     {
         std::memset(m_few, kFree, sizeof m_few);
@@ -101,7 +101,7 @@ class KqNameIndex {
 
     const std::vector<Variable>& m_variables;
     size_t m_size = 0;
-    uint8_t m_few[kFewSlots]; // no longer looked at once there is a table on the heap
+    uint8_t m_few[kFewSlots]; // unused once there is a table on the heap
     uint64_t m_first[kInline];
     std::vector<uint64_t> m_hashes; // of all names, once they are too many for m_first
     std::vector<size_t> m_slots;

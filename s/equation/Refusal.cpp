@@ -1,6 +1,6 @@
 // A refused text in, why and where out: what the tokenizer, the tree builder and the reading of
-// init values have recorded, and nothing that they do not know. Fails: std::bad_alloc.  Cost: that
-// of setting the equation, in memory too.
+// init values have recorded, and nothing more.
+// Fails: std::bad_alloc.  Cost: that of setting the equation, in memory too.
 #include <Kq_BoolEquationImp.h>
 
 #include <cstring>
@@ -25,7 +25,7 @@ Refusal MakeRefusal(Refusal::CODE code, size_t offset, size_t length)
     return refusal;
 }
 
-// Why a text that is read as an init value stands for no expression.
+// Why a text that is read as an init value does not stand for an expression.
 // Requires: KqDigits::IsCandidate(text).
 Refusal FindInitRefusal(const String& text)
 {
@@ -67,7 +67,7 @@ Refusal Kq_BoolEquationImp::FindRefusal(const String& text, const std::vector<St
         if (refusal.code != Refusal::NONE)
             KqLocateToken(source, tokens, result.refusedPosition, refusal);
     }
-    // The expression of an init value is our own but for the names in it.
+    // Only the names in an init value's expression are the caller's, so one of them is to blame.
     if (isInitValue && refusal.code != Refusal::NONE)
         return MakeRefusal(Refusal::INIT_NAME, 0, text.length());
     return refusal;

@@ -9,8 +9,8 @@
 
 class KqResults {
   public:
-    // Requires: an equation; numVariables <= kKqMaxColumnVariables, all variables of an object that
-    // holds the store, which is neither set nor cleared while this is in use.
+    // Requires: an equation; numVariables <= kKqMaxColumnVariables, and all variables of an object
+    // that holds the store. That object is neither set nor cleared while this is in use.
     // Fails: std::bad_alloc.
     KqResults(const KqStore& store, unsigned int numVariables)
         : m_digits(store.GetDigits()), m_num_variables(numVariables)
@@ -25,8 +25,8 @@ class KqResults {
         return m_num_variables > 6 ? size_t(1) << (m_num_variables - 6) : 1;
     }
 
-    // Words of a piece that is filled within some milliseconds; a power of two that divides them
-    // all.
+    // Words of a piece that is filled within some milliseconds; a power of two that divides
+    // GetNumWords().
     size_t GetNumPieceWords() const
     {
         return m_digits ? GetNumWords() : m_column->GetNumPieceWords();

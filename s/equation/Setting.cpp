@@ -1,5 +1,5 @@
-// Text in, equation out: the object is cleared, everything is made apart from it, and it takes it
-// whole at the end.
+// Text in, equation out: the object is cleared, everything is made apart from it, and at the end
+// the object takes it whole.
 // Fails: false with the object cleared; std::bad_alloc, or what a message's receiver throws, with
 // the object cleared or as it was.
 #include <Kq_BoolEquationImp.h>
@@ -22,10 +22,10 @@ typedef KqVariable Variable;
 
 namespace {
 
-// Room made for the first variable of an equation: ordinary ones never regrow their table.
+// Room made at an equation's first variable, so that ordinary tables never grow again.
 constexpr size_t kFirstVariables = 8;
 
-// Tells, after messages went out, whether the object is there and holds its store as before: a
+// Tells, after messages went out, whether the object still exists and still holds its store: a
 // message's receiver may have set, cleared or destroyed it.
 class Watch {
   public:
@@ -47,7 +47,7 @@ class Watch {
     KqStoreHold m_hold; // so that clearing the object gives it another store
 };
 
-// Defines the name of every ID node that is not a variable yet, with value 0 and in text order, and
+// Defines the name of every ID node that is not yet a variable, with value 0 and in text order, and
 // writes its variable's index into every ID node.  Requires: nodes in the order of 'tokens'.
 void DefineNames(const KqTokens& tokens, const std::vector<Node*>& nodes,
                  std::vector<Variable>& variables)
@@ -118,12 +118,12 @@ bool Kq_BoolEquationImp::SetEquationWithExplicitTerms(const std::vector<String>&
     return false;
 }
 
-// Sets an expression over the inputs and, after them, whatever else it names. For an init value
-// whose expression it is, 'initValue' is the text that becomes its own root.
+// Sets an expression over the inputs and, after them, whatever else it names. When it is the
+// expression of an init value, 'initValue' is the text that becomes its own root.
 bool Kq_BoolEquationImp::SetExpression(const char* text, size_t length,
                                        std::vector<Variable> inputs, const String* initValue)
 {
-    // Read before anything is cleared: the text may be one of the names that go.
+    // Read before anything is cleared: the text may be one of the names that are removed.
     KqTokens tokens(length);
     const bool isRead = KqScanTokens(text, GetNamePool(), tokens, nullptr);
     Clear();
@@ -134,7 +134,7 @@ bool Kq_BoolEquationImp::SetExpression(const char* text, size_t length,
                     : BuildSilently(tokens, inputs, initValue);
 }
 
-// Makes the equation of the tokens. Nothing is written but the dump of what is refused.
+// Builds the equation from the tokens. Writes nothing except the dump of what is refused.
 // Requires: a cleared object.
 bool Kq_BoolEquationImp::BuildSilently(const KqTokens& tokens, std::vector<Variable>& inputs,
                                        const String* initValue)
@@ -150,17 +150,17 @@ bool Kq_BoolEquationImp::BuildSilently(const KqTokens& tokens, std::vector<Varia
             FinishTree(tokens, initValue, result.root, tree);
         }
     } catch (...) {
-        m_variables.clear(); // rather than an equation that lacks some of its variables
+        m_variables.clear(); // rather than keep an equation that lacks some of its variables
         throw;
     }
-    // The receiver may do anything to this object, which is done with.
+    // The receiver may do anything to this object, which is not used after this.
     if (result.broken)
         result.broken->DbgFailure();
     return result.root != nullptr;
 }
 
-// The same with the tree written as it grows, to a receiver that may do anything to this object:
-// when it has, that is what counts.
+// The same, but the tree is written as it grows, to a receiver that may do anything to this object;
+// what the receiver sets takes precedence.
 bool Kq_BoolEquationImp::BuildTraced(const KqTokens& tokens, std::vector<Variable>& inputs,
                                      const String* initValue)
 {
@@ -198,13 +198,13 @@ bool Kq_BoolEquationImp::BuildTraced(const KqTokens& tokens, std::vector<Variabl
     return true;
 }
 
-// Takes the checked tree: variables, the init value's own root, pre-order.
-// Requires: nodes in the order of 'tokens'; inputs that are variables by now; an empty store.
+// Takes the checked tree: defines variables, adds the init value's own root, lists in pre-order.
+// Requires: nodes in the order of 'tokens'; inputs that are already variables; an empty store.
 void Kq_BoolEquationImp::FinishTree(const KqTokens& tokens, const String* initValue, Node* root,
                                     KqTree& tree)
 {
     tree.root = root;
-    // Variables are numbered in the order of the text, which pre-order need not be.
+    // Variables are numbered in text order, which pre-order need not be.
     DefineNames(tokens, tree.list, m_variables);
     if (initValue)
         tree.AddTruthTableRoot(*initValue);
@@ -213,7 +213,7 @@ void Kq_BoolEquationImp::FinishTree(const KqTokens& tokens, const String* initVa
     m_store->TakeTree(tree);
 }
 
-// Takes the list; a table that has been larger keeps its room.
+// Takes the list; a table that was once larger keeps its room.
 void Kq_BoolEquationImp::TakeVariables(std::vector<Variable>& inputs)
 {
     assert(m_variables.empty());
@@ -230,7 +230,7 @@ void Kq_BoolEquationImp::TakeVariables(std::vector<Variable>& inputs)
 }
 
 // Sets an init value over 'inputs' or, when there are none, over its own names. Its tree is owed,
-// but where the way to it is output or only the expression counts.
+// except where the way to it is output or only the expression counts.
 bool Kq_BoolEquationImp::SetDigits(std::unique_ptr<KqDigits> digits, std::vector<Variable> inputs)
 {
     if (!digits->IsExact() || KqDebugMode::IsOn()) {
@@ -262,8 +262,8 @@ void Kq_BoolEquationImp::TokenizeNodes(const char* text)
 
 void Kq_BoolEquationImp::BuildTree()
 {
-    // Built of copies, because other objects may share the tokens, and a message's receiver may do
-    // anything to this one.
+    // Built from copies, because other objects may share the tokens, and a message's receiver may
+    // do anything to this one.
     KqTree copy;
     m_store->CopyTokens(copy);
     if (copy.list.empty())

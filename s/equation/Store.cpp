@@ -17,12 +17,12 @@ namespace {
 
 constexpr size_t kKeptSlots = 3000;
 
-// Guards what changes in stores that several objects may share: the list and the links as long as
-// there is no root, the moment in which a tree that was owed appears, and the watchers. Never held
-// while memory is allocated or freed, which may use equations, or a message goes out.
+// Guards what changes in stores that several objects may share: the list and the links while there
+// is no root, the moment in which an owed tree appears, and the watchers. Never held while memory
+// is allocated or freed, because that may use equations, or while a message goes out.
 std::mutex s_sharedStores;
 
-// Takes the lock where nodes are loose: below a root they and their list no longer change.
+// Takes the lock while nodes are loose: once there is a root, nodes and list no longer change.
 std::unique_lock<std::mutex> LockLoose(const std::atomic<Node*>& root)
 {
     std::unique_lock<std::mutex> lock(s_sharedStores, std::defer_lock);
@@ -75,7 +75,7 @@ void KqStore::Clear() noexcept
     m_root.store(nullptr, std::memory_order_relaxed);
     m_block.Free();
     m_list.clear();
-    // The list of an ordinary equation is kept for the next one, a long one is given back.
+    // The list of an ordinary equation is kept for the next one; a long one is given back.
     if (m_list.capacity() > kKeptSlots)
         std::vector<Node*>().swap(m_list);
     m_evaluation.Drop();
@@ -83,12 +83,12 @@ void KqStore::Clear() noexcept
     assert(IsEmpty());
 }
 
-// The tree that the digits owe, for all holders. Whoever comes second throws its own away.
+// Makes the tree that the digits owe, for all holders. The thread that comes second frees its own.
 const Node* KqStore::PayTree() const
 {
     KqTree made;
     KqMakeDigitsTree(*m_digits, made);
-    // After 'made', so that what is thrown away is freed without the lock.
+    // Declared after 'made', so that what is thrown away is freed without the lock.
     const std::lock_guard<std::mutex> paying(s_sharedStores);
     if (!m_root.load(std::memory_order_relaxed)) {
         assert(m_list.empty()); // invariant 5
@@ -117,7 +117,7 @@ void KqStore::CopyTokens(KqTree& copy) const
     const size_t numNodes = CountNodes();
     if (numNodes == 0)
         return;
-    // Loose tokens come and go as a whole, and they are there: their texts and types stay.
+    // Loose tokens come and go as a whole, and here they exist: their texts and types stay.
     copy.MakeRoom(numNodes);
     for (const Node* node : m_list)
         copy.MakeNode(node->GetType(), node->GetToken())->SetValue(node->GetValue());
@@ -153,8 +153,8 @@ bool KqStore::IsSame(const KqStore& other) const
 {
     if (this == &other)
         return true;
-    // Two init values of the same text differ as their names do and, with the bits in another
-    // order, as their terms do. Nodes are asked for where one of the trees was made at once.
+    // Two init values with the same text differ if their names do or, with the bits in another
+    // order, if their terms do. Nodes are compared only where one of the trees was made at once.
     const String* const initValue = GetInitValue();
     const String* const otherInitValue = other.GetInitValue();
     if (!initValue != !otherInitValue || (initValue && !KqIsSameText(*initValue, *otherInitValue)))
@@ -175,14 +175,14 @@ bool KqStore::IsSame(const KqStore& other) const
 void KqStore::LinkVariable(const String& name, unsigned int variableIndex)
 {
     if (m_digits)
-        return; // invariant 5: its names have been variables ever since
+        return; // invariant 5: its names are variables already
     const std::unique_lock<std::mutex> linking = LockLoose(m_root);
     const bool isShared = IsShared();
     for (Node* node : m_list) {
         if (!node->IsId() || !KqIsSameText(node->GetToken(), name) ||
             node->GetValue() == variableIndex)
             continue;
-        // Before the value changes: what is made of it afterwards must not be kept.
+        // Done before the value changes: what is made from it afterwards must not be kept.
         if (isShared)
             m_evaluation.Abandon();
         else
@@ -203,9 +203,9 @@ std::vector<unsigned int> KqStore::MakeHandle(const String& name, unsigned int v
             KqAppendDigitsPositions(*m_digits, static_cast<size_t>(found - names.begin()), values);
         return values;
     }
-    const size_t numNodes = CountNodes(); // once they are there, their texts stay
+    const size_t numNodes = CountNodes(); // once nodes exist, their texts stay
     for (size_t position = 0; position < numNodes; ++position) {
-        // Deliberate: the node's type is not asked for, only its token.
+        // Deliberate: only the node's token is compared, not its type.
         if (KqIsSameText(m_list[position]->GetToken(), name))
             values.push_back(static_cast<unsigned int>(position));
     }

@@ -11,22 +11,25 @@
 #include "Evaluation.h"
 #include "Tree.h"
 
-// The tree of an equation that was read from an init value is owed at first: it is made when
-// somebody asks for the root or the nodes, for all holders at once. Whoever asks for them cannot
-// tell; what can be told of the digits is told without them.
+// The tree of an equation that was read from an init value is owed at first: it is made for all
+// holders at once when somebody asks for the root or the nodes. Those who ask for them cannot tell
+// the difference; whatever the digits can answer is answered without them.
 //
 // Invariants:
-// 1. m_count is the number of engine objects, and guards, that point here; the last one deletes.
+// 1. m_count is the number of engine objects, and guards, that point here; the last one deletes it.
 // 2. m_list lists every node of m_block once, and owns none.
-// 3. m_root is null until the whole tree has passed its checks. Then nodes and list no longer
-//    change, but for the nodes' values. From the end of SetEquation on the list is in pre-order.
-// 4. m_evaluation is made of the nodes and their variable indices, and goes when they change.
+// 3. m_root is null until the whole tree has passed its checks. After that nodes and list no longer
+//    change, except for the nodes' values. From the end of SetEquation on, the list is in
+//    pre-order.
+// 4. m_evaluation is derived from the nodes and their variable indices, and not used once they
+//    change.
 // 5. The tree is owed while there are m_digits and no root; then there are no nodes. The names of
 //    m_digits are the first variables of every holder. They never change while others hold them.
 //
 // Threads: const members at any time; they publish the owed tree and what evaluation keeps once,
-// complete. Others want the store alone, but for those that say so: the loose tokens and watchers
-// that these change are guarded by one lock of the process. Nothing is allocated or freed under it.
+// complete. Other members need exclusive access, except those that say otherwise: one process-wide
+// lock guards the loose tokens and watchers that these change. Nothing is allocated or freed under
+// it.
 class KqStore {
   public:
     typedef Kq_BoolEquationImp::Node Node;
@@ -42,22 +45,22 @@ class KqStore {
         assert(m_count.load(std::memory_order_relaxed) > 0);
         m_count.fetch_add(1, std::memory_order_relaxed);
     }
-    // Takes one holder away.
+    // Removes one holder.
     static void Release(KqStore* store) noexcept
     {
         assert(store->m_count.load(std::memory_order_relaxed) > 0);
-        // Nobody can join the only holder, so it need not count.
+        // Nobody can join the only holder, so it need not be counted down.
         if (!store->IsShared() || store->m_count.fetch_sub(1, std::memory_order_acq_rel) == 1)
             delete store;
     }
     bool IsShared() const { return m_count.load(std::memory_order_acquire) > 1; }
 
     bool HasEquation() const { return m_digits || m_root.load(std::memory_order_acquire); }
-    // Whether there are neither nodes nor a tree that is owed.
+    // Whether there are neither nodes nor an owed tree.
     bool IsEmpty() const;
 
     // The root, null without one. Makes the tree when it is owed.
-    // Fails: std::bad_alloc; the tree is owed still.
+    // Fails: std::bad_alloc; the tree is still owed.
     const Node* GetRoot() const
     {
         Node* const root = m_root.load(std::memory_order_acquire);
@@ -71,19 +74,20 @@ class KqStore {
     // A list whose capacity may serve the next tree.
     void LendList(std::vector<Node*>& list) noexcept { m_list.swap(list); }
 
-    // Loose tokens, also of a shared store. Makes nodes of them, unless the store is not empty.
+    // Loose tokens, even of a shared store. Makes nodes of them, unless the store is not empty.
     void TakeTokens(const KqTokens& tokens);
-    // Makes copies of the nodes while they are loose; none when there are none or a tree.
+    // Copies the nodes while they are loose; makes none when there are none, or when there is a
+    // tree.
     void CopyTokens(KqTree& copy) const;
-    // Links the nodes as a tree of such copies is linked, unless somebody else has done so.
+    // Links the nodes as the tree of such copies is linked, unless somebody else has done so.
     void TakeLinks(const KqTree& tree) noexcept;
 
     // The text of an equation that is an init value, null for any other.
     const String* GetInitValue() const;
-    // Whether both are of the same nodes.  Fails: std::bad_alloc.
+    // Whether both have the same nodes.  Fails: std::bad_alloc.
     bool IsSame(const KqStore& other) const;
 
-    // Writes a new variable's index into the ID nodes of its name, of a shared store too.
+    // Writes a new variable's index into the ID nodes of its name, even in a shared store.
     void LinkVariable(const String& name, unsigned int variableIndex);
     // The variable's index, then the position of every node whose token is the name.
     std::vector<unsigned int> MakeHandle(const String& name, unsigned int variableIndex) const;
@@ -113,18 +117,18 @@ class KqStore {
     // The results as read, null for an equation that was not read from digits.
     const KqDigits* GetDigits() const { return m_digits.get(); }
 
-    // Who is building here while messages go out. Several may be: the receiver of one's messages,
-    // or another thread, builds a copy.
+    // A builder that works here while messages go out. There may be several: the receiver of one's
+    // messages, or another thread, may build a copy.
     struct Watcher {
         const void* holder; // null once it has let the store go
         Watcher* next;
     };
-    // Any thread may ask these of a shared store.
+    // Any thread may call these for a shared store.
     void AddWatcher(Watcher& watcher) noexcept;
     void RemoveWatcher(const Watcher& watcher) noexcept;
     bool HasHolder(const Watcher& watcher) const noexcept;
-    // The holder lets the store go. Without the lock a watcher of this holder is seen: it was added
-    // before, and it stays.
+    // The holder lets the store go. A watcher of this holder is seen even without the lock: it was
+    // added before, and it stays.
     void TellWatchers(const void* holder) noexcept
     {
         if (m_watchers.load(std::memory_order_relaxed))
@@ -137,17 +141,17 @@ class KqStore {
     void TellEachWatcher(const void* holder) noexcept;
     unsigned int EvalOther(const Variables& variables) const;
 
-    // The first three fields are what an equation is made of, in this order.
+    // The first three fields are what an equation consists of, in this order.
     mutable std::atomic<Node*> m_root{nullptr};
     mutable std::vector<Node*> m_list;
     std::atomic<unsigned int> m_count{1};
     mutable KqNodeBlock m_block;
     mutable KqEvaluation m_evaluation;
     std::unique_ptr<const KqDigits> m_digits;
-    std::atomic<Watcher*> m_watchers{nullptr}; // owned by none
+    std::atomic<Watcher*> m_watchers{nullptr}; // none is owned
 };
 
-// One more holder, while somebody is called who may set, clear or destroy all the others.
+// One more holder, during a call that may set, clear or destroy all the others.
 class KqStoreHold {
   public:
     explicit KqStoreHold(KqStore& store) : m_store(store) { m_store.Hold(); }

@@ -1,5 +1,5 @@
 // Truth table: the result column as rows, and comparison of tables.
-// In debug mode every row is evaluated node by node, because there the trace is output.
+// In debug mode every row is evaluated node by node, because then the trace is output.
 // Fails: std::bad_alloc, with the rows appended so far.  Cost: O(2^n * n) for the rows.
 #include <Kq_BoolEquationImp.h>
 
@@ -39,8 +39,7 @@ void AppendRows(KqResults results, std::vector<unsigned int>& values, std::vecto
     }
 }
 
-// Appends all rows, evaluated one by one with their traces and dumps as long as the debug mode is
-// on.
+// Appends all rows, evaluated one by one, with their traces and dumps while debug mode is on.
 void AppendTracedRows(const Kq_BoolEquationImp::Node& root,
                       std::vector<std::pair<String, unsigned int>> variables,
                       std::vector<unsigned int>& values, std::vector<Row>& rows)
@@ -124,11 +123,11 @@ void TruthTable::Build(const Kq_BoolEquationImp& equation)
     m_rows.clear();
     m_variable_names.clear();
     const unsigned int numVariables = equation.GetNumVariables();
-    // Deliberate: a constant has no table, not one of a single row.
+    // Deliberate: a constant has no table rather than one of a single row.
     if (!equation || numVariables > kKqMaxColumnVariables || numVariables == 0)
         return;
     const bool isTraced = KqDebugMode::IsOn();
-    // Apart from this table, which a message's receiver may change.
+    // Built separately, because a message's receiver may change this table.
     TruthTable apart;
     TruthTable& built = isTraced ? apart : *this;
     built.m_equation = equation.GetEquation(false);
@@ -144,7 +143,7 @@ void TruthTable::Build(const Kq_BoolEquationImp& equation)
         m_variable_names.swap(built.m_variable_names);
         m_rows.swap(built.m_rows);
     };
-    const Kq_BoolEquationImp held(equation); // the receiver may change the equation, too
+    const Kq_BoolEquationImp held(equation); // the receiver may change the equation too
     try {
         AppendTracedRows(*held.GetRoot(), held.GetVariables(), values, built.m_rows);
     } catch (...) {

@@ -46,7 +46,7 @@ bool Kq_BoolEquationImp::IsVariableDefined(const String& name) const
     return FindVariable(name) != kKqNotFound;
 }
 
-// Deliberate: of a handle only the index counts, whatever equation it came from.
+// Deliberate: only the index of a handle counts, whatever equation it came from.
 bool Kq_BoolEquationImp::IsVariableDefined(const Kq_BoolEquation::Handle& handle) const
 {
     return FindVariable(handle) != kKqNotFound;

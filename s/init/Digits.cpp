@@ -1,4 +1,4 @@
-// Init value in, packed results out; and the expression that they stand for.
+// Init value in, packed results out, and the expression that they stand for.
 // Fails: std::bad_alloc.  Cost: O(digits) to read, O(terms * names) for the expression.
 #include "Digits.h"
 
@@ -64,7 +64,7 @@ inline uint64_t ReadWord(const char* digits, size_t numDigits, unsigned int& see
     return word;
 }
 
-// Packs the digits, the last one being row 0; false when one is none of its base.
+// Packs the digits, the last one being row 0; false when one is not a digit of its base.
 template <unsigned int kDigitBits>
 bool ReadWords(const char* digits, size_t numDigits, uint64_t* words)
 {
@@ -78,7 +78,7 @@ bool ReadWords(const char* digits, size_t numDigits, uint64_t* words)
     return seen < 1u << kDigitBits;
 }
 
-// How many variables a value of 'numRows' rows is read over: as many as number its rows.
+// How many variables a value of 'numRows' rows has: as many as it takes to number its rows.
 unsigned int RequiredVariables(uint64_t numRows)
 {
     unsigned int numVariables = 0;
@@ -87,12 +87,12 @@ unsigned int RequiredVariables(uint64_t numRows)
     return numVariables;
 }
 
-// Exchanges two bits of all row numbers.  Requires: low < high.
+// Exchanges two bits in all row numbers.  Requires: low < high.
 void SwapRowBits(unsigned int low, unsigned int high, std::vector<uint64_t>& words)
 {
     assert(low < high);
     if (high < 6) {
-        // A row with the low bit alone changes places with the one with the high bit alone.
+        // A row with only the low bit set changes places with the one with only the high bit set.
         const unsigned int distance = (1u << high) - (1u << low);
         const uint64_t movers = kKqRowsWithBit[low] & ~kKqRowsWithBit[high];
         for (uint64_t& word : words) {
@@ -199,7 +199,7 @@ void KqDigits::ChooseForm()
     m_num_terms = static_cast<size_t>(m_is_sum ? numOnes : numZeros);
 }
 
-// Gives the rows that have no digit the result that an expression without their terms has.
+// Gives the rows without a digit the result that an expression without their terms has.
 void KqDigits::AddMissingRows()
 {
     const uint64_t numRows = uint64_t(1) << m_names.size();
@@ -213,7 +213,7 @@ void KqDigits::AddMissingRows()
         m_words[0] &= (uint64_t(1) << numRows) - 1;
 }
 
-// From the order of the digits, whose lowest bit is the first name's, to that of the rows.
+// Converts from the order of the digits, whose lowest bit is the first name's, to that of the rows.
 void KqDigits::ReverseRows()
 {
     const unsigned int numNames = static_cast<unsigned int>(m_names.size());
@@ -231,7 +231,7 @@ uint64_t KqDigits::ReverseBits(uint64_t row) const
 
 bool KqDigits::IsExact() const
 {
-    // Deliberate: over no names the expression is an empty group, 0 whatever the digit.
+    // Deliberate: over no names the expression is an empty group, which is 0 whatever the digit.
     return !m_names.empty() && std::all_of(m_names.begin(), m_names.end(), KqIsPlainName);
 }
 
@@ -281,7 +281,7 @@ void KqDigits::Fill(unsigned int numVariables, uint64_t firstWord, size_t numWor
                     uint64_t* words) const
 {
     assert(numVariables >= m_names.size());
-    // Variables after the names are the lowest bits of a row: each result stands so many times.
+    // Variables after the names are the lowest bits of a row, so each result is repeated.
     const unsigned int level = numVariables - static_cast<unsigned int>(m_names.size());
     if (level == 0) {
         assert(firstWord + numWords <= m_words.size());

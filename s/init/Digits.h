@@ -40,15 +40,15 @@ class KqDigits {
     }
 
     // Reads 'text' over the names of 'inputs'. 'isFirstLowest' gives the first one the lowest bit
-    // of a digit's row number instead of the highest. Null when the text is none: an unknown
-    // prefix, a bad digit, or digits for another number of names.
+    // of a digit's row number instead of the highest. Null when the text is not an init value over
+    // these names: an unknown prefix, a bad digit, or digits for another number of names.
     // Requires: IsCandidate(text).  Fails: std::bad_alloc.
     // Cost: O(text), with 'isFirstLowest' O(text * names).
     static std::unique_ptr<KqDigits> Read(const String& text, const Variables& inputs,
                                           bool isFirstLowest);
 
-    // Where a text that Read refuses has a byte that is no digit of its base, or 1 when that is not
-    // the x or b of a prefix; its length when there is none.
+    // The position, in a text that Read refuses, of the first byte that is not a digit of its base,
+    // or 1 when the byte there is not the x or b of a prefix; the text's length when there is none.
     // Requires: IsCandidate(text).
     static size_t FindBadDigit(const String& text);
 
@@ -60,7 +60,7 @@ class KqDigits {
     bool IsSum() const { return m_is_sum; }
 
     // Whether the results are those of the expression as the tokenizer reads it: there is a name,
-    // and each is one name to the tokenizer too. Otherwise only the expression counts.
+    // and the tokenizer reads each as one name too. Otherwise only the expression counts.
     bool IsExact() const;
 
     // The expression, its terms in the order of the digits, from the last to the first.
@@ -89,11 +89,11 @@ class KqDigits {
         }
     }
 
-    // Whether the terms are the same ones with the names' bits in opposite order.
+    // Whether the terms stay the same when the names' bits are in the opposite order.
     bool HasSymmetricTerms() const;
 
     // How many of the first 'numNames' names have a "~" in the term of 'row'.
-    // Requires: so many names.
+    // Requires: at least that many names.
     unsigned int CountNegations(uint64_t row, size_t numNames) const
     {
         assert(numNames <= m_names.size());
@@ -111,7 +111,7 @@ class KqDigits {
     unsigned int Eval(const Variables& variables) const;
 
     // Writes words of the column over 'numVariables' variables, the first ones being the names;
-    // with fewer than six the one word repeats the column up to its end.
+    // with fewer than six variables, the one word repeats the column up to its end.
     // Requires: numVariables >= the number of names.
     void Fill(unsigned int numVariables, uint64_t firstWord, size_t numWords,
               uint64_t* words) const;
@@ -121,7 +121,8 @@ class KqDigits {
 
     bool ReadDigits(unsigned int bitsPerDigit);
     void ChooseForm();
-    // The word that holds a row. All digits are in memory, so its index fits where rows do not.
+    // The word that holds a row. All digits are in memory, so its index fits where row numbers do
+    // not.
     static size_t WordOf(uint64_t row) { return static_cast<size_t>(row / 64); }
     uint64_t GetTermRows(size_t word) const { return m_is_sum ? m_words[word] : ~m_words[word]; }
     void AddMissingRows();
@@ -132,7 +133,7 @@ class KqDigits {
     String m_text;
     std::vector<String> m_names;
     std::vector<uint64_t> m_words; // with fewer than six names the rows repeat up to the end
-    uint64_t m_num_digits = 0;     // binary ones
+    uint64_t m_num_digits = 0;     // counted in binary digits
     size_t m_num_terms = 0;
     bool m_is_first_lowest;
     bool m_is_sum = false;

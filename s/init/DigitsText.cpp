@@ -10,9 +10,9 @@ namespace {
 
 // Words whose digits go to the string at a time, from a buffer in the processor's cache.
 constexpr size_t kPieceWords = 256;
-// Up to so many digits go to the string one at a time. It measures a text that it is given, and for
-// the processor to read what was written a moment before takes longer than these digits do: 4 of
-// them take 19 ns in place of 29, one 15 in place of 27.
+// Up to this many digits go to the string one at a time. The string measures each text it is given,
+// and reading back what was just written takes the processor longer than these digits do: 4 of them
+// take 19 ns instead of 29, one takes 15 instead of 27.
 constexpr unsigned int kFewDigits = 4;
 
 // The binary digits of a byte of the column, the highest row first.
@@ -44,8 +44,8 @@ void ReverseBytes(const uint64_t* words, size_t numWords, unsigned char* bytes)
     }
 }
 
-// Two digits for each byte. 'letter' is how far the digit that stands for 10 is beyond where the
-// others would go on. Written so that the compiler makes it work on many bytes at a time.
+// Two digits for each byte. 'letter' is how far the digit for 10 lies beyond where the others would
+// go on. Written so that the compiler makes it work on many bytes at a time.
 void WriteHex(const unsigned char* bytes, size_t numBytes, unsigned char letter, char* text)
 {
     for (size_t byte = 0; byte < numBytes; ++byte) {
@@ -97,7 +97,7 @@ void KqDigitsText::AppendFewRows(uint64_t word, unsigned int numVariables)
             m_text += GetDigit(word >> (row - digitRows) & ((1u << digitRows) - 1));
         return;
     }
-    // All 64 rows are written, as that needs no loop of its own, and the last ones taken.
+    // All 64 rows are written, which needs no separate loop, and the last digits are used.
     char text[64 + 1];
     WriteWords(&word, 1, text);
     m_text += text + (64 - numRows) / m_base;

@@ -12,8 +12,8 @@
 // Rows to a digit.
 enum KQ_BASE : unsigned int { KQ_BINARY = 1, KQ_HEXADECIMAL = 4 };
 
-// Whether a string class can make room ahead. The host interface does not ask for it; where it is
-// there, a long text is written once instead of being moved each time it has doubled.
+// Whether a string class can make room ahead. The host interface does not require it; where it
+// exists, a long text is written once instead of being moved each time it doubles.
 template <class String, class = void>
 struct KqHasReserve : std::false_type {
 };
@@ -44,7 +44,7 @@ class KqDigitsText {
     // The column of 1 to 6 variables.
     void AppendFewRows(uint64_t word, unsigned int numVariables);
 
-    // Makes room for the digits of so many words, where the host's string can.
+    // Makes room for the digits of this many words, if the host's string can.
     void Reserve(uint64_t numWords)
     {
         KqReserve(m_text, m_text.length() + static_cast<size_t>(numWords * 64 / m_base));

@@ -1,4 +1,4 @@
-// The tree of an init value, made of its results: node by node the one that its expression would
+// The tree of an init value, made from its results: node by node the one that its expression would
 // give. Its shape follows from the rows alone, so positions need no tree.
 #include "DigitsTree.h"
 
@@ -11,8 +11,8 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// Terms, and factors in a term, hang in chains that lean to the left: in pre-order all operators of
-// a chain, the topmost first, then its operands.
+// Terms, and factors in a term, hang in chains that lean to the left: pre-order has all operators
+// of a chain, the topmost first, then its operands.
 size_t CountOperators(size_t numOperands)
 {
     return numOperands - 1;
@@ -46,7 +46,7 @@ Node* MakeNode(KqTree& tree, KqSpellingId id)
 constexpr KqSpellingId kProduct = KqSpellingOf("*");
 constexpr KqSpellingId kSum = KqSpellingOf("+");
 
-// A chain below one node: its operators are made at once, its operands are handed in.
+// A chain below one node: its operators are made at once, its operands are added one by one.
 class Chain {
   public:
     // Requires: room for the operators.
@@ -59,7 +59,7 @@ class Chain {
         }
     }
 
-    // Operands come in text order, the one of the lowest operator's left first.
+    // Operands come in text order, starting with the left one of the lowest operator.
     void Add(Node* operand)
     {
         if (!m_has_first) {
@@ -73,7 +73,7 @@ class Chain {
     }
 
   private:
-    Node* m_lowest; // that lacks an operand; the holder when there are no operators
+    Node* m_lowest; // lacks an operand; the holder when there are no operators
     bool m_has_first = false;
 };
 

@@ -1,5 +1,6 @@
 // Messages to the host: which module a message names, the one way to issue it, and the debug
-// switch. The text after KQ_EMIT's line is a printf format with its arguments; it adds no line end.
+// switch. The arguments after KQ_EMIT's line are a printf format and its values; no line end is
+// added.
 #ifndef KQ_MESSAGES_H
 #define KQ_MESSAGES_H
 
@@ -23,8 +24,8 @@ constexpr KqModule kKqNodeModule = {"../s/Kq_BoolEquationImpNode.cpp", "$Revisio
     Port_MsgManData::createObject("Kq", (module).path, (line), (module).revision)                  \
         .issueStatus(__VA_ARGS__)
 
-// The debug switch. It stands with the other statics in the engine's main source, and is asked
-// before each message: a receiver may turn it off, and another thread may at any time.
+// The debug switch. It is defined with the other statics in the engine's main source. It is read
+// before each message, because a receiver or another thread may turn it off at any time.
 struct KqDebugMode {
     static std::atomic<bool> s_isOn;
     static bool IsOn() { return s_isOn.load(std::memory_order_relaxed); }

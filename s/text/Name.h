@@ -24,12 +24,13 @@ inline bool KqIsSameText(const Port::StringBase<char>& left, const Port::StringB
 // Up to this length the hash alone tells texts of one length apart.
 constexpr size_t kKqMaxExactHash = 8;
 
-// A number of 64 bits for a text, of which all bits vary; another one in each process where the
-// system places libraries at random, so that no text can be written to slow a table down.
-// Of two texts of one length up to kKqMaxExactHash it is different: every step can be undone.
+// A 64-bit hash of a text; all of its bits vary. It differs from process to process where the
+// system loads libraries at random addresses, so nobody can write a text that slows a table down.
+// Different texts of one length up to kKqMaxExactHash have different hashes: every step can be
+// undone.
 uint64_t KqHashText(const char* text, size_t length);
 
-// Whether 'name' is the text, whose hash is known.
+// Whether 'name' equals the text; the hashes of both are given.
 inline bool KqIsNamed(const Port::StringBase<char>& name, uint64_t nameHash, const char* text,
                       size_t length, uint64_t hash)
 {

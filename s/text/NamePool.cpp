@@ -10,7 +10,7 @@ namespace {
 
 constexpr size_t kFirstSlots = 16;
 
-// Its address differs from process to process where the system wants that.
+// Its address differs from process to process where the system randomises addresses.
 const char kAnchor = 0;
 
 uint64_t LoadBytes(const char* bytes, size_t length)
@@ -20,7 +20,7 @@ uint64_t LoadBytes(const char* bytes, size_t length)
     return word;
 }
 
-// The bytes of a text of up to eight, each of them at least once.
+// Loads all bytes of a text of up to eight bytes, each at least once.
 uint64_t LoadShort(const char* text, size_t length)
 {
     if (length >= 4)
@@ -61,7 +61,7 @@ KqNamePool::~KqNamePool()
         std::unique_ptr<Table> table(shard.table.load(std::memory_order_relaxed));
         for (size_t position = 0; table && position <= table->mask; ++position)
             delete table->slots[position].load(std::memory_order_relaxed);
-        // One after another: a chain of destructors would be as deep as it is long.
+        // One after another: nested destructors would go as deep as the chain is long.
         while (table)
             table = std::move(table->outgrown);
     }
@@ -69,10 +69,10 @@ KqNamePool::~KqNamePool()
 
 const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uint64_t hash)
 {
-    // The host's string is made of a text with a NUL byte at its end.
+    // The host's string is made from a text that ends with a NUL byte.
     const std::string text(name, length);
     assert(text.find('\0') == std::string::npos);
-    // Both outlive the lock.
+    // Declared before the lock, so that both are freed after it is released.
     std::unique_ptr<const KqName> entry(new KqName{text.c_str(), hash});
     std::unique_ptr<Table> larger;
     std::unique_lock<std::mutex> adding(shard.lock);
@@ -81,7 +81,7 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
             TakeTable(shard, std::move(larger));
             break;
         }
-        // Others may add names meanwhile, and tables for them.
+        // Meanwhile other threads may add names, and tables for them.
         adding.unlock();
         larger.reset(new Table(numSlots));
         adding.lock();
@@ -99,7 +99,7 @@ const KqName& KqNamePool::Add(Shard& shard, const char* name, size_t length, uin
     return *added;
 }
 
-// The size of the table that the shard needs for one more name; 0 when the present one has room.
+// The size of the table that the shard needs for one more name; 0 when the current one has room.
 // Requires: the shard's lock.
 size_t KqNamePool::CountSlotsToMake(const Shard& shard)
 {
@@ -110,7 +110,7 @@ size_t KqNamePool::CountSlotsToMake(const Shard& shard)
     return 2 * (shard.numNames + 1) <= numSlots ? 0 : 4 * numSlots;
 }
 
-// Shows all names in a larger table from now on.
+// Publishes a larger table that shows all names.
 // Requires: the shard's lock.
 void KqNamePool::TakeTable(Shard& shard, std::unique_ptr<Table> larger) noexcept
 {

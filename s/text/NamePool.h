@@ -8,15 +8,15 @@
 
 #include "Name.h"
 
-// A hash table in shards, each with a table of its own.
-// Threads: all at any time. A name that is there is found without a lock. A new one, and a larger
-// table, is made before its shard's lock is taken; a thread that loses the race throws its own away
-// afterwards. So whoever serves or takes back memory may use the pool.
+// A hash table split into shards, each with its own table.
+// Threads: all at any time. A known name is found without a lock. A new name, or a larger table, is
+// allocated before its shard's lock is taken; a thread that loses the race frees its own
+// afterwards. So code that allocates or frees memory may itself use the pool.
 // Invariants:
-// 1. An entry that a table shows is complete and never changes, moves or goes.
-// 2. A shard's table shows every name of the shard; it is at most half full. Tables it has outgrown
-//    are kept, because a reader may still look at one: they are smaller than the present one
-//    together.
+// 1. An entry that a table shows is complete and never changes, moves or goes away.
+// 2. A shard's table shows every name of the shard and is at most half full. Tables that it has
+//    outgrown are kept, because a reader may still be using one; together they are smaller than the
+//    current one.
 class KqNamePool {
   public:
     KqNamePool() = default;
@@ -24,7 +24,8 @@ class KqNamePool {
     KqNamePool(const KqNamePool&) = delete;
     KqNamePool& operator=(const KqNamePool&) = delete;
 
-    // The one entry equal to the 'length' bytes at 'name', made on first request. No byte is NUL.
+    // The one entry equal to the 'length' bytes at 'name', made on first request. No byte may be
+    // NUL.
     // Fails: std::bad_alloc; the pool stays usable.  Cost: in step with the name's length.
     const KqName& Find(const char* name, size_t length)
     {
@@ -50,7 +51,7 @@ class KqNamePool {
     struct Table {
         explicit Table(size_t numSlots) : mask(numSlots - 1), slots(new Slot[numSlots]()) {}
 
-        // The slot that holds the name, or the first free one on its way.
+        // The slot that holds the name, or the first free one in its search order.
         Slot* SlotOf(const char* name, size_t length, uint64_t hash) const
         {
             size_t position = static_cast<size_t>(hash) & mask;
@@ -61,16 +62,16 @@ class KqNamePool {
             }
         }
 
-        const size_t mask; // the number of slots, a power of two, less 1
+        const size_t mask; // the number of slots, a power of two, minus 1
         const std::unique_ptr<Slot[]> slots;
-        std::unique_ptr<Table> outgrown; // the one before
+        std::unique_ptr<Table> outgrown; // the table before this one
     };
 
-    // What every look-up reads and what every new name writes lie in cache lines of their own: on
-    // one line, names that two threads add slow each other's look-ups down by a third.
+    // What every look-up reads and what every new name writes lie on separate cache lines: on one
+    // line, two threads that add names would slow each other's look-ups down by a third.
     struct Shard {
         alignas(kCacheLine) std::atomic<Table*> table{nullptr}; // owned
-        alignas(kCacheLine) std::mutex lock;                    // held by whoever adds a name
+        alignas(kCacheLine) std::mutex lock;                    // held while a name is added
         size_t numNames = 0;
     };
 

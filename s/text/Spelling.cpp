@@ -1,4 +1,4 @@
-// The table of spellings as strings of the host, made once and shared by all nodes.
+// The table of spellings as host strings, made once and shared by all nodes.
 #include "Spelling.h"
 
 typedef Port::StringBase<char> String;

@@ -1,6 +1,6 @@
 // The one table of spellings: every operator, parenthesis and constant in every accepted form, and
-// each node type's name and spelling in the three fixed syntaxes. The tokenizer's tables follow
-// from it at compile time, and nodes write themselves by it.
+// each node type's name and spelling in the three fixed syntaxes. The tokenizer's tables are made
+// from it at compile time, and nodes are written from it.
 #ifndef KQ_SPELLING_H
 #define KQ_SPELLING_H
 
@@ -13,8 +13,8 @@ struct KqSpelling {
     Kq_BoolEquationImp::Node::TYPE type;
 };
 
-// What the tokenizer accepts. A spelling is one character, an inversion's character directly before
-// an operator's, or a word between dots; SpellingTables.h checks that.
+// What the tokenizer accepts. A spelling is one character, a negation character directly before an
+// operator character, or a word between dots; SpellingTables.h checks this.
 constexpr KqSpelling kKqSpellings[] = {
     {"&", Kq_BoolEquationImp::Node::AND},     {"*", Kq_BoolEquationImp::Node::AND},
     {".AND.", Kq_BoolEquationImp::Node::AND}, {"|", Kq_BoolEquationImp::Node::OR},
@@ -34,7 +34,7 @@ constexpr KqSpelling kKqSpellings[] = {
     {"1", Kq_BoolEquationImp::Node::ONE},
 };
 
-// Row of kKqSpellings.
+// A row of kKqSpellings.
 typedef unsigned char KqSpellingId;
 
 constexpr KqSpellingId kKqNumSpellings = sizeof kKqSpellings / sizeof kKqSpellings[0];
@@ -47,7 +47,7 @@ constexpr bool KqIsSameSpelling(const char* left, const char* right)
     return *left == *right;
 }
 
-// The row of a text, kKqNoSpelling when there is none.
+// The row of a text, or kKqNoSpelling when there is none.
 constexpr KqSpellingId KqSpellingOf(const char* text)
 {
     for (KqSpellingId id = 0; id < kKqNumSpellings; ++id) {
@@ -64,7 +64,7 @@ struct KqTypeSpelling {
 
 constexpr unsigned int kKqNumTypes = 14;
 
-// Indexed by Node::TYPE; the last row is for every value that is not one.
+// Indexed by Node::TYPE; the last row is for all other values.
 constexpr KqTypeSpelling kKqTypes[kKqNumTypes + 1] = {
     {"AND", {"&", "*", ".AND."}},     {"0", {"0", "0", "0"}},
     {"1", {"1", "1", "1"}},           {"ID", {nullptr, nullptr, nullptr}},
@@ -76,9 +76,9 @@ constexpr KqTypeSpelling kKqTypes[kKqNumTypes + 1] = {
     {"UNKNOWN", {"??", "??", "??"}},
 };
 
-// What nodes and tokens write. Made once, on the first request, and valid until unload.
+// The texts of tokens and nodes. Made once, on the first request, and valid until unload.
 const KqName& KqGetSpelling(KqSpellingId id);
-// The type's spelling in the syntax 'syntaxIndex', 0 to 2; null for the node's own token.
+// The type's spelling in the syntax 'syntaxIndex', 0 to 2; null when the node writes its own token.
 const Port::StringBase<char>* KqGetTypeSpelling(unsigned int type, unsigned int syntaxIndex);
 const Port::StringBase<char>& KqGetTypeName(unsigned int type);
 

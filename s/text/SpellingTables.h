@@ -1,5 +1,5 @@
-// The tokenizer's tables, made of the table of spellings at compile time: what a character starts,
-// what follows a negation's character, which words stand between dots.
+// The tokenizer's tables, made from the table of spellings at compile time: what a character
+// starts, what may follow a negation character, which words stand between dots.
 #ifndef KQ_SPELLINGTABLES_H
 #define KQ_SPELLINGTABLES_H
 
@@ -24,7 +24,7 @@ enum CLASS : uint8_t {
 
 struct Character {
     CLASS startsA;
-    KqSpellingId spelling; // of CONSTANT, SINGLE and NEGATION: by itself
+    KqSpellingId spelling; // of CONSTANT, SINGLE and NEGATION: the character alone
 };
 
 template <class Entry>
@@ -77,8 +77,8 @@ constexpr Characters MakeCharacters()
 
 constexpr Characters kCharacters = MakeCharacters();
 
-// The spelling that starts with an inversion's character, by the character after it. An operator
-// written directly after it belongs to it: "~&" is always one NAND and never NOT and AND.
+// The spellings that start with one negation character, by the character after it. An operator
+// written directly after it belongs to it: "~&" is always one NAND, never a NOT and an AND.
 struct Negations {
     char prefix;
     ByCharacter<KqSpellingId> next;
@@ -148,8 +148,8 @@ constexpr Table<KqSpellingId, kNumKeywords> MakeKeywords()
 constexpr Table<Negations, kNumNegations> kNegations = MakeAllNegations();
 constexpr Table<KqSpellingId, kNumKeywords> kKeywords = MakeKeywords();
 
-// Whether the scan can find a spelling: a sign of its own, a negation's before another sign, or a
-// word that ends at its second dot; each once.
+// Whether the scan can find a spelling: a single sign, a negation sign followed by another sign, or
+// a word that ends at its second dot. No other row may have the same text.
 constexpr bool IsFound(KqSpellingId id)
 {
     const char* const text = kKqSpellings[id].text;

@@ -1,5 +1,5 @@
 // Text in, one token for each piece out, in text order.
-// Fails: false for a text that is refused, with the reason for whoever asks; std::bad_alloc.
+// Fails: false for a refused text, with the reason on request; std::bad_alloc.
 // Cost: one pass over the text.
 #include "Tokens.h"
 
@@ -29,7 +29,7 @@ KqSpellingId NegationSpelling(char prefix, char next)
     return kNegations.of[row].next[next];
 }
 
-// The word of 'length' characters with both dots; kKqNoSpelling when there is no such word.
+// The spelling of a word of 'length' characters, both dots included; kKqNoSpelling without one.
 KqSpellingId KeywordSpelling(const char* word, size_t length)
 {
     for (const KqSpellingId id : kKeywords.of) {
@@ -51,7 +51,7 @@ bool IsNamePart(char character)
     return startsA == NAME || startsA == CONSTANT || startsA == DIGIT_OF_NAME;
 }
 
-// The character after the next 'mark' that follows the one at 'start', null when there is none.
+// The position after the next 'mark' beyond the character at 'start'; null when there is none.
 const char* EndOfMarked(const char* start, char mark)
 {
     const char* end = std::strchr(start + 1, mark);
@@ -80,7 +80,7 @@ class Scanner {
     const Refusal& GetRefusal() const { return m_refusal; }
 
   private:
-    // Records why the text is refused at the place reached, for whoever asks.
+    // Records why the text is refused at the current position, in case the caller asks.
     bool Refuse(Refusal::CODE code, size_t length)
     {
         m_refusal.code = code;
@@ -89,7 +89,7 @@ class Scanner {
         return false;
     }
 
-    // The first ")" that closes nothing, otherwise the last "(" that nothing closes, is to blame.
+    // Blames the first ")" that closes nothing, otherwise the last "(" that nothing closes.
     bool RefuseParens()
     {
         size_t numOpen = 0;
@@ -100,7 +100,7 @@ class Scanner {
             numOpen += type == Node::LP ? 1u : 0u;
             numOpen -= type == Node::RP ? 1u : 0u;
         }
-        // The numbers differ and each ")" closes a "(", so there is one that none closes.
+        // The counts differ and every ")" closes a "(", so some "(" is never closed.
         size_t position = m_tokens.GetSize() - 1;
         for (size_t numClosed = 0;; --position) {
             const Node::TYPE type = m_tokens.begin()[position].type;
@@ -220,7 +220,7 @@ bool KqScanTokens(const char* text, KqNamePool& names, KqTokens& tokens, Refusal
 void KqLocateToken(const char* text, const KqTokens& tokens, size_t position, Refusal& refusal)
 {
     assert(position < tokens.GetSize());
-    // Between tokens there are blanks only, and each is as long as its text.
+    // Only blanks separate tokens, and each token is as long as its text.
     const KqTokens::Token* token = tokens.begin();
     size_t offset = std::strspn(text, " \t\n");
     for (size_t left = position; left > 0; --left, ++token) {

@@ -12,7 +12,7 @@
 class KqNamePool;
 
 // A list of tokens. The first ones need no heap.
-// Words are those of the pool of names and the table of spellings: they outlive every equation.
+// Words belong to the pool of names or the table of spellings, so they outlive every equation.
 class KqTokens {
   public:
     struct Token {
@@ -20,8 +20,8 @@ class KqTokens {
         const KqName* word;
     };
 
-    // Few texts have more tokens than every second character starts one: room for so many is made
-    // at once, as growing a long list costs more than memory that is never touched.
+    // Few texts have more than one token for every two characters. Room for that many is made at
+    // once, because growing a long list costs more than memory that is never touched.
     explicit KqTokens(size_t textLength) : m_expected_size(std::min(textLength / 2, kMaxExpected))
     {
     }
@@ -41,7 +41,7 @@ class KqTokens {
 
   private:
     static constexpr size_t kInline = 128;
-    // A text may be blanks for the most part, so the guess is worth 16 MB at most.
+    // A text may be mostly blanks, so the guess may reserve at most 16 MB.
     static constexpr size_t kMaxExpected = size_t(1) << 20;
 
     void AppendToHeap(const Token& token)
@@ -59,15 +59,15 @@ class KqTokens {
     std::vector<Token> m_all; // all tokens, once they are too many for m_first
 };
 
-// Appends the tokens of 'text', up to its first NUL byte, and reads names into the pool. False when
-// the text is refused; 'refusal', unless null, then tells why and where.
+// Appends the tokens of 'text', up to its first NUL byte, and adds its names to the pool. False
+// when the text is refused; 'refusal', unless null, then says why and where.
 // Tokens do not point into the text.  Requires: no tokens yet.  Fails: std::bad_alloc.
 bool KqScanTokens(const char* text, KqNamePool& names, KqTokens& tokens,
                   Kq_BoolEquation::Refusal* refusal);
 
-// Puts the place of the token at 'position' into 'refusal'. Tokens do not know their places,
-// because only a refusal asks.
-// Requires: the tokens of the text; more than 'position'.
+// Stores the place of the token at 'position' in 'refusal'. Tokens do not record their places,
+// because only a refusal needs them.
+// Requires: the tokens of the text, more than 'position' of them.
 void KqLocateToken(const char* text, const KqTokens& tokens, size_t position,
                    Kq_BoolEquation::Refusal& refusal);
 

@@ -17,7 +17,7 @@ namespace {
 //
 // Invariants:
 // 1. Child links form a tree at all times.
-// 2. A node's parent link names the node that has it as a child, but for the keys of m_holders.
+// 2. A node's parent link names the node that has it as a child, except for the keys of m_holders.
 class TreeBuilder {
   public:
     TreeBuilder(const std::vector<Node*>& nodes, bool isTraced)
@@ -38,7 +38,7 @@ class TreeBuilder {
     }
 
   private:
-    // The switch is asked each time: a message's receiver may have turned it.
+    // The switch is read each time: a message's receiver may have changed it.
     void Trace() const
     {
         if (m_is_traced && KqDebugMode::IsOn())
@@ -57,8 +57,8 @@ class TreeBuilder {
     bool RefuseRightParen(const Node* node);
     bool RefuseChildren(const Node* node);
 
-    // The node that has 'node' as a child, null at the top. All walks up go this way, so they
-    // end: it follows child links backwards, and those form a tree (invariants 1 and 2).
+    // The node that has 'node' as a child, null at the top. All walks up go this way, so they end:
+    // they follow child links backwards, and those form a tree (invariants 1 and 2).
     Node* Up(Node* node) const
     {
         if (node->IsNot() && !m_holders.empty()) {
@@ -77,7 +77,7 @@ class TreeBuilder {
         return node;
     }
 
-    // Makes 'operand' the left operand of 'node'; its parent link is true from now on.
+    // Makes 'operand' the left operand of 'node'; its parent link is correct from then on.
     void TakeLeft(Node* node, Node* operand)
     {
         assert(!node->GetLeftChild());
@@ -102,7 +102,7 @@ class TreeBuilder {
     bool m_is_traced;
     KqBuildResult m_result;
     // The top NOT of a negated operator inside something keeps its parent link to the operator's
-    // first operand; this remembers the node that has it as a child.
+    // first operand; this maps it to the node that has it as a child.
     std::unordered_map<const Node*, Node*> m_holders;
 };
 
@@ -143,14 +143,14 @@ bool TreeBuilder::PlaceOperand(Node* node)
     return true;
 }
 
-// Closes the nearest open group; the group becomes the cursor, the operand placed last.
+// Closes the nearest open group, which becomes the cursor: it is now the operand placed last.
 bool TreeBuilder::PlaceRightParen(Node* node)
 {
     const auto isOpen = [](const Node* group) { return group->IsLp() && !group->GetRightChild(); };
     Node* group = m_cursor;
     while (group && !isOpen(group)) {
-        // Deliberate: from the top NOT of a negated operator, an open "(" that is the operator's
-        // first operand is nearer than anything that holds the NOT.
+        // Deliberate: seen from the top NOT of a negated operator, an open "(" that is the
+        // operator's first operand is nearer than anything that holds the NOT.
         Node* parent = group->GetParent();
         group = parent && isOpen(parent) ? parent : Up(group);
     }
@@ -175,8 +175,9 @@ bool TreeBuilder::PlaceOperator(Node* node)
     if (!anchor) {
         TakeLeft(node, below);
     } else if (anchor->IsBinOp()) {
-        // One precedence for all: the operator takes the place of the highest one of the run.
-        // Deliberate: IsBinOp is asked as it is, so a constant in an operand's place counts; only
+        // All operators have one precedence: this one takes the place of the highest one of the
+        // run.
+        // Deliberate: IsBinOp is used as it is, so a constant in an operand's place counts; only
         // the dump of the failing build can show it.
         Node* highest = anchor;
         Node* above = Up(highest);
@@ -196,7 +197,8 @@ bool TreeBuilder::PlaceOperator(Node* node)
 }
 
 // A binary operator whose 'anchor' is not an operator: the operator becomes the anchor's left child
-// in the cursor's place. The right one is never an operand: operands go right below operators only.
+// in the cursor's place. The anchor's right child is never an operand: only operators have one
+// there.
 bool TreeBuilder::PlaceInGroup(Node* node, Node* anchor)
 {
     if (anchor->GetLeftChild() == m_cursor) {
@@ -215,8 +217,8 @@ bool TreeBuilder::PlaceInGroup(Node* node, Node* anchor)
     return true;
 }
 
-// A binary operator after a NOT without operand: "X ~ op Y" means "~(X op Y)". The NOT hangs
-// below X by now; the chain of NOTs goes where X was, and X goes below the operator.
+// A binary operator after a NOT without an operand: "X ~ op Y" means "~(X op Y)". At this point the
+// NOT hangs below X; the chain of NOTs moves to where X was, and X moves below the operator.
 bool TreeBuilder::PlaceNegatedOperator(Node* node)
 {
     Node* chainTop = m_cursor;
@@ -225,7 +227,7 @@ bool TreeBuilder::PlaceNegatedOperator(Node* node)
         chainTop = operand;
         operand = Up(operand);
     }
-    // An operand whose first slot was taken before ("A & ~ | B") has no place to give.
+    // The chain must be the operand's left child; in "A & ~ | B" A already has that place.
     if (!operand || operand->GetLeftChild() != chainTop) {
         m_result.broken = m_cursor;
         return Refuse(Refusal::NEGATED_OPERATOR, m_cursor);
@@ -236,7 +238,7 @@ bool TreeBuilder::PlaceNegatedOperator(Node* node)
     TakeLeft(node, operand);
     operand->SetLeftChild(nullptr);
     if (holder) {
-        // Deliberate: the chain's own parent link stays at the operand, and dumps show it.
+        // Deliberate: the chain's own parent link still points at the operand, and dumps show it.
         ReplaceChild(holder, operand, chainTop);
         m_holders[chainTop] = holder;
     } else {
@@ -246,11 +248,11 @@ bool TreeBuilder::PlaceNegatedOperator(Node* node)
     return true;
 }
 
-// Records what is to blame, for whoever asks: the token 'numAfter' tokens after the node, in text
-// order.
+// Records which token is to blame, in case the caller asks: the one 'numAfter' tokens after the
+// node, in text order.
 bool TreeBuilder::Refuse(Refusal::CODE code, const Node* node, size_t numAfter)
 {
-    // The first token is placed unseen, and a ")" there is the fault whatever follows from it.
+    // The first token is placed unchecked, and a ")" there is the fault whatever follows from it.
     const Node* first = m_nodes[0];
     assert(node >= first);
     assert(static_cast<size_t>(node - first) + numAfter < m_nodes.size());
@@ -260,8 +262,8 @@ bool TreeBuilder::Refuse(Refusal::CODE code, const Node* node, size_t numAfter)
     return false;
 }
 
-// A ")" that finds no open group. Where a "(" is open, the operator directly after it, perhaps
-// with a negation apart from it, has taken it for its operand and is to blame.
+// A ")" that finds no open group. If a "(" is still open, the operator directly after it, perhaps
+// with a separate negation, has taken it as its operand and is to blame.
 bool TreeBuilder::RefuseRightParen(const Node* node)
 {
     for (const Node* earlier = m_nodes[0]; earlier != node; ++earlier) {
@@ -275,15 +277,15 @@ bool TreeBuilder::RefuseRightParen(const Node* node)
     return Refuse(Refusal::PAREN, node);
 }
 
-// A node whose children are not those that its type allows.
+// Refuses a node whose children are not those that its type allows.
 bool TreeBuilder::RefuseChildren(const Node* node)
 {
-    // Whatever hangs below a name or constant was written directly after it.
+    // Anything below a name or constant was written directly after it.
     if (node->IsId() || node->IsConst())
         return Refuse(Refusal::OPERAND, node, 1);
     if (node->IsNot())
         return Refuse(Refusal::NO_OPERAND, node);
-    // The first token has no operand before it; it has taken the right one in its place.
+    // The first token has no operand before it, so its right operand was placed on the left.
     return Refuse(node == m_nodes[0] ? Refusal::NO_LEFT_OPERAND : Refusal::NO_RIGHT_OPERAND, node);
 }
 
@@ -327,7 +329,7 @@ constexpr AllowedTable MakeAllowedTable()
     return table;
 }
 
-// A table, because the types of a text follow no pattern that a processor could foretell.
+// A table, because the types in a text follow no pattern that a processor could predict.
 constexpr AllowedTable kAllowed = MakeAllowedTable();
 
 bool HasAllowedChildren(const Node& node)

@@ -1,5 +1,5 @@
-// The node dump: a subtree as indented lines through the message manager, each line made of several
-// messages. Only reads. Depth costs memory for the pending nodes and output for the indentation.
+// The node dump: writes a subtree as indented lines to the message manager, several messages to a
+// line. Only reads. Depth costs memory for the pending nodes and output for the indentation.
 #include <Kq_BoolEquationImpNode.h>
 
 #include <cstring>
@@ -13,14 +13,14 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// Node dumps carry fixed numbers; they name no line of this file.
+// Node dumps carry fixed line numbers, which are not lines of this file.
 constexpr int kPrefixLine = 487;
 constexpr int kLeftLine = 503;
 constexpr int kRightLine = 508;
 constexpr int kNodeLine = 512;
 
-// The dump of a node that broke a build ends after so many node lines or before so many bytes: a
-// text of 16 kB that does not build could otherwise cost a hundred million messages.
+// The dump of a node that broke a build ends after this many node lines or before this many bytes:
+// otherwise a 16 kB text that does not build could cost a hundred million messages.
 constexpr size_t kMaxFailureNodes = 256;
 constexpr size_t kMaxFailureBytes = size_t(1) << 20;
 
@@ -126,8 +126,8 @@ void Node::DbgLine(int depth) const
 }
 
 // Puts this node's path in front of 'name': "TOP." and an L or R for each step down.
-// A node that its parent does not have ends the path there, without "TOP.": so the walk ends even
-// where the parent link of a negated operator's NOT closes a circle.
+// A node that is not a child of its parent ends the path there, without "TOP.", so the walk ends
+// even where the parent link of a negated operator's NOT closes a circle.
 void Node::DbgName(String& name) const
 {
     std::string steps;

@@ -1,5 +1,5 @@
 // The value of a subtree for one table of variable values; no recursion.
-// In debug mode one line for each node, children before their parent, goes to the message manager.
+// In debug mode one line for each node goes to the message manager, children before their parent.
 #include "NodeEval.h"
 
 #include "Messages.h"
@@ -12,11 +12,11 @@ typedef std::vector<std::pair<String, unsigned int>> Variables;
 
 namespace {
 
-// The evaluation trace carries fixed numbers; they name no line of this file.
+// The evaluation trace carries fixed line numbers, which are not lines of this file.
 constexpr int kTraceLine = 444;
 constexpr int kTraceTextLine = 446;
 
-// An index beyond the table reads as 0.
+// An index beyond the table counts as 0.
 unsigned int VariableValue(unsigned int variableIndex, const Variables& variables)
 {
     return variableIndex < variables.size() ? variables[variableIndex].second : 0u;
@@ -61,7 +61,7 @@ struct Place {
     unsigned int left; // value of the left operand, once it is known
 };
 
-// Keeps the value of the subtree left last; afterLeave(node, value) sees each value.
+// Keeps the value of the subtree that was left last; afterLeave(node, value) gets each value.
 template <class AfterLeave>
 struct Evaluator {
     Evaluator(const Variables& table, AfterLeave after) : variables(table), afterLeave(after) {}
@@ -119,7 +119,7 @@ unsigned int KqEvalSilently(const Node& root, const Variables& variables)
 unsigned int Node::Eval(const Variables& variables) const
 {
     return EvalTree(*this, variables, [](const Node& node, unsigned int value) {
-        // Asked for each value: a message's receiver may have turned the switch.
+        // Read for each value: a message's receiver may have changed the switch.
         if (!KqDebugMode::IsOn())
             return;
         String name;

@@ -1,4 +1,4 @@
-// Node by node evaluation for those who evaluate by their own choice, debug mode or not.
+// Node-by-node evaluation that the library itself decides on: never traced, debug mode or not.
 #ifndef KQ_NODEEVAL_H
 #define KQ_NODEEVAL_H
 

@@ -1,5 +1,5 @@
 // How many children take part in a node's value: the one place that sorts node types into
-// operators, those that hand on or invert one operand, and leaves.
+// operators, those that pass on or invert one operand, and leaves.
 #ifndef KQ_OPERANDS_H
 #define KQ_OPERANDS_H
 

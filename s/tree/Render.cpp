@@ -12,15 +12,15 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// A node, and the topmost of the NOT nodes directly above it that have not been written yet; the
-// node itself when there are none.
+// A node, and the topmost of the unwritten NOT nodes directly above it; the node itself when there
+// are none.
 struct Place {
     const Node* node;
     const Node* pendingTop;
 };
 
-// Writes one tree as text. Characters collect in a buffer that is handed on when it is full, so
-// the result grows by pieces and not by characters.
+// Writes one tree as text. Characters collect in a buffer that is flushed when it is full, so the
+// result grows in pieces, not character by character.
 class Writer {
   public:
     Writer(KqSpellingOfNode spelling, bool spaces) : m_spelling(spelling), m_spaces(spaces) {}
@@ -92,13 +92,13 @@ void Writer::WriteTokens(const Place& place)
 void Writer::WriteToken(const String& token)
 {
     const size_t length = token.length();
-    // A blank before the token and a 0 after the text take a character each.
+    // A blank before the token and a 0 after the text take one character each.
     if (length + 2 > kBufferSize - m_length)
         Flush();
     if (m_spaces && m_has_written)
         m_buffer[m_length++] = ' ';
     m_has_written = m_has_written || length > 0;
-    // The buffer ends at its first NUL byte; a token that is longer or has one goes straight.
+    // The buffer ends at its first NUL byte; a token that is too long or has one bypasses it.
     if (length + 2 > kBufferSize || std::memchr(token.c_str(), '\0', length)) {
         Flush();
         m_result += token;

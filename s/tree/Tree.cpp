@@ -1,5 +1,5 @@
 // Tokens in, nodes out: made in one block, listed in the order asked for, freed together.
-// Fails: std::bad_alloc, and what was made goes with the tree.
+// Fails: std::bad_alloc, and what was made is freed with the tree.
 #include "Tree.h"
 
 #include <cerrno>
@@ -19,8 +19,8 @@ typedef Port::StringBase<char> String;
 
 namespace {
 
-// Asks for large pages for a block of several megabytes that is about to be filled. A hint to the
-// system where there is one, and nothing elsewhere; docs/benchmarks.md says what it saves.
+// Asks for large pages for a block of several megabytes that is about to be filled. Only a hint,
+// and only on Linux; docs/benchmarks.md says what it saves.
 void AdviseLargePages(void* block, size_t size)
 {
 #if defined(__linux__)
@@ -107,7 +107,7 @@ struct Checker : KqPreOrder {
 void KqNodeBlock::Allocate(size_t numNodes)
 {
     assert(m_size == 0);
-    Free(); // an allocation that failed before may have left a block without nodes
+    Free(); // an earlier failed allocation may have left a block without nodes
     m_nodes = Node::m_kq_boolequationimp_node_mem.allocate(numNodes);
     m_num_slots = numNodes;
     AdviseLargePages(m_nodes, m_num_slots * sizeof(Node));
@@ -141,7 +141,7 @@ void KqTree::MakeRoom(size_t numNodes)
 void KqTree::MakeNodes(const KqTokens& tokens)
 {
     MakeRoom(tokens.GetSize() + 1);
-    // Sized at once: a list that grows with each node takes a tenth longer in all.
+    // Sized at once: growing the list node by node takes a tenth longer overall.
     list.resize(tokens.GetSize());
     Node** position = list.data();
     for (const KqTokens::Token& token : tokens)

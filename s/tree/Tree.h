@@ -9,7 +9,8 @@
 
 class KqTokens;
 
-// Memory for nodes, side by side in the order they are made, from the node class's allocator.
+// Memory for nodes, side by side in the order in which they are made, from the node class's
+// allocator.
 // Invariant: the first m_size slots hold nodes, which are destroyed with the block.
 class KqNodeBlock {
   public:
@@ -20,10 +21,10 @@ class KqNodeBlock {
     KqNodeBlock(const KqNodeBlock&) = delete;
     KqNodeBlock& operator=(const KqNodeBlock&) = delete;
 
-    // Room for so many nodes.  Requires: none so far.  Fails: std::bad_alloc.
+    // Makes room for this many nodes.  Requires: none so far.  Fails: std::bad_alloc.
     void Allocate(size_t numNodes);
 
-    // Requires: room.  Fails: std::bad_alloc, and there is no such node.
+    // Requires: room.  Fails: std::bad_alloc, and no node is made.
     Node* Make(Node::TYPE type, const Port::StringBase<char>& text)
     {
         assert(m_size < m_num_slots);
@@ -41,15 +42,15 @@ class KqNodeBlock {
     size_t m_size = 0;
 };
 
-// A root, the list of all nodes, and their block, made apart from any equation and then given to
-// its store whole. No message's receiver knows of it, and whatever fails leaves no trace.
+// A root, the list of all nodes, and their block, built apart from any equation and then handed
+// whole to its store. No message receiver knows of it, and a failure leaves no trace.
 struct KqTree {
     typedef Kq_BoolEquationImp::Node Node;
 
-    // Makes a node of each token, in their order, and leaves room for one more.
+    // Makes one node for each token, in their order, and leaves room for one more.
     // Fails: std::bad_alloc.
     void MakeNodes(const KqTokens& tokens);
-    // Makes room, and then nodes, one by one.  Requires: no nodes so far; room.
+    // Makes room, then nodes one by one.  Requires: no nodes so far; room.
     void MakeRoom(size_t numNodes);
     Node* MakeNode(Node::TYPE type, const Port::StringBase<char>& text)
     {
@@ -62,7 +63,7 @@ struct KqTree {
     // Requires: a root; room.
     void AddTruthTableRoot(const Port::StringBase<char>& initValue);
     // Lists the tree in pre-order.
-    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the list in no order.
+    // Requires: a checked tree of all nodes.  Fails: std::bad_alloc, with the list in no set order.
     void ListInPreOrder();
 
     Node* root = nullptr;
@@ -74,9 +75,9 @@ struct KqTree {
 // Fails: std::bad_alloc.
 bool KqIsSameTree(const Kq_BoolEquationImp::Node* left, const Kq_BoolEquationImp::Node* right);
 
-// Asserts that the list is the tree at 'root' in pre-order and that links agree, for the builds
-// that check. A NOT's parent link may differ: that of the top NOT of a negated operator inside
-// something stays at the operator's first operand.
+// In builds with assertions, checks that the list is the tree at 'root' in pre-order and that links
+// agree. A NOT's parent link may differ: that of the top NOT of a negated operator inside something
+// stays at the operator's first operand.
 void KqCheckTree(const Kq_BoolEquationImp::Node* root,
                  const std::vector<Kq_BoolEquationImp::Node*>& list);
 

@@ -1,6 +1,6 @@
-// The one walk over trees, without recursion: the depth of a tree is the text's to choose, the
-// stack is the host's. The first entries of a stack stay in place, so ordinary walks allocate
-// nothing.
+// The one walk over trees. It does not recurse: the text decides how deep a tree is, and the stack
+// belongs to the host. The first entries of the walk's own stack are stored in place, so ordinary
+// walks allocate nothing.
 #ifndef KQ_WALK_H
 #define KQ_WALK_H
 
@@ -18,8 +18,8 @@ class KqStack {
   public:
     bool IsEmpty() const { return m_size == 0; }
 
-    // A new entry on top, to be filled in place: one that is copied there as a whole waits for the
-    // parts it was just made of.
+    // Adds an entry on top, to be filled in place: copying a finished one there would have to wait
+    // for the parts it was just made of.
     Entry& Add()
     {
         if (m_size >= kInline)
@@ -48,14 +48,14 @@ class KqStack {
     std::vector<Entry> m_rest;
 };
 
-// What a visitor wants of the place it has entered: which of its places below to go to, and whether
+// What a visitor wants at the place it has entered: which of the places below to visit, and whether
 // to come back to it between them and after the last.
 enum KqBelow : unsigned int {
     KQ_NONE = 0,
     KQ_ONE = 1,  // the first alone
     KQ_BOTH = 2, // the first, then the second
     KQ_RETURN = 4,
-    KQ_END = 8 // the whole walk
+    KQ_END = 8 // ends the whole walk
 };
 
 // For visitors that never return to a place.
@@ -71,7 +71,7 @@ struct KqPreOrder {
     }
 };
 
-// What is to be done with a place that waits.
+// What remains to be done with a waiting place.
 enum KqStage : unsigned int { KQ_TO_ENTER, KQ_AFTER_FIRST, KQ_AFTER_LAST };
 
 template <class Place, bool kIsPreOrder>
@@ -87,7 +87,8 @@ struct KqWaiting {
     KqStage stage;
 };
 
-// A visitor that never returns leaves but places to enter: half the memory of pointers.
+// A visitor that never returns only leaves places to enter; without a stage, pointers take half the
+// memory.
 template <class Place>
 struct KqWaiting<Place, true> {
     static KqStage GetStage() { return KQ_TO_ENTER; }
@@ -102,16 +103,16 @@ struct KqWaiting<Place, true> {
 };
 
 // Walks a tree from 'place' down, in pre-order and, where the visitor asks for it, in post-order.
-// A place is whatever the visitor needs to know of a node, a plain value: a pointer, a pair, a
-// pointer with a depth or a result. The visitor has
+// A place is a plain value with whatever the visitor needs to know about a node: a pointer, a pair,
+// or a pointer with a depth or a result. The visitor has
 //     unsigned int Enter(Place& place, Place& first, Place& second)
 //         the place is reached; sets the places below, but not the second when it will return;
-//         gives back a KqBelow, or'ed with KQ_RETURN;
+//         returns a KqBelow, or'ed with KQ_RETURN;
 //     bool Between(Place& place, Place& second)
-//         all below the first is done; sets the second, or returns false to pass it over;
+//         all below the first is done; sets the second, or returns false to skip it;
 //     void Leave(Place& place)
 //         all below is done.
-// Fails: std::bad_alloc.  Cost: O(places); memory for as many as wait for others at a time.
+// Fails: std::bad_alloc.  Cost: O(places); memory for the places that wait at one time.
 template <class Place, class Visitor>
 void KqWalk(Place place, Visitor&& visitor)
 {

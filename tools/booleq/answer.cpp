@@ -45,7 +45,7 @@ void SayRefusal(const Text& text, const Request& request, Output& output,
                           report.reason + "\n" +
                           MarkPlace(text.text, report.offset, report.length, "  ");
     if (report.hint.empty())
-        message.pop_back(); // the line end is Complain's
+        message.pop_back(); // Complain writes the line end
     else
         message += "  " + report.hint;
     Complain(output, message);
@@ -182,7 +182,7 @@ std::pair<std::string, std::string> JsonAroundArray(const Text& text, const Requ
     Json json = Envelope(text, request, status);
     json["result"] = result;
     const std::string line = JsonLine(json) + "\n";
-    // The array is the last thing but for the two objects' ends.
+    // Only the ends of the two objects come after the array.
     const size_t middle = line.rfind("[]") + 1;
     return {line.substr(0, middle), line.substr(middle)};
 }

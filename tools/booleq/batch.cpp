@@ -1,4 +1,4 @@
-// The command 'batch': a table of functions, CSV or JSON lines, line by line; never held as a
+// The command 'batch': a table of functions, CSV or JSON lines, line by line; it is never held as a
 // whole.
 #include "batch.h"
 
@@ -26,7 +26,7 @@ struct Line {
     size_t number;
 };
 
-// Some lines one after the other, in one piece of memory: a thread that frees what another one has
+// Some lines, one after another, in one piece of memory: a thread that frees what another one has
 // allocated waits for it.
 struct Lines {
     struct Place {
@@ -93,7 +93,7 @@ unsigned int ParseJobs(const Request& request)
     return static_cast<unsigned int>(std::stoul(text));
 }
 
-// What became of some lines, in their order.
+// The answers to some lines, in the order of the lines.
 struct Answered {
     struct Complaint {
         size_t end; // of the line's text
@@ -104,7 +104,7 @@ struct Answered {
     uint64_t counts[5] = {}; // by outcome
 };
 
-// One line after the other. It remembers what lines have in common.
+// Answers one line after another. It remembers what lines have in common.
 class Answering {
   public:
     Answering(const Request& request, const TableFormat& header)
@@ -136,7 +136,7 @@ class Answering {
     BatchRow m_row; // of the line answered last
 };
 
-// The lines of a table, read one after the other; empty ones and the header are no rows.
+// Reads the lines of a table, one after another; empty lines and the header are not rows.
 class TableReader {
   public:
     TableReader(const Request& request, Output& output)
@@ -231,7 +231,7 @@ void RunAlone(const Request& request, TableReader& reader, Answers& answers)
     }
 }
 
-// Some lines at a time for a thread; what they become keeps their order.
+// Answers some lines in one thread; the answers keep the order of the lines.
 Answered AnswerLines(const Lines& lines, const Request& request, const TableFormat& header)
 {
     std::optional<NoMessages> silence; // of the thread that answers
@@ -250,7 +250,7 @@ Answered AnswerLines(const Lines& lines, const Request& request, const TableForm
     return answered;
 }
 
-// At most so many groups of lines are in work at once, so that memory does not grow with the table.
+// Limits the groups of lines in work at once, so memory does not grow with the table.
 void RunTogether(const Request& request, unsigned int numJobs, TableReader& reader,
                  Answers& answers)
 {

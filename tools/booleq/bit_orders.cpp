@@ -11,7 +11,7 @@ namespace booleq {
 
 namespace {
 
-// Two columns; the digits of the second are made when those of the first are written.
+// Two columns; the digits of the second are made only after those of the first are written.
 void PutBoth(const char* label, const kq_logic::Function& msb, const kq_logic::Function& lsb,
              size_t width, std::string (kq_logic::Function::*digits)() const, Output& output)
 {

@@ -1,5 +1,5 @@
-// What a command is, and what it was asked to do. Commands stand in one table (commands.cpp); the
-// parser, the help, the man page and the completion are all made from it.
+// What a command is, and what it was asked to do. All commands are in one table (commands.cpp); the
+// parser, the help, the man page and the completion are made from it.
 #ifndef BOOLEQ_COMMAND_H
 #define BOOLEQ_COMMAND_H
 
@@ -13,7 +13,7 @@
 
 namespace booleq {
 
-// The command line makes no sense; the text says why and what to write.
+// The command line makes no sense; the text says why, and what to write instead.
 class UsageError : public std::runtime_error {
   public:
     using std::runtime_error::runtime_error;
@@ -29,13 +29,13 @@ struct Command;
 
 struct Request {
     const Command* command = nullptr;
-    // With lines, the operands after the text; otherwise the text is the first.
+    // With lines, all operands besides the texts; otherwise the text comes first.
     std::vector<std::string> operands;
     bool hasLines = false; // "-" or --file: texts are the lines of 'file'
     std::string file;      // "-" is standard input
     Reading reading;
     bool json = false;
-    bool debug = false;                        // the library's diagnostics are let through
+    bool debug = false;                        // lets the library's diagnostics through
     std::map<std::string, std::string> values; // of the command's own options that were given
 
     bool Has(const std::string& option) const { return values.count(option) != 0; }
@@ -48,15 +48,15 @@ struct Request {
 };
 
 struct Command {
-    const char* name;     // of a group two words: "netlist diff"
+    const char* name;     // two words for a group: "netlist diff"
     const char* operands; // "EQUATION NAME=VALUE..."
-    size_t minOperands;   // the text included
+    size_t minOperands;   // including the text
     size_t maxOperands;
     const char* summary; // one line without a full stop
-    const char* text;    // what else there is to know, in lines of at most 90 characters
+    const char* text;    // everything else to know, in lines of at most 90 characters
     std::vector<Option> options;
     std::vector<const char*> examples; // whole command lines
-    // Answers on 'output', complaints on standard error; the exit status out.
+    // Writes answers to 'output', complaints to standard error; returns the exit status.
     // Fails: UsageError; IoError.
     int (*run)(const Request& request, Output& output);
     bool takesFiles = false; // the operands are files, "-" among them, and no equation is read
@@ -64,16 +64,16 @@ struct Command {
 
 constexpr size_t kAnyNumber = static_cast<size_t>(-1);
 
-// In the order of the help; the first one is meant where no command is named.
+// In the order of the help; the first one is used when no command is named.
 const std::vector<Command>& Commands();
-// The command that the words begin with, and how many of them are its name; null for none.
+// The command that the words begin with, and how many of them are its name; null without one.
 const Command* FindCommand(const std::vector<std::string>& words, size_t& numWords);
-// The commands of a group, by its word ("netlist"); empty for a word that is none.
+// The commands of a group, by its word ("netlist"); empty when there is no such group.
 std::vector<const Command*> CommandsOfGroup(const std::string& word);
-// The command whose name is most like the word, a letter or two apart; null when none is. A word
-// that must be a command may be a short one, or a name's beginning.
+// The command whose name is most like the word, a letter or two apart; null without one. A word
+// that must be a command may be short, or the beginning of a name.
 const Command* NearestCommand(const std::string& word, bool isCommand);
-// Options that every command takes, or every one that takes files.
+// The options of every command, or of every command that takes files.
 const std::vector<Option>& CommonOptions(bool takesFiles);
 
 } // namespace booleq

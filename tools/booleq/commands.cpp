@@ -56,7 +56,7 @@ std::vector<const Command*> CommandsOfGroup(const std::string& word)
     return group;
 }
 
-// The number of letters to put in, take out, change or swap with the next one, after Damerau.
+// The number of letters to insert, delete, change or swap with the next one (Damerau).
 size_t EditDistance(const std::string& left, const std::string& right)
 {
     std::vector<std::vector<size_t>> distance(left.size() + 1,
@@ -80,7 +80,7 @@ size_t EditDistance(const std::string& left, const std::string& right)
 
 const Command* NearestCommand(const std::string& word, bool isCommand)
 {
-    const size_t minLength = isCommand ? 3 : 4; // shorter ones are names of inputs
+    const size_t minLength = isCommand ? 3 : 4; // shorter ones are the names of inputs
     constexpr size_t kMaxLength = 8;
     const Command* nearest = nullptr;
     size_t least = 3;

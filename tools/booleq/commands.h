@@ -1,4 +1,4 @@
-// The commands, each in a file of its own name; commands.cpp puts them into the table.
+// The commands, each in the file of its name; commands.cpp puts them into the table.
 #ifndef BOOLEQ_COMMANDS_H
 #define BOOLEQ_COMMANDS_H
 

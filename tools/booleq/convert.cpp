@@ -1,5 +1,4 @@
-// The command 'convert': an equation as text of another notation, proved equal before it is
-// printed.
+// The command 'convert': an equation in another notation, proved equal before it is printed.
 #include <cassert>
 
 #include <kq_logic/convert.h>
@@ -28,7 +27,7 @@ const Target& ParseTarget(const std::string& word)
     return *target;
 }
 
-// A word that every target takes for the name of what is put around an expression.
+// A word that every target accepts as the name of the unit around an expression.
 std::string ParseUnit(const Request& request, const Target& target)
 {
     const std::string name = request.Get("--name");
@@ -67,7 +66,7 @@ Json ToJson(const Request& request, const kq_logic::Conversion& conversion)
 
 void PutText(const kq_logic::Conversion& conversion, Output& output)
 {
-    // An expression alone must stay one, without a comment.
+    // A bare expression must stay one, so nothing is added as a comment.
     if (!conversion.saysNames)
         for (const auto& change : ChangedNames(conversion.inputs, conversion.names))
             Complain(output, "note: " + Visible(change.first) + " is written " + change.second);
@@ -77,7 +76,7 @@ void PutText(const kq_logic::Conversion& conversion, Output& output)
     output.Put(conversion.text);
 }
 
-// The short form in place of the equation, over the same inputs.  Fails: why there is none.
+// Sets the equation to its short form over the same inputs.  Fails: why there is none.
 std::string Shorten(Kq_BoolEquation& equation)
 {
     const size_t numInputs = equation.GetNumVariables();

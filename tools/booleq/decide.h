@@ -1,5 +1,5 @@
-// What commands that decide share: their options, what is shown meanwhile, and files of clauses and
-// of proofs.
+// What the commands that decide share: their options, what is shown during the work, and files of
+// clauses and proofs.
 #ifndef BOOLEQ_DECIDE_H
 #define BOOLEQ_DECIDE_H
 
@@ -12,15 +12,15 @@
 
 namespace booleq {
 
-// "--seconds": where a decision must not take forever.
+// "--seconds": for commands whose decision must not take forever.
 Option SecondsOption();
 // "--cnf" and "--proof".
 std::vector<Option> ClauseOptions();
 
-// What --seconds says; 'seconds' without it.  Fails: UsageError.
+// The value of --seconds; 'seconds' without it.  Fails: UsageError.
 double ParseSeconds(const Request& request, double seconds);
 
-// Says on a terminal for how long something is being decided or searched for, as long as it lives.
+// While it exists, shows on a terminal how long something has been decided or searched for.
 // One at a time.
 class WorkingProgress {
   public:
@@ -29,7 +29,7 @@ class WorkingProgress {
     WorkingProgress(const WorkingProgress&) = delete;
     WorkingProgress& operator=(const WorkingProgress&) = delete;
 };
-// What 'work' gives back, with that meanwhile.
+// Returns the result of 'work', and shows this meanwhile.
 template <class Work>
 auto Watched(const Work& work)
 {
@@ -37,13 +37,13 @@ auto Watched(const Work& work)
     return work();
 }
 
-// Fails: UsageError, when a file is asked for that cannot be: of many lines, or a proof from a
-// build without a solver. To be called first.
+// Fails: UsageError, when a file is asked for that cannot be written: for many lines, or a proof in
+// a build without a solver. To be called first.
 void CheckClauseOptions(const Request& request);
-// Writes the files that are asked for. 'verdict' is what was decided about the question; only
-// kq_logic::Verdict::Equal, nothing satisfies the clauses, can be proved. Gives back a status:
-// kDone, or kUndecided when the proof was not finished in time, and there is no file then. Fails:
-// IoError.
+// Writes the files that are asked for. 'verdict' is the decision about the question; only
+// kq_logic::Verdict::Equal, meaning that nothing satisfies the clauses, can be proved. Returns a
+// status: kDone, or kUndecided when the proof was not finished in time, and then there is no file.
+// Fails: IoError.
 int WriteClauses(const Request& request, Output& output, const Cnf& cnf, kq_logic::Verdict verdict,
                  double seconds);
 // Whether any file is asked for.
@@ -57,19 +57,19 @@ inline bool IsDifferent(const kq_logic::Decision& decision)
 {
     return decision.verdict == kq_logic::Verdict::Different;
 }
-// The assignment that differs, as a row number.  Requires: Different, at most 64 inputs.
+// The assignment that makes a difference, as a row number.  Requires: Different, at most 64 inputs.
 uint64_t RowOf(const kq_logic::Decision& decision);
 
 // "not decided in 10 seconds"
 std::string NotDecidedIn(double seconds);
 // The same, or "not decided: " and the reason.
-// Requires: the decision is undecided, and so many seconds were allowed.
+// Requires: the decision is undecided, and this many seconds were allowed.
 std::string UndecidedText(const kq_logic::Decision& decision, double seconds);
 // Name and value of each input.
 Json AssignmentJson(const std::vector<std::string>& inputs, const std::vector<bool>& values);
-// "first at row 4 of 8", or what else is known of it.
+// "first at row 4 of 8", or whatever else is known about it.
 std::string PlaceText(const kq_logic::Decision& decision);
-// The row number, null for more inputs than a row number is given for.
+// The row number; null when there are too many inputs for one.
 Json RowJson(const kq_logic::Decision& decision);
 
 } // namespace booleq

@@ -1,4 +1,4 @@
-// The command 'equal': are two equations the same function.
+// The command 'equal': whether two equations are the same function.
 #include <algorithm>
 
 #include "commands.h"

@@ -38,8 +38,8 @@ std::vector<Assignment> ParseAssignments(const Request& request)
     return assignments;
 }
 
-// What keeps the assignments from being one value for each input; empty when nothing does. One of
-// many lines need not have all the inputs; those that it has go to 'assigned'.
+// Why the assignments do not give one value for each input; empty when they do. One of many lines
+// need not have all the inputs; those that it has are added to 'assigned'.
 std::string Assign(Kq_BoolEquation& equation, const std::vector<Assignment>& assignments,
                    bool isLine, std::set<std::string>& assigned)
 {

@@ -57,7 +57,7 @@ std::string Lines(const std::vector<Option>& options)
     return text;
 }
 
-// Text for roff: nothing in it is a request or an escape.
+// Text for roff, with nothing in it that roff would read as a request or an escape.
 std::string Roff(const std::string& text)
 {
     std::string roff;
@@ -208,7 +208,7 @@ std::string ManPage()
     return roff + ".SH EXIT STATUS\n" + RoffVerbatim(kStatuses);
 }
 
-// The words of 'words' that are in no other place before, with blanks between them.
+// The distinct words of 'words', in order of first occurrence, with blanks between them.
 std::string Once(const std::vector<std::string>& words)
 {
     std::vector<std::string> once;
@@ -218,7 +218,7 @@ std::string Once(const std::vector<std::string>& words)
     return Join(once, " ");
 }
 
-// What the completion knows of the commands: patterns of a case with what to do.
+// What the completion knows about the commands: the patterns of a case and what to do for each.
 struct CompletionCases {
     std::vector<std::string> firstWords;
     std::string groups;      // a group and the words that follow it

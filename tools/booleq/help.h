@@ -10,12 +10,12 @@
 namespace booleq {
 
 // The answer to a command line without a command: --help, --version, --man-page, --completion.
-// False when it is none of them.
+// False for any other.
 bool AnswerForTool(const std::vector<std::string>& arguments, std::string& answer);
 
 std::string ToolHelp();
 std::string CommandHelp(const Command& command);
-// What commands a group has.  Requires: there is one with this word.
+// The commands of a group.  Requires: a group of this name.
 std::string GroupHelp(const std::string& word);
 std::string ManPage(); // roff, for section 1
 std::string BashCompletion();

@@ -12,7 +12,7 @@ namespace {
 constexpr size_t kMargin = 20;
 constexpr size_t kLine = 26; // from one bar to the next
 constexpr size_t kBarHeight = 18;
-constexpr size_t kBarLength = 320; // of the longest
+constexpr size_t kBarLength = 320; // length of the longest
 constexpr size_t kNumberWidth = 110;
 constexpr size_t kMaxLabel = 60; // characters
 
@@ -48,7 +48,7 @@ void PutHistograms(const std::vector<Histogram>& histograms, Output& output)
         output.Put(SvgText(kMargin, y + kBarHeight - 4, "start", histogram.title));
         y += kLine;
         for (const Bar& bar : histogram.bars) {
-            // A number that is not 0 shows.
+            // A number that is not 0 is always visible.
             const auto length = static_cast<size_t>(static_cast<double>(bar.number) * kBarLength /
                                                     static_cast<double>(most));
             output.Put(SvgNote(left - kCharacterWidth, y + kBarHeight - 4, "end", Label(bar)));

@@ -20,7 +20,7 @@ struct Histogram {
     std::vector<Bar> bars;
 };
 
-// One below the other. The longest bar of each is as long as there is room.
+// One below the other. The longest bar of each takes all the room there is.
 void PutHistograms(const std::vector<Histogram>& histograms, Output& output);
 
 } // namespace booleq

@@ -1,4 +1,4 @@
-// The command 'init': init values in both orders of counting, and what reads back.
+// The command 'init': init values in both bit orders, and which texts read back.
 #include <algorithm>
 
 #include <kq_logic/permute.h>
@@ -13,13 +13,13 @@ namespace booleq {
 
 namespace {
 
-// Above, the digits are too long to be one text in JSON.
+// With more inputs, the digits are too long for one text in JSON.
 constexpr size_t kMaxJsonInputs = 24;
 
-// One of the two orders of counting. The digits are made when they are written: with 30 inputs
-// they are 256 MB and 1 GB.
+// One of the two bit orders. The digits are made only when they are written: with 30 inputs they
+// are 256 MB and 1 GB.
 struct Order {
-    const kq_logic::Function& column; // as somebody sees it who counts so
+    const kq_logic::Function& column; // as seen by somebody who counts this way
     bool lsbFirst;
 };
 
@@ -35,7 +35,7 @@ bool ReadsBack(const kq_logic::Function& function, const std::string& text, bool
     Kq_BoolEquation equation;
     kq_logic::Function read;
     kq_logic::Function inOrder;
-    // Over a name like 'a'+b the library reads the inputs of the expression that it stands for.
+    // For a name like 'a'+b the library reads the inputs of the expression that it stands for.
     if (!SetVerbatim(equation, text, reading) || !read.Set(equation) ||
         read.NumInputs() != function.NumInputs() ||
         !kq_logic::Permute(read, function.Inputs(), inOrder).empty() || inOrder != function)
@@ -51,7 +51,7 @@ std::string Names(const kq_logic::Function& function)
     return Visible(Join(function.Inputs(), ", "));
 }
 
-// The digits are printed in full once.
+// The digits are printed in full only once.
 std::string Shortened(const std::string& digits)
 {
     return digits.size() <= 40 ? digits : digits.substr(0, 40) + "...";
@@ -147,7 +147,7 @@ Json AsJson(const Order& msb, const Order& lsb)
 }
 
 // The picture: the table with its rows from the top, the digits below it to the right, and an arrow
-// from each row to its digit. Arrows do not cross, as the highest row stands first in the text.
+// from each row to its digit. Arrows do not cross, because the highest row comes first in the text.
 constexpr size_t kMargin = 20;
 constexpr size_t kRowHeight = 24;
 constexpr size_t kRowNumberWidth = 64;
@@ -155,7 +155,7 @@ constexpr size_t kResultWidth = 64;
 constexpr size_t kDigitWidth = 24;
 constexpr size_t kTableTop = 110;
 
-// Where the column of each input begins, and after them that of the result.
+// Where the column of each input begins and, after these, that of the result.
 std::vector<size_t> ColumnPlaces(const kq_logic::Function& function)
 {
     std::vector<size_t> places = {kMargin + kRowNumberWidth};
@@ -199,7 +199,7 @@ void PutPictureTable(const kq_logic::Function& function, const std::vector<size_
     }
 }
 
-// The digits of both bases below each other, from 'left' and 'top' on.
+// The digits of both bases, one below the other, starting at 'left' and 'top'.
 void PutPictureDigits(const kq_logic::Function& function, size_t left, size_t top, Output& output)
 {
     const size_t numRows = function.NumRows();

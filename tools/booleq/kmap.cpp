@@ -1,5 +1,5 @@
 // The command 'kmap': the Karnaugh map of up to six inputs, as text and as SVG. Rows and columns
-// stand in Gray code: neighbours differ in one input.
+// are in Gray code: neighbours differ in one input.
 #include "answer.h"
 #include "commands.h"
 #include "map.h"

@@ -19,8 +19,8 @@ namespace {
 
 constexpr size_t kBufferBytes = 65536;
 
-// What is there, one byte at least; fread would wait until the buffer is full.
-// Fails: 0 at the end, -1.
+// Reads what is available, at least one byte; fread would wait until the buffer is full.
+// Fails: 0 at the end; -1.
 long ReadSome(int file, std::vector<char>& buffer)
 {
 #ifdef _WIN32

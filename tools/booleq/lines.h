@@ -1,4 +1,4 @@
-// Lines of any length from a file or standard input; only memory bounds them.
+// Lines of any length from a file or standard input; only memory limits them.
 #ifndef BOOLEQ_LINES_H
 #define BOOLEQ_LINES_H
 
@@ -9,7 +9,7 @@
 
 namespace booleq {
 
-// What some programs put before the first line of a file, and at the end of each.
+// Some programs put these before the first line of a file, and at the end of each line.
 void DropByteOrderMark(std::string& line);
 void DropCarriageReturn(std::string& line);
 
@@ -23,12 +23,12 @@ class LineReader {
     LineReader(const LineReader&) = delete;
     LineReader& operator=(const LineReader&) = delete;
 
-    // The next line without its line feed; a last line needs none. NUL bytes and carriage returns
-    // are handed on. It waits for the end of this line only, not for what follows in a pipe.
+    // The next line without its line feed; the last line needs none. NUL bytes and carriage returns
+    // are kept. It waits only for the end of this line, not for what follows in a pipe.
     // Fails: false after the last line; IoError when the stream cannot be read.
     bool Next(std::string& line);
 
-    // Bytes read so far, and in all; 0 in all when nobody knows (a pipe).
+    // Bytes read so far, and in all; 0 in all when the size is unknown (a pipe).
     uint64_t GetPosition() const { return m_num_read - (m_end - m_position); }
     uint64_t GetSize() const { return m_size; }
 

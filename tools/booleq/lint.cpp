@@ -1,4 +1,5 @@
-// The command 'lint': who reads the text as another function, and where the library surprises.
+// The command 'lint': which tools read the text as another function, and where the library
+// surprises.
 #include "lint.h"
 
 #include "commands.h"
@@ -11,7 +12,7 @@ namespace {
 
 constexpr double kDefaultSeconds = 10; // for each reader
 
-// The parts of a difference as lines, the same for notations that read alike.
+// A difference as lines; notations that read the text alike share them.
 std::string DifferenceText(const LintReport& report, const ForeignReading& reading)
 {
     const auto line = [](const std::string& label, const std::string& value) {
@@ -34,7 +35,7 @@ std::string DifferenceText(const LintReport& report, const ForeignReading& readi
 
 void PutDifferences(const LintReport& report, Output& output)
 {
-    std::vector<std::pair<std::string, std::string>> groups; // notations, and their lines
+    std::vector<std::pair<std::string, std::string>> groups; // notations and their lines
     for (const ForeignReading& reading : report.readings) {
         if (!reading.isRead || reading.decision.IsEqual())
             continue;

@@ -1,6 +1,6 @@
 // booleq: explains and compares Boolean equations on a terminal or in a pipe.
-// Command line, file or standard input in; answers on standard output, complaints on standard
-// error, one of the statuses of status.h out.
+// Reads the command line, a file or standard input; writes answers to standard output and
+// complaints to standard error; returns one of the statuses of status.h.
 #include <csignal>
 #include <cstdio>
 #include <new>
@@ -11,7 +11,7 @@
 #include <io.h>
 
 extern "C" int _dowildcard;
-int _dowildcard = 0; // an argument is an equation: its * names no files
+int _dowildcard = 0; // an argument is an equation: a * in it is not a wildcard
 #else
 #include <clocale>
 #include <cstring>
@@ -50,7 +50,7 @@ int Run(const std::vector<std::string>& arguments, Output& output)
     }
     if (!line.note.empty())
         Complain(output, line.note);
-    std::optional<NoMessages> silence; // whoever types an equation gets a reason instead
+    std::optional<NoMessages> silence; // the user gets a reason instead
     if (!line.request.debug)
         silence.emplace();
     WarnAboutInputs(line.request.reading, output);
@@ -66,11 +66,11 @@ int Fail(const char* message, const char* more = "")
 void PrepareProcess()
 {
 #ifdef _WIN32
-    // The same bytes as elsewhere: a line feed stays one byte, and a control-Z ends nothing.
+    // The same bytes as on other systems: a line feed stays one byte, and a control-Z ends nothing.
     for (std::FILE* stream : {stdin, stdout, stderr})
         _setmode(_fileno(stream), _O_BINARY);
 #else
-    std::signal(SIGPIPE, SIG_IGN); // writing fails then, and the end is an orderly one
+    std::signal(SIGPIPE, SIG_IGN); // writing fails instead, and the process ends in order
     std::setlocale(LC_CTYPE, "");
     if (std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0)
         ShowUtf8([](uint32_t character) {
@@ -95,7 +95,7 @@ int main(int argc, char** argv)
         output.Flush();
         return status;
     } catch (const ReaderGone&) {
-        return kDone; // it has what it wanted
+        return kDone; // the reader has what it wanted
     } catch (const UsageError& error) {
         return Fail(error.what(), "\nTry 'booleq --help'.");
     } catch (const std::bad_alloc&) {

@@ -16,7 +16,7 @@ void PutMapText(const Map& map, size_t cellWidth,
     const std::string margin(width - rowNames.size(), ' ');
     output.Put(std::string(width, ' ') + "  " + map.ColumnNames() + "\n");
     const auto putLine = [&](std::string line, const auto& at) {
-        size_t numBlanks = 0; // not written at the end of a line
+        size_t numBlanks = 0; // dropped at the end of a line
         for (size_t column = 0; column < map.NumColumns(); ++column) {
             const MapCell cell = at(column);
             line += std::string(numBlanks + 2, ' ') + cell.text;

@@ -1,4 +1,4 @@
-// A Karnaugh map (karnaugh_map.h) as text and as a picture. What stands in a cell is the caller's.
+// A Karnaugh map (karnaugh_map.h) as text and as a picture. The caller decides what is in a cell.
 #ifndef BOOLEQ_MAP_H
 #define BOOLEQ_MAP_H
 
@@ -11,12 +11,12 @@
 
 namespace booleq {
 
-// What stands in a cell of text, and how many columns of a terminal it takes.
+// The contents of a cell as text, and how many columns of a terminal they take.
 struct MapCell {
     std::string text;
     size_t width;
 };
-// Cells stand 'cellWidth' apart, as wide as a column's label at least.
+// Cells are 'cellWidth' apart.  Requires: a width of at least that of a column's label.
 void PutMapText(const Map& map, size_t cellWidth,
                 const std::function<MapCell(size_t row, size_t column)>& cellAt, Output& output);
 

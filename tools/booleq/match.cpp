@@ -1,4 +1,4 @@
-// The command 'match': are two functions one up to the order of inputs, or up to inversions.
+// The command 'match': whether two functions are one up to the order of inputs or inversions.
 #include <algorithm>
 #include <cassert>
 
@@ -14,7 +14,7 @@ namespace booleq {
 
 namespace {
 
-// A, B, C, ... for an init value whose inputs nobody has named.
+// A, B, C, ... for an init value whose inputs have no names.
 std::vector<std::string> LetterNames(size_t count)
 {
     std::vector<std::string> names;
@@ -24,7 +24,7 @@ std::vector<std::string> LetterNames(size_t count)
     return names;
 }
 
-// The number of inputs of an init value that names none; kMaxFunctionInputs + 1 for another text.
+// The number of inputs of an init value without names; kMaxFunctionInputs + 1 for any other text.
 size_t WidthOf(const std::string& text)
 {
     if (IsSizedLiteral(text)) {
@@ -37,7 +37,7 @@ size_t WidthOf(const std::string& text)
     return width.numRows > 0 ? width.numInputs : kMaxFunctionInputs + 1;
 }
 
-// Whether the text is an init value over the inputs listed.
+// Whether the text is an init value over the listed inputs.
 bool IsInitOver(const std::string& text, const Reading& reading)
 {
     Kq_BoolEquation equation;
@@ -45,8 +45,9 @@ bool IsInitOver(const std::string& text, const Reading& reading)
            SetFromText(equation, text, reading) && !equation.IsExpression();
 }
 
-// The inputs that --inputs names, or --second-inputs for the second. An init value gets letters
-// when none are listed, or when the list is for the other one. Anything else is read as usual.
+// Sets the function over the inputs of --inputs, or of --second-inputs for the second text. An init
+// value gets letters when none are listed, or when the list is for the other text. Anything else is
+// read as usual.
 bool SetNamed(const Text& text, const Request& request, bool isListForOther, Output& output,
               kq_logic::Function& function)
 {
@@ -61,7 +62,7 @@ bool SetNamed(const Text& text, const Request& request, bool isListForOther, Out
     return SetFunction(text, lettered, output, function);
 }
 
-// The same for the second, whose inputs may have names of their own.
+// The request for the second text, whose inputs may have their own names.
 Request ForSecond(const Request& request)
 {
     Request second(request);
@@ -75,7 +76,7 @@ Request ForSecond(const Request& request)
     return second;
 }
 
-// "order" or "inversions"; null: no match. One by order alone is found before any other.
+// "order" or "inversions"; null: no match. A match by order alone is found before any other.
 const char* LevelOf(const kq_logic::Matching& matching)
 {
     if (!matching.isFound)

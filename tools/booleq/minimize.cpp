@@ -19,7 +19,7 @@ namespace booleq {
 namespace {
 
 const char* const kDefaultTarget = "primary";
-constexpr Limits kReadingLimits = {10}; // for reading a written equation again
+constexpr Limits kReadingLimits = {10}; // for reading a written equation back
 
 struct Format {
     bool isPla = false;
@@ -182,7 +182,7 @@ void CheckFormat(const Format& format, const SumOptions& options, const Pla& tab
                          std::to_string(table.outputs.size()) + "; --to map shows all");
 }
 
-// Counts how often the search asks; that it asks is what shows that it is alive.
+// Counts the search's calls: that it calls at all shows that it is alive.
 Progress* shownProgress = nullptr;
 uint64_t numAsked = 0;
 
@@ -195,7 +195,7 @@ void ShowProgress()
 int RunMinimize(const Request& request, Output& output)
 {
     const SumOptions options = ParseOptions(request);
-    ParseFormat(request, false); // a wrong word is said before any work
+    ParseFormat(request, false); // a wrong word is reported before any work
     Work work;
     MinimizeInput input;
     Progress progress("minimising, steps", 0);

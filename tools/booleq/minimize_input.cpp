@@ -15,7 +15,7 @@ bool IsFile(const std::string& path)
     std::FILE* stream = std::fopen(path.c_str(), "rb");
     if (!stream)
         return false;
-    const bool canRead = std::fgetc(stream) != EOF || !std::ferror(stream); // no folder
+    const bool canRead = std::fgetc(stream) != EOF || !std::ferror(stream); // false for a folder
     std::fclose(stream);
     return canRead;
 }
@@ -30,7 +30,7 @@ std::string WholeFile(const std::string& path)
     return text;
 }
 
-// The first line that has more than blanks and a comment.
+// The first line that has something other than blanks and a comment.
 std::string FirstLine(const std::string& text)
 {
     size_t begin = 0;
@@ -111,7 +111,7 @@ class EquationReader {
 
     bool IsEmpty() const { return m_outputs.empty(); }
 
-    // Fails: false, and the refusal has been said.
+    // Fails: false, and the refusal has been printed.
     bool MakeTable(Work& work, MinimizeInput& input)
     {
         for (size_t index = 0; index < m_outputs.size(); ++index)

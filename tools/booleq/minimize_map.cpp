@@ -13,7 +13,7 @@ const char* const kColours[] = {"#1f6fb2", "#c0392b", "#2e8b57", "#8e44ad", "#d3
 constexpr size_t kNumColours = 6;
 constexpr int kAnsiColours[kNumColours] = {34, 31, 32, 35, 33, 36};
 
-// The cells of one output: in the map's row and column order.
+// The cells of one output, in the map's order of rows and columns.
 struct Cells {
     Cells(const Pla& itsTable, const Sum& sum, size_t itsOutput)
         : table(itsTable), output(itsOutput), map(itsTable.inputs)
@@ -106,8 +106,8 @@ void PutTextMap(const Cells& cells, bool isColoured, Output& output)
                    TermText(cells.table, cells.terms[term]) + "\n");
 }
 
-// Runs of places that a term has along one side, as [first, last]; one that goes over the edge is
-// two.
+// The runs of cells that a term has along one side, as [first, last]; a run that wraps around the
+// edge becomes two.
 std::vector<std::pair<size_t, size_t>> Runs(size_t numPlaces, const std::vector<bool>& isIn)
 {
     std::vector<std::pair<size_t, size_t>> runs;

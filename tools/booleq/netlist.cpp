@@ -15,14 +15,14 @@ namespace booleq {
 
 namespace {
 
-// A file that is not there is no matter of its content. It is not opened here: a pipe is read once.
+// A missing file is not a refusal of its contents. It is not opened here: a pipe is read once.
 void CheckFile(const std::string& file)
 {
     if (file != "-" && access(file.c_str(), R_OK) != 0)
         throw IoError("cannot read " + Visible(file), errno);
 }
 
-// 0 where nobody knows.
+// 0 when the size is unknown.
 uint64_t SizeOf(const std::string& file)
 {
     std::error_code error;

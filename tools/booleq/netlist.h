@@ -1,4 +1,4 @@
-// What the commands 'netlist ...' share: their options, and reading a file as the request says.
+// What the 'netlist ...' commands share: their options, and reading a file as the request says.
 #ifndef BOOLEQ_NETLIST_H
 #define BOOLEQ_NETLIST_H
 
@@ -13,25 +13,25 @@
 
 namespace booleq {
 
-// What stands for the equation of a function that has no short one.
+// Stands for the equation of a function that has no short one.
 constexpr char kNoExpression[] = "(no expression short enough)";
 
 // --cells and --top.
 std::vector<Option> NetlistOptions();
 
-// The cell types that are known, with those of --cells.
+// The known cell types, with those of --cells.
 // Fails: UsageError for a file that cannot be read or is not such a table.
 CellTypes CellTypesOf(const Request& request);
 
-// Fails: IoError, for an operand that is a file and cannot be opened.
+// Fails: IoError, for a file operand that cannot be opened.
 void CheckFiles(const Request& request);
 
-// Reads a netlist; shows how far it is, on a terminal.
-// Fails: false, and the refusal has been said or answered: return kRefused. IoError, when the file
-// cannot be opened.
+// Reads a netlist; on a terminal, shows how far it has got.
+// Fails: false, and the refusal has been printed or answered: return kRefused. IoError, when the
+// file cannot be opened.
 bool ReadNetlist(const std::string& file, const Request& request, const CellTypes& cellTypes,
                  const std::string& keyAttribute, Output& output, Design& design);
-// Two of them, at once where there are two processors.
+// Reads two of them, at the same time where there are two processors.
 bool ReadNetlists(const Request& request, const CellTypes& cellTypes,
                   const std::string& keyAttribute, Output& output, Design& left, Design& right);
 

@@ -1,4 +1,4 @@
-// The command 'netlist check': what is odd about look-up tables, a line for each finding.
+// The command 'netlist check': what is odd about look-up tables, one line for each finding.
 #include <memory>
 
 #include "commands.h"
@@ -41,7 +41,7 @@ std::vector<SarifRule> RulesForSarif()
     return rules;
 }
 
-// Goes to its ways out as it is found: there may be very many.
+// Writes each finding as soon as it is found: there may be very many.
 class FindingsOut {
   public:
     FindingsOut(const std::string& file, const Request& request, Output& output)
@@ -53,7 +53,7 @@ class FindingsOut {
 
     uint64_t Put(const Design& design)
     {
-        // The status stands before the findings, so whether there are any is asked first.
+        // The status comes before the findings, so whether there are any is asked first.
         std::pair<std::string, std::string> around;
         if (m_request.json) {
             around = AroundFindings(design);

@@ -1,5 +1,4 @@
-// The command 'netlist diff': whether every look-up table of a netlist is still the function it
-// was.
+// The command 'netlist diff': whether every look-up table of a netlist is still the same function.
 #include <algorithm>
 
 #include "cause_text.h"
@@ -27,7 +26,7 @@ NetId ParseOpen(const Request& request)
     return word == "0" ? kNetZero : kNetOne;
 }
 
-// Lines of two names; '#' begins a comment.
+// Lines of two names each; '#' begins a comment.
 Renames ReadRenames(const std::string& file)
 {
     Renames renames;
@@ -300,7 +299,7 @@ int RunDiff(const Request& request, Output& output)
     options.names = ParseNames(request);
     options.followsWires = request.Has("--allow-wires");
     if (request.Has("--rows"))
-        ParseRows(request.Get("--rows")); // wrong usage shows before any work
+        ParseRows(request.Get("--rows")); // wrong usage is reported before any work
     if (request.Has("--key") && request.Get("--key").empty())
         throw UsageError("--key needs the name of an attribute");
     if (request.Has("--open"))

@@ -75,7 +75,7 @@ bool MatchesGlob(const std::string& glob, const std::string& text)
     return place == glob.size();
 }
 
-// What is asked for of --cell and --net.
+// What --cell and --net ask for.
 class Filter {
   public:
     explicit Filter(const Request& request)
@@ -108,11 +108,11 @@ struct ListedTable {
     std::string type;
     std::string output;
     std::vector<std::string> pins; // nets, the most significant pin first
-    std::string equation;          // empty where there is none
+    std::string equation;          // empty when there is none
     std::string kind;
     std::string meaning;
-    std::string init;    // the first pin of 'pins' being the most significant
-    std::string lsbInit; // the first one being the least significant
+    std::string init;    // with the first of 'pins' as the most significant
+    std::string lsbInit; // with the first one as the least significant
 };
 
 class Lister {
@@ -137,7 +137,7 @@ class Lister {
     }
 
   private:
-    // The functions of the tables that are asked for, each once, by all processors.
+    // The texts for the functions of the tables asked for, each made once, by all processors.
     void PrepareTexts()
     {
         std::vector<bool> isAsked;
@@ -150,7 +150,7 @@ class Lister {
             isAsked[m_found.function] = true;
         }
         m_texts.resize(m_functions.Functions().size());
-        constexpr size_t kPart = 16; // a millisecond or so
+        constexpr size_t kPart = 16; // about a millisecond
         RunInParts(m_texts.size(), kPart, LutWork(), [&](size_t begin, size_t end) {
             for (size_t function = begin; function < end; ++function)
                 if (function < isAsked.size() && isAsked[function])
@@ -252,13 +252,13 @@ class Lister {
     Filter m_filter;
     TableFunctions m_functions;
     TableFunctions::Found m_found;
-    std::vector<FunctionTexts> m_texts; // by function; those that are not asked for stay empty
+    std::vector<FunctionTexts> m_texts; // by function; empty for those not asked for
     std::vector<std::pair<std::string, std::string>> m_inits; // digits, by init value
 };
 
 int RunList(const Request& request, Output& output)
 {
-    ParseFormat(request); // wrong usage shows before any work
+    ParseFormat(request); // wrong usage is reported before any work
     ParseTarget(request);
     const CellTypes cellTypes = CellTypesOf(request);
     Design design;

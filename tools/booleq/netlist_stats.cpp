@@ -1,4 +1,4 @@
-// The command 'netlist stats': what a design is made of.
+// The command 'netlist stats': what a design consists of.
 #include <algorithm>
 
 #include "census.h"

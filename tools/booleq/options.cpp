@@ -17,8 +17,8 @@ bool IsOptionWord(const std::string& word)
     return word.size() > 1 && word[0] == '-' && (word[1] < '0' || word[1] > '9');
 }
 
-// What the parser left over: the operands, or a mistyped option. They are no positional option of
-// the parser because that would take "[A]" and "%%" for lists.
+// What the parser left over: the operands, or a mistyped option. They are not a positional option
+// of the parser, because it would read "[A]" and "%%" as lists.
 std::vector<std::string> TakeOperands(std::vector<std::string> extras)
 {
     // After "--" every word is an operand, whatever it begins with.
@@ -65,7 +65,7 @@ void CheckOperands(Request& request, bool hasFile)
     }
     if (command.takesFiles)
         return;
-    // In any place; a second one is a text like others.
+    // It may be in any place; a second one is a text like any other.
     const auto dash = std::find(operands.begin(), operands.end(), "-");
     if (dash == operands.end())
         return;
@@ -79,7 +79,7 @@ void CheckInputOptions(Request& request)
     Reading& reading = request.reading;
     const std::string list = request.Get("--inputs");
     reading.hasInputs = request.Has("--inputs");
-    // --from of permute is such a list, too.
+    // The --from of 'permute' is such a list too.
     if (!reading.hasInputs && !request.Has("--from") && (reading.lsbFirst || reading.reverse))
         throw UsageError("--lsb-first and --reverse say how --inputs is read: give --inputs");
     if (!reading.hasInputs)
@@ -91,7 +91,7 @@ void CheckInputOptions(Request& request)
         throw UsageError("--inputs has a single quote that is not closed: " + Excerpt(list));
 }
 
-// One option of the table in the parser; its value goes to the request when it is given.
+// An option of the table in the parser; its value goes to the request when it is given.
 struct ParsedOption {
     const Option* option = nullptr;
     std::string value;
@@ -135,7 +135,7 @@ void FillRequest(Request& request, const std::vector<ParsedOption>& entries)
 
 } // namespace
 
-// Which words of a group there are: "stats, list, check or diff".
+// The words of a group: "stats, list, check or diff".
 std::string GroupWords(const std::string& group)
 {
     std::vector<std::string> words;
@@ -163,7 +163,7 @@ std::string HelpFor(const std::vector<std::string>& arguments)
                      (nearest ? std::string("; the nearest is '") + nearest->name + "'" : ""));
 }
 
-// A word that begins commands without being one: which of them is not said.
+// A word that only begins the names of commands, without saying which of them.
 bool AnswerForGroup(const std::vector<std::string>& arguments, std::string& answer)
 {
     if (arguments.empty() || CommandsOfGroup(arguments.front()).empty())
@@ -186,7 +186,7 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
         return line;
     }
     Request& request = line.request;
-    // The first words only, so that a variable called like a command stays an equation elsewhere.
+    // Only the first words, so that elsewhere a variable named like a command stays an equation.
     size_t numNamed = 0;
     const Command* named = FindCommand(arguments, numNamed);
     request.command = named ? named : &Commands().front();
@@ -208,7 +208,7 @@ CommandLine ParseCommandLine(const std::vector<std::string>& arguments)
     for (ParsedOption& entry : entries)
         AddOption(app, entry);
 
-    // The parser takes its words from the back.
+    // The parser takes its words from the end.
     std::vector<std::string> words(arguments.rbegin(),
                                    arguments.rend() - static_cast<std::ptrdiff_t>(numNamed));
     try {

@@ -10,17 +10,17 @@
 
 namespace booleq {
 
-// The words of a command line, understood: either an answer that is ready, or a request.
+// The words of a command line after parsing: either a ready answer or a request.
 struct CommandLine {
     std::string answer; // not empty: the text of --help or --version, and nothing else to do
-    std::string note;   // not empty: said on standard error first
+    std::string note;   // not empty: print this on standard error first
     Request request;
 };
 
 // Fails: UsageError.
 CommandLine ParseCommandLine(const std::vector<std::string>& arguments);
 
-// A number of --rows: "all" is the highest.  Fails: UsageError.
+// The value of --rows: "all" is the highest number.  Fails: UsageError.
 uint64_t ParseRows(const std::string& text);
 
 } // namespace booleq

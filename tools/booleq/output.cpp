@@ -51,7 +51,7 @@ void Output::Flush()
 void Output::WriteBlock()
 {
     const std::string block = std::move(m_block);
-    m_block.clear(); // also when writing fails: it is not tried again
+    m_block.clear(); // even when writing fails: it is not tried again
     Write(block.data(), block.size());
 }
 

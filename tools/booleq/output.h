@@ -14,7 +14,7 @@ class IoError : public std::runtime_error {
     IoError(const std::string& what, int errorNumber);
 };
 
-// Whoever read the output has left, as 'head' does.
+// The reader of the output has gone away, as 'head' does.
 class ReaderGone : public IoError {
   public:
     explicit ReaderGone(int errorNumber) : IoError("cannot write standard output", errorNumber) {}
@@ -22,12 +22,12 @@ class ReaderGone : public IoError {
 
 class Output {
   public:
-    // 'name' is what a complaint calls it.
+    // 'name' is what complaints call it.
     explicit Output(std::FILE* stream, std::string name = "standard output");
     // Fails: IoError or ReaderGone, here or at the next call, when the stream takes no more.
     void Put(const std::string& text);
     void Put(const char* text, size_t length);
-    // Everything put so far has left this process afterwards.
+    // After this, everything put so far has left the process.
     void Flush();
 
   private:
@@ -40,8 +40,8 @@ class Output {
     std::string m_block;
 };
 
-// One line on standard error after "booleq: "; what was put before it is flushed first, so that
-// the two streams keep their order on a terminal.
+// Writes one line to standard error after "booleq: ". What was put before it is flushed first, so
+// that the two streams keep their order on a terminal.
 void Complain(Output& output, const std::string& message);
 
 } // namespace booleq

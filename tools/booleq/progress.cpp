@@ -13,7 +13,7 @@ namespace {
 constexpr auto kPatience = std::chrono::milliseconds(500);
 constexpr auto kPause = std::chrono::milliseconds(100);
 
-// Async-signal-safe calls only.
+// Only async-signal-safe calls.
 void Interrupted(int signal)
 {
     constexpr char kMessage[] = "\nbooleq: interrupted, the output is not complete\n";
@@ -57,7 +57,7 @@ void Progress::Write(uint64_t done)
 
 void HandleInterrupts()
 {
-    // What a parent told to ignore stays ignored.
+    // A signal that the parent ignored stays ignored.
     for (const int signal : {SIGINT, SIGTERM})
         if (std::signal(signal, Interrupted) == SIG_IGN)
             std::signal(signal, SIG_IGN);

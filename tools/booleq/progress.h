@@ -1,4 +1,4 @@
-// How far long work is, on a terminal only; and a clean end when it is interrupted.
+// Shows on a terminal how far long work has got, and ends cleanly when it is interrupted.
 #ifndef BOOLEQ_PROGRESS_H
 #define BOOLEQ_PROGRESS_H
 
@@ -9,10 +9,10 @@
 namespace booleq {
 
 // Writes "booleq: WHAT: 42%" over and over to standard error when that is a terminal and the work
-// takes longer than a moment; wipes it at the end.
+// takes longer than a moment; erases it at the end.
 class Progress {
   public:
-    // 'total' 0: unknown, the number itself is shown.
+    // 'total' 0: unknown, so the number itself is shown.
     Progress(std::string what, uint64_t total);
     ~Progress();
     Progress(const Progress&) = delete;
@@ -23,7 +23,7 @@ class Progress {
         if (m_is_terminal && done >= m_next)
             Write(done);
     }
-    // The same for work that counts slowly: the clock is asked each time.
+    // The same for work that counts slowly: the clock is read each time.
     void ShowNow(uint64_t done)
     {
         if (m_is_terminal)
@@ -35,15 +35,15 @@ class Progress {
 
     std::string m_what;
     uint64_t m_total;
-    uint64_t m_next = 0; // the clock is not asked below
+    uint64_t m_next = 0; // below this the clock is not read
     bool m_is_terminal;
     bool m_is_shown = false;
     std::chrono::steady_clock::time_point m_start;
     std::chrono::steady_clock::time_point m_written;
 };
 
-// From now on an interrupt says so and ends the process by its signal, so that a shell's loop
-// around it ends too.
+// From now on an interrupt prints a message and ends the process by its signal, so that a shell's
+// loop around it ends too.
 void HandleInterrupts();
 
 } // namespace booleq

@@ -21,7 +21,7 @@ std::FILE* OpenToWrite(const std::string& name)
     return stream;
 }
 
-// A path as a URI reference: what is not a letter, digit or "-._~/" stands as %XX.
+// A path as a URI reference: anything other than a letter, digit or "-._~/" is written as %XX.
 std::string UriOf(const std::string& path)
 {
     static constexpr char kDigits[] = "0123456789ABCDEF";
@@ -68,7 +68,7 @@ SarifFile::SarifFile(const std::string& file, std::vector<SarifRule> rules)
       m_output(m_stream, Visible(file))
 {
     const std::string text = JsonLine(Log(m_rules)) + "\n";
-    // The results are the last thing but for the ends of what they stand in.
+    // Only the ends of the objects around them come after the results.
     const size_t middle = text.rfind("[]") + 1;
     assert(middle != 0);
     m_output.Put(text.substr(0, middle));

@@ -1,5 +1,5 @@
-// Findings as SARIF 2.1.0, the form in which checkers hand them to other programs. They are written
-// one after the other, so that a million of them takes no memory.
+// Findings as SARIF 2.1.0, the form in which checkers pass them to other programs. They are written
+// one by one, so that a million of them takes no memory.
 #ifndef BOOLEQ_SARIF_H
 #define BOOLEQ_SARIF_H
 
@@ -19,7 +19,7 @@ struct SarifRule {
 };
 
 struct SarifResult {
-    size_t rule; // of the rules
+    size_t rule; // index of the rule
     std::string message;
     std::string file;
     uint32_t line;    // 0: none
@@ -35,7 +35,7 @@ class SarifFile {
     SarifFile& operator=(const SarifFile&) = delete;
 
     void Put(const SarifResult& result);
-    // The file is whole after this, and not before.
+    // The file is complete after this, and not before.
     void Finish();
 
   private:

@@ -1,4 +1,4 @@
-// The command 'sat': can an equation be 1, or is it always.
+// The command 'sat': whether an equation can be 1, or is always 1.
 #include <algorithm>
 
 #include "commands.h"
@@ -9,7 +9,7 @@ namespace booleq {
 
 namespace {
 
-// The question: is there an assignment for which the equation has the value that is looked for.
+// The question: whether the equation has the value looked for under some assignment.
 // Different answers yes, Equal no.
 bool IsYes(const kq_logic::Decision& decision, bool asksAlways)
 {

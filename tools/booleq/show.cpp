@@ -59,7 +59,7 @@ void PutInputs(const Kq_BoolEquation& equation, Output& output)
                      InputName(equation, numInputs - 1) + " the least; " + rows);
 }
 
-// An equation that has no table has no init value either; the reason is the same.
+// An equation without a table has no init value either, for the same reason.
 void PutMissingTable(const Kq_BoolEquation& equation, Output& output)
 {
     const unsigned int numInputs = equation.GetNumVariables();
@@ -77,7 +77,7 @@ void PutMissingTable(const Kq_BoolEquation& equation, Output& output)
     PutField(output, "truth table", reason);
 }
 
-// Straight from the library's text: with 30 inputs these are 256 MB and 1 GB.
+// Straight from the library's text: with 30 inputs it is 256 MB or 1 GB.
 void PutDigits(Output& output, const std::string& label, const Port::StringBase<char>& digits)
 {
     PutLabel(output, label);
@@ -108,7 +108,7 @@ unsigned int HighestRow(Kq_BoolEquation& equation)
     return equation.Eval();
 }
 
-// What a given init value leaves open, and where the printed one counts in another way.
+// Notes what a given init value leaves open, and where the printed one counts differently.
 void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& notes)
 {
     if (equation.GetNumVariables() == 0) {
@@ -126,7 +126,7 @@ void NoteInitValue(Kq_BoolEquation& equation, const Reading& reading, Notes& not
                         "reads back without --lsb-first");
 }
 
-// Renderings write no parentheses of their own, so some trees cannot be read back from them.
+// Renderings add no parentheses, so some trees cannot be read back from them.
 bool ReadsBack(const Kq_BoolEquation& equation, const Reading& reading)
 {
     Kq_BoolEquation again;
@@ -190,7 +190,7 @@ void ShowEquation(Kq_BoolEquation& equation, const Request& request, uint64_t ma
         PrintTable(equation, maxRows, output);
 }
 
-// Init values are null where the text answer leaves them out.
+// Init values are null where the text answer omits them.
 Json ShowAsJson(Kq_BoolEquation& equation, const Request& request)
 {
     const unsigned int numInputs = equation.GetNumVariables();

@@ -1,5 +1,5 @@
-// Exit statuses of the tool; scripts rely on these numbers. Where lines are answered one by one,
-// the highest status of any line is the tool's.
+// Exit statuses of the tool; scripts rely on these numbers. When lines are answered one by one, the
+// tool returns the highest status of any line.
 #ifndef BOOLEQ_STATUS_H
 #define BOOLEQ_STATUS_H
 

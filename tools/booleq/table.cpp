@@ -29,7 +29,7 @@ RowFormat ParseFormat(const Request& request)
     throw UsageError("--format is text, markdown, csv or json, not '" + Visible(format) + "'");
 }
 
-// Nobody fills a disk unawares.
+// Announces a large table, so that nobody fills a disk by accident.
 void AnnounceSize(const std::vector<std::string>& names, uint64_t maxRows, RowFormat format,
                   Output& output)
 {
@@ -68,8 +68,8 @@ int RunTable(const Request& request, Output& output)
 {
     const RowFormat format = ParseFormat(request);
     if (request.Has("--rows"))
-        ParseRows(request.Get("--rows")); // wrong usage shows before any answer
-    Request asJson = request;             // refusals are answered in the format asked for
+        ParseRows(request.Get("--rows")); // wrong usage is reported before any answer
+    Request asJson = request;             // refusals use the same format
     asJson.json = format == RowFormat::kJson;
     return ForEachText(asJson, output, [&](const Text& text) {
         kq_logic::Function function;

@@ -16,14 +16,14 @@ namespace {
 constexpr int kMaxJsonDepth = 100;
 constexpr size_t kNoColumn = static_cast<size_t>(-1);
 
-// Fields of one line of CSV. A line end inside a field is not accepted: one stray quote would
-// swallow the rest of the file.  Fails: false when a quote is not closed or has text after it.
+// Splits one line of CSV into fields. A line end inside a field is not accepted: one stray quote
+// would swallow the rest of the file.  Fails: false when a quote is not closed or text follows it.
 // Many programs end lines with a carriage return too.
 bool SplitCsv(const std::string& line, std::vector<std::string>& fields)
 {
     const size_t length = line.size() - (!line.empty() && line.back() == '\r' ? 1 : 0);
     size_t numFields = 0;
-    // The texts of the line before are written over, so that their memory serves again.
+    // The texts of the line before are overwritten, so that their memory is used again.
     const auto next = [&]() -> std::string& {
         if (numFields == fields.size())
             fields.emplace_back();
@@ -85,7 +85,7 @@ class CsvFormat : public TableFormat {
         if (fields.size() - m_num_columns == 3)
             throw UsageError("the first line of the table names its columns; none is called "
                              "inputs, equation or init");
-        // A table that was completed before has the column already.
+        // A table that was completed earlier already has the column.
         const auto result = std::find(fields.begin(), fields.end(), "result");
         m_result = static_cast<size_t>(result - fields.begin());
         if (result == fields.end())
@@ -102,7 +102,7 @@ class CsvFormat : public TableFormat {
         row.inputs.clear();
         row.equation.clear();
         row.init.clear();
-        m_fields.resize(m_num_columns); // what a bad row has stays in its columns
+        m_fields.resize(m_num_columns); // what a bad row has too much is dropped
         m_fields.resize(m_num_written);
         if (!isSplit)
             return Refused("a quote is not closed, or has more after it than a comma");
@@ -143,11 +143,11 @@ class CsvFormat : public TableFormat {
     }
 
   private:
-    // The names of a field.
+    // The names in a field.
     struct InputList {
         std::vector<std::string> inputs;
         std::string joined;
-        bool isClosed = true; // false: a quote is not
+        bool isClosed = true; // false: a quote is not closed
     };
 
     static InputList Split(const std::string& field)
@@ -165,7 +165,7 @@ class CsvFormat : public TableFormat {
             AppendCsvField(field, line);
             line += ',';
         }
-        line.pop_back(); // a header has a field at least
+        line.pop_back(); // a header has at least one field
     }
 
     size_t m_num_columns = 0; // of the file
@@ -173,21 +173,21 @@ class CsvFormat : public TableFormat {
     size_t m_equation = kNoColumn;
     size_t m_init = kNoColumn;
     size_t m_result = kNoColumn;
-    size_t m_num_written = 0;          // columns of what is written
-    std::vector<std::string> m_fields; // of the line read last
+    size_t m_num_written = 0;          // columns that are written
+    std::vector<std::string> m_fields; // of the last line read
     Recent<std::string, InputList> m_lists;
-    const InputList* m_list = nullptr; // of the line read last, where it was read so far
+    const InputList* m_list = nullptr; // of the last line read, once it has been split
 };
 
 class JsonFormat : public TableFormat {
   public:
-    JsonFormat() {} // not noexcept, as an empty Json need not be
+    JsonFormat() {} // not noexcept, because an empty Json need not be
 
     bool IsHeader(const std::string&, std::string&) override { return false; }
 
     BatchResult ReadRow(const std::string& line, BatchRow& row) override
     {
-        // The writer of JSON goes as deep as its reader was led.
+        // The JSON writer recurses as deep as its reader was led.
         bool isDeep = false;
         const auto keep = [&isDeep](int depth, Json::parse_event_t, Json&) {
             isDeep = isDeep || depth > kMaxJsonDepth;
@@ -251,7 +251,7 @@ class JsonFormat : public TableFormat {
         return true;
     }
 
-    Json m_json; // the line read last
+    Json m_json; // the last line read
 };
 
 } // namespace

@@ -1,5 +1,5 @@
 // Tables of functions, CSV or JSON lines: a line becomes a row, a row with its result becomes a
-// line. A format keeps the line read last, so each thread needs its own: Clone.
+// line. A format keeps the last line read, so each thread needs its own: Clone.
 #ifndef BOOLEQ_TABLE_FORMAT_H
 #define BOOLEQ_TABLE_FORMAT_H
 
@@ -19,9 +19,9 @@ class TableFormat {
     // True for a line that is not a row (a header); 'answer' is what to write for it.
     // Fails: UsageError for a header without any of the columns.
     virtual bool IsHeader(const std::string& line, std::string& answer) = 0;
-    // Sets all of the row; its texts' memory serves again.
+    // Sets all of the row; the memory of its texts is used again.
     virtual BatchResult ReadRow(const std::string& line, BatchRow& row) = 0;
-    // Appends the line read last with the row's members and the outcome, and a line end.
+    // Appends the last line read with the row's members and the outcome, and a line end.
     virtual void WriteRow(const std::string& line, const BatchRow& row, const BatchResult& result,
                           std::string& written) = 0;
     // Another one that knows the header.

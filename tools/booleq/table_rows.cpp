@@ -24,7 +24,7 @@ std::string ShownName(const std::vector<std::string>& names, size_t index)
     return fits ? name : "#" + std::to_string(index + 1);
 }
 
-// In Markdown a bar ends the cell.
+// In Markdown a bar would end the cell.
 std::string MarkdownCell(const std::string& name)
 {
     std::string cell;
@@ -37,7 +37,7 @@ std::string MarkdownCell(const std::string& name)
 struct RowShape {
     std::string header;
     std::string row;            // every digit a '0'
-    std::vector<size_t> digits; // where the digits of the inputs stand, then the result's
+    std::vector<size_t> digits; // places of the digits of the inputs, then of the result
     size_t numberWidth = 0;     // of the row number, right-aligned in front of the row
 };
 
@@ -153,7 +153,7 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
     if (numPrinted == 0)
         return;
     output.Put("\n");
-    // The packed column takes about the work of one evaluation for 64 rows.
+    // Filling the packed column costs about as much as one evaluation per 64 rows.
     Rows rows;
     if (numPrinted >= (uint64_t(1) << names.size()) / 64 && RowsOf(equation, rows)) {
         const auto valueAt = [&rows](uint64_t row) { return rows.At(row); };
@@ -164,7 +164,7 @@ void PrintTable(Kq_BoolEquation& equation, uint64_t maxRows, Output& output)
     for (const auto& variable : equation.GetVariables())
         handles.push_back(equation.GetVariableHandle(variable.first));
     const auto valueAt = [&](uint64_t row) {
-        for (size_t column = 0; column < handles.size(); ++column) // shift: below 30
+        for (size_t column = 0; column < handles.size(); ++column) // the shift is below 30
             equation.SetVariable(handles[column], (row >> (handles.size() - 1 - column)) & 1u);
         return equation.Eval() != 0;
     };
@@ -180,7 +180,7 @@ std::string CsvField(const std::string& text)
 
 void AppendCsvField(const std::string& text, std::string& line)
 {
-    bool isSpecial = false; // to the end without a branch, so that many are compared at once
+    bool isSpecial = false; // no branch before the end, so that many are compared at once
     for (const char character : text)
         isSpecial |= character == ',' || character == '"' || character == '\r' || character == '\n';
     if (!isSpecial) {

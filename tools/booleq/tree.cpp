@@ -1,4 +1,4 @@
-// The command 'tree': the expression tree as indented text, as a Graphviz graph, as JSON.
+// The command 'tree': the expression tree as indented text, as a Graphviz graph or as JSON.
 #include "tree.h"
 
 #include <algorithm>
@@ -10,7 +10,7 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxIndent = 40; // levels; below, the depth is written as a number
+constexpr size_t kMaxIndent = 40; // levels; deeper, the depth is written as a number
 
 void PutText(const TreeList& list, Output& output)
 {
@@ -27,7 +27,7 @@ Json Link(size_t index)
     return index == TreeList::kNoNode ? Json() : Json(index);
 }
 
-// A list, not a tree of objects: the text decides the depth, and readers have their limits.
+// A list, not nested objects: the text decides the depth, and JSON readers have their limits.
 Json AsJson(const TreeList& list)
 {
     Json nodes = Json::array();

@@ -1,5 +1,5 @@
 // Work for several threads, whose results come out in the order in which the work went in.
-// Tasks share nothing but what they are given; an exception comes out of Take in place of a result.
+// Tasks share nothing but what they are given; Take rethrows a task's exception.
 #ifndef BOOLEQ_WORK_QUEUE_H
 #define BOOLEQ_WORK_QUEUE_H
 
@@ -15,7 +15,7 @@
 namespace booleq {
 
 // One thread adds and takes; the queue's own threads work.
-// Invariant: m_waiting are the tasks that no thread has begun; each has its future in m_results.
+// Invariant: m_waiting has the tasks that no thread has begun; each has its future in m_results.
 template <class Result>
 class WorkQueue {
   public:
@@ -27,7 +27,7 @@ class WorkQueue {
             m_threads.emplace_back([this] { Work(); });
     }
 
-    // Tasks that were not begun are dropped.
+    // Tasks that have not begun are dropped.
     ~WorkQueue()
     {
         {
@@ -58,8 +58,8 @@ class WorkQueue {
         m_changed.notify_one();
     }
 
-    // The result of the oldest task; waits for it.  Requires: not empty.  Fails: what the task
-    // threw.
+    // The result of the oldest task; waits for it.
+    // Requires: not empty.  Fails: what the task threw.
     Result Take()
     {
         assert(!IsEmpty());
@@ -86,12 +86,12 @@ class WorkQueue {
     }
 
     size_t m_max_tasks;
-    std::deque<std::future<Result>> m_results; // of the adding thread only
+    std::deque<std::future<Result>> m_results; // used only by the adding thread
     std::mutex m_mutex;                        // guards what follows
     std::condition_variable m_changed;
     std::deque<std::packaged_task<Result()>> m_waiting;
     bool m_is_over = false;
-    std::vector<std::thread> m_threads; // the last, as they use the others
+    std::vector<std::thread> m_threads; // last, because they use the others
 };
 
 } // namespace booleq

@@ -1,6 +1,6 @@
-// Bus arbiter: four requesters, the one with the lowest number wins; one that is masked does not
-// ask. 'lock' keeps the bus for requester 'owner' as long as that one asks. 'alarm' tells of a bad
-// parity of what the winner sends.
+// Bus arbiter: of four requesters the one with the lowest number wins; a masked one does not ask.
+// 'lock' keeps the bus for requester 'owner' as long as that one asks. 'alarm' reports a parity
+// error in the requests.
 module arbiter (
     input  [3:0] req,
     input  [3:0] mask,

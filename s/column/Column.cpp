@@ -165,8 +165,8 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
     while (rest.variables >> level != 0) {
         const unsigned int variable = HighestVariable(rest.variables);
         const bool value = (firstWord >> (variable - 6) & 1u) != 0;
-        if (depth < m_path_length && m_path[depth].variable == variable &&
-            m_path[depth].value == value) {
+        if (depth < m_path_length && m_path[depth].value == value) {
+            assert(m_path[depth].variable == variable); // all above it is fixed alike
             rest = m_path[depth++].rest;
             continue;
         }

@@ -74,7 +74,6 @@ struct Evaluator {
         }
         const unsigned int numOperands = KqNumOperands(place.node->GetType());
         if (numOperands == 0) {
-            value = 0;
             Leave(place);
             return KQ_NONE;
         }

@@ -36,8 +36,10 @@ class Writer {
             return left.node ? KQ_ONE : KQ_NONE;
         left.pendingTop = left.node;
         right.node = right.pendingTop = place.node->GetRightChild();
-        if (left.node && place.node->IsBinOp())
-            return right.node ? KQ_BOTH | KQ_RETURN : KQ_ONE | KQ_RETURN;
+        if (left.node && place.node->IsBinOp()) {
+            assert(right.node); // an init value's own root is never written
+            return KQ_BOTH | KQ_RETURN;
+        }
         WriteTokens(place);
         if (left.node && right.node)
             return KQ_BOTH;
@@ -52,11 +54,7 @@ class Writer {
         return true;
     }
 
-    void Leave(const Place& place)
-    {
-        if (!place.node->GetRightChild())
-            WriteTokens(place);
-    }
+    void Leave(const Place&) {}
 
   private:
     void WriteTokens(const Place& place);

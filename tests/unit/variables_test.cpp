@@ -147,6 +147,25 @@ TEST(Variables, DefinitionLinksNodesThatCameBefore)
     EXPECT_EQ(1u, engine.Eval());
 }
 
+// Copies share nodes, and a node has one index for all of them: that of the last definition.
+// Tables of more than six variables are evaluated by a program from the second time on.
+TEST(Variables, NodesOfAVariableThatACopyLacksCountAsZero)
+{
+    Engine engine;
+    engine.TokenizeNodes("a|b|c|d|e|f|g|h");
+    engine.BuildTree();
+    Engine copy(engine);
+    for (const char* const name : {"a", "b", "c", "d", "e", "f", "g"})
+        EXPECT_TRUE(copy.DefineVariable(name, 0));
+    for (const char* const name : {"s", "t", "u", "v", "w", "x", "y", "z", "h"})
+        EXPECT_TRUE(engine.DefineVariable(name, 1));
+    for (unsigned int time = 0; time < 3; ++time)
+        EXPECT_EQ(0u, copy.Eval());
+    EXPECT_EQ(1u, engine.Eval());
+    EXPECT_TRUE(copy.SetVariable("g", 1));
+    EXPECT_EQ(1u, copy.Eval());
+}
+
 TEST(Variables, ManyNamesKeepTheirOrder)
 {
     std::string text = "v0";

@@ -156,8 +156,7 @@ void Comparison::CompareAll(const CompareOptions& options)
                 verdicts[place] = Compare(m_pairing.pairs[place]);
         });
     }
-    std::vector<uint64_t> counts(m_left.nets.size(),
-                                 0); // for each renamed net, the pairs that have it
+    std::vector<uint64_t> counts(m_left.nets.size(), 0); // pairs that have a renamed net
     for (size_t place = 0; place < verdicts.size(); ++place)
         Count(m_pairing.pairs[place], verdicts[place], counts);
     assert(m_num_same + m_num_renamed + m_different.size() == m_pairing.pairs.size());

@@ -43,8 +43,7 @@ class TableFunctions {
     const Design& m_design;
     std::vector<Folded> m_inits; // by init value
     std::vector<Rows> m_functions;
-    std::unordered_map<uint64_t, uint32_t>
-        m_words[kMaxWordInputs + 1]; // numbers of functions, by number of inputs
+    std::unordered_map<uint64_t, uint32_t> m_words[kMaxWordInputs + 1]; // by number of inputs
     std::map<Rows, uint32_t> m_wide;
 };
 

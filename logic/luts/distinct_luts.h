@@ -14,7 +14,7 @@ namespace booleq {
 // Invariant: firstPlaces and counts have an element for each distinct table, in ascending order of
 // the tables as numbers.
 struct DistinctLuts {
-    std::vector<uint64_t> words; // the tables as LutsOf takes them: two words each for seven inputs
+    std::vector<uint64_t> words; // the tables as LutsOf takes them: seven inputs have two words
     std::vector<uint64_t> firstPlaces; // in the array
     std::vector<uint64_t> counts;      // their sum is the number of tables in the array
 };

@@ -1,7 +1,7 @@
 // Takes the cells of a module one by one, in parts as a reader meets them, and makes tables of
-// cells whose type is known. Anything odd about a cell becomes a finding. Fails: ReadFault for a
-// cell without a type, and where a limit on sizes is passed. Cost: proportional to the parts of the
-// cell; no allocation once the scratch space has grown.
+// cells whose type is known. Anything odd about a cell becomes a finding.
+// Fails: ReadFault for a cell without a type, and where a limit on sizes is passed.
+// Cost: proportional to the parts of the cell; no allocation once the scratch space has grown.
 #ifndef BOOLEQ_DESIGN_CELL_INTAKE_H
 #define BOOLEQ_DESIGN_CELL_INTAKE_H
 

@@ -111,8 +111,8 @@ void CellIntake::EndTable(uint32_t cellType, uint32_t designType)
     EndUnreadOf(designType);
 }
 
-// Adds the connected outputs; if none is connected, the first one that the parameters allow. Fails:
-// false, with a finding.
+// Adds the connected outputs; if none is connected, the first one that the parameters allow.
+// Fails: false, with a finding.
 bool CellIntake::AddOutputs(uint32_t cellType, uint32_t designType)
 {
     const CellType& type = m_cell_types.All()[cellType];

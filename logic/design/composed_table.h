@@ -1,6 +1,6 @@
 // The rows of one output of a cell, over the pins that it depends on: for a plain table, bits of
-// its parameter; for a tree of tables, what the tree computes. Cost: for a plain table, copying its
-// words; for a tree, rows times steps.
+// its parameter; for a tree of tables, what the tree computes.
+// Cost: for a plain table, copying its words; for a tree, rows times steps.
 #ifndef BOOLEQ_DESIGN_COMPOSED_TABLE_H
 #define BOOLEQ_DESIGN_COMPOSED_TABLE_H
 

@@ -1,4 +1,5 @@
-// The forms of an EDIF text and the names in them. Fails: ReadFault with a line.
+// The forms of an EDIF text and the names in them.
+// Fails: ReadFault with a line.
 #ifndef BOOLEQ_DESIGN_EDIF_FORMS_H
 #define BOOLEQ_DESIGN_EDIF_FORMS_H
 

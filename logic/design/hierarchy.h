@@ -1,6 +1,7 @@
 // Lays out the modules of a file as one design: each instance of a module gets its own tables and
-// nets, and nets that ports join become one. Fails: ReadFault for no top or several, a module that
-// contains itself, or more items than allowed.  Cost: linear in the resulting design.
+// nets, and nets that ports join become one.
+// Fails: ReadFault for no top or several, a module that contains itself, or more items than
+// allowed.  Cost: linear in the resulting design.
 #ifndef BOOLEQ_DESIGN_HIERARCHY_H
 #define BOOLEQ_DESIGN_HIERARCHY_H
 

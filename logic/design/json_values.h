@@ -1,4 +1,5 @@
-// Values of a JSON text as the netlist reader needs them. Fails: simdjson's own exceptions.
+// Values of a JSON text as the netlist reader needs them.
+// Fails: simdjson's own exceptions.
 #ifndef BOOLEQ_DESIGN_JSON_VALUES_H
 #define BOOLEQ_DESIGN_JSON_VALUES_H
 

@@ -1,6 +1,6 @@
 // The names of a design. Each distinct one is kept once, in one block of bytes, and has a number.
-// Fails: std::bad_alloc; std::length_error for more than 2^32 - 1 names. Cost: a look-up takes one
-// probe or two; a name takes its bytes and about 16 more.
+// Fails: std::bad_alloc; std::length_error for more than 2^32 - 1 names.
+// Cost: a look-up takes one probe or two; a name takes its bytes and about 16 more.
 #ifndef BOOLEQ_DESIGN_NAME_ARENA_H
 #define BOOLEQ_DESIGN_NAME_ARENA_H
 

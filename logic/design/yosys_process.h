@@ -1,6 +1,6 @@
-// Verilog, converted to JSON by the program yosys. Fails: ReadFault if the program is missing,
-// refuses the text, or takes too long. However the work ends, even by a signal that kills this
-// process, the program is killed and no file is left.
+// Verilog, converted to JSON by the program yosys.
+// Fails: ReadFault if the program is missing, refuses the text, or takes too long. However the work
+// ends, even by a signal that kills this process, the program is killed and no file is left.
 #ifndef BOOLEQ_DESIGN_YOSYS_PROCESS_H
 #define BOOLEQ_DESIGN_YOSYS_PROCESS_H
 

@@ -44,7 +44,8 @@ const char* CauseWord(CauseCode code);
 std::vector<Cause> FindCauses(const PinFunction& left, const PinFunction& right);
 
 // The init value that would give the right table the left one's function, as rows over the right
-// one's pins. Fails: false if the right one lacks a net on which the left one depends.
+// one's pins.
+// Fails: false if the right one lacks a net on which the left one depends.
 bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows);
 
 } // namespace booleq

@@ -1,6 +1,7 @@
 // Compares two designs table by table. In: two designs; out: which tables differ, which only one
 // design has, and which nets have another name. The details of a difference are worked out on
-// demand. Cost: some microseconds for each table; a millisecond to describe a difference.
+// demand.
+// Cost: some microseconds for each table; a millisecond to describe a difference.
 #ifndef BOOLEQ_INSPECT_COMPARISON_H
 #define BOOLEQ_INSPECT_COMPARISON_H
 

@@ -1,5 +1,5 @@
-// Mistakes that programs make with init values: digits shifted, halves exchanged and so on. Cost:
-// rows times digits; wide tables have no faults of single digits.
+// Mistakes that programs make with init values: digits shifted, halves exchanged and so on.
+// Cost: rows times digits; wide tables have no faults of single digits.
 #ifndef BOOLEQ_INSPECT_INIT_FAULT_H
 #define BOOLEQ_INSPECT_INIT_FAULT_H
 

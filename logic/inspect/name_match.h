@@ -1,7 +1,7 @@
 // Looks up names of one design in another: nets and cells that have the same name. Each design has
-// its own names, so each name is looked up once as text, and after that only by number. Cost: a
-// look-up for each name and each scope; a vector for names at the top, a hash map for names in
-// instances.
+// its own names, so each name is looked up once as text, and after that only by number.
+// Cost: a look-up for each name and each scope; a vector for names at the top, a hash map for names
+// in instances.
 #ifndef BOOLEQ_INSPECT_NAME_MATCH_H
 #define BOOLEQ_INSPECT_NAME_MATCH_H
 

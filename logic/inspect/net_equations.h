@@ -1,5 +1,5 @@
-// Equations for the functions of a comparison, over its nets. Cost: a short form for each distinct
-// function, a millisecond or less.
+// Equations for the functions of a comparison, over its nets.
+// Cost: a short form for each distinct function, a millisecond or less.
 #ifndef BOOLEQ_INSPECT_NET_EQUATIONS_H
 #define BOOLEQ_INSPECT_NET_EQUATIONS_H
 

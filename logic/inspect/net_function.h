@@ -1,6 +1,6 @@
 // A look-up table as a function of nets: its rows over the nets that matter, in ascending order.
-// Two tables are the same function if these are equal, whatever their pins, widths and types. Cost:
-// a few operations on the rows for each input; up to six inputs fit in one word.
+// Two tables are the same function if these are equal, whatever their pins, widths and types.
+// Cost: a few operations on the rows for each input; up to six inputs fit in one word.
 #ifndef BOOLEQ_INSPECT_NET_FUNCTION_H
 #define BOOLEQ_INSPECT_NET_FUNCTION_H
 

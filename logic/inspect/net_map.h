@@ -1,5 +1,6 @@
 // Which net of one design is which net of another, as far as that is known: one numbering for the
-// nets of both. Cost: a number for each net; joining by names takes a look-up for each name.
+// nets of both.
+// Cost: a number for each net; joining by names takes a look-up for each name.
 #ifndef BOOLEQ_INSPECT_NET_MAP_H
 #define BOOLEQ_INSPECT_NET_MAP_H
 

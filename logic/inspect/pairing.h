@@ -1,5 +1,6 @@
 // Which table of one design corresponds to which of another. In: both designs, and which nets are
-// the same. Out: pairs, and the tables left over on each side. Cost: some look-ups for each table.
+// the same. Out: pairs, and the tables left over on each side.
+// Cost: some look-ups for each table.
 #ifndef BOOLEQ_INSPECT_PAIRING_H
 #define BOOLEQ_INSPECT_PAIRING_H
 

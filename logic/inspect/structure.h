@@ -1,7 +1,7 @@
 // Finds nets that are the same because the tables around them are, for nets whose names differ or
 // are missing. In: pairs of tables. Out: nets joined.  Fails: never; nets that it cannot decide
-// stay unknown. Cost: in each round, one visit to each pair with an unknown net; at most kMaxRounds
-// rounds.
+// stay unknown.
+// Cost: in each round, one visit to each pair with an unknown net; at most kMaxRounds rounds.
 #ifndef BOOLEQ_INSPECT_STRUCTURE_H
 #define BOOLEQ_INSPECT_STRUCTURE_H
 

@@ -1,6 +1,6 @@
 // What is odd about a design's tables: what the reader found, then what the tables themselves show.
-// Findings are passed on one by one; there may be as many as tables. Cost: one visit to each table;
-// memory for one number for each distinct function of nets.
+// Findings are passed on one by one; there may be as many as tables.
+// Cost: one visit to each table; memory for one number for each distinct function of nets.
 #ifndef BOOLEQ_INSPECT_TABLE_FINDINGS_H
 #define BOOLEQ_INSPECT_TABLE_FINDINGS_H
 

@@ -1,6 +1,7 @@
 // The distinct functions of a design's tables, each numbered once: constant and repeated inputs are
-// folded, idle ones are left out, the rest stay in the order of the pins. Cost: a look-up for each
-// table; tables whose pins are all different nets are folded only once for each init value.
+// folded, idle ones are left out, the rest stay in the order of the pins.
+// Cost: a look-up for each table; tables whose pins are all different nets are folded only once for
+// each init value.
 #ifndef BOOLEQ_INSPECT_TABLE_FUNCTIONS_H
 #define BOOLEQ_INSPECT_TABLE_FUNCTIONS_H
 

@@ -1,7 +1,8 @@
 // The canonical form: two tables have the same one if and only if they are the same function up to
 // the order of inputs, or up to inversions too. In: tables of up to six inputs; out: the form, and
-// how the table becomes it. Fails: for arrays, as lut_array.h says.  Cost: under a microsecond for
-// a random table of six inputs; never more than all 92,160 transformations.
+// how the table becomes it.
+// Fails: for arrays, as lut_array.h says.  Cost: under a microsecond for a random table of six
+// inputs; never more than all 92,160 transformations.
 #ifndef BOOLEQ_LUTS_CANONICAL_H
 #define BOOLEQ_LUTS_CANONICAL_H
 

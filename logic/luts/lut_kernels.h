@@ -1,7 +1,7 @@
 // Questions about, and changes to, all tables of an array. In: tables, and one argument for all or
 // one for each; out: the caller's arrays, one element for each table. 'results' has tables of the
-// input's shape and may be the same memory, but may not overlap it otherwise. Fails:
-// std::bad_alloc, and what Watch() throws.  Cost: some nanoseconds for each table.
+// input's shape and may be the same memory, but may not overlap it otherwise.
+// Fails: std::bad_alloc, and what Watch() throws.  Cost: some nanoseconds for each table.
 #ifndef BOOLEQ_LUTS_LUT_KERNELS_H
 #define BOOLEQ_LUTS_LUT_KERNELS_H
 

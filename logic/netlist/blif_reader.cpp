@@ -1,6 +1,6 @@
 // Makes a network of a BLIF text, which is read like any netlist. It accepts what a network can
-// hold: one model, one output, only tables, each signal defined before it is used. Fails: false,
-// and 'network' is unchanged.  Cost: linear in the text and the rows of the tables.
+// hold: one model, one output, only tables, each signal defined before it is used.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text and the rows of the tables.
 #include <algorithm>
 
 #include "fold.h"

@@ -1,6 +1,6 @@
 // Reads files of equations: the orders of inputs and outputs, then "signal = expression;" lines,
-// each signal defined before it is used and the one output last. Fails: false, and 'network' is
-// unchanged.  Cost: linear in the text.
+// each signal defined before it is used and the one output last.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text.
 #include <sstream>
 
 #include "foreign_tree.h"

@@ -37,7 +37,8 @@ struct Network {
     uint32_t output = 0;
 };
 
-// Read the part of the formats that the writers use. Fails: false for anything else.
+// Read the part of the formats that the writers use.
+// Fails: false for anything else.
 bool ReadBlif(const std::string& text, Network& network);
 bool ReadEqn(const std::string& text, Network& network);
 bool ReadPla(const std::string& text, Network& network);

@@ -1,5 +1,6 @@
 // Makes a network of a table of products. It accepts what a network can hold: one output, names for
-// everything, no don't-cares. Fails: false, and 'network' is unchanged.  Cost: linear in the text.
+// everything, no don't-cares.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text.
 #include <numeric>
 
 #include "network_builder.h"

@@ -340,7 +340,8 @@ void SetEquationClass(const py::object& type)
     equationClass = reinterpret_cast<PyTypeObject*>(type.inc_ref().ptr());
     // The garbage collector tracks objects of classes written in Python. Equations hold texts and
     // names and never each other, and a million of them would make it scan all memory again and
-    // again. Requires: no objects exist yet.
+    // again.
+    // Requires: no objects exist yet.
     equationClass->tp_flags &= ~Py_TPFLAGS_HAVE_GC;
     equationClass->tp_traverse = nullptr;
     equationClass->tp_clear = nullptr;

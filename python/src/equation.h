@@ -25,8 +25,8 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Shared with threads that work on it without the interpreter's lock. Invariant: the equation is
-// set, and all values are 0.
+// Shared with threads that work on it without the interpreter's lock.
+// Invariant: the equation is set, and all values are 0.
 struct Content {
     Kq_BoolEquation equation;
     size_t NumInputs() const { return equation.GetVariables().size(); }
@@ -93,8 +93,8 @@ class Equation {
     mutable std::unique_ptr<Kq_BoolEquation> m_scratch; // variables are set in this copy
 };
 
-// The names of an iterable as a tuple of plain str. Fails: TypeError, and ValueError for a name
-// that is not legal or is listed twice.
+// The names of an iterable as a tuple of plain str.
+// Fails: TypeError, and ValueError for a name that is not legal or is listed twice.
 py::tuple RequireInputs(const py::object& inputs);
 
 // Texts of more characters are large; one of this length takes some ten microseconds.
@@ -121,8 +121,8 @@ const Equation& RequireEquation(const py::handle& value, const char* what);
 // An equation, or a text, 0 or 1 as an equation.  Fails: null for another type; booleq.ParseError.
 py::object ToEquation(const py::handle& value);
 
-// The results; with 'isReversed' the first input is bit 0 of the row's number. Fails: ValueError
-// for more than 30 inputs; what a signal handler raises.
+// The results; with 'isReversed' the first input is bit 0 of the row's number.
+// Fails: ValueError for more than 30 inputs; what a signal handler raises.
 booleq::Rows RowsOf(const Equation& equation, bool isReversed = false);
 kq_logic::Function FunctionOf(const Equation& equation);
 

@@ -1,6 +1,6 @@
 // The interpreter's lock: released while the library works, and taken again to check for signals.
-// In: work that touches no Python object; out: its result. Fails: what the work throws, and what a
-// signal handler raises, within a twentieth of a second.
+// In: work that touches no Python object; out: its result.
+// Fails: what the work throws, and what a signal handler raises, within a twentieth of a second.
 #ifndef BOOLEQ_PYTHON_LOCK_H
 #define BOOLEQ_PYTHON_LOCK_H
 
@@ -36,8 +36,9 @@ class Unlocked {
 struct Interrupted {};
 
 // Runs the handlers of pending signals, at most every ten milliseconds; it is what Watch() calls.
-// On other threads than the main one, it only checks whether the work is abandoned. Fails:
-// Interrupted on a thread without the lock or an abandoned one, otherwise the exception itself.
+// On other threads than the main one, it only checks whether the work is abandoned.
+// Fails: Interrupted on a thread without the lock or an abandoned one, otherwise the exception
+// itself.
 void CheckSignals();
 
 // Makes Watch() call CheckSignals, and keeps track of the main thread and of forks. Call it once.
@@ -70,7 +71,8 @@ typedef std::shared_ptr<std::atomic<bool>> AbandonFlag;
 void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work);
 
 // Runs work that cannot always be interrupted on a separate thread. If a handler raises, the result
-// is abandoned. Requires: 'work' owns or shares everything that it uses.
+// is abandoned.
+// Requires: 'work' owns or shares everything that it uses.
 template <class Work>
 auto Beside(const Work& work) -> decltype(work())
 {

@@ -18,8 +18,8 @@ struct ValueColumn {
     ItemKind kind;
 };
 
-// Packs rows 'first' to first + numRows - 1; bits of the last word beyond these rows are 0. Fails:
-// false for a value other than 0 and 1; the words are then meaningless.
+// Packs rows 'first' to first + numRows - 1; bits of the last word beyond these rows are 0.
+// Fails: false for a value other than 0 and 1; the words are then meaningless.
 bool PackColumn(const ValueColumn& column, size_t first, size_t numRows, uint64_t* words);
 
 // Whether the value in row 'row' is neither 0 nor 1.

@@ -37,7 +37,7 @@ def verdicts_of_abc(folder, numbers):
     done = subprocess.run(["berkeley-abc", "-f", script], capture_output=True, text=True,
                           timeout=TIMEOUT)
     said = [line for line in done.stdout.splitlines() if line.startswith("Networks are ")]
-    if len(said) != len(numbers): # one went wrong, nobody knows which
+    if len(said) != len(numbers): # one failed, but it is not known which
         if len(numbers) == 1:
             return ["no answer"]
         return [verdicts_of_abc(folder, [number])[0] for number in numbers]

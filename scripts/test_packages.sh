@@ -42,7 +42,7 @@ fi
 
 base=$directory/base
 logs=$directory/logs
-password=seventeen-herons # of the newcomer, whose root is thrown away
+password=seventeen-herons # of the newcomer, whose root is deleted
 
 # Where this machine gets Debian 12 from: one line "URI SUITE" for each part.
 debian_sources() {

@@ -1,13 +1,13 @@
-"""What pip calls to build the package (PEP 517): CMake builds and installs it, this file packs it.
+"""The build backend for pip (PEP 517): CMake builds and installs, this file packs.
 
-Standard library only, so that nothing has to be fetched. The wheel holds the module, the libraries
-that it uses beside it, and metadata; the source distribution holds what building a wheel takes.
-Called as a program it writes the directory *.dist-info of an installation that CMake makes:
+It uses only the standard library, so that nothing has to be fetched. The wheel holds the module,
+the libraries that it uses, and metadata; the source distribution holds what building a wheel takes.
+Called as a program, it writes the directory *.dist-info of an installation that CMake makes:
 build_backend.py dist-info DIRECTORY.
 """
 import sys
 
-if sys.version_info < (3, 11):  # said before what follows fails to be imported
+if sys.version_info < (3, 11):  # before the imports below fail
     raise SystemExit("booleq needs Python 3.11 or newer; this is Python " +
                      ".".join(str(number) for number in sys.version_info[:3]))
 
@@ -31,7 +31,7 @@ NAME = PROJECT["name"]
 SOURCES = ["CMakeLists.txt", "LICENSE", "README.md", "pyproject.toml", "cmake", "docs/python.md",
            "include", "logic", "port", "python", "s", "tools"]
 SOLVER_NOTICE = "LICENSE.cadical"
-DATE = (1980, 1, 1, 0, 0, 0)  # the earliest that a zip file can have; the same every time
+DATE = (1980, 1, 1, 0, 0, 0)  # the earliest of a zip file; fixed, so that bytes are reproducible
 
 
 def _version():
@@ -61,7 +61,7 @@ def _metadata(has_solver_notice=True):
 
 
 def _solver_notice():
-    """The solver's authors and terms, which are also ours: who passes its code on passes them on."""
+    """The solver's authors and terms (the same as ours), which must go along with its code."""
     packed = (ROOT / "cmake/packages/solver.copyright").read_text(encoding="utf-8")
     holders = re.search(r"^Copyright: (.*?)^Comment:", packed, re.MULTILINE | re.DOTALL)[1]
     terms = (ROOT / PROJECT["license"]["file"]).read_text(encoding="utf-8")
@@ -87,13 +87,13 @@ def _run(*command):
 
 
 def _has_tool_headers():
-    """Whether the command-line tool can be built, which takes two libraries of headers."""
+    """Whether the command-line tool can be built, which needs two header-only libraries."""
     return all(any((Path(root) / header).exists() for root in ("/usr/include", "/usr/local/include"))
                for header in ("CLI/CLI.hpp", "nlohmann/json.hpp"))
 
 
 def _build():
-    """Builds the package; the build directory, which it returns, stays for the next time."""
+    """Builds the package and returns the build directory, which stays for the next time."""
     if shutil.which("cmake") is None:
         raise SystemExit(f"{NAME} is built by CMake, and there is none; on Debian 12: "
                          "apt-get install cmake g++ make pybind11-dev python3-dev")
@@ -135,7 +135,7 @@ class _Wheel:
 
 
 def _write_information(write, is_wheel=True):
-    """Calls write(name, bytes) for the files of the directory *.dist-info but RECORD.
+    """Calls write(name, bytes) for the files of *.dist-info except RECORD.
 
     A package that another program makes has its own place for the solver's notice.
     """
@@ -186,7 +186,7 @@ prepare_metadata_for_build_editable = prepare_metadata_for_build_wheel
 
 
 def build_editable(wheel_directory, config_settings=None, metadata_directory=None):
-    """A wheel that points at the build directory, whose package is links to the sources' files."""
+    """A wheel that points at the build directory, where the package is links to the sources."""
     information = f"{NAME}-{_version()}.dist-info"
     file_name = f"{NAME}-{_version()}-{_tag()}.whl"
     wheel = _Wheel(Path(wheel_directory) / file_name, information)
@@ -224,7 +224,7 @@ def build_sdist(sdist_directory, config_settings=None):
 
 
 def _write_installed(directory):
-    """What pip and importlib.metadata read of a package that another program has installed."""
+    """Writes what pip and importlib.metadata read about a package that pip did not install."""
     information = Path(directory) / f"{NAME}-{_version()}.dist-info"
     information.mkdir(parents=True, exist_ok=True)
     _write_information(lambda name, content: (information / name).write_bytes(content),

@@ -3,10 +3,11 @@
 
 usage: bench_batch.py TOOL [--rows N] [--kinds KIND,...] [--tries N]
 
-Kinds of rows: 'equations' whose init value is missing, 'both' to be compared, 'values' whose equation
-is missing, 'chains' without groups, each input once, whose init value is missing. Each table is of N rows (1,000,000) and from a fixed seed. The fastest of some tries (3)
-counts, by the clock; the output goes through a pipe, and must be the same for all numbers of threads.
-Prints a Markdown table.
+Kinds of rows: 'equations' lack the init value, 'both' have both to compare, 'values' lack the
+equation, 'chains' without groups, with each input once, lack the init value. Each table has N rows
+(1,000,000) and a fixed seed. The fastest of several tries (3) counts, by wall-clock time. The
+output goes through a pipe, and must be the same for all numbers of threads. Prints a Markdown
+table.
 """
 import argparse
 import hashlib
@@ -24,7 +25,7 @@ NAMES = ["sel", "a", "b", "en", "d0", "d1"]
 
 
 def random_equation(rng, names):
-    """Each input once, some twice, in groups: what a netlist's cells say, with its value."""
+    """Each input once, some twice, in groups, as in a netlist's cells; with its value."""
     count = len(names)
     columns = {}
     for place, name in enumerate(names):
@@ -50,7 +51,7 @@ def random_equation(rng, names):
 
 
 def random_chain(rng, names):
-    """'a & ~b | c': grouped from the left. Its value is left to the tool."""
+    """'a & ~b | c', grouped from the left; the tool computes its value."""
     return " {} ".join(("~" if rng.random() < 0.2 else "") + name for name in names) \
         .format(*(rng.choice(OPERATORS[:3]) for _ in names[1:]))
 
@@ -70,7 +71,7 @@ def write_table(path, kind, rows):
 
 
 def run(tool, path, jobs):
-    """Seconds, and a digest of all that was written."""
+    """Seconds, and a digest of all output."""
     digest = hashlib.sha256()
     start = time.perf_counter()
     with subprocess.Popen([tool, "batch", "--jobs", str(jobs), path], stdout=subprocess.PIPE,

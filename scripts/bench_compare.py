@@ -1,14 +1,14 @@
 #!/usr/bin/env python3
-"""Compares two builds by running the benchmark executables of both in turn.
+"""Compares two builds by running the benchmark executables of both alternately.
 
 usage: bench_compare.py OLD NEW [--rounds N] [--filter REGEX] [NAME...]
 
-OLD and NEW are build directories with a bench folder in them; NAME is bench_set and the like, all
-executables that both have when there is none. A case counts as changed only when the slowest run of
-one build is faster than the fastest run of the other. Times are processor time. The compare.py of
-libbenchmark-tools runs all rounds of one executable and then all of the other, so that a machine
-that grows warm or busy looks like a change; that is why this script is here.
-Exit status: 1 when something became slower.
+OLD and NEW are build directories that contain a bench folder. NAME is bench_set and the like;
+without a NAME, all executables that both have are run. A case counts as changed only if the slowest
+run of one build is faster than the fastest run of the other. Times are processor time. This script
+exists because the compare.py of libbenchmark-tools runs all rounds of one executable and then all
+of the other, so that a machine that grows warm or busy looks like a change.
+Exit status: 1 if something became slower.
 """
 import argparse
 import json
@@ -48,7 +48,7 @@ def format_range(times):
 
 
 def report(name, old, new):
-    """Prints a change; returns 1 for slower, -1 for faster, 0 when the ranges overlap."""
+    """Prints a change; returns 1 for slower, -1 for faster, 0 if the ranges overlap."""
     if max(new) < min(old):
         change = -1
     elif min(new) > max(old):

@@ -1,13 +1,14 @@
 #!/usr/bin/env python3
-"""Times decisions beside those of berkeley-abc's "cec", about the same pairs in the same run.
+"""Times decisions against those of berkeley-abc's "cec", on the same pairs in the same run.
 
 usage: bench_decide.py TOOL DECIDE_PAIRS [COUNT [FIRST]]
 
-TOOL is booleq, DECIDE_PAIRS the program of tests/decide, which writes COUNT random pairs (100) as
-texts and as BLIF. Both programs answer about each pair in turn, three times, and the fastest counts,
-once as whole processes that read the pair, once without their start: ours as DECIDE_PAIRS measures it,
-cec as one process that reads and decides the pair five times more. Then reorderings of 2,000 operands.
-Exit status 1 when the answers differ, when our median is the longer one, or a reordering takes 50 ms.
+TOOL is booleq; DECIDE_PAIRS is the program of tests/decide, which writes COUNT random pairs (100)
+as texts and as BLIF. Both programs decide each pair in turn, three times, and the fastest time
+counts: once as whole processes that read the pair, once without their start. Without the start,
+ours is what DECIDE_PAIRS measures, cec a process that reads and decides the pair five more times.
+Then reorderings of 2,000 operands are decided. Exit status 1 if the answers differ, if our median
+is longer, or if a reordering takes 50 ms.
 """
 import pathlib
 import random
@@ -25,7 +26,7 @@ STATUSES = {0: "equal", 1: "different"}
 
 
 def timed(command):
-    """Seconds of the fastest of some tries, and the last one's end."""
+    """Seconds of the fastest of several tries, and how the last one ended."""
     seconds = []
     for _ in range(TRIES):
         start = time.perf_counter()
@@ -46,7 +47,7 @@ def abc(commands):
 
 
 def time_pair(tool, folder, number, decided):
-    """Seconds: ours as a process, cec as one, ours alone, cec alone; what they answered."""
+    """Seconds: ours as a process, cec as a process, ours alone, cec alone; and the answers."""
     texts = [(folder / f"{number}{side}.txt").read_text() for side in "ab"]
     ours, done = timed([tool, "equal", "--", *texts])
     command = f"cec {folder}/{number}a.blif {folder}/{number}b.blif; "
@@ -57,7 +58,7 @@ def time_pair(tool, folder, number, decided):
 
 
 def time_reorderings(tool):
-    """Operators, and the seconds that a whole process takes to find both sides equal."""
+    """Operators, and the seconds for a whole process that finds both sides equal."""
     rng = random.Random(1)
     names = [f"v{number}" for number in range(NUM_OPERANDS)]
     for operator in "&|^":

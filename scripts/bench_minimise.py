@@ -1,11 +1,12 @@
 #!/usr/bin/env python3
-"""Minimises a folder of PLA files and compares with a table of what another program needs.
+"""Minimises a folder of PLA files and compares with a table of another program's results.
 
 usage: bench_minimise.py TOOL FOLDER [--exact SECONDS] [--table CSV] [--check]
 
-CSV (FOLDER/espresso.csv unless given) has the columns file, terms, seconds, fewest_terms. Prints a
-Markdown table. --check: exit status 1 unless no file has more terms than that by more than 5 % and
-more than one, the total is not more, and known minima are never undercut nor missed where proved.
+CSV (FOLDER/espresso.csv by default) has the columns file, terms, seconds, fewest_terms. Prints a
+Markdown table. --check: exit status 1 if a file has more terms than in the table by more than 5 %
+and more than one, if the total is more, or if a known minimum is undercut, or missed where ours is
+proved.
 """
 import argparse
 import csv

@@ -1,11 +1,11 @@
 #!/usr/bin/env python3
-"""Prints how long 'booleq netlist' takes for a million tables, beside Yosys and Python's json.
+"""Prints how long 'booleq netlist' takes for a million tables, next to Yosys and Python's json.
 
 usage: bench_netlist.py MAKE_NETLIST BOOLEQ [TABLES [RUNS]]
 
-Writes netlists of TABLES (1,000,000) six-input tables and asks each command RUNS times (2), the least
-time of which counts; Yosys and Python read 100,000. Answers go to a file that is looked at once and
-thrown away. Markdown; exit status 1 where a command fails or answers something else.
+Writes netlists of TABLES (1,000,000) six-input tables and runs each command RUNS times (2); the
+least time counts. Yosys and Python read 100,000 tables. Answers go to a temporary file, which is
+checked once. Prints Markdown; exit status 1 if a command fails or its answer is wrong.
 """
 import os
 import pathlib

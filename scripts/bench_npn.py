@@ -3,8 +3,8 @@
 
 usage: bench_npn.py BENCH_LUTS [--count N]
 
-Both run on one core, one after the other. berkeley-abc's ways that are exact are its testnpn -A 10
-and 11; its time is what it prints. Markdown; exit status 1 where one of them fails.
+Both run on one core, one after the other. The exact methods of berkeley-abc are testnpn -A 10 and
+11; its time is what it prints. Prints Markdown; exit status 1 if a program fails.
 """
 import argparse
 import json

@@ -3,14 +3,14 @@
 
 usage: bench_table.py BUILD [NAME...] [--pairs] [--doc] [--benchmark_OPTION...]
 
-Runs BUILD/bench/bench_NAME, all when there is no NAME, keeps the results in BUILD/results, and
-prints what the library takes against its baselines, then how each step grows, and what two threads
+Runs BUILD/bench/bench_NAME, or all of them without NAME, keeps the results in BUILD/results, and
+prints the library's times against its baselines, then how each step grows, and how much two threads
 get done; with --pairs also every formula by itself.
-With --doc the tables, and the machine they come from, replace what docs/benchmarks.md holds between
-its two 'figures' marks.
-Times are processor time: the median of all repetitions, the shortest in brackets. Of several
+With --doc the tables, with a description of the machine, replace what docs/benchmarks.md has
+between its two 'figures' marks.
+Times are processor time: the median of all repetitions, with the shortest in brackets. Of several
 formulas in one line, the one with the worst ratio is shown.
-Exit status: 1 when a case gave a wrong answer or could not be measured.
+Exit status: 1 if a case gave a wrong answer or could not be measured.
 """
 import argparse
 import collections
@@ -25,9 +25,9 @@ BEGIN = "<!-- figures: begin -->"
 END = "<!-- figures: end -->"
 NANOSECONDS = {"ns": 1, "us": 1e3, "ms": 1e6, "s": 1e9}
 
-# What is promised. 'pair': ours against the baseline, for all cases whose name starts with the
-# prefix. 'item': time per item. 'growth': time per item at the second size against the first.
-# 'peak': bytes of memory for a byte of text.
+# Promises. 'pair': ours against the baseline, for all cases whose name starts with the prefix.
+# 'item': time per item. 'growth': time per item at the second size against the first. 'peak': bytes
+# of memory for each byte of text.
 Target = collections.namedtuple("Target", "work kind prefix limit")
 TARGETS = (
     *(Target(f"column, {size} variables, {2 * size} operators, {kind}", "pair",
@@ -63,7 +63,8 @@ TARGETS = (
 )
 GROWTH_SIZES = ("10000", "1000000")
 
-# Work of two threads to that of one in the same time, by the clock: at least this, on two cores.
+# The least ratio of the work of two threads to that of one, in the same wall-clock time, on two
+# cores.
 ThreadTarget = collections.namedtuple("ThreadTarget", "work name limit")
 THREAD_TARGETS = (
     ThreadTarget("12 tokens set, 1,000 known names", "threads/set_known_names", 1.85),
@@ -111,7 +112,7 @@ def read_results(paths):
     for path in paths:
         text = pathlib.Path(path).read_text()
         if not text:
-            continue  # a filter that fits no case of this executable
+            continue  # the filter matches no case of this executable
         results = json.loads(text)
         contexts.append(results["context"])
         for entry in results["benchmarks"]:
@@ -136,7 +137,7 @@ def judge(worst, target):
 
 
 def find_pairs(cases, prefix):
-    """Ratio, name and both sides of every pair whose name starts with the prefix."""
+    """The ratio, name and both sides of every pair whose name starts with the prefix."""
     pairs = []
     for name, ours in cases.items():
         stem = name[:-len("/ours")]
@@ -204,7 +205,7 @@ def pair_table(cases):
 
 
 def shape_table(cases):
-    """Time per item of every case without a baseline, the sizes of one shape in one line."""
+    """The time per item of every case without a baseline, with all sizes of a shape in one line."""
     lines = {}
     for name, case in cases.items():
         match = re.fullmatch(r"(.*?)/((?:n=)?\d+(?:/\d+)?)/ours", name)
@@ -284,7 +285,7 @@ ALL = ["set", "read", "eval", "render", "column", "init_value", "truth_table", "
 
 
 def run_executables(build, names, options):
-    """Runs bench_NAME of each name; the files of results."""
+    """Runs bench_NAME for each name; returns the files of results."""
     folder = build / "results"
     folder.mkdir(parents=True, exist_ok=True)
     results = []

@@ -3,8 +3,8 @@
 
 usage: build_docs.py ROOT OUTPUT
 
-OUTPUT is a directory and is replaced whole. Exit status: 1 when Doxygen warns, when a public member
-has no comment, when a link leads nowhere, or when a path of this machine stands in the result.
+OUTPUT is a directory, which is replaced completely. Exit status: 1 if Doxygen warns, if a public
+member has no comment, if a link leads nowhere, or if the result contains a path of this machine.
 """
 import html.parser
 import pathlib
@@ -24,7 +24,7 @@ def version(root):
 
 
 def filtered(root, path):
-    """The text that Doxygen reads, and complaints of what it would pass over in silence."""
+    """The text that Doxygen reads, and complaints about what it would silently ignore."""
     lines = path.read_text(encoding="utf-8").splitlines()
     if path.suffix == ".md":
         return "\n".join(doc_filter.filter_page(path, lines)) + "\n", []
@@ -35,7 +35,7 @@ def filtered(root, path):
 
 
 def prepare(root, source):
-    """Puts what Doxygen reads below 'source'."""
+    """Writes what Doxygen reads to 'source'."""
     complaints = []
     for path in [*sorted(root.glob("*.md")), *sorted(root.glob("docs/*.md")),
                  *sorted(root.glob("include/**/*.h"))]:
@@ -66,7 +66,7 @@ OUTPUT_DIRECTORY = "{output}"
 
 
 class Links(html.parser.HTMLParser):
-    """The links of one page and the places that links may lead to."""
+    """The links of a page, and the places to which links may lead."""
 
     def __init__(self, path):
         super().__init__()

@@ -3,13 +3,13 @@
 
 usage: check_abi.py LIBRARY HEADERS BASELINE [--update]
 
-LIBRARY carries debug information, HEADERS is the folder of the public headers, BASELINE the text
-that --update writes. What programs built before rely on must stay: functions, their arguments and
+LIBRARY has debug information; HEADERS is the folder of the public headers; BASELINE is the text
+that --update writes. What programs built earlier rely on must stay: functions, their arguments and
 results, sizes and layouts of public classes. Private member functions and types that are only
-declared in HEADERS do not count: no inline function of the headers calls them. Additions are
-printed and allowed. abidw and abidiff of libabigail do the work; this script leaves out private members
-and paths, which they would compare too.
-Exit status: 1 when something was removed or changed.
+declared in HEADERS do not count, because no inline function of the headers calls them. Additions
+are printed and allowed. abidw and abidiff of libabigail do the work; this script leaves out private
+members and paths, which they would also compare.
+Exit status: 1 if something was removed or changed.
 """
 import argparse
 import pathlib
@@ -23,7 +23,7 @@ ABIDW = ["abidw", "--exported-interfaces-only", "--no-parameter-names", "--no-wr
 
 
 def internal_functions(root):
-    """Symbols of member functions that are private, or of classes that headers only declare."""
+    """The symbols of member functions that are private, or of classes that headers only declare."""
     for each in root.iter("class-decl"):
         is_internal = each.get("is-declaration-only") == "yes"
         for member in each.findall("member-function"):
@@ -48,7 +48,7 @@ def read_interface(library, headers):
                    (function.tag == "elf-symbol" and function.get("name") in internal)
                    for function in functions):
                 parent.remove(child)
-    # Where the sources lie is not part of the interface.
+    # The location of the sources is not part of the interface.
     for unit in root.iter("abi-instr"):
         unit.set("path", unit.get("path").rpartition("/")[2])
     return ElementTree.tostring(root, encoding="unicode") + "\n"

@@ -3,10 +3,10 @@
 
 usage: check_decide.py DECIDE_PAIRS [COUNT [FIRST]]
 
-DECIDE_PAIRS is the program of tests/decide. For each of COUNT pairs (10000) of 20 to 300 inputs its
-verdict must be that of minisat, picosat and cryptominisat about the clauses that it writes, and
-that of "cec" of berkeley-abc about both sides as BLIF. Half of the pairs are rewritten and must be
-equal. Prints the counts and the times of our decisions; exit status 1 when anything disagrees.
+DECIDE_PAIRS is the program of tests/decide. For each of COUNT pairs (10000) of 20 to 300 inputs,
+its verdict must agree with minisat, picosat and cryptominisat on the clauses that it writes, and
+with "cec" of berkeley-abc on both sides as BLIF. Half of the pairs are rewritten and must be equal.
+Prints the counts and the times of our decisions; exit status 1 if anything disagrees.
 """
 import collections
 import concurrent.futures
@@ -30,14 +30,14 @@ def verdict_of_solver(command, clauses):
 
 
 def verdicts_of_abc(folder, numbers):
-    """Of all pairs by one process: it takes longer to start than to answer."""
+    """The verdicts on all pairs by one process, because starting takes longer than answering."""
     script = folder / "script"
     script.write_text("".join(f"cec {folder}/{number}a.blif {folder}/{number}b.blif\n"
                               for number in numbers))
     done = subprocess.run(["berkeley-abc", "-f", script], capture_output=True, text=True,
                           timeout=TIMEOUT)
     said = [line for line in done.stdout.splitlines() if line.startswith("Networks are ")]
-    if len(said) != len(numbers): # one went wrong, nobody knows which
+    if len(said) != len(numbers): # one failed, but it is not known which
         if len(numbers) == 1:
             return ["no answer"]
         return [verdicts_of_abc(folder, [number])[0] for number in numbers]
@@ -47,7 +47,7 @@ def verdicts_of_abc(folder, numbers):
 
 
 def cross_check(folder, line, abc):
-    """What disagrees about the pair of a line; the line's fields."""
+    """What disagrees about the pair of a line, and the line's fields."""
     number, verdict, proof, kind, microseconds = line.split()
     found = []
     if kind == "rewritten" and verdict != "equal":

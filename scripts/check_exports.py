@@ -3,12 +3,13 @@
 
 usage: check_exports.py LIBRARY [--host NAME] [--second FIRST] [--objects FILE...]
 
-Exported names belong to the classes Kq_BoolEquation and Kq_BoolEquationImp; the needed libraries are
-the host library, the C++ library and the C library. With --second LIBRARY is the second library: its
-names belong to the namespace kq_logic, and it needs FIRST, the first library, and what reads netlists
-too. With --objects, static objects with a run-time initialiser are looked for too: only the engine's main source may have them (and the node model its
-class allocator), because the order of initialisation across files is undefined.
-Exit status: 1 when something was found.
+Exported names must belong to the classes Kq_BoolEquation and Kq_BoolEquationImp; the library may
+need only the host library, the C++ library and the C library. With --second, LIBRARY is the second
+library: its names belong to the namespace kq_logic, and it also needs FIRST, the first library, and
+the libraries that read netlists. With --objects, static objects with a run-time initialiser are
+also looked for: only the engine's main source may have them (and the node model its class
+allocator), because the order of initialisation across files is undefined.
+Exit status: 1 if something was found.
 """
 import argparse
 import pathlib
@@ -16,8 +17,8 @@ import re
 import subprocess
 import sys
 
-# Mangled, because the demangled name of a template's instance begins with the type it returns: one of
-# a standard template over our classes would look like ours.
+# Mangled names, because the demangled name of a template's instance begins with its return type: an
+# instance of a standard template over our classes would look like ours.
 EXPORTED = re.compile(r"_ZNK?(15Kq_BoolEquation|18Kq_BoolEquationImp)")
 SECOND = re.compile(r"_ZNK?8kq_logic")
 NEEDED = re.compile(r"(libstdc\+\+|libc\+\+|libc\+\+abi|libgcc_s|libc|libm|ld-linux[-\w]*)\.so[.\d]*")

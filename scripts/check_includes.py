@@ -3,10 +3,10 @@
 
 usage: check_includes.py ROOT
 
-Checked: the floors (who may include whom), the own header first, no include of a .cpp file, sizes of
-files, plain ASCII, the names of the rooms' headers and in the host's folders, foreign declarations,
-where a test model may look. clang-tidy checks functions' sizes, macros and names ('./dev check').
-Exit status: 1 when something was found.
+Checked: the floors (who may include whom), a source's own header first, no include of a .cpp file,
+sizes of files, plain ASCII, names of the rooms' headers and in the host's folders, foreign
+declarations, what a test model may include. clang-tidy checks functions' sizes, macros and names
+('./dev check'). Exit status: 1 if something was found.
 """
 import pathlib
 import re
@@ -17,10 +17,11 @@ ENGINE = "Kq_BoolEquationImp.h"
 NODE = "Kq_BoolEquationImpNode.h"
 PUBLIC = {FACADE, ENGINE, NODE}
 
-# What a public header may include of the other two: each knows only those below it. Inside, the build
-# enforces the floors: a room's compiler sees the headers of the rooms before it and no others.
+# What a public header may include of the other two: each knows only those below it. Inside the
+# library, the build enforces the floors: a room's compiler sees only the headers of the rooms
+# before it.
 PUBLIC_FLOORS = {FACADE: set(), ENGINE: {FACADE}, NODE: {ENGINE}}
-SYSTEM_HEADERS = {"sys/mman.h"}  # large pages for large texts, where the system has them
+SYSTEM_HEADERS = {"sys/mman.h"}  # large pages for large texts, if the system has them
 
 MAX_HEADER_LINES = 199
 MAX_SOURCE_LINES = 399
@@ -55,7 +56,7 @@ def is_ours(name):
 
 
 def check_library_includes(path, lines, report):
-    """Public headers in angle brackets, headers of rooms by their bare names in quotes."""
+    """Public headers are in angle brackets, headers of rooms by their bare names in quotes."""
     others = PUBLIC_FLOORS.get(path.name, PUBLIC)
     for number, bracket, name in includes(lines):
         if bracket == "<":
@@ -68,7 +69,7 @@ def check_library_includes(path, lines, report):
 
 
 def check_own_header(path, lines, report):
-    """Included first, a header shows that it lacks nothing."""
+    """A source includes its own header first, which shows that the header is complete."""
     own = path.with_suffix(".h")
     if path.suffix == ".cpp" and own.exists():
         found = includes(lines)
@@ -77,7 +78,7 @@ def check_own_header(path, lines, report):
 
 
 def table_lines(lines):
-    """Indices of lines inside constant tables: 'const ... = {' at the margin to '};'."""
+    """The indices of lines inside constant tables: from 'const ... = {' at the margin to '};'."""
     inside, indices = False, set()
     for index, line in enumerate(lines):
         if inside and re.match(r"\s*\}+;", line):
@@ -137,8 +138,8 @@ def check_host(root, report):
 
 
 def check_users(root, report):
-    """Tool and logic see the public headers only, the Python module the facade's and logic's; the
-    reference model nothing of the library."""
+    """Tool and logic see only the public headers, the Python module the facade's and logic's, and
+    the reference model nothing of the library."""
     for path in sorted([*root.glob("logic/**/*"), *root.glob("tools/**/*")]):
         if path.suffix in (".h", ".cpp"):
             for number, _, name in includes(read_lines(path)):
@@ -155,8 +156,8 @@ def check_users(root, report):
 
 
 def check_rooms(root, report):
-    """Headers of rooms are included by name alone, and what links them sees the folders of all: one
-    of a name that another has, or tool or module, would be taken for it."""
+    """Headers of rooms are included by name alone, and what links them sees the folders of all. So
+    two with the same name, in rooms, tool or module, would be confused."""
     seen = {}
     for path in sorted([*root.glob("logic/*/*.h"), *root.glob("tools/booleq/*.h"),
                         *root.glob("python/src/*.h")]):
@@ -172,7 +173,7 @@ def check_rooms(root, report):
 
 
 def check_second_library(root, report):
-    """Headers of the second library show nothing of what is under it."""
+    """Headers of the second library show nothing of the rooms under it."""
     for path in sorted(root.glob("include/kq_logic/*")):
         lines = read_lines(path)
         for number, bracket, name in includes(lines):

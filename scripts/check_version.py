@@ -1,13 +1,13 @@
 #!/usr/bin/env python3
-"""Checks that the version is stated in one place, and that all that is made from it agrees.
+"""Checks that the version is stated in one place, and that everything made from it agrees.
 
 usage: check_version.py VERSION SOURCES [PREFIX]
 
-VERSION is what CMakeLists.txt says in project(). Below SOURCES no other file may state it, but for
-CHANGELOG.md, whose newest release must be it, with a date; a pyproject.toml that describes its
+VERSION is the one in project() of CMakeLists.txt. No other file under SOURCES may state it, except
+CHANGELOG.md, whose newest release must be VERSION, with a date; a pyproject.toml that describes its
 project takes it from the build (dynamic). PREFIX is an installed tree: its packages for CMake and
-pkg-config, its libraries, its tool and its Python module, each where it is there, must say VERSION.
-Prints one line for each violation.  Exit status: 1 when there is one.
+pkg-config, its libraries, its tool and its Python module must give VERSION, each if it is
+installed. Prints one line for each violation.  Exit status: 1 if there is one.
 """
 import os
 import pathlib
@@ -85,7 +85,7 @@ def output_of(*command, **environment):
 
 
 def stated_versions(prefix, major):
-    """(what, the version that it states) of everything installed."""
+    """Pairs (what, the version that it states) for everything installed."""
     for package in prefix.rglob("kq_boolequation.pc"):
         yield "pkg-config", output_of("pkg-config", "--modversion", "kq_boolequation",
                                       PKG_CONFIG_PATH=str(package.parent))

@@ -1,8 +1,9 @@
-"""What Doxygen reads in place of a header or a page; the files themselves stay plain.
+"""What Doxygen reads instead of a header or a page; the files themselves stay plain.
 
-Headers: a comment stands for the declarations below it, up to a blank line or the next comment; a
-declaration with a comment after it has that one alone. "As in CLASS." stands for the comment of the
-member of the same name there. The comment that opens the file is the file's. Lines keep their numbers, so that warnings name the right ones.
+Headers: a comment applies to the declarations below it, up to a blank line or the next comment; a
+declaration followed by a comment has only that one. "As in CLASS." stands for the comment of the
+member of the same name there. The comment that opens the file is the file's. Lines keep their
+numbers, so that warnings name the right ones.
 Pages: headings, links between pages and pictures, as Doxygen wants them.
 """
 import collections
@@ -24,7 +25,7 @@ def escape(text):
 
 
 def markup(text):
-    """Plain text with quoted pieces as code, and nothing that Doxygen takes for a command."""
+    """Plain text, with quoted pieces as code and nothing that Doxygen takes for a command."""
     pieces, end = [], 0
     for match in CODE.finditer(text):
         code = match[0] if match[0][0] == '"' else match[0][1:-1]
@@ -56,7 +57,7 @@ def as_doc(lines, subject=""):
 
 
 def as_file_doc(lines):
-    """The comment that opens a file, and the example that it has in indented lines."""
+    """The comment that opens a file, and the example in its indented lines."""
     text, example = [], []
     for line in lines:
         (example if line.startswith("//     ") else text).append(line)
@@ -78,11 +79,11 @@ class Header:
     def __init__(self, lines):
         self.lines = lines
         self.output = [""] * len(lines)
-        self.comment = []      # of the declarations that come now
-        self.statement = ""    # the declaration so far, when it goes on in the next line
+        self.comment = []      # of the declarations that follow
+        self.statement = ""    # the declaration so far, if it continues on the next line
         self.body_depth = 0    # braces within a function's body
         self.in_enum = False
-        self.bare_enumerators = []  # numbers of lines; Doxygen 1.9.4 passes over them in silence
+        self.bare_enumerators = []  # numbers of lines; Doxygen 1.9.4 silently ignores them
 
     def comment_at(self, index):
         block = []
@@ -124,7 +125,7 @@ class Header:
             self.body_depth += line.count("{") - line.count("}")
             self.output[index] = line
         elif index > 0 and self.lines[index - 1].endswith("\\"):
-            self.output[index] = line  # a macro goes on
+            self.output[index] = line  # a macro continues
         elif line.startswith("#"):
             define = re.match(r"#define (\w+)", line)
             trailing = TRAILING.match(line)
@@ -157,7 +158,7 @@ class Header:
 # --- pages --------------------------------------------------------------------------------------
 
 NO_BRACKETS = str.maketrans("", "", "[]")
-HEADING_TARGET = re.compile(r"\[[^\]]+\]: \S+\.md#")  # where a heading in brackets leads: to itself
+HEADING_TARGET = re.compile(r"\[[^\]]+\]: \S+\.md#")  # a heading in brackets that links to itself
 CODE_SPAN = re.compile(r"`([^`]+)`")
 LINK = re.compile(r"(!?)\[([^\]]*)\]\(([^)\s]+)\)")
 
@@ -167,7 +168,7 @@ def page_name(path):
 
 
 def slug(heading):
-    """The anchor that a heading has where the page is read as it is."""
+    """The anchor that a heading has if the page is read as it is."""
     heading = re.sub(r"[`*]", "", heading).strip().lower()
     return re.sub(r"[^\w\- ]", "", heading).replace(" ", "-")
 
@@ -184,7 +185,7 @@ def link(match, own_name):
 
 
 def code_span(match):
-    """A quote would end it too early, and a bar in it end a table's cell."""
+    """A quote would end it too early, and a bar in it would end a table's cell."""
     if "\\|" in match[1]:
         return "<code>" + escape(match[1].replace("\\|", "|")).replace("|", "\\|") + "</code>"
     return f"``{match[1]}``" if "'" in match[1] else match[0]

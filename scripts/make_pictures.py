@@ -1,11 +1,12 @@
 #!/usr/bin/env python3
-"""Makes the pictures of the documentation, or checks that they are what would be made now.
+"""Makes the pictures of the documentation, or checks that they are up to date.
 
 usage: make_pictures.py [--check] ROOT BOOLEQ
 
-What booleq prints is compared byte for byte. What Graphviz's dot draws depends on the fonts of the
-machine, so of that nodes, edges and texts are compared, and not where they stand. Exit status of a
-check: 1 when a picture is not up to date, 77 when there is no dot and all others are.
+Pictures that booleq prints are compared byte for byte. What Graphviz's dot draws depends on the
+fonts of the machine, so only nodes, edges and texts are compared, not their positions. Exit status
+of a check: 1 if a picture is not up to date, 77 if dot is missing and all other pictures are up to
+date.
 """
 import pathlib
 import shutil
@@ -41,7 +42,7 @@ def draw(path):
 
 
 def what_is_drawn(svg):
-    """Nodes, edges and texts of a picture that dot drew."""
+    """The nodes, edges and texts of a picture that dot drew."""
     root = xml.etree.ElementTree.fromstring(svg.encode())
     return [element.text for element in root.iter() if element.tag in (SVG + "title", SVG + "text")]
 

@@ -1,24 +1,23 @@
 #!/usr/bin/env python3
 """Mutation check: changes one operator, constant or condition in s/ at a time and runs the quick
-tests, which should fail; reports the changes that no test notices. Debian 12 has no program that
+tests, which should fail. Reports the changes that no test notices. Debian 12 has no program that
 does this for C++.
 
 usage: mutate.py ROOT WORK [--count N] [--seed N] [--jobs N] [--only TEXT] [--survivors] [--list]
 
-WORK is where copies of the tree and their builds are kept, one for each job; ROOT is not changed.
-A mutant costs one compilation (a header: one for each user), one link and the tests up to the
-first failure. It is killed by a failing or crashing test, and by one that takes several times the
-processor time it takes without it. What counts as a mutant, and what is left out:
+WORK holds copies of the tree and their builds, one for each job; ROOT is not changed. A mutant
+costs one compilation (in a header: one for each source that includes it), one link and the tests up
+to the first failure. It is killed by a test that fails, crashes or takes several times its usual
+processor time. What counts as a mutant, and what is left out:
   - operators are those with blanks around them or in front of an operand, so no template brackets,
     pointers and references;
-  - comments, texts, preprocessor lines, assertions and the check of the debug builds are no
-    behaviour;
-  - SPEED_ONLY names what changes time or memory and no result: hints, room made beforehand, sizes
-    of tables and stacks that grow, thresholds between two ways to one result;
-  - a mutant that does not compile, or whose machine code equals the original's, is none.
+  - comments, texts, preprocessor lines, assertions and the check of the debug builds are left out;
+  - SPEED_ONLY names what changes time or memory but no result: hints, reserved room, sizes of
+    tables and stacks that grow, thresholds between two ways to the same result;
+  - a mutant that does not compile, or whose machine code equals the original's, does not count.
 scripts/mutants_equivalent.txt lists mutants that cannot be noticed, each with its reason; they are
 not counted either.
-Exit status: 1 when a mutant survived that is not listed.
+Exit status: 1 if a mutant survived that is not listed.
 """
 import argparse
 import collections
@@ -35,14 +34,14 @@ import signal
 import subprocess
 import sys
 
-NOT_COPIED = re.compile(r"\.git|build.*")  # of the tree's root
+NOT_COPIED = re.compile(r"\.git|build.*")  # in the tree's root
 CONFIGURE = ["-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
              "-DCMAKE_CXX_FLAGS_DEBUG=-O1 -D_GLIBCXX_ASSERTIONS",
              "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", "-DKQ_BUILD_TOOLS=OFF",
              "-DKQ_BUILD_LOGIC=OFF"]
 LIBRARY = "kq_boolequation"
 
-# Likely killers first; the large texts and what fails allocations take longest.
+# Likely killers first; tests of large texts and of failing allocations take longest.
 EXHAUSTIVE = "*UpToThreeTokens*:*EveryTextOfOneByte*:*InitValues*:*UpToFiveTokensTrace*"
 TESTS = [
     ("unit_tests", "-Large.*"),
@@ -53,12 +52,12 @@ TESTS = [
     ("random_tests", "Allocation.*:Operations.*"),
     ("loading/loading_tests", "*"),
 ]
-SLOWDOWN = 4  # of processor time; the clock, which other programs stretch, may run much longer
+SLOWDOWN = 4  # in processor time; wall-clock time, which other programs stretch, may be much longer
 MIN_SECONDS = 4
 CLOCK = 10
 MAX_MEMORY = 8 << 30
 
-# Lines that change time or memory and no result, by file and text.
+# Lines that change time or memory but no result, by their text.
 SPEED_ONLY = [re.compile(text) for text in (
     r"\b(reserve|max|min)\(.*(Expected|kFirstVariables|kInline|GetSize|numDigits|size\(\))",
     r"\breserve\(",
@@ -93,7 +92,8 @@ TOKEN = re.compile(r"""
   | (?P<blank>\s+)
 """, re.X | re.M | re.S)
 
-# What to put between two places of a file; the line there, before and after, blanks closed up.
+# What to put between two places of a file; and the line there, before and after, without extra
+# blanks.
 Mutant = collections.namedtuple("Mutant", "path line begin end after old new")
 
 
@@ -110,7 +110,7 @@ def closing(tokens, opening):
 
 
 def skipped_ranges(tokens):
-    """Token ranges of assertions, of functions that are named above, of attributes."""
+    """The token ranges of assertions, of functions named above and of attributes."""
     for index, (kind, text, _) in enumerate(tokens[:-1]):
         if kind != "name" or tokens[index + 1][1] != "(":
             continue
@@ -136,7 +136,7 @@ def new_number(text):
 
 
 def changes(tokens, source, index):
-    """(begin, end, after) of each change that starts at a token."""
+    """(begin, end, after) for each change that starts at a token."""
     kind, text, begin = tokens[index]
     end = begin + len(text)
     before, behind = source[begin - 1:begin], source[end:end + 1]
@@ -213,7 +213,7 @@ def children_seconds():
 
 
 class Tree:
-    """A copy of the sources, its build, and what is needed to change one source at a time."""
+    """A copy of the sources with its build, and how to change one source at a time."""
 
     def __init__(self, root, work):
         self.source, self.build = work / "tree", work / "build"
@@ -268,12 +268,12 @@ class Tree:
                     self.objects.setdefault(name, []).append((commands[path], path))
 
     def read_links(self, targets):
-        """The command of each link that objects of s/ take part in, the shared library's first."""
+        """The command of each link in which objects of s/ take part, the shared library's first."""
         objects = {used for path, uses in self.objects.items() if path.endswith(".cpp")
                    for _, used in uses if used.endswith(".cpp.o")}
         links = []
         for target in targets:
-            # The shared library's link is followed by the links to its other names.
+            # The shared library's link command is followed by the links to its other names.
             links += [line for line in self.run(
                 ["ninja", "-C", self.build, "-t", "commands", target]).splitlines()
                       if " -c " not in line and not objects.isdisjoint(line.split())]
@@ -329,7 +329,7 @@ class Tree:
 
 
 def sources(root):
-    """All sources and headers of s/, in all its folders."""
+    """All sources and headers in all folders of s/."""
     return sorted(path for path in (root / "s").rglob("*") if path.suffix in (".cpp", ".h"))
 
 
@@ -341,7 +341,7 @@ def choose(root, seed, only):
 
 
 def campaign(trees, mutants, count, report):
-    """The results of the first 'count' mutants that are any."""
+    """The results of the first 'count' mutants that count."""
     free = queue.Queue()
     for tree in trees:
         free.put(tree)

@@ -1,16 +1,16 @@
 #!/usr/bin/env python3
-"""Runs fuzzers one after the other and prints a table of what they did.
+"""Runs fuzzers one after another and prints a table of what they did.
 
 usage: run_fuzz.py SECONDS BUILD SOURCE NAME...       run each for so many seconds
        run_fuzz.py NUMBERx BUILD SOURCE NAME...       run each for so many executions: 1000000x, 1e8x
        run_fuzz.py --keep BUILD SOURCE NAME...        choose the inputs that SOURCE/corpus keeps
 
-Each fuzzer runs in two processes, which share what they find.
-BUILD is the folder of the executables fuzz_NAME and replay_NAME, SOURCE that of the targets. Inputs
-found are kept in BUILD/found/NAME, so that the next run goes on from there; an input that breaks
-something is told in words and lies in BUILD/findings. --keep chooses, of the inputs kept and found,
-the fewest that reach all code that all of them reach.
-Exit status: 1 when something was found, or a fuzzer could not run.
+Each fuzzer runs in two processes, which share what they find. BUILD is the folder of the
+executables fuzz_NAME and replay_NAME, SOURCE that of the targets. Inputs found are kept in
+BUILD/found/NAME, so that the next run continues from there. An input that breaks something is
+reported and kept in BUILD/findings. --keep chooses, from the inputs kept and found, the fewest that
+reach all the code that all of them reach. Exit status: 1 if something was found, or if a fuzzer
+could not run.
 """
 import os
 import pathlib
@@ -22,7 +22,7 @@ import time
 
 WORKERS = 2
 SECONDS_PER_INPUT = 10  # a hang is a finding
-MEGABYTES = 3072  # the pool of names keeps every name it has seen
+MEGABYTES = 3072  # enough for the pool of names, which keeps every name that it has seen
 MAX_LENGTH = {"text": 240, "init_value": 320, "script": 400, "column": 240, "lean": 80, "pla": 400,
               "netlist_blif": 2000, "netlist_edif": 3000, "netlist_json": 3000}
 DICTIONARY = {"text": "text", "lean": "text"}
@@ -62,7 +62,7 @@ def describe(target, path):
 
 
 def read_limit(text):
-    """The option that ends a run after so many seconds, or so many executions: '60', '1e8x'."""
+    """The option that ends a run after so many seconds or executions: '60', '1e8x'."""
     found = re.fullmatch(r"(\d+(?:e\d+)?)(x?)", text)
     if not found:
         sys.exit(f"run_fuzz.py: '{text}' is neither seconds (60) nor executions (1000000x, 1e8x)")
@@ -71,7 +71,7 @@ def read_limit(text):
 
 
 def run(target, limit):
-    """Runs one fuzzer and gives its row of the table, and what it found."""
+    """Runs one fuzzer; returns its row of the table and what it found."""
     before = count_files(target.found)
     log_path = target.build / f"fuzz_{target.name}.log"
     former = set(target.findings.iterdir())
@@ -100,7 +100,7 @@ def run(target, limit):
 
 
 def covered(target):
-    """Edges that all inputs reach together; the fork mode's own count adds some up twice."""
+    """The edges that all inputs reach together; the count of the fork mode counts some twice."""
     done = subprocess.run(target.command("-runs=0", target.found, target.kept),
                           stdout=subprocess.PIPE, stderr=subprocess.STDOUT, text=True,
                           errors="replace", cwd=target.build, check=False)

@@ -1,12 +1,12 @@
 #!/usr/bin/env bash
-# Debian packages and a fresh clone in clean Debian 12 roots, as people meet them:
+# Tests Debian packages and a fresh clone in clean Debian 12 roots, as people use them:
 #   user       nothing but the packages, installed by apt
 #   developer  programs built against them; when they are purged, no file is left behind
 #   newcomer   the two commands of README and its lines for pip in a fresh clone, on Debian's minimal
 #              system, as a user whose sudo asks for a password
-# piuparts would check purging alone, in one more root; here that is a list of files before and after.
-# The same commit packed elsewhere gives the same bytes. All of it runs in a namespace of its own:
-# when this script ends, however it does, nothing stays mounted or running.
+# piuparts would check only purging, in one more root; here a list of files before and after does
+# that. The same commit packed elsewhere must give the same bytes. Everything runs in its own
+# namespace: however this script ends, nothing stays mounted or running.
 # usage: test_packages.sh REPOSITORY PACKAGES DIRECTORY   as root; roots and logs go to DIRECTORY
 set -euo pipefail
 
@@ -21,7 +21,7 @@ die() {
 
 # --- the namespace ----------------------------------------------------------------------------
 
-# Out here, the script only waits; killed, it takes the namespace along.
+# Outside the namespace, the script only waits; if it is killed, the namespace ends with it.
 if [ "${KQ_NAMESPACE:-}" != inside ]; then
     [ "$(id -u)" -eq 0 ] || die "only root can change roots and mount: sudo ./dev test-packages"
     KQ_NAMESPACE=inside setpriv --pdeathsig KILL unshare --mount --pid --fork --kill-child \
@@ -32,7 +32,7 @@ if [ "${KQ_NAMESPACE:-}" != inside ]; then
     trap 'exit 143' TERM
     status=0
     wait "$child" || status=$?
-    # Mounts are gone now. After a failure the roots stay, to be looked at.
+    # The mounts are gone now. After a failure the roots stay for inspection.
     [ "$status" -ne 0 ] ||
         rm -rf --one-file-system -- "$directory"/{user,developer,newcomer,clone}
     exit "$status"
@@ -42,9 +42,9 @@ fi
 
 base=$directory/base
 logs=$directory/logs
-password=seventeen-herons # of the newcomer, whose root is thrown away
+password=seventeen-herons # of the newcomer, whose root is deleted
 
-# Where this machine gets Debian 12 from, one line "URI SUITE" for each part.
+# Where this machine gets Debian 12 from: one line "URI SUITE" for each part.
 debian_sources() {
     # shellcheck disable=SC2016 # apt-get expands these
     apt-get indextargets --format '$(ORIGIN) $(COMPONENT) $(REPO_URI) $(CODENAME)' \
@@ -74,8 +74,7 @@ make_base() {
     mv -- "$base.new" "$base"
 }
 
-# A fresh copy of the base, with what programs expect to be mounted. Packages that were fetched once
-# are kept outside.
+# A fresh copy of the base, with the mounts that programs expect. Fetched packages are kept outside.
 make_root() {
     local root=$directory/$1
     rm -rf --one-file-system -- "$root"
@@ -102,7 +101,7 @@ in_root() {
 # Arguments: name of the root, what to install.
 apt_get_install() { in_root "$1" 900 apt-get -q -y install "${@:2}"; }
 
-# Every file of a root but what apt, dpkg and caches write for themselves.
+# Every file of a root except what apt, dpkg and caches write for themselves.
 file_list() {
     (cd -- "$directory/$1" && find . -xdev \( -path ./var/cache -o -path ./var/log -o -path ./tmp \
         -o -path ./var/lib/apt -o -path ./var/lib/dpkg -o -path ./packages \) -prune \
@@ -115,8 +114,8 @@ passed=0
 failed=0
 skipped=0
 
-# Arguments: name, command. A failed test shows the end of what it printed; 'status' tells callers.
-# Not to be called in a condition: the command would go on after an error within it.
+# Arguments: name, command. A failed test shows the end of its output; 'status' tells callers. Do
+# not call it in a condition: the command would continue after an error inside it.
 status=0
 try() {
     local name=$1 log=$logs/${1//[^A-Za-z0-9]/-}.log started=$SECONDS
@@ -141,7 +140,7 @@ try() {
 
 is_ours() { printf '%s\n' "${names[@]}" | grep -qxF -- "$1"; }
 
-# The file is one that the package holds.
+# Whether the package contains the file.
 belongs_to() {
     local root=$1 file=$2 package=$3
     local owner
@@ -152,7 +151,7 @@ belongs_to() {
 
 install_packages() { (cd -- "$directory/$1" && apt_get_install "$1" ./packages/*.deb); }
 
-# What programs are built with, and what our packages depend on: neither is a leftover of ours.
+# What programs are built with, and what our packages depend on: neither counts as left behind.
 install_tools() {
     local name dependencies=()
     cd -- "$directory/developer"
@@ -228,7 +227,7 @@ same_bytes() {
     done
 }
 
-# An ordinary user, who may use sudo with a password. The lists of packages go, because a minimal
+# An ordinary user, who may use sudo with a password. Removes the package lists, because a minimal
 # system has none.
 add_newcomer() {
     in_root newcomer 300 apt-get -q update
@@ -240,7 +239,7 @@ add_newcomer() {
     in_root newcomer 60 chown -R newcomer: /home/newcomer
 }
 
-# Arguments: seconds, command. It runs on a terminal, where the password is typed when asked for.
+# Arguments: seconds, command. Runs it on a terminal, where the password is typed when asked for.
 as_newcomer() {
     local seconds=$1
     shift
@@ -249,7 +248,7 @@ as_newcomer() {
         HOME=/home/newcomer PATH=/usr/local/bin:/usr/bin:/bin LC_ALL=C.UTF-8 "$@"
 }
 
-# Nobody is there to type the password: a clear end, not a wait.
+# With nobody to type the password, the command must end with a clear message, not wait.
 newcomer_is_refused() {
     local status=0
     timeout -k 10 60 setsid chroot --userspec=newcomer:newcomer "$directory/newcomer" \
@@ -261,7 +260,7 @@ newcomer_is_refused() {
     grep -F 'could not install' "$logs/refused.txt"
 }
 
-# Arguments: seconds, a verb of ./dev and its arguments. Prints what the two figures of README are.
+# Arguments: seconds, a verb of ./dev and its arguments. Prints the two figures that README gives.
 newcomer_dev() {
     local seconds=$1 before start=$SECONDS
     shift
@@ -286,10 +285,10 @@ newcomer_tests() {
     tail -n 1 -- "$logs/newcomer.txt" | grep -E '^[0-9]+ passed, 0 failed'
 }
 
-# README's lines for pip as they stand, in a virtual environment; apt's question is answered.
+# README's lines for pip, unchanged, in a virtual environment; apt's question is answered.
 newcomer_uses_pip() {
     local lines
-    # shellcheck disable=SC2016 # these are the marks of README
+    # shellcheck disable=SC2016 # these are README's markers
     lines=$(sed -n '/^```sh pip$/,/^```$/p' "$repository/README.md" | sed '1d; $d')
     [ -n "$lines" ]
     as_newcomer 1800 /bin/bash -ec "cd ~/repository; ${lines/apt install/apt install -y}

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
-# Runs a command on a terminal of its own and types a password ($KQ_PASSWORD) whenever sudo asks for
-# it there, as a user would. What the terminal shows goes to standard output with plain line ends; a
-# last line says how often the password was typed.
+# Runs a command on its own terminal and types a password ($KQ_PASSWORD) whenever sudo asks for it,
+# as a user would. What the terminal shows goes to standard output with plain line ends; the last
+# line says how often the password was typed.
 # usage: type_password.py SECONDS COMMAND...   ends with the command's status, or 124 when time is up
 import os
 import pty
@@ -18,7 +18,7 @@ def fail(message):
     sys.exit(2)
 
 
-# The password is typed after the whole prompt, because sudo throws away what came before.
+# The password is typed after the whole prompt, because sudo discards earlier input.
 def converse(terminal, password, deadline):
     shown, times_typed, is_over = b"", 0, False
     while not is_over and time.monotonic() < deadline:
@@ -54,7 +54,7 @@ def main():
     times_typed, is_over = converse(terminal, password, time.monotonic() + int(sys.argv[1]))
     if not is_over:
         os.kill(process, signal.SIGKILL)
-    os.close(terminal)  # hangs up on whatever is still running there
+    os.close(terminal)  # sends a hang-up to whatever still runs there
     status = os.waitstatus_to_exitcode(os.waitpid(process, 0)[1])
     print(f"type_password: prompts answered: {times_typed}")
     sys.exit(124 if not is_over else status if status >= 0 else 128 - status)

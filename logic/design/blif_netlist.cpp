@@ -54,8 +54,8 @@ class BlifNetlistReader {
 
     [[noreturn]] void Refuse(const std::string& what) const { ThrowAtLine(m_start, what); }
 
-    // The words of the next line that has any, with those that it continues by '\'.
-    // Deliberate: '#' begins a comment only at the start of a word, for it stands in names, too.
+    // The words of the next line that has any, together with those of the lines continued by '\'.
+    // Deliberate: '#' begins a comment only at the start of a word, because names contain it, too.
     bool NextLine()
     {
         m_words.clear();
@@ -128,7 +128,7 @@ class BlifNetlistReader {
         Flush();
     }
 
-    // What says something of times and loads only.
+    // Directives that are only about times and loads.
     static bool IsAboutTiming(std::string_view word)
     {
         static constexpr const char* kWords[] = {".area",
@@ -185,7 +185,7 @@ class BlifNetlistReader {
 
     void ReadBlackBox() { m_module->isBlackBox = true; }
 
-    // Rows that do not matter outside say nothing of the tables.
+    // External don't-cares (.exdc) say nothing about the tables.
     void SkipToEnd()
     {
         Flush();
@@ -220,7 +220,7 @@ class BlifNetlistReader {
         return known.net;
     }
 
-    // Two names of one net. Without a table: this is what connects nets elsewhere.
+    // Two names of one net. There is no table here: other formats connect nets the same way.
     void ReadConnection()
     {
         Flush();
@@ -285,7 +285,7 @@ class BlifNetlistReader {
         for (size_t pin = 0; pin < numLow; ++pin)
             if (pattern[pin] != '-')
                 low &= pattern[pin] == '1' ? BitPattern(pin) : ~BitPattern(pin);
-        size_t care = 0; // of a word's number
+        size_t care = 0; // bits of a word's number
         size_t value = 0;
         for (size_t pin = 6; pin < pattern.size(); ++pin) {
             care |= size_t(pattern[pin] != '-') << (pin - 6);
@@ -326,7 +326,7 @@ class BlifNetlistReader {
         m_intake.EndWithRows(booleq::Rows(m_num_pins, m_words_of_rows), m_inputs, output);
     }
 
-    // Deliberate: a signal without inputs is a constant, as Yosys reads it, and not a table.
+    // Deliberate: a signal without inputs is a constant, as Yosys reads it, not a table.
     void FlushConstant()
     {
         if (m_output_name == "$undef" && m_rows_are == Rows01::None) {
@@ -339,7 +339,7 @@ class BlifNetlistReader {
             return;
         const bool isOne = m_rows_are == Rows01::Ones;
         m_module->joins.emplace_back(isOne ? kNetOne : kNetZero, output);
-        if (m_output_name != (isOne ? "$true" : "$false")) // which only spell a constant
+        if (m_output_name != (isOne ? "$true" : "$false")) // these names only spell a constant
             AddNote(FindingCode::ConstantNet, output, isOne ? "always 1" : "always 0");
     }
 
@@ -349,7 +349,7 @@ class BlifNetlistReader {
                                    : std::string(m_job.design.names.Text(m_module->netNames[net]));
     }
 
-    // What is said of a table that does not become one.
+    // A finding about a .names that does not become a table.
     void AddNote(FindingCode code, LocalNet output, const std::string& text)
     {
         if (output < kNumFixedNets)
@@ -409,7 +409,7 @@ class BlifNetlistReader {
         m_is_named = true;
     }
 
-    // From the word to the end of the line, without quotation marks.
+    // The text from this word to the end of the line, without enclosing quotation marks.
     std::string_view TextFrom(size_t word) const
     {
         const char* first = m_words[word].data();
@@ -435,7 +435,7 @@ class BlifNetlistReader {
             m_intake.SetKey(m_job.design.names.Add(TextFrom(2)));
     }
 
-    // The table or cell that stands open is complete.
+    // Completes the table or cell that is open.
     void Flush()
     {
         const Open open = m_open;
@@ -455,9 +455,9 @@ class BlifNetlistReader {
     Pace m_pace;
     CellIntake m_intake;
     std::string_view m_rest;
-    std::vector<std::string_view> m_words; // of the line
+    std::vector<std::string_view> m_words; // of the current line
     uint32_t m_line = 0;
-    uint32_t m_start = 0; // the line where m_words begin
+    uint32_t m_start = 0; // the line where m_words begins
     std::unordered_set<NameId> m_model_names;
     ModuleContent* m_module = nullptr;
     std::vector<KnownNet> m_nets; // by name
@@ -470,7 +470,7 @@ class BlifNetlistReader {
     Rows01 m_rows_are = Rows01::None;
     uint64_t m_num_rows = 0;
     bool m_is_named = false;
-    bool m_is_wire = false; // its row says that the output is the input
+    bool m_is_wire = false; // its last row says that the output is the input
 };
 
 } // namespace

@@ -114,7 +114,7 @@ uint32_t CellIntake::DesignTypeOf(KnownType& known, size_t variant)
     return designType;
 }
 
-// Pins mostly come in the order of the type, so the hint is mostly right.
+// Pins usually come in the order of the type, so the hint is usually right.
 const CellIntake::Pin* CellIntake::FindPin(std::string_view name, size_t hint) const
 {
     if (hint < m_pins.size() && m_pins[hint].name == name)
@@ -142,7 +142,7 @@ bool CellIntake::HasAllPins(const CellType& type) const
     });
 }
 
-// A[12] of the vector pin A.
+// Whether 'pin' is the vector pin A or a bit of it such as A[12].
 bool CellIntake::IsVectorBit(const CellType& type, std::string_view pin, size_t& bit) const
 {
     const std::string& vector = type.vectorPin;
@@ -195,7 +195,7 @@ void CellIntake::End()
     RefusePins(known);
 }
 
-// No variant of the type has all the pins. The one that has most of them tells which are strange.
+// No variant of the type has all the pins. The one that has most of them shows which are strange.
 void CellIntake::RefusePins(KnownType& known)
 {
     size_t best = 0;
@@ -241,7 +241,7 @@ LocalNet CellIntake::OutputNet(const std::string& pin)
     return found == nullptr || found->count == 0 ? kNetOpen : m_bits[found->first];
 }
 
-// The bits of the vector pin become m_inputs, whether it came whole or bit by bit.
+// The bits of the vector pin become m_inputs, whether the pin came whole or bit by bit.
 void CellIntake::GatherVector(const CellType& type)
 {
     m_inputs.clear();
@@ -267,7 +267,7 @@ void CellIntake::GatherVector(const CellType& type)
     }
 }
 
-// A cell without a name gets one by its line; a table, that of its output.
+// A cell without a name is named after its line. (A table is named after its output.)
 NameId CellIntake::NameOrLine()
 {
     return m_name != 0 ? m_name : m_design.names.Add("$line" + std::to_string(m_line));
@@ -325,7 +325,7 @@ void CellIntake::AddFinding(FindingCode code, const std::string& text)
     m_findings.push_back(std::move(finding));
 }
 
-// Findings of this cell are of that table, or of the cell's name where it has none.
+// Attaches the findings of this cell to that table, or to the cell's name if it has no table.
 void CellIntake::PlaceFindings(uint32_t table)
 {
     for (ReadFinding& finding : m_findings) {

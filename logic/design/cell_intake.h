@@ -1,6 +1,7 @@
-// Takes the cells of a module one by one, as a reader meets their parts, and makes tables of those
-// whose type is known. What is odd about a cell becomes a finding; nothing here refuses a file.
-// Cost: in step with the parts of the cell; no allocation once the scratch space has grown.
+// Takes the cells of a module one by one, in parts as a reader meets them, and makes tables of
+// cells whose type is known. Anything odd about a cell becomes a finding.
+// Fails: ReadFault for a cell without a type, and where a limit on sizes is passed.
+// Cost: proportional to the parts of the cell; no allocation once the scratch space has grown.
 #ifndef BOOLEQ_DESIGN_CELL_INTAKE_H
 #define BOOLEQ_DESIGN_CELL_INTAKE_H
 
@@ -16,41 +17,41 @@
 
 namespace booleq {
 
-// A parameter's value: a text as it stands in the file, or a number.
+// A parameter's value: a text as written in the file, or a number.
 struct CellValue {
     std::string_view text;
     uint64_t number = 0;
     bool isNumber = false;
 };
 
-// Sets the number from a text of decimal digits.  Fails: false for more than 64 bits; the value
-// stays a text then, which is not an init value.
+// Sets the number from a text of decimal digits.  Fails: false if the text is anything else or
+// needs more than 64 bits; the value then stays a text.
 bool TakeNumber(CellValue& value);
 
 // Between Begin and End, views must stay valid.
 class CellIntake {
   public:
-    // 'bare' says how the format means digits without a prefix.
+    // 'bare' says how the format reads digits without a prefix.
     CellIntake(Design& design, const CellTypes& cellTypes, BareDigits bare);
 
-    // Cells are of this module from now on.
+    // The cells that follow belong to this module.
     void EnterModule(ModuleContent& module) { m_module = &module; }
 
-    // 0 is not a name.
+    // A name of 0 means that the cell has none.
     void Begin(NameId name, uint32_t line);
-    uint32_t Line() const { return m_line; } // as Begin got it
+    uint32_t Line() const { return m_line; } // as given to Begin
     void SetType(std::string_view type) { m_type = type; }
     void SetName(NameId name) { m_name = name; }
     void SetKey(NameId key) { m_key = key; }
     void AddParameter(std::string_view name, const CellValue& value);
     void AddPin(std::string_view pin, const LocalNet* nets, size_t numNets);
-    // The cell is complete.
+    // Ends a cell with all its parts.
     void End();
 
-    // The cell, between Begin and End, is a table whose rows the format itself says.
-    // The inputs are from the least significant, as in an init value.
+    // Ends a cell, instead of End, whose rows the format itself gives. The inputs begin with the
+    // least significant, as in an init value.
     void EndWithRows(const Rows& rows, const std::vector<LocalNet>& inputs, LocalNet output);
-    // It cannot be read, for that reason.
+    // Ends a cell, instead of End, that cannot be read, for that reason.
     void EndUnread(FindingCode code, const std::string& text);
 
   private:
@@ -63,7 +64,7 @@ class CellIntake {
         std::string_view name;
         CellValue value;
     };
-    // What is known of a type's name: the variants, and the type in the design for each of them.
+    // What is known about a type name: its variants, and for each of them the type in the design.
     struct KnownType {
         const std::vector<uint32_t>* variants = nullptr;
         std::vector<uint32_t> designTypes;
@@ -114,11 +115,11 @@ class CellIntake {
     std::vector<Parameter> m_parameters;
     std::vector<Pin> m_pins;
     std::vector<LocalNet> m_bits;
-    std::vector<LocalNet> m_inputs;   // of the table that is made
+    std::vector<LocalNet> m_inputs;   // of the table being made
     std::vector<InitDigits> m_digits; // of the type's parameters
-    std::vector<uint64_t> m_words;    // of the table that is made
+    std::vector<uint64_t> m_words;    // of the table being made
     std::vector<uint64_t> m_unknown;
-    std::vector<ReadFinding> m_findings; // of this cell; they wait for its table
+    std::vector<ReadFinding> m_findings; // of this cell, kept until its table is made
 };
 
 } // namespace booleq

@@ -1,4 +1,4 @@
-// The tables of a cell: what its parameters and pins say of each output.
+// The tables of a cell: one for each output, from its parameters and pins.
 #include <algorithm>
 #include <cassert>
 
@@ -9,7 +9,7 @@ namespace booleq {
 
 namespace {
 
-// Whether a value, in whatever spelling, is that number.
+// Whether a value, in any spelling, is that number.
 bool IsNumber(const CellValue& value, uint64_t number)
 {
     if (value.isNumber)
@@ -74,7 +74,7 @@ bool CellIntake::AreConditionsMet(const CellStep& step) const
                        [this](const CellCondition& condition) { return IsMet(condition); });
 }
 
-// The value of a parameter, as many bits as the table has rows.  Fails: false, with a finding.
+// The value of a parameter, in 'numBits' bits.  Fails: false, with a finding.
 bool CellIntake::ReadParameter(const CellParameter& parameter, uint32_t numBits, InitDigits& digits)
 {
     const CellValue* value = FindValue(parameter.name);
@@ -111,7 +111,7 @@ void CellIntake::EndTable(uint32_t cellType, uint32_t designType)
     EndUnreadOf(designType);
 }
 
-// The outputs that are connected; of a cell without one, the first that its parameters allow.
+// Adds the connected outputs; if none is connected, the first one that the parameters allow.
 // Fails: false, with a finding.
 bool CellIntake::AddOutputs(uint32_t cellType, uint32_t designType)
 {
@@ -134,7 +134,7 @@ bool CellIntake::AddOutputs(uint32_t cellType, uint32_t designType)
     return first != nullptr && (isAny || AddOutput(type, *first, designType));
 }
 
-// Those of this cell; what was found of them is the cell's.
+// Removes the tables of this cell; findings about them become findings about the cell.
 void CellIntake::RemoveTables(size_t first)
 {
     if (m_module->tables.size() == first)
@@ -147,7 +147,7 @@ void CellIntake::RemoveTables(size_t first)
     m_module->keys.resize(first);
 }
 
-// Fails: false, with a finding, where a parameter is not a number.
+// Fails: false, with a finding, if a parameter is not a number.
 bool CellIntake::AddOutput(const CellType& type, const ComposedTable& output, uint32_t designType)
 {
     m_digits.resize(std::max(m_digits.size(), type.parameters.size()));

@@ -14,7 +14,7 @@ namespace booleq {
 namespace {
 
 constexpr uint32_t kMaxParameterBits = 1u << 16;
-constexpr size_t kMaxCellPins = 16; // of all tables of a cell
+constexpr size_t kMaxCellPins = 16; // inputs, for all tables of a cell together
 
 std::vector<std::string> Words(std::string_view line)
 {
@@ -197,7 +197,7 @@ class TypeReader {
         m_type->steps.push_back(std::move(step));
     }
 
-    // PARAMETER=VALUE [initial], once or more.
+    // PARAMETER=VALUE [initial], one or more times.
     void ReadConditions(size_t word, CellStep& step) const
     {
         for (; word < m_words.size(); ++word) {
@@ -226,7 +226,7 @@ class TypeReader {
         Refuse(Quoted(name) + " is neither an input nor a table before this");
     }
 
-    // A parameter, bits of one (INIT[31:0]), or a number.
+    // Reads a parameter, bits of one (INIT[31:0]), or a number.
     void ReadSource(CellStep& step) const
     {
         if (step.inputs.size() > kMaxCellPins)
@@ -312,7 +312,7 @@ bool HasSamePins(const CellType& left, const CellType& right)
 const CellTypes& CellTypes::Known()
 {
     static const CellTypes* const types = [] {
-        auto* made = new CellTypes; // for the life of the process, whose end needs no order
+        auto* made = new CellTypes; // never deleted, so the order at exit does not matter
         std::string fault;
         const bool isRead = made->Add(KnownText(), "cells.txt", fault);
         assert(isRead);
@@ -334,7 +334,7 @@ bool CellTypes::Add(std::string_view text, const std::string& file, std::string&
                 m_types[*same] = std::move(type);
                 continue;
             }
-            // Those that come later are tried first: a user's go before ours.
+            // Types that come later are tried first: a user's before ours.
             variants.insert(variants.begin(), static_cast<uint32_t>(m_types.size()));
             m_types.push_back(std::move(type));
         }

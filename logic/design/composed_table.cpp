@@ -9,7 +9,7 @@ namespace booleq {
 
 namespace {
 
-// Bits first to first + count - 1, as words.
+// Copies bits first to first + count - 1, as words.
 void CopyBits(const std::vector<uint64_t>& source, uint64_t first, uint64_t count,
               std::vector<uint64_t>& target)
 {
@@ -55,7 +55,7 @@ ComposedTable::ComposedTable(const CellType& type, size_t output)
                 m_pins.push_back(input);
                 continue;
             }
-            assert(input - numPins < step); // steps use those before them
+            assert(input - numPins < step); // a step uses only steps before it
             m_is_used[input - numPins] = true;
             hasSteps = true;
         }
@@ -65,7 +65,7 @@ ComposedTable::ComposedTable(const CellType& type, size_t output)
     SortUnique(m_parameters);
     m_is_plain = !hasSteps && !m_parameters.empty();
     if (m_is_plain)
-        m_pins = type.steps[output].inputs; // in the order of the row, whatever that of the type
+        m_pins = type.steps[output].inputs; // in the order of the row number, not of the type
     else
         SortUnique(m_pins);
 }

@@ -1,6 +1,6 @@
-// The rows of one output of a cell, over the pins that it depends on: of a plain table bits of its
-// parameter, of a tree of tables what the tree says.
-// Cost: of a plain table that of its words, of a tree rows times steps.
+// The rows of one output of a cell, over the pins that it depends on: for a plain table, bits of
+// its parameter; for a tree of tables, what the tree computes.
+// Cost: for a plain table, copying its words; for a tree, rows times steps.
 #ifndef BOOLEQ_DESIGN_COMPOSED_TABLE_H
 #define BOOLEQ_DESIGN_COMPOSED_TABLE_H
 
@@ -13,18 +13,18 @@ namespace booleq {
 
 class ComposedTable {
   public:
-    // Requires: type.steps[output] is an output, of a type without a vector pin; the type outlives
-    // this.
+    // Requires: type.steps[output] is an output; the type has no vector pin and outlives this
+    // object.
     ComposedTable(const CellType& type, size_t output);
 
     const CellStep& Step() const { return m_type.steps[m_output]; }
-    // Of the type, from the least significant; the rows are over these.
+    // The pins of the type that the rows are over, the least significant first.
     const std::vector<uint32_t>& Pins() const { return m_pins; }
-    // Of the type; those that the rows depend on.
+    // The parameters of the type that the rows depend on.
     const std::vector<uint32_t>& Parameters() const { return m_parameters; }
 
-    // digits[k] is the value of parameter k.  False: no bit is unknown. Bits of a tree are known
-    // only where all its parameters are.
+    // digits[k] is the value of parameter k.  Returns whether any row is unknown. A row of a tree
+    // is unknown if any of the bits that it reads is unknown.
     bool Tabulate(const std::vector<InitDigits>& digits, std::vector<uint64_t>& words,
                   std::vector<uint64_t>& unknown) const;
 

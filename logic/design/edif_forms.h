@@ -1,5 +1,5 @@
-// Forms of an EDIF text and the names in them.
-// Throws ReadFault with a line.
+// The forms of an EDIF text and the names in them.
+// Fails: ReadFault with a line.
 #ifndef BOOLEQ_DESIGN_EDIF_FORMS_H
 #define BOOLEQ_DESIGN_EDIF_FORMS_H
 
@@ -23,7 +23,7 @@ struct EdifName {
     bool isArray = false;
 };
 
-// Strings that had to be decoded live as long as this.
+// Strings that had to be decoded live as long as this object.
 class EdifForms {
   public:
     explicit EdifForms(const ReadJob& job) : m_pace(job), m_tokens(job.source.Text()) {}
@@ -32,23 +32,24 @@ class EdifForms {
     [[noreturn]] void Refuse(const std::string& what) const { m_tokens.Refuse(what); }
     // The next part of a form; false at its end.
     bool NextPart(const char* form);
-    // Reads the rest of (edifVersion ..., which must be 2 0 0: others say nets in other forms.
+    // Reads the rest of (edifVersion ..., which must be 2 0 0: other versions write nets in other
+    // forms.
     void RequireVersion();
     // Skips the rest of a form.
     void Close(const char* form);
     // A string with its escapes replaced.
     std::string_view Decoded(std::string_view text);
-    // (rename ident "text") or ident, being the current token.
+    // The current token as a name: (rename ident "text") or ident.
     EdifName CurrentName();
-    // The next token is a name, or an array of one with a number of bits.
+    // The next token as a name, or as an array: a name with a number of bits.
     EdifName ReadName();
-    // The value in the rest of a (property NAME ...) of a string or an integer; false for others.
+    // Reads the rest of (property NAME ...). False unless the value is a string or an integer.
     bool ReadValue(CellValue& value);
     // The current token as a number.
     uint64_t Number(uint64_t max) const;
 
   private:
-    // A word: an '&' before it only lets it begin with a digit.
+    // The current token as a word, without an '&' in front, which only lets it begin with a digit.
     std::string_view Ident() const;
 
     Pace m_pace;

@@ -1,5 +1,6 @@
 // Reads EDIF 2.0.0: libraries of cells, each with an interface of ports and a view of instances and
-// nets. Nets say which pins they join, so the cells of a view are made when all of it is read.
+// nets. Pins are listed by net, not by cell, so the cells of a view are made after all of it is
+// read.
 #include <algorithm>
 #include <unordered_map>
 
@@ -74,12 +75,12 @@ class EdifReader {
         }
     }
 
-    // Cells of two libraries may have one name; modules may not.
+    // Cells of two libraries may share a name; modules may not.
     NameId ModuleName(std::string_view text)
     {
         std::string name(text);
         if (m_job.cellTypes.Find(name) != nullptr)
-            return m_job.design.names.Add(name); // never a module
+            return m_job.design.names.Add(name); // a known type is never a module
         for (int number = 2; !m_module_names.emplace(m_job.design.names.Add(name), true).second;
              ++number)
             name = std::string(text) + "#" + std::to_string(number);
@@ -123,7 +124,7 @@ class EdifReader {
         port.ident = m_idents.Add(name.ident);
         std::string_view text = name.text;
         if (name.isArray && text.find('[') != std::string_view::npos)
-            text = text.substr(0, text.find('[')); // a range
+            text = text.substr(0, text.find('[')); // without its range
         port.name = m_job.design.names.Add(text);
         port.numBits = name.numBits;
         while (m_forms.NextPart("port")) {
@@ -139,7 +140,7 @@ class EdifReader {
             m_forms.Close("direction");
         }
         for (const EdifPort& other : cell.ports)
-            if (other.ident == port.ident && cell.ports.size() < 1000) // else the square would cost
+            if (other.ident == port.ident && cell.ports.size() < 1000) // above, too slow
                 m_forms.Refuse("there are two ports " + Quoted(name.ident));
         cell.ports.push_back(port);
     }
@@ -174,7 +175,7 @@ class EdifReader {
         }
         const NameId ident = m_idents.Add(name.ident);
         if (library == EdifView::kNone) {
-            // That of the library, or the one that stood last.
+            // The cell of this library, or else the last cell of that name.
             const auto own = m_cell_numbers.find(CellKey(m_library, ident));
             if (own != m_cell_numbers.end())
                 return own->second;
@@ -199,7 +200,7 @@ class EdifReader {
         m_view.MakeCells(m_cells);
     }
 
-    // Bundles of nets are read as the nets in them; they stand in one another twice at most.
+    // A bundle of nets is read as the nets in it. A counter follows the nesting, not recursion.
     void ReadContentsParts(const char* form, uint32_t cell)
     {
         uint64_t depth = 1;
@@ -339,7 +340,7 @@ class EdifReader {
         m_view.joints.push_back(joint);
     }
 
-    // A cell has few ports; those of a large one are found by a map that is made once.
+    // Most cells have few ports. The ports of a large cell are found by a map that is made once.
     uint32_t FindPort(const EdifCell& cell, std::string_view ident)
     {
         const NameId id = m_idents.Find(ident);
@@ -361,7 +362,7 @@ class EdifReader {
         return place;
     }
 
-    // What an identifier means in the view that is read.
+    // What an identifier means in the current view.
     struct Known {
         uint32_t instanceEpoch = 0;
         uint32_t instance = 0;
@@ -381,7 +382,7 @@ class EdifReader {
     EdifTokens& m_tokens;
     EdifView m_view;
 
-    NameArena m_idents; // names of the file's own, apart from those of the design
+    NameArena m_idents; // the file's identifiers, kept apart from the design's names
     NameId m_library = 0;
     std::vector<EdifCell> m_cells;
     std::unordered_map<uint64_t, uint32_t> m_cell_numbers; // by library and identifier

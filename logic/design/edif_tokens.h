@@ -1,5 +1,5 @@
-// The tokens of an EDIF text, one after another: parentheses with their keyword, words and strings.
-// Throws ReadFault with a line.  Cost: in step with the text; depth takes no memory.
+// The tokens of an EDIF text, one at a time: parentheses with their keyword, words and strings.
+// Fails: ReadFault with a line.  Cost: linear in the text; nesting takes no memory.
 #ifndef BOOLEQ_DESIGN_EDIF_TOKENS_H
 #define BOOLEQ_DESIGN_EDIF_TOKENS_H
 
@@ -14,14 +14,14 @@ class EdifTokens {
   public:
     explicit EdifTokens(std::string_view text) : m_text(text) {}
 
-    // Makes the next token the current one; of "(net", Open with the text "net".
+    // Makes the next token the current one; "(net" is Open with the text "net".
     EdifToken Next();
     EdifToken Kind() const { return m_kind; }
-    // A keyword or word as it stands there, a string without its quotes.
+    // A keyword or word as written, or a string without its quotes.
     std::string_view Text() const { return m_token; }
-    // Whether the current token opens that form; keywords are the same in either case.
+    // Whether the current token opens that form; upper and lower case are the same in keywords.
     bool IsOpen(std::string_view keyword) const;
-    // Skips what the current token began: to the closing parenthesis of an Open, else nothing.
+    // Skips the rest of the form that the current token opens; nothing if it is not an Open.
     void Skip();
     // Line of the current token, from 1.
     uint64_t Line() const { return m_line; }
@@ -40,8 +40,8 @@ class EdifTokens {
     std::string_view m_token;
 };
 
-// The bytes of a string: "%34%" is a quotation mark, "%10 13%" two characters.
-// Returns the text itself where there is nothing to replace, else 'buffer'.
+// The bytes of a string: "%34%" is a quotation mark, "%10 13%" is two characters. Returns the text
+// itself if there is nothing to replace, else 'buffer'.
 std::string_view DecodeEdifString(std::string_view text, std::string& buffer);
 
 } // namespace booleq

@@ -1,5 +1,5 @@
-// A view of an EDIF cell: its instances and what its nets join. Nets say which pins they have, so
-// cells are made when all of it is read.
+// A view of an EDIF cell: its instances and what its nets join. Pins are listed by net, not by
+// cell, so the cells are made after the whole view is read.
 #ifndef BOOLEQ_DESIGN_EDIF_VIEW_H
 #define BOOLEQ_DESIGN_EDIF_VIEW_H
 
@@ -11,14 +11,14 @@
 namespace booleq {
 
 struct EdifPort {
-    NameId ident = 0; // of m_idents, by which pins refer to it
+    NameId ident = 0; // in EdifReader::m_idents; pins refer to the port by it
     NameId name = 0;  // without a range, "A" of "A[5:0]"
     uint32_t numBits = 1;
     PortDirection direction = PortDirection::Both;
 };
 
 struct EdifCell {
-    NameId type = 0;           // the name of its module, different for each cell
+    NameId type = 0;           // the name of its module, unique for each cell
     std::string_view typeText; // the name of its type, which may be a known one
     std::vector<EdifPort> ports;
 };
@@ -27,7 +27,7 @@ struct EdifCell {
 struct EdifJoint {
     uint32_t instance; // kNone: a port of the cell itself
     uint32_t port;
-    uint32_t member; // from the most significant bit
+    uint32_t member; // 0 is the most significant bit
     LocalNet net;
 };
 
@@ -45,7 +45,7 @@ struct EdifProperty {
     CellValue value;
 };
 
-// Invariant: joints, instances and properties are of the view that was begun last.
+// Invariant: joints, instances and properties belong to the view begun last.
 class EdifView {
   public:
     static constexpr uint32_t kNone = UINT32_MAX;
@@ -55,16 +55,18 @@ class EdifView {
     {
     }
 
-    // The view becomes a module of that name.
+    // Begins a view, which becomes a module of that name.
     void Begin(NameId module);
 
     LocalNet AddNet(std::string_view name);
-    // Each bit of a port is a net of its own where none is joined to it.
+    // A bit of a port that no net joins becomes a net itself.
     void MakePorts(const EdifCell& cell);
-    // Sorted by instance, then by port and bit, which are the pins of its cell in order.
+    // Makes the cells from the joints, sorted by instance, then by port and bit: the order of the
+    // pins of the cell.
     void MakeCells(const std::vector<EdifCell>& cells);
-    // The type of a cell whose port has any number of bits, else null. Yosys has one cell $lut for
-    // all of them, with the bits of one: an instance says its own width, and members count from it.
+    // The type of a cell if this port may have any number of bits, else null. Yosys writes one cell
+    // $lut for all widths, with the number of bits of one of them. Each instance has its own width,
+    // from which members count.
     const CellType* VectorType(const EdifCell& cell, const EdifPort& port) const;
 
     std::vector<EdifInstance> instances;
@@ -79,7 +81,7 @@ class EdifView {
     // The joints of one port, the last member first.
     void AddPin(const EdifInstance& instance, const EdifCell& cell, const EdifJoint* first,
                 const EdifJoint* last);
-    // 0 where the instance does not say it: as many as are joined.
+    // 0 if the instance does not give one; then the width is the number of bits joined.
     uint32_t OwnWidth(const EdifInstance& instance, const CellType& type) const;
 
     const ReadJob& m_job;

@@ -36,7 +36,7 @@ FoldedRows FoldTable(const Design& design, const DesignTable& table)
     const NetId* inputs = design.Inputs(table);
     FoldedRows folded;
     folded.rows = TableRows(design, design.inits[table.init]);
-    std::vector<unsigned int> kept; // inputs of the rows, descending: from the first pin on
+    std::vector<unsigned int> kept; // inputs of the rows, descending: the order of the pins
     for (unsigned int pin = 0; pin < numInputs; ++pin) {
         const unsigned int input = numInputs - 1 - pin;
         const NetId net = inputs[pin];

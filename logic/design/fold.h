@@ -10,14 +10,14 @@ namespace booleq {
 // Cost: one copy of the words.
 Rows TableRows(const Design& design, const InitValue& init);
 
-// A table after folding. nets[k] is input k of the rows; a net stands once, kNetOpen and
-// kNetUnknown as often as pins.
+// A table after folding. nets[k] is input k of the rows. A net occurs once; kNetOpen and
+// kNetUnknown occur once for each such pin.
 struct FoldedRows {
     Rows rows;
     std::vector<NetId> nets;
 };
 
-// A table without its inputs that are constants or repeat a net; inputs without effect stay.
+// A table without the inputs that are constant or repeat a net. Inputs without effect stay.
 FoldedRows FoldTable(const Design& design, const DesignTable& table);
 
 } // namespace booleq

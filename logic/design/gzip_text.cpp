@@ -1,4 +1,4 @@
-// A compressed text becomes a plain one, by zlib; no_gzip_text.cpp stands in where that is missing.
+// Uncompresses a text with zlib. A build without zlib uses no_gzip_text.cpp instead.
 #include "source_text.h"
 
 #include <algorithm>
@@ -15,7 +15,7 @@ namespace booleq {
 
 namespace {
 
-// A stream of zlib that is ended.
+// Owns a zlib stream and ends it.
 class Inflater {
   public:
     Inflater()
@@ -35,8 +35,8 @@ class Inflater {
 
 } // namespace
 
-// One member after another, as gzip files may have them; the length that the file announces is not
-// believed.
+// Reads one member after another, because a gzip file may have several. The length that the file
+// states is not trusted.
 void SourceText::Inflate()
 {
     SourceText plain;

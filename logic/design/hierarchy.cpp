@@ -52,7 +52,7 @@ class Layout {
         uint32_t module;
         ScopeId scope;
         size_t nextPending = 0;
-        std::vector<NetId> nets; // of the design, by local net
+        std::vector<NetId> nets; // the net of the design for each local net
     };
 
     bool IsModule(NameId type, uint32_t& module) const
@@ -172,7 +172,7 @@ class Layout {
         for (const auto& join : content.joins)
             m_joiner.Join(frame.nets[join.first], frame.nets[join.second]);
         AppendCells(content, frame);
-        m_path.push_back(std::move(frame)); // 'parent' and 'cell' end here
+        m_path.push_back(std::move(frame)); // 'parent' and 'cell' may dangle from here on
     }
 
     void BindPorts(const Frame& parent, const PendingCell& cell, Frame& frame)
@@ -197,7 +197,7 @@ class Layout {
         }
     }
 
-    // An open or unknown pin leaves the port's net on its own.
+    // An open or unknown pin leaves the port's net separate.
     void Bind(NetId outer, LocalNet inner, Frame& frame)
     {
         if (outer == kNetOpen || outer == kNetUnknown)
@@ -227,7 +227,7 @@ class Layout {
                                               ScopedName{frame.scope, alias.name});
     }
 
-    // The top's cells move, for it is laid out once and its nets are those of the design.
+    // The top's cells are moved: it is laid out once, and its nets are those of the design.
     void AppendCells(ModuleContent& content, const Frame& frame)
     {
         const auto numTables = static_cast<uint32_t>(m_design.tables.size());
@@ -294,7 +294,8 @@ class Layout {
         }
     }
 
-    // Of tables without a name, that which their net shows now; also in what is said of them.
+    // Gives tables without a name the name that their output net now shows, in their findings as
+    // well.
     void NameByOutputs()
     {
         for (DesignTable& table : m_design.tables)
@@ -334,7 +335,7 @@ class Layout {
         m_design.findings.push_back(std::move(finding));
     }
 
-    // Tables of one scope follow one another.
+    // The tables of one scope are consecutive.
     void CheckNames()
     {
         std::vector<uint32_t> lastWith(m_design.names.Size(), kNone);
@@ -352,7 +353,7 @@ class Layout {
         }
     }
 
-    // The outputs of one cell follow one another, and an output stands once.
+    // The outputs of one cell are consecutive, in ascending order, and no output occurs twice.
     bool IsSameCell(uint32_t first, uint32_t second) const
     {
         return second == first + 1 &&

@@ -1,6 +1,7 @@
-// Lays out the modules of a file as one design: each instance of a module gets tables and nets of
-// its own, nets that ports join become one. Throws ReadFault: no top or several, a module within
-// itself, more than the items allowed. Cost: in step with the design that comes out.
+// Lays out the modules of a file as one design: each instance of a module gets its own tables and
+// nets, and nets that ports join become one.
+// Fails: ReadFault for no top or several, a module that contains itself, or more items than
+// allowed.  Cost: linear in the resulting design.
 #ifndef BOOLEQ_DESIGN_HIERARCHY_H
 #define BOOLEQ_DESIGN_HIERARCHY_H
 
@@ -11,13 +12,13 @@
 namespace booleq {
 
 struct LayoutOptions {
-    std::string top;         // empty: the module that says so, or that no other one uses
-    bool isFirstTop = false; // else the first one, as BLIF has it
+    std::string top;         // empty: the module marked as top, or the one that no other uses
+    bool isFirstTop = false; // if 'top' is empty, the first module, as in BLIF
     bool hasKeys = false;
     uint64_t maxItems = 0; // tables, nets and instances
 };
 
-// The modules are used up.  Requires: no two have one name.
+// Consumes the modules.  Requires: no two have the same name.
 void LayOut(std::vector<ModuleContent>& modules, const LayoutOptions& options, Design& design);
 
 } // namespace booleq

@@ -30,7 +30,7 @@ bool IsDecimal(char character)
 struct Literal {
     std::string_view digits;
     unsigned int bitsPerDigit = 0; // 0: decimal
-    uint64_t size = 0;             // that stands before the base; 0: none
+    uint64_t size = 0;             // the number before the base; 0: none
 };
 
 void Clear(uint32_t numBits, InitDigits& digits)
@@ -41,7 +41,8 @@ void Clear(uint32_t numBits, InitDigits& digits)
     digits.hasUnknown = digits.isShort = digits.isLong = false;
 }
 
-// One bit at a time from the last digit; a bit that is too high makes it too long unless it is 0.
+// Writes one bit at a time, from the last digit. A bit that is too high makes the value too long
+// unless it is 0.
 class BitWriter {
   public:
     BitWriter(uint32_t numBits, InitDigits& digits) : m_num_bits(numBits), m_digits(digits) {}
@@ -83,11 +84,11 @@ bool ReadPowerOfTwo(const Literal& literal, uint32_t numBits, InitDigits& digits
             writer.Put((value >> bit & 1u) != 0, value == kUnknownDigit);
         ++numDigits;
     }
-    // Where a size says more bits than there are digits, zeros fill them, or the x that stands
-    // first.
+    // If the size gives more bits than the digits do, the rest are zeros, or x if the first digit
+    // is x.
     while (value == kUnknownDigit && writer.Place() < std::min<uint64_t>(literal.size, numBits))
         writer.Put(false, true);
-    // A size says how many bits the digits stand for; without one, they say so themselves.
+    // A size gives the number of bits; without one, the number of digits does.
     const uint64_t perDigit = literal.bitsPerDigit;
     const uint64_t numSaid = literal.size != 0 ? literal.size : numDigits * perDigit;
     digits.isShort = numSaid < numBits;
@@ -111,7 +112,7 @@ uint64_t MultiplyAdd(std::vector<uint64_t>& words, uint64_t value)
 
 bool ReadDecimal(const Literal& literal, uint32_t numBits, InitDigits& digits)
 {
-    // A number of 2^16 bits has fewer than 20,000 digits, which bounds the square of the work.
+    // A number of 2^16 bits has fewer than 20,000 digits; that bounds the quadratic cost.
     const size_t first = std::min(literal.digits.find_first_not_of("0_"), literal.digits.size());
     if (literal.digits.empty() || literal.digits.size() - first > 20000)
         return false;
@@ -150,7 +151,7 @@ unsigned int BitsOfBase(char letter)
     }
 }
 
-// The parts of 16'hcafe, also without a size or with an s before the base.
+// Splits 16'hcafe into its parts; the size may be missing, and an s may precede the base.
 bool SplitSized(std::string_view text, size_t quote, Literal& literal)
 {
     if (quote > kMaxSizeDigits ||
@@ -191,18 +192,19 @@ bool Split(std::string_view text, BareDigits bare, uint32_t numBits, Literal& li
     if (quote != std::string_view::npos)
         return SplitSized(text, quote, literal);
     if (text.size() > 2 && text[0] == '0' && ((text[1] | 0x20) == 'x' || (text[1] | 0x20) == 'b')) {
-        // A Yosys string may begin with 0x, too: there x is a digit. It has as many digits as bits.
+        // A Yosys string may begin with 0x, too: there x is a digit, and there are as many digits
+        // as bits.
         const bool isYosys =
             bare != BareDigits::Hex && IsBinaryText(text) && text.size() == numBits;
         const bool isHex = (text[1] | 0x20) == 'x';
-        const bool isPlainBinary = bare == BareDigits::Hex && !isHex; // 0b1 is hexadecimal then
+        const bool isPlainBinary = bare == BareDigits::Hex && !isHex; // 0b1 is then hexadecimal
         if (!isYosys && !isPlainBinary) {
             literal.bitsPerDigit = isHex ? 4 : 1;
             literal.digits = text.substr(2);
             return true;
         }
     }
-    // A prefix without digits, unless it is two digits.
+    // A prefix without digits is refused, unless it can be two digits.
     if (text.size() == 2 && numBits != 2 && text[0] == '0' && !IsDecimal(text[1]) &&
         bare != BareDigits::Hex)
         return false;
@@ -242,13 +244,13 @@ bool ReadPlainBits(std::string_view text, uint64_t& value)
     value = 0;
     size_t place = 0;
     for (; place + 8 <= text.size(); place += 8) {
-        uint64_t digits = 0; // one in each byte, the first in the lowest
+        uint64_t digits = 0; // one in each byte, the first in the lowest byte
         for (unsigned int digit = 0; digit < 8; ++digit)
             digits |= uint64_t(static_cast<unsigned char>(text[place + digit])) << (8 * digit);
         digits ^= 0x3030303030303030;
         if ((digits & 0xfefefefefefefefe) != 0)
             return false;
-        // Digit k of the byte goes to bit 63 - k: no two of the products meet.
+        // Digit k goes to bit 63 - k: no two of the products overlap.
         value = value << 8 | (digits * 0x8040201008040201) >> 56;
     }
     for (; place < text.size(); ++place) {

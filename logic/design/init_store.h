@@ -1,4 +1,4 @@
-// Init values of a design, each different one kept once.
+// The init values of a design; each distinct one is kept once.
 #ifndef BOOLEQ_DESIGN_INIT_STORE_H
 #define BOOLEQ_DESIGN_INIT_STORE_H
 
@@ -9,21 +9,21 @@
 
 namespace booleq {
 
-// Of all different init values of a design. A line of some bytes can ask for a table of 8 KB, so
-// the size of a file bounds nothing: a file of 100 MB could ask for 40 GB. This is 32 million
-// different tables of six inputs, about as many as the largest file has room for, and 32,768 of
-// sixteen.
+// Limit for all distinct init values of a design together. A line of a few bytes can ask for a
+// table of 8 KB, so the size of the file is not a bound: a file of 100 MB could ask for 40 GB. The
+// limit allows 32 million distinct tables of six inputs, about as many as the largest file has room
+// for, or 32,768 of sixteen.
 constexpr uint64_t kMaxInitBytes = uint64_t(1) << 28;
 
-// Invariant: m_slots has a power of two of elements, at most three quarters used; one is 0 or the
-// number of an init value plus one.
+// Invariant: the number of slots is a power of two, and at most three quarters are used. A slot is
+// 0 or the number of an init value plus one.
 class InitStore {
   public:
     explicit InitStore(Design& design);
 
     // 'unknown' may be null: no unknown bits.
-    // Fails: false, where all of them would take more than kMaxInitBytes.
-    // Cost: in step with the words.
+    // Fails: false if all of them together would take more than kMaxInitBytes.
+    // Cost: linear in the words.
     bool Add(unsigned int numInputs, const uint64_t* words, const uint64_t* unknown, InitId& init);
 
   private:

@@ -1,5 +1,5 @@
-// Reads what Yosys writes as JSON (write_json): modules with ports, cells and names of nets. A bit
-// of a net is a number of its module, or "0", "1", "x", "z".
+// Reads the JSON that Yosys writes (write_json): modules with ports, cells and names of nets. A bit
+// of a net is a number within its module, or "0", "1", "x", "z".
 #include <cassert>
 #include <unordered_map>
 
@@ -39,7 +39,7 @@ class JsonReader {
             }
             if (!hasModules)
                 throw ReadFault{"the JSON text has no \"modules\"; was it written by write_json?"};
-            const char* rest = nullptr; // there is none at the end
+            const char* rest = nullptr; // the call fails at the end of the text
             if (m_document.current_location().get(rest) == simdjson::SUCCESS)
                 Refuse("unexpected text after the last '}'");
         } catch (const simdjson::simdjson_error& error) {
@@ -48,7 +48,7 @@ class JsonReader {
     }
 
   private:
-    // What is being read, for messages; names are of the file.
+    // What is being read, for messages; the names are views into the file.
     struct Place {
         std::string_view module;
         const char* section = "";
@@ -56,7 +56,7 @@ class JsonReader {
         std::string_view part;
     };
 
-    // Bytes from the start, 0 where it is not known.
+    // The position in bytes from the start; 0 if it is not known.
     size_t Location()
     {
         const char* location = nullptr;
@@ -83,7 +83,7 @@ class JsonReader {
         throw ReadFault{text};
     }
 
-    // In place of the parser's words, those that a reader of the message can do something with.
+    // Replaces the parser's words by words that help the reader of the message.
     static std::string ReasonOf(simdjson::error_code error)
     {
         switch (error) {
@@ -104,7 +104,7 @@ class JsonReader {
         }
     }
 
-    // Says of each name whether it stood in this section before.
+    // Begins a section, in which AddOnce refuses a name that was there before.
     void EnterSection(const char* section)
     {
         m_place.section = section;
@@ -206,7 +206,7 @@ class JsonReader {
         return kNetUnknown;
     }
 
-    // The bits become m_bits.
+    // Reads the bits into m_bits.
     void ReadBits(json::value bits)
     {
         m_bits.clear();
@@ -350,7 +350,7 @@ class JsonReader {
         }
     }
 
-    // The first name is the net's, but a public one goes before a tool's own.
+    // A net gets its first name, but a public name replaces one that a tool made up.
     void NameNet(LocalNet net, NameId name, bool isHidden)
     {
         if (net == kNetUnknown)
@@ -366,7 +366,7 @@ class JsonReader {
             m_module->aliases.push_back({net, name});
     }
 
-    // A net that only cells and ports know gets a name that says so.
+    // Makes up names for nets that occur only in cells and ports.
     void NameTheRest()
     {
         for (size_t net = kNumFixedNets; net < m_module->netNames.size(); ++net)
@@ -378,7 +378,7 @@ class JsonReader {
     Pace m_pace;
     json::parser m_parser;
     json::document m_document;
-    bool m_has_document = false; // else it must not be asked for its location
+    bool m_has_document = false; // only then may it be asked for its location
     Place m_place;
     CellIntake m_intake;
     BitNumbers m_bit_numbers;
@@ -386,7 +386,7 @@ class JsonReader {
     std::vector<LocalNet> m_bits;
     std::string m_text;
     uint32_t m_section = 0;
-    std::vector<uint32_t> m_section_of; // by name: where it stood last
+    std::vector<uint32_t> m_section_of; // by name: the last section that had it
 };
 
 } // namespace

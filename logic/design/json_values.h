@@ -1,5 +1,5 @@
-// Values of a JSON text as the reader of netlists takes them; simdjson's errors go through as they
-// are.
+// Values of a JSON text as the netlist reader needs them.
+// Fails: simdjson's own exceptions.
 #ifndef BOOLEQ_DESIGN_JSON_VALUES_H
 #define BOOLEQ_DESIGN_JSON_VALUES_H
 
@@ -15,7 +15,8 @@ namespace booleq {
 
 namespace json = simdjson::ondemand;
 
-// The local nets of a module by their number in the file. Numbers are dense, but need not be.
+// The local nets of a module by their numbers in the file. The numbers are usually dense, but need
+// not be.
 class BitNumbers {
   public:
     explicit BitNumbers(size_t numBytes) : m_max_dense(numBytes / 8) {}
@@ -26,7 +27,7 @@ class BitNumbers {
         m_sparse.clear();
     }
 
-    // The element of a bit, 0 at first; valid until the next call.
+    // The element of a bit, initially 0; the reference is valid until the next call.
     LocalNet& At(uint64_t bit)
     {
         if (bit >= m_max_dense)
@@ -42,8 +43,8 @@ class BitNumbers {
     std::unordered_map<uint64_t, LocalNet> m_sparse;
 };
 
-// The text of a string that has no escapes as it stands in the file, so that it need not be
-// copied. Empty data: it has some. The first quotation mark ends it then.
+// The text of a string without escapes, in place in the file, so that it need not be copied. Null
+// data: the string has escapes. Without escapes, the first quotation mark ends it.
 inline std::string_view Plain(json::raw_json_string raw)
 {
     const char* start = raw.raw();
@@ -66,7 +67,7 @@ inline std::string_view StringOf(json::value value)
     return plain.data() != nullptr ? plain : std::string_view(value.get_string());
 }
 
-// Fails: false for what is not a string.
+// Fails: false if the value is not a string.
 inline bool GetString(json::value value, std::string_view& text)
 {
     if (value.type() != json::json_type::string)
@@ -75,7 +76,7 @@ inline bool GetString(json::value value, std::string_view& text)
     return true;
 }
 
-// A flag is a number other than 0, or binary digits with a 1.
+// Whether a flag is set: a number other than 0, or binary digits with a 1.
 inline bool IsSet(json::value value)
 {
     if (value.type() == json::json_type::string)
@@ -83,7 +84,7 @@ inline bool IsSet(json::value value)
     return value.type() == json::json_type::number && double(value.get_double()) != 0;
 }
 
-// What is not a string, as it stands there.
+// A value that is not a string, as written in the file.
 inline std::string_view Token(json::value value)
 {
     const std::string_view token = value.raw_json_token();

@@ -1,5 +1,4 @@
-// What a reader found in one module, with nets and names of its own, before the hierarchy is laid
-// out.
+// What a reader found in one module, with its own nets and names, before the hierarchy is laid out.
 #ifndef BOOLEQ_DESIGN_MODULE_CONTENT_H
 #define BOOLEQ_DESIGN_MODULE_CONTENT_H
 
@@ -25,7 +24,7 @@ struct ModulePort {
     PortDirection direction = PortDirection::Both;
 };
 
-// A cell whose type may be a module; which one, is known when all of them are read.
+// A cell whose type may be a module; that is known once all modules are read.
 struct PendingCell {
     NameId name = 0;
     NameId type = 0;
@@ -40,15 +39,14 @@ struct NetAlias {
 };
 
 // Invariants:
-// 1. Nets are below netNames.size(), whose first kNumFixedNets elements name nothing.
-// 2. Tables' names, findings' tables and unread cells are of this module, in scope 0.
+// 1. Nets are below netNames.size(). The first kNumFixedNets elements of netNames name nothing.
+// 2. Names of tables, tables of findings, and unread cells are of this module, in scope 0.
 struct ModuleContent {
     NameId name = 0;
     bool isTop = false;
     bool isBlackBox = false;
     std::vector<NameId> netNames = std::vector<NameId>(kNumFixedNets, 0);
-    std::vector<bool> isHidden =
-        std::vector<bool>(kNumFixedNets, false); // its name is a tool's own
+    std::vector<bool> isHidden = std::vector<bool>(kNumFixedNets, false); // a tool made up its name
     std::vector<NetAlias> aliases;
     std::vector<ModulePort> ports;
     std::vector<BitRange> pins; // of pending cells

@@ -18,7 +18,7 @@ uint64_t Mix(uint64_t value)
     return value ^ value >> 29;
 }
 
-// Eight bytes at a time: names of a netlist are long and much alike.
+// Hashes eight bytes at a time: names in a netlist are long and similar.
 uint64_t Hash(std::string_view name)
 {
     uint64_t hash = name.size() * kMultiplier;
@@ -38,8 +38,8 @@ uint64_t Hash(std::string_view name)
 
 NameArena::NameArena() : m_ends(1, 0), m_slots(kFirstSlots, 0), m_hashes(1, 0) {}
 
-// The slot of the name, or the free one that would be its own. Slot values are name numbers; 0, the
-// empty name, is never stored.
+// The slot of the name, or the free slot where it would go. Slots hold name numbers; 0, the empty
+// name, is never stored.
 size_t NameArena::SlotOf(std::string_view name, uint64_t hash) const
 {
     const size_t mask = m_slots.size() - 1;
@@ -104,8 +104,8 @@ void NameArena::Rehash(size_t numSlots)
     m_slots = std::move(slots);
 }
 
-// In a file of a large design a name stands about every 350 bytes. Memory that is reserved and not
-// written is not taken.
+// The file of a large design has a new name about every 350 bytes. Memory that is reserved but
+// never written is not used.
 void NameArena::Reserve(uint64_t numBytes)
 {
     const auto numNames = static_cast<size_t>(numBytes / 350);

@@ -1,6 +1,6 @@
-// Names of a design: each different one is kept once, in one block of bytes, and is a number.
-// Fails: std::bad_alloc, std::length_error above 2^32 - 1 names or bytes of one block of 2^32.
-// Cost: a look-up of one probe or two; a name takes its bytes and some 16 more.
+// The names of a design. Each distinct one is kept once, in one block of bytes, and has a number.
+// Fails: std::bad_alloc; std::length_error for more than 2^32 - 1 names.
+// Cost: a look-up takes one probe or two; a name takes its bytes and about 16 more.
 #ifndef BOOLEQ_DESIGN_NAME_ARENA_H
 #define BOOLEQ_DESIGN_NAME_ARENA_H
 
@@ -15,19 +15,21 @@ typedef uint32_t NameId; // 0 is the empty name
 
 // Invariants:
 // 1. Name k has the bytes from m_ends[k - 1] to m_ends[k]; name 0 is empty.
-// 2. m_slots has a power of two of elements, at most three quarters used; one is 0 or a name.
+// 2. The number of slots is a power of two, and at most three quarters are used. A slot is 0 or a
+//    name.
 class NameArena {
   public:
     static constexpr NameId kNoName = UINT32_MAX;
 
     NameArena();
 
-    // Makes room for what a text of so many bytes may have; without it, the arena grows by itself.
+    // Reserves room for the names of a text of this many bytes. Optional: the arena also grows on
+    // demand.
     void Reserve(uint64_t numBytes);
 
-    // The number of a name, a new one where it is not there.
+    // The number of a name; a new one if the name is new.
     NameId Add(std::string_view name);
-    // kNoName where it is not there.
+    // The number of a name; kNoName if it is not known.
     NameId Find(std::string_view name) const;
     // Valid until the next Add.  Requires: name < Size().
     std::string_view Text(NameId name) const

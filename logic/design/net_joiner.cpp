@@ -13,7 +13,7 @@ void NetJoiner::Hide(NetId net)
     m_is_hidden[net] = true;
 }
 
-// Chains become shorter on the way.
+// Shortens the chain on the way.
 NetId NetJoiner::Root(NetId net)
 {
     if (net >= m_parents.size())
@@ -33,7 +33,7 @@ void NetJoiner::Join(NetId first, NetId second)
     NetId low = Root(first);
     NetId high = Root(second);
     if (low == high || (low == kNetZero && high == kNetOne) || (low == kNetOne && high == kNetZero))
-        return; // a net that is both 0 and 1 stays what it was first
+        return; // a net tied to both 0 and 1 keeps the first
     if (low > high)
         std::swap(low, high);
     for (auto net = static_cast<NetId>(m_parents.size()); net <= high; ++net)

@@ -1,4 +1,4 @@
-// Nets of a design that turn out to be one.
+// Joins nets of a design that turn out to be the same.
 #ifndef BOOLEQ_DESIGN_NET_JOINER_H
 #define BOOLEQ_DESIGN_NET_JOINER_H
 
@@ -8,16 +8,16 @@
 
 namespace booleq {
 
-// Invariant: m_parents[net] <= net, so a chain of parents ends; a net beyond its end is its own.
+// Invariant: m_parents[net] <= net, so a chain of parents ends. A net past the end of m_parents is
+// its own parent.
 class NetJoiner {
   public:
-    // The nets are the same from now on. Open and unknown ones are never.
+    // Makes the two nets the same.  Requires: neither is open or unknown.
     void Join(NetId first, NetId second);
-    // Its name is a tool's own: another one is shown where there is one.
+    // Marks a net's name as made up by a tool: another name is shown if there is one.
     void Hide(NetId net);
-    // Gives the nets that are one a common number, and the numbers that are free to others. The
-    // names that are not shown become aliases.  Cost: in step with the design; nothing without a
-    // join.
+    // Gives joined nets one number and renumbers all nets without gaps. Names that are not shown
+    // become aliases.  Cost: linear in the design; nothing if no nets were joined.
     void Apply(Design& design);
 
   private:

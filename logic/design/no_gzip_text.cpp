@@ -1,4 +1,4 @@
-// In place of gzip_text.cpp, for a build without zlib.
+// Replaces gzip_text.cpp in a build without zlib.
 #include "source_text.h"
 
 #include "read_fault.h"

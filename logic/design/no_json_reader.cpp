@@ -1,4 +1,4 @@
-// In place of json_reader.cpp, for a build without simdjson.
+// Replaces json_reader.cpp in a build without simdjson.
 #include "read_fault.h"
 #include "readers.h"
 

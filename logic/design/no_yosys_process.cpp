@@ -1,4 +1,4 @@
-// In place of yosys_process.cpp, for systems that start programs in another way than POSIX.
+// Replaces yosys_process.cpp on systems that do not start programs as POSIX does.
 #include "yosys_process.h"
 
 #include "read_fault.h"

@@ -28,7 +28,7 @@ bool BeginsWith(std::string_view text, std::string_view start)
     return text.substr(0, start.size()) == start;
 }
 
-// What a text is, by its first word that is not a comment of BLIF.
+// The format of a text, decided by its first word after any BLIF comments.
 Format Recognise(std::string_view text)
 {
     const std::string_view head = text.substr(0, 4096);

@@ -1,5 +1,5 @@
-// Why a file is not read. Readers throw it from wherever they stand, ReadDesign catches it: no
-// caller of the room sees it, and what was built so far goes with the stack.
+// Why a file is not read. Readers throw it at any depth and ReadDesign catches it, so no caller of
+// the room sees it, and unwinding the stack discards what was built so far.
 #ifndef BOOLEQ_DESIGN_READ_FAULT_H
 #define BOOLEQ_DESIGN_READ_FAULT_H
 
@@ -21,7 +21,7 @@ struct ReadFault {
     throw ReadFault{"line " + std::to_string(line) + ": " + text};
 }
 
-// A name from a file as messages show it.
+// A name from a file, quoted and shortened for messages.
 inline std::string Quoted(std::string_view name)
 {
     return "'" + Excerpt(std::string(name.substr(0, 200))) + "'";

@@ -1,6 +1,6 @@
-// The readers of the formats. Each takes a text that is in memory and gives modules; names and init
-// values go into the design at once.
-// Throw ReadFault with a line or a path.  Cost: one pass over the text.
+// The readers of the formats. Each turns a text in memory into modules; names and init values go
+// straight into the design.
+// Fails: ReadFault with a line or a path.  Cost: one pass over the text.
 #ifndef BOOLEQ_DESIGN_READERS_H
 #define BOOLEQ_DESIGN_READERS_H
 
@@ -13,7 +13,7 @@
 
 namespace booleq {
 
-// What the readers share: the file, what is asked of it, and the design that names go to.
+// What all readers get: the file, the options, and the design that the names go into.
 struct ReadJob {
     const SourceText& source;
     const ReadOptions& options;
@@ -26,7 +26,7 @@ void ReadYosysJson(const ReadJob& job);
 void ReadBlifNetlist(const ReadJob& job);
 void ReadEdif(const ReadJob& job);
 
-// Yosys writes a backslash before a name of the design that looks like one of its own.
+// Removes the backslash that Yosys writes before a user's name that looks like one of its own.
 inline std::string_view WithoutMark(std::string_view name)
 {
     const bool isMarked = name.size() > 1 && name[0] == '\\' &&
@@ -34,13 +34,13 @@ inline std::string_view WithoutMark(std::string_view name)
     return isMarked ? name.substr(1) : name;
 }
 
-// Says when it is time to look whether somebody wants the work to end, and tells how far it is.
+// Decides when to check for an interrupt, and reports progress.
 class Pace {
   public:
     explicit Pace(const ReadJob& job) : m_job(job) {}
-    // Every few thousand calls.
+    // True once every few thousand calls.
     bool IsDue() { return ++m_num_calls % kEvery == 0; }
-    // Calls the watch, which may throw, and whoever asked for the progress.
+    // Calls Watch(), which may throw, and the progress callback if there is one.
     void Report(uint64_t numBytesDone) const;
 
   private:

@@ -33,7 +33,7 @@ std::string SystemReason()
     return std::strerror(errno);
 }
 
-// In large pages, where the system has them: filling small ones takes as long as reading the file.
+// Uses large pages if the system has them: filling small ones takes as long as reading the file.
 void* AllocateLarge(size_t numBytes)
 {
 #if defined(MADV_HUGEPAGE)
@@ -77,7 +77,7 @@ void SourceText::Release()
     m_size = m_capacity = 0;
 }
 
-// Large blocks move without being copied, and pages that nobody has written take no memory.
+// realloc moves large blocks without copying, and pages that were never written take no memory.
 void SourceText::Reserve(size_t numBytes)
 {
     if (numBytes > kMaxSourceBytes + kPadding)
@@ -140,8 +140,8 @@ void SourceText::ReadStream(int descriptor)
         if (m_capacity < m_size + kPadding + 1)
             throw ReadFault{kSourceTooLarge};
         const size_t room = std::min(m_capacity - m_size - kPadding, kSourceReadBytes);
-        const ssize_t numRead =
-            read(descriptor, m_bytes + m_size, static_cast<unsigned int>(room)); // small
+        const ssize_t numRead = read(descriptor, m_bytes + m_size,
+                                     static_cast<unsigned int>(room)); // at most kSourceReadBytes
         if (numRead < 0 && errno == EINTR)
             continue;
         if (numRead < 0)

@@ -1,4 +1,4 @@
-// The bytes of a netlist file, uncompressed, in one block that is filled once.
+// The uncompressed bytes of a netlist file, in one block that is filled once.
 #ifndef BOOLEQ_DESIGN_SOURCE_TEXT_H
 #define BOOLEQ_DESIGN_SOURCE_TEXT_H
 
@@ -9,7 +9,7 @@
 
 namespace booleq {
 
-// Positions in a text are 32 bits in the readers.
+// The readers keep positions in 32 bits.
 constexpr uint64_t kMaxSourceBytes = 4294967000;
 constexpr char kSourceTooLarge[] = "the text is larger than 4,294,967,000 bytes";
 constexpr size_t kFirstSourceBytes = size_t(1) << 16;
@@ -25,20 +25,20 @@ class SourceText {
     SourceText(const SourceText&) = delete;
     SourceText& operator=(const SourceText&) = delete;
 
-    // The file, standard input for "-"; a file that begins as gzip files do is uncompressed.
-    // Throws ReadFault: it cannot be read, is not whole, or is larger than kMaxSourceBytes.
+    // Reads the file, or standard input for "-", and uncompresses it if it begins like a gzip file.
+    // Fails: ReadFault if it cannot be read, is truncated, or is larger than kMaxSourceBytes.
     void ReadFile(const std::string& file);
     void ReadStream(int descriptor);
-    // A text that is compressed, too, is uncompressed.
+    // Copies a text, which may be compressed, too.
     void Copy(std::string_view text);
 
-    // Empty again, without its memory.
+    // Empties the text and frees its memory.
     void Release();
 
     std::string_view Text() const { return std::string_view(m_bytes, m_size); }
     // Including the padding.
     size_t Capacity() const { return m_size + kPadding; }
-    // From 1.  Cost: in step with the position.
+    // The line, counted from 1.  Cost: linear in the position.
     uint64_t LineOf(size_t position) const;
 
   private:

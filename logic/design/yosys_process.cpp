@@ -29,15 +29,15 @@ constexpr char kNotThere[] =
     "Verilog is read by the program yosys, which is not installed; install it "
     "(Debian: apt-get install yosys), or write the netlist as JSON, BLIF or EDIF";
 
-// A child has its files as these descriptors.
+// The descriptors of the child's files.
 enum Place { kTextPlace = 3, kJsonPlace = 4 };
 constexpr char kTextName[] = "/dev/fd/3:";
 constexpr int kFreePlace = 5;
-constexpr int kCannotStart = 126; // statuses of the child, as shells have them
+constexpr int kCannotStart = 126; // statuses of the child, as in shells
 constexpr int kNotFound = 127;
 constexpr char kScript[] = "read_verilog /dev/fd/3; write_json /dev/fd/4";
 
-// A file without a name: nothing of it is left when we end, in whatever way.
+// A file without a name: nothing is left of it, however this process ends.
 class NamelessFile {
   public:
     NamelessFile()
@@ -91,18 +91,19 @@ struct WorkFiles {
     NamelessFile messages;
 };
 
-// In the child, between fork and exec: nothing here allocates or locks.
+// Runs in the child, between fork and exec: it must not allocate or lock.
 [[noreturn]] void RunYosys(const WorkFiles& files, pid_t parent, char* const* arguments)
 {
-    setpgid(0, 0); // a group of its own, so that all of it can be ended
+    setpgid(0, 0); // its own process group, so that all of it can be killed
 #if defined(__linux__)
-    prctl(PR_SET_PDEATHSIG, SIGKILL); // who ends us ends it, too
+    prctl(PR_SET_PDEATHSIG, SIGKILL); // it is killed when we are
     if (getppid() != parent)
         _exit(kCannotStart);
 #else
     static_cast<void>(parent);
 #endif
-    // Copies above all places first, so that none is overwritten before it is copied.
+    // First copies to descriptors above all places, so that none is overwritten before it is
+    // copied.
     const int text = fcntl(files.text.Descriptor(), F_DUPFD, kFreePlace);
     const int json = fcntl(files.json.Descriptor(), F_DUPFD, kFreePlace);
     const int messages = fcntl(files.messages.Descriptor(), F_DUPFD, kFreePlace);
@@ -115,13 +116,13 @@ struct WorkFiles {
     _exit(errno == ENOENT ? kNotFound : kCannotStart);
 }
 
-// A running program with all that it starts; it does not outlive this.
+// A running program with all that it starts; it does not outlive this object.
 class Child {
   public:
     explicit Child(const WorkFiles& files)
     {
         std::vector<std::string> words = {"yosys", "-q", "-p", kScript};
-        std::vector<char*> arguments(words.size() + 1); // the last is null
+        std::vector<char*> arguments(words.size() + 1); // the last one is null
         std::transform(words.begin(), words.end(), arguments.begin(),
                        [](std::string& word) { return word.data(); });
         const pid_t parent = getpid();
@@ -130,7 +131,7 @@ class Child {
             throw ReadFault{std::string("cannot start yosys: ") + std::strerror(errno)};
         if (m_process == 0)
             RunYosys(files, parent, arguments.data());
-        setpgid(m_process, m_process); // whoever of the two comes first
+        setpgid(m_process, m_process); // parent and child both do this: either may be first
     }
     ~Child()
     {

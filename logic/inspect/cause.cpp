@@ -11,8 +11,8 @@ namespace booleq {
 
 namespace {
 
-// The rows that some assignment of the nets leads to: constants have their value, pins of one net
-// the same one.
+// The rows that an assignment of the nets can reach: constant pins have their value, and pins of
+// the same net have equal values.
 Rows ReachableRows(const std::vector<NetId>& nets)
 {
     const auto numPins = static_cast<unsigned int>(nets.size());
@@ -31,7 +31,7 @@ Rows ReachableRows(const std::vector<NetId>& nets)
     return reachable;
 }
 
-// Which digit all changed rows are in; empty where they are in several, or there are none.
+// The digit that holds all changed rows; empty if there are several or none.
 std::string ChangedDigit(const Rows& changed)
 {
     const uint64_t first = FirstDifference(changed, ConstantRows(changed.NumInputs(), false));
@@ -75,20 +75,22 @@ class CauseFinder {
     }
 
   private:
-    // One of a kind is enough: a shift by a hexadecimal digit is one by four binary ones.
+    // One cause of a kind is enough: a shift by a hexadecimal digit is also one by four binary
+    // digits.
     bool IsKnown(CauseCode code) const
     {
         return std::any_of(m_causes.begin(), m_causes.end(),
                            [code](const Cause& cause) { return cause.code == code; });
     }
 
-    // Done to the left table's init value it gives the right one's function.
+    // Whether the fault, applied to the left table's init value, gives the right one's function.
     bool LeadsToRight(const InitFault& fault) const
     {
         return Normalise({fault.apply(m_left.rows), m_left.nets}) == m_right_function;
     }
 
-    // Undone of the right table's init value, or done to the one that it should have.
+    // Whether the fault, undone in the right table's init value or applied to the value that it
+    // should have, explains the difference.
     bool LeadsFromRight(const InitFault& fault) const
     {
         if (fault.undo && Normalise({fault.undo(m_right.rows), m_right.nets}) == m_left_function)
@@ -96,8 +98,8 @@ class CauseFinder {
         return m_has_expected && IsZero((fault.apply(m_expected) ^ m_right.rows) & m_reachable);
     }
 
-    // What says no more than another cause: a half is told apart by an input; digits that are
-    // shifted out and are 0 are as good as rotated.
+    // Drops causes that say no more than another one: exchanged halves are an inverted input, and a
+    // shift that loses only zeros is a rotation.
     void DropWeaker()
     {
         const bool hasShift = IsKnown(CauseCode::DigitsShifted);
@@ -117,7 +119,7 @@ class CauseFinder {
         m_causes.push_back(std::move(cause));
     }
 
-    // By the right table's pins first: it is the one that is looked at.
+    // Tries the right table's pins first, because that table is the one being checked.
     void FindInitFaults()
     {
         for (const InitFault& fault : InitFaults(m_right.rows.NumInputs()))
@@ -128,7 +130,7 @@ class CauseFinder {
                 AddInitFault(fault, m_left);
     }
 
-    // Two pins, constant ones and idle ones among them, then any order of those that matter.
+    // Tries two pins, including constant and idle ones, then any order of the pins that matter.
     void FindSwappedPins()
     {
         const size_t numPins = m_right.nets.size();
@@ -151,10 +153,10 @@ class CauseFinder {
         const std::vector<NetId>& nets = m_left_function.nets;
         if (nets.size() < 2 || nets.size() > kMaxMatchInputs)
             return;
-        std::vector<std::string> names; // any: places are what counts
+        std::vector<std::string> names; // arbitrary: only places count
         for (size_t place = 0; place < nets.size(); ++place)
             names.push_back("n" + std::to_string(place));
-        constexpr double kSeconds = 1; // of one table; hard ones stay without this cause
+        constexpr double kSeconds = 1; // for one table; hard ones get no such cause
         const Function left(names, m_left_function.rows);
         const Matching matching =
             Match(left, Function(names, m_right_function.rows), false, kSeconds);
@@ -181,7 +183,8 @@ class CauseFinder {
              isSameInit ? "the pins changed their order, the init value did not change" : ""});
     }
 
-    // Over the right table's pins; else over the left one's, where the right one has idle pins.
+    // Compares over the right table's pins. If that finds nothing, compares over the left one's,
+    // which helps if the right one has idle pins.
     void FindChangedDigit()
     {
         Rows other;
@@ -194,7 +197,7 @@ class CauseFinder {
             m_causes.push_back({CauseCode::DigitChanged, {}, detail});
     }
 
-    // A net that another one, or a constant, stands for in the whole function.
+    // Finds a net that is replaced by another one, or by a constant, in the whole function.
     void FindOtherNet()
     {
         std::vector<NetId> gone;
@@ -210,7 +213,8 @@ class CauseFinder {
                 AddOtherNet(gone.front(), net);
     }
 
-    // One pin of the right table, where a net has several, or the pin is constant or idle.
+    // Finds one wrong pin of the right table if its net has several pins, or the pin is constant or
+    // idle.
     void FindOtherPin()
     {
         std::vector<NetId> candidates = m_left.nets;
@@ -241,8 +245,8 @@ class CauseFinder {
     const PinFunction& m_right;
     NetFunction m_left_function;
     NetFunction m_right_function;
-    Rows m_expected;  // the right one's init value, had it the left one's function
-    Rows m_reachable; // of the right table, see ReachableRows
+    Rows m_expected;  // the right one's init value if it had the left one's function
+    Rows m_reachable; // of the right table; see ReachableRows
     bool m_has_expected = false;
     std::vector<Cause> m_causes;
 };
@@ -289,7 +293,7 @@ std::vector<Cause> FindCauses(const PinFunction& left, const PinFunction& right)
 
 bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows)
 {
-    // Over all pins, then each net of the function by the first pin that has it.
+    // Each net of the function takes the first pin that has it.
     const auto numPins = static_cast<unsigned int>(right.nets.size());
     std::vector<unsigned int> pinOf;
     for (const NetId net : left.nets) {
@@ -299,7 +303,7 @@ bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows)
         pinOf.push_back(static_cast<unsigned int>(found - right.nets.begin()));
     }
     Rows result = left.rows;
-    std::vector<unsigned int> order = pinOf; // widened inputs come in front
+    std::vector<unsigned int> order = pinOf; // Widen puts new inputs in front
     std::vector<unsigned int> others;
     for (unsigned int pin = 0; pin < numPins; ++pin)
         if (std::find(pinOf.begin(), pinOf.end(), pin) == pinOf.end())
@@ -307,7 +311,7 @@ bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows)
     for (size_t count = 0; count < others.size(); ++count)
         result = Widen(result);
     order.insert(order.begin(), others.begin(), others.end());
-    // Input k of the result is the one of 'result' that stands for pin k.
+    // places[k] is the input of 'result' for pin k.
     std::vector<unsigned int> places(numPins);
     for (unsigned int place = 0; place < numPins; ++place)
         places[order[place]] = place;

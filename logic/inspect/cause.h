@@ -1,7 +1,7 @@
-// Why two tables that should be one differ, where a fault that tools make explains it: what was
-// done to the one so that it became the other. In: the pins of both tables in common net numbers.
-// Out: every fault that explains the difference whole, each applied and compared before it is
-// named.  Cost: some thousand operations on rows.
+// Why two tables that should be the same differ, if a typical fault of tools explains it: what
+// turned one into the other. In: the pins of both tables in common net numbers. Out: every fault
+// that explains the whole difference; each is applied and the result compared before it is named.
+// Cost: some thousand operations on rows.
 #ifndef BOOLEQ_INSPECT_CAUSE_H
 #define BOOLEQ_INSPECT_CAUSE_H
 
@@ -14,38 +14,38 @@ namespace booleq {
 
 enum class CauseCode {
     OutputInverted,
-    PinsSwapped,     // inputs trade places; the init value did not follow
+    PinsSwapped,     // inputs are exchanged; the init value did not follow
     BitOrder,        // the pins' significance is reversed
-    HalvesExchanged, // of the init value: its most significant pin is inverted
-    InputInverted,   // another pin is
+    HalvesExchanged, // of the init value: the most significant pin is inverted
+    InputInverted,   // any other pin is inverted
     DigitsShifted,
     DigitsRotated,
     DigitsLost, // the first ones are 0
     DigitsReversed,
     DigitChanged, // one
     OtherNet,     // one input comes from another net
-    InputStuck,   // one input is taken as a constant
-    OutputMoved   // the function is the same, and drives another net
+    InputStuck,   // one input is replaced by a constant
+    OutputMoved   // the function is the same but drives another net
 };
 
 struct Cause {
     CauseCode code;
-    std::vector<NetId> nets; // of PinsSwapped the nets of the left table, then what each is taken
-                             // for; of the others the nets that they are about
-    std::string detail; // more than the nets say: "by 2 digits to the right, filled with zeros"
+    std::vector<NetId> nets; // for PinsSwapped, nets of the left table, then what each became; else
+                             // the nets concerned
+    std::string detail; // in addition to the nets: "by 2 digits to the right, filled with zeros"
 };
 
-// "pins-swapped" and so on, for reports.
+// A word for reports, such as "pins-swapped".
 const char* CauseWord(CauseCode code);
 
-// Causes in the order of CauseCode's list. Both tables are given as pins, the first one the most
-// significant.
+// The causes, in the order of CauseCode. Both tables are given by their pins, the most significant
+// first.
 // Requires: the functions differ.
 std::vector<Cause> FindCauses(const PinFunction& left, const PinFunction& right);
 
-// What the right table's init value would have to be for the left one's function: rows over the
-// right one's pins.
-// Fails: false where the right one lacks a net that the left one depends on.
+// The init value that would give the right table the left one's function, as rows over the right
+// one's pins.
+// Fails: false if the right one lacks a net on which the left one depends.
 bool RightRows(const NetFunction& left, const PinFunction& right, Rows& rows);
 
 } // namespace booleq

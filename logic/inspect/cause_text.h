@@ -1,4 +1,4 @@
-// Causes of differences as sentences, with the names of nets.
+// The causes of differences as sentences with the names of nets.
 #ifndef BOOLEQ_INSPECT_CAUSE_TEXT_H
 #define BOOLEQ_INSPECT_CAUSE_TEXT_H
 
@@ -8,7 +8,7 @@
 
 namespace booleq {
 
-// A sentence without a capital and a full stop. Names are as the file has them.
+// A sentence without a capital or a full stop. Names are written as in the file.
 std::string CauseText(const Comparison& comparison, const Cause& cause);
 
 } // namespace booleq

@@ -13,7 +13,7 @@ namespace booleq {
 
 namespace {
 
-// More pairs by key than by names: then names say nothing.
+// Names say nothing if there are more pairs by key than by name.
 bool SaysNothingByName(const Pairing& pairing)
 {
     const auto numByKey =
@@ -22,7 +22,7 @@ bool SaysNothingByName(const Pairing& pairing)
     return 2 * static_cast<size_t>(numByKey) > pairing.pairs.size();
 }
 
-// Wires of both functions, in the order of the left pins, then of the right ones.
+// The nets of both functions, in the order of the left pins, then of the right pins.
 std::vector<NetId> NetOrder(const PinFunction& left, const PinFunction& right,
                             const NetFunction& leftFunction, const NetFunction& rightFunction)
 {
@@ -39,17 +39,17 @@ std::vector<NetId> NetOrder(const PinFunction& left, const PinFunction& right,
     return order;
 }
 
-// Of functions with too many unknown nets to try them all.
+// For functions with too many unknown nets to try all assignments.
 bool IsSameInSomeOrder(const Rows& left, const Rows& right)
 {
     const unsigned int numInputs = left.NumInputs();
     if (numInputs <= kMaxCanonicalInputs)
         return FindCanonical(left.Words()[0], numInputs, CanonicalScope::Order).form ==
                FindCanonical(right.Words()[0], numInputs, CanonicalScope::Order).form;
-    std::vector<std::string> names; // any: places are what counts
+    std::vector<std::string> names; // arbitrary: only places count
     for (unsigned int input = 0; input < numInputs; ++input)
         names.push_back("n" + std::to_string(input));
-    constexpr double kSeconds = 1; // of one table; one that takes longer differs
+    constexpr double kSeconds = 1; // for one table; one that takes longer counts as different
     return booleq::Match(Function(names, left), Function(names, right), false, kSeconds).isFound;
 }
 
@@ -91,7 +91,7 @@ void Comparison::Match(const CompareOptions& options)
         FollowWires(m_left, m_pairing.onlyLeft);
         FollowWires(m_right, m_pairing.onlyRight);
     }
-    // A net that is found may be the output of more tables that belong together.
+    // A net that was found may be the output of further tables, which can then be paired.
     for (bool isMore = true; isMore;) {
         const NetPairs joined = JoinByStructure(m_left, m_right, m_pairing, doubtful, m_nets);
         for (const auto& pair : joined) {
@@ -113,8 +113,8 @@ bool Comparison::HasRenamed(const TablePair& pair) const
                        [this](NetId net) { return m_is_renamed[net]; });
 }
 
-// An output that nothing is connected to is not looked at where names are gone: whether a cell that
-// is only there for its carry drives a net is the file's choice.
+// If names are gone, an output that is not connected is ignored: for a cell that is used only for
+// its carry, the file may or may not connect the output.
 Comparison::Verdict Comparison::CompareOutputs(const TablePair& pair) const
 {
     const NetId left = m_left.tables[pair.left].output;
@@ -144,8 +144,8 @@ Comparison::Verdict Comparison::Compare(const TablePair& pair) const
 
 void Comparison::CompareAll(const CompareOptions& options)
 {
-    constexpr size_t kBlock = 65536; // pairs from one look at the progress to the next
-    constexpr size_t kPart = 512;    // of a thread, a millisecond or less
+    constexpr size_t kBlock = 65536; // pairs between two calls of 'progress'
+    constexpr size_t kPart = 512;    // pairs for a thread at a time: a millisecond or less
     std::vector<Verdict> verdicts(m_pairing.pairs.size());
     for (size_t first = 0; first < verdicts.size(); first += kBlock) {
         if (options.progress)
@@ -156,13 +156,13 @@ void Comparison::CompareAll(const CompareOptions& options)
                 verdicts[place] = Compare(m_pairing.pairs[place]);
         });
     }
-    std::vector<uint64_t> counts(m_left.nets.size(), 0); // of renamed nets: pairs that have it
+    std::vector<uint64_t> counts(m_left.nets.size(), 0); // pairs that have a renamed net
     for (size_t place = 0; place < verdicts.size(); ++place)
         Count(m_pairing.pairs[place], verdicts[place], counts);
     assert(m_num_same + m_num_renamed + m_different.size() == m_pairing.pairs.size());
     for (RenamedNet& net : m_renamed)
         net.numTables = counts[net.left];
-    // Of tables that differ all the same.
+    // Drops nets that occur only in tables that differ anyway.
     m_renamed.erase(std::remove_if(m_renamed.begin(), m_renamed.end(),
                                    [](const RenamedNet& net) { return net.numTables == 0; }),
                     m_renamed.end());

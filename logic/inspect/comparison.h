@@ -1,7 +1,7 @@
-// Table by table, whether two designs say the same.
-// In: two designs; out: which tables differ, which only one design has, which nets are called
-// otherwise. What a difference is made of is worked out when somebody asks for it.
-// Cost: some microseconds for each table; a millisecond for one that differs and is described.
+// Compares two designs table by table. In: two designs; out: which tables differ, which only one
+// design has, and which nets have another name. The details of a difference are worked out on
+// demand.
+// Cost: some microseconds for each table; a millisecond to describe a difference.
 #ifndef BOOLEQ_INSPECT_COMPARISON_H
 #define BOOLEQ_INSPECT_COMPARISON_H
 
@@ -17,60 +17,59 @@
 namespace booleq {
 
 enum class NetNames {
-    Auto, // by name, unless pairs by key show that the names are others
+    Auto, // by name, unless pairs by key show that the names were changed
     Kept, // by name
-    Gone  // by structure alone
+    Gone  // by key and structure only
 };
 
 struct CompareOptions {
     Renames renames;
     NetNames names = NetNames::Auto;
-    // Who reads a net that only passes another one, by a table that the other design lacks, reads
-    // that one. Wrong where the cell of such a table has a flip-flop, too.
+    // If a table that the other design lacks only passes a net, readers of its output count as
+    // readers of that net. Wrong if the cell of such a table also has a flip-flop.
     bool followsWires = false;
-    // What an input reads that nothing is connected to: kNetZero, kNetOne, or nothing that is
-    // known.
+    // The value of an input that is not connected: kNetZero, kNetOne, or kNetOpen for unknown.
     NetId openInputs = kNetOpen;
     void (*progress)(void* context, uint64_t numDone, uint64_t numTables) = nullptr;
     void* progressContext = nullptr;
 };
 
-// Tables that say the same once a net of the left design is taken for one of the right.
+// A net of the left design that makes tables equal once it is identified with one of the right.
 struct RenamedNet {
     NetId left;
     NetId right;
-    uint64_t numTables; // that have it, of the left design
+    uint64_t numTables; // of the left design, that have the net
 };
 
 // One pair that differs, for people and programs.
 struct Difference {
-    std::vector<std::pair<std::string, bool>> assignment; // nets in the order of the left pins
-    bool isSameFunction = false;                          // then there is no assignment
-    bool left = false;                                    // values there
+    std::vector<std::pair<std::string, bool>> assignment; // nets, in the order of the left pins
+    bool isSameFunction = false;                          // if true, there is no assignment
+    bool left = false;                                    // the values for that assignment
     bool right = false;
-    NetFunction leftFunction; // in common numbers
+    NetFunction leftFunction; // over common numbers
     NetFunction rightFunction;
     std::vector<Cause> causes;
-    std::string expectedInit; // hexadecimal, for the right table's pins; empty where it lacks a net
+    std::string expectedInit; // hexadecimal, for the right table's pins; empty if it lacks a net
 };
 
-// Designs stay as they are, but for their inputs, which CompareOptions::followsWires and openInputs
-// change.
-// Invariant: each pair is the same, the same but for renamed nets, or one of 'different'.
+// Compares two designs, of which only the table inputs change, by followsWires and openInputs.
+// Invariant: each pair is the same, or the same except for renamed nets, or in Different().
 class Comparison {
   public:
     // Requires: both designs outlive the comparison.
     Comparison(Design& left, Design& right, const CompareOptions& options);
 
-    // Nothing differs, is called otherwise or is on one side only, but for wires with followsWires.
+    // Whether nothing differs, is renamed or is in one design only; wires are ignored with
+    // followsWires.
     bool IsSame() const;
     const Design& Left() const { return m_left; }
     const Design& Right() const { return m_right; }
     const Pairing& Pairs() const { return m_pairing; }
     const NetMap& Nets() const { return m_nets; }
     uint64_t NumSame() const { return m_num_same; }
-    uint64_t NumRenamed() const { return m_num_renamed; } // the same but for names of nets
-    // The same in some order of inputs that nothing tells apart; among NumSame.
+    uint64_t NumRenamed() const { return m_num_renamed; } // the same except for names of nets
+    // Pairs that are the same in some order of indistinguishable inputs; included in NumSame.
     uint64_t NumByOrder() const { return m_num_by_order; }
     const std::vector<TablePair>& Different() const { return m_different; }
     const std::vector<RenamedNet>& RenamedNets() const { return m_renamed; }
@@ -108,9 +107,9 @@ class Comparison {
     uint64_t m_num_by_order = 0;
 };
 
-// A table that only passes a net, or is constant.
+// Whether a table only passes a net or is constant.
 bool IsWire(const Design& design, uint32_t table);
-// "only passes NET", "constant 1", or empty for a table that is more.
+// "only passes NET", "constant 1", or empty for any other table.
 std::string WireText(const Design& design, uint32_t table);
 
 } // namespace booleq

@@ -12,7 +12,7 @@ namespace booleq {
 
 namespace {
 
-// A word that every notation takes for a name and none has for itself, and no other text holds.
+// A word that is a name in every notation, is reserved in none, and occurs in no other text.
 std::string Placeholder(unsigned int input)
 {
     return "kqin" + std::to_string(input) + "kq";
@@ -56,7 +56,7 @@ bool IsIdentifier(const std::string& name)
            });
 }
 
-// Letters and digits of the name, and a number that no other net has.
+// The letters and digits of the name, followed by the net's number.
 std::string ChangedName(const Design& design, NetId net, const std::string& name)
 {
     std::string changed = "net";

@@ -6,7 +6,7 @@ namespace booleq {
 
 namespace {
 
-// A fault that changes where rows stand: row k comes from row source(k); kNoRow gives a 0.
+// Moves rows: row k comes from row source(k); kNoRow gives a 0.
 Rows MoveRows(const Rows& rows, const std::function<uint64_t(uint64_t)>& source)
 {
     Rows moved(rows.NumInputs());
@@ -43,7 +43,7 @@ Rows DropFirst(const Rows& rows, uint64_t numKept)
     return MoveRows(rows, [=](uint64_t row) { return row < numKept ? row : Rows::kNoRow; });
 }
 
-// Groups of so many rows, the last group first.
+// Puts the last group of so many rows first, and so on.
 Rows ReverseGroups(const Rows& rows, uint64_t group)
 {
     const uint64_t numGroups = rows.NumRows() / group;
@@ -62,7 +62,8 @@ void AddDigitFaults(uint64_t numRows, uint64_t digit, const char* noun,
                           [=](const Rows& rows) { return ShiftUp(rows, distance); }, nullptr});
         faults.push_back({CauseCode::DigitsShifted, by + " to the right, filled with zeros",
                           [=](const Rows& rows) { return ShiftDown(rows, distance); }, nullptr});
-        // Half way round is the exchange of halves; less than that is the shorter way.
+        // A rotation by half is the exchange of halves; beyond half, the other direction is
+        // shorter.
         if (2 * distance < numRows) {
             const auto left = [=](const Rows& rows) { return RotateUp(rows, distance); };
             const auto right = [=](const Rows& rows) { return RotateUp(rows, numRows - distance); };
@@ -100,7 +101,7 @@ std::vector<InitFault> InitFaults(unsigned int numInputs)
     constexpr uint64_t kMaxDigits = 64;
     if (numRows >= 2 * kDigitRows && numRows / kDigitRows <= kMaxDigits)
         AddDigitFaults(numRows, kDigitRows, "hexadecimal digit", faults);
-    if (numRows >= 8 * kDigitRows) { // two bytes are two halves
+    if (numRows >= 8 * kDigitRows) { // reversing two bytes would be exchanging halves
         const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, 2 * kDigitRows); };
         faults.push_back(
             {CauseCode::DigitsReversed, "bytes, the last one first", reverse, reverse});

@@ -1,5 +1,5 @@
-// What programs do to init values by mistake: digits shifted, halves exchanged and so on.
-// Cost: in step with the rows times the digits; wide tables have no faults of single digits.
+// Mistakes that programs make with init values: digits shifted, halves exchanged and so on.
+// Cost: rows times digits; wide tables have no faults of single digits.
 #ifndef BOOLEQ_INSPECT_INIT_FAULT_H
 #define BOOLEQ_INSPECT_INIT_FAULT_H
 
@@ -12,18 +12,18 @@
 
 namespace booleq {
 
-constexpr unsigned int kDigitRows = 4; // of a hexadecimal digit
+constexpr unsigned int kDigitRows = 4; // rows in a hexadecimal digit
 
-// What may happen to an init value, and what undoes it.
+// A fault of an init value, and how to undo it.
 struct InitFault {
     CauseCode code;
     std::string detail;
     std::function<Rows(const Rows&)> apply;
-    std::function<Rows(const Rows&)> undo; // empty where something is lost
-    int input = -1;                        // of the pins, that it is about
+    std::function<Rows(const Rows&)> undo; // empty if the fault loses something
+    int input = -1;                        // the pin that the fault is about; -1: none
 };
 
-// Those that happen to the init value alone, of so many pins.
+// The faults that change only the init value of a table of so many pins.
 std::vector<InitFault> InitFaults(unsigned int numInputs);
 
 } // namespace booleq

@@ -1,5 +1,5 @@
-// Equations of the functions of a comparison, over its nets.
-// Cost: a short form for each different function, a millisecond or less.
+// Equations for the functions of a comparison, over its nets.
+// Cost: a short form for each distinct function, a millisecond or less.
 #ifndef BOOLEQ_INSPECT_NET_EQUATIONS_H
 #define BOOLEQ_INSPECT_NET_EQUATIONS_H
 
@@ -13,10 +13,10 @@ namespace booleq {
 
 class NetEquations {
   public:
-    // Requires: the comparison outlives this.
+    // Requires: the comparison outlives this object.
     explicit NetEquations(const Comparison& comparison);
 
-    // Of a function in common numbers; empty where it has no short expression.
+    // The equation of a function in common numbers; empty if it has no short expression.
     std::string Of(const NetFunction& function);
 
   private:

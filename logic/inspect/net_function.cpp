@@ -10,7 +10,7 @@ namespace booleq {
 
 namespace {
 
-// Takes input 'input' out of rows that do not depend on it.
+// Removes input 'input' from rows that do not depend on it.
 void DropInput(PinFunction& pins, unsigned int input)
 {
     std::vector<unsigned int> rest;
@@ -21,7 +21,8 @@ void DropInput(PinFunction& pins, unsigned int input)
     pins.nets.erase(pins.nets.begin() + input);
 }
 
-// Input 'second' is the same net as 'first': rows in which they differ never count.
+// Makes the rows independent of input 'second', which is the same net as 'first': rows in which the
+// two differ are never reached.
 Rows Merge(const Rows& rows, unsigned int first, unsigned int second)
 {
     const Rows low = Cofactor(Cofactor(rows, first, false), second, false);
@@ -43,7 +44,7 @@ void FoldConstants(PinFunction& pins)
     }
 }
 
-// By insertion, a swap of neighbours at a time: there are few inputs, and most are in order.
+// Insertion sort by swapping neighbours: there are few inputs, and most are in order.
 void SortNets(PinFunction& pins)
 {
     for (size_t end = 1; end < pins.nets.size(); ++end)
@@ -121,7 +122,7 @@ NetFunction Replace(const NetFunction& function, NetId net, NetId by)
 
 std::string HexOf(const Rows& rows)
 {
-    std::vector<std::string> names; // digits need none, only their number
+    std::vector<std::string> names; // their spelling does not matter, only their number
     for (unsigned int input = 0; input < rows.NumInputs(); ++input)
         names.push_back(std::to_string(input));
     return Function(std::move(names), rows).Hex();
@@ -132,7 +133,7 @@ PinFunction PinsOf(const Design& design, const DesignTable& table)
     PinFunction pins;
     pins.rows = TableRows(design, design.inits[table.init]);
     const NetId* const inputs = design.Inputs(table);
-    // The file counts pins from the least significant one, rows from the most significant.
+    // Designs count pins from the least significant, rows count inputs from the most significant.
     for (unsigned int input = design.NumInputs(table); input-- > 0;)
         pins.nets.push_back(inputs[input]);
     return pins;

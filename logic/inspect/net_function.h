@@ -1,6 +1,6 @@
-// A look-up table as what it says about nets: its rows over the nets that matter, in one order, so
-// that two tables say the same where these are equal, whatever their pins, widths and types.
-// Cost: a few operations on the rows for each input; up to six inputs in one word.
+// A look-up table as a function of nets: its rows over the nets that matter, in ascending order.
+// Two tables are the same function if these are equal, whatever their pins, widths and types.
+// Cost: a few operations on the rows for each input; up to six inputs fit in one word.
 #ifndef BOOLEQ_INSPECT_NET_FUNCTION_H
 #define BOOLEQ_INSPECT_NET_FUNCTION_H
 
@@ -12,7 +12,7 @@
 
 namespace booleq {
 
-// Rows over pins, the first one the most significant bit of a row's number, as they are: nets may
+// Rows over pins as given, the first pin being the most significant bit of a row's number. Nets may
 // be constants, repeat, or have no effect.
 struct PinFunction {
     Rows rows;
@@ -20,9 +20,9 @@ struct PinFunction {
 };
 
 // Invariants of what Normalise makes:
-// 1. Each net stands once, ascending, and none is kNetZero or kNetOne.
+// 1. Nets are ascending, each occurs once, and none is kNetZero or kNetOne.
 // 2. The rows depend on every net.
-// An open or unknown pin is an input like another; several of them are one.
+// Open pins count as one input like any other, and so do unknown pins.
 struct NetFunction {
     Rows rows;
     std::vector<NetId> nets;
@@ -36,24 +36,27 @@ inline bool operator!=(const NetFunction& left, const NetFunction& right)
 
 // Requires: as many nets as the rows have inputs.
 NetFunction Normalise(PinFunction pins);
-// The same with the nets called by other numbers.
+// The same function with net k renumbered to numbers[k].
 NetFunction Renumber(const NetFunction& function, const std::vector<NetId>& numbers);
 
-// With a net at a value, and with another net in place of it; a net without effect changes nothing.
+// The function with a net fixed to a value, or replaced by another net. A net that is not in the
+// function changes nothing.
 NetFunction Fix(const NetFunction& function, NetId net, bool value);
 NetFunction Replace(const NetFunction& function, NetId net, NetId by);
 
-// Hexadecimal digits of rows, the highest first, as Function::Hex writes them.
+// The hexadecimal digits of rows, the highest first, as Function::Hex writes them.
 std::string HexOf(const Rows& rows);
 
 // The pins of a table.
 PinFunction PinsOf(const Design& design, const DesignTable& table);
 
-// Where the two first differ: a value for each of 'order', its first one counting most.
+// The first assignment for which the two differ: a value for each net of 'order', the first
+// counting most.
 // Requires: they differ, and 'order' has all nets of both.
 std::vector<bool> FirstDifference(const NetFunction& left, const NetFunction& right,
                                   const std::vector<NetId>& order);
-// The value for an assignment of the nets in 'order'.  Requires: it has all nets of the function.
+// The value for an assignment of the nets in 'order'.  Requires: 'order' has all nets of the
+// function.
 bool ValueAt(const NetFunction& function, const std::vector<NetId>& order,
              const std::vector<bool>& values);
 

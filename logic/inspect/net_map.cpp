@@ -18,7 +18,7 @@ ScopedIndex IndexNets(const Design& design)
     return index;
 }
 
-// Whether a table drives or reads a net.
+// For each net, whether a table drives or reads it.
 std::vector<bool> NetsOfTables(const Design& design)
 {
     std::vector<bool> isUsed(design.nets.size(), false);
@@ -29,7 +29,7 @@ std::vector<bool> NetsOfTables(const Design& design)
     return isUsed;
 }
 
-// The nets with the wanted paths; the others stay kNotThere.
+// Fills in the nets that have the wanted paths; the others stay kNotThere.
 void FindPaths(const Design& design, std::unordered_map<std::string, NetId>& wanted)
 {
     const auto look = [&](const ScopedName& name, NetId net) {

@@ -1,6 +1,6 @@
-// Which net of one design is which of another one, as far as that is known: one numbering for the
+// Which net of one design is which net of another, as far as that is known: one numbering for the
 // nets of both.
-// Cost: a number for each net; by names a look-up for each.
+// Cost: a number for each net; joining by names takes a look-up for each name.
 #ifndef BOOLEQ_INSPECT_NET_MAP_H
 #define BOOLEQ_INSPECT_NET_MAP_H
 
@@ -12,18 +12,19 @@
 
 namespace booleq {
 
-// A net of the left design and what the right one calls it, by paths.
+// Nets of the left design and what the right one calls them, as paths.
 typedef std::vector<std::pair<std::string, std::string>> Renames;
 
-// Nets of the left design keep their numbers. One of the right design has that of the left net it
-// is the same as, or one of its own, after those of the left.
-// Invariant: m_rights and m_numbers say the same, and no two nets of a design are one of the other.
+// Nets of the left design keep their numbers. A net of the right design has the number of the left
+// net that it is the same as, or else its own number, after all those of the left.
+// Invariant: m_rights and m_numbers agree, and no two nets of a design are the same net of the
+// other.
 class NetMap {
   public:
-    // Nothing is known but constants, and that open is open.
+    // Initially, only the fixed nets are known: constants, unknown and open.
     NetMap(const Design& left, const Design& right);
 
-    // From now on they are the same.  Requires: neither is known yet.
+    // Makes the two nets the same.  Requires: neither is known yet.
     void Join(NetId left, NetId right);
 
     bool IsKnownLeft(NetId left) const { return m_rights[left] != kNotThere; }
@@ -36,11 +37,11 @@ class NetMap {
     }
     NetId NumberOfRight(NetId right) const { return m_numbers[right]; }
     bool IsLeft(NetId number) const { return number < m_rights.size(); }
-    // The right net of a number of its own.
+    // The right net of a number that is not a left net's.
     NetId RightOf(NetId number) const { return number - static_cast<NetId>(m_rights.size()); }
-    // kNotThere where it is not known.
+    // kNotThere if it is not known.
     NetId RightOfLeft(NetId left) const { return m_rights[left]; }
-    size_t NumKnown() const { return m_num_known; } // without constants
+    size_t NumKnown() const { return m_num_known; } // without the fixed nets
 
   private:
     std::vector<NetId> m_rights;  // of each left net
@@ -48,15 +49,15 @@ class NetMap {
     size_t m_num_known = 0;
 };
 
-// What names say about which nets are the same.
+// What JoinByNames could not decide.
 struct NameJoins {
-    Renames unused; // what could not be used of the renames
-    // Nets with a name in common of which one is of no table: the name may have moved.
+    Renames unused; // the renames that could not be used
+    // Pairs of nets with a common name of which one belongs to no table: the name may have moved.
     std::vector<std::pair<NetId, NetId>> doubtful;
 };
 
-// Joins nets that 'renames' takes for one another, then those with a name in common, if tables of
-// both designs have them.
+// Joins the nets that 'renames' lists, then nets with a common name if tables of both designs use
+// them.
 NameJoins JoinByNames(const Design& left, const Design& right, const NameMatch& match,
                       const Renames& renames, NetMap& nets);
 

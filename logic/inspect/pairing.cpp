@@ -10,7 +10,8 @@ namespace booleq {
 
 namespace {
 
-// A cell's outputs are told apart by their pins; a cell with one has it alone, whatever its name.
+// Outputs of a cell are distinguished by their pins. If both cells have only one output, the names
+// of the pins do not matter.
 bool IsSameOutput(const Design& left, const DesignTable& leftTable, const Design& right,
                   const DesignTable& rightTable)
 {
@@ -60,7 +61,7 @@ class Pairer {
         return !name.empty() && name.front() == '$';
     }
 
-    // The outputs of a cell follow one another, so the first one leads to all.
+    // The outputs of a cell are consecutive, so the first one leads to all of them.
     void PairByPath(bool isMadeUp)
     {
         ScopedIndex index(m_right);

@@ -1,5 +1,5 @@
-// Which table of one design is which of another one.
-// In: both designs, and which nets are the same. Out: pairs, and what is left on each side.
+// Which table of one design corresponds to which of another. In: both designs, and which nets are
+// the same. Out: pairs, and the tables left over on each side.
 // Cost: some look-ups for each table.
 #ifndef BOOLEQ_INSPECT_PAIRING_H
 #define BOOLEQ_INSPECT_PAIRING_H
@@ -22,22 +22,23 @@ struct TablePair {
     PairedBy by;
 };
 
-// Invariant: each table of a design is in one pair, or once among those that are left.
+// Invariant: each table of a design is either in exactly one pair or once in onlyLeft or onlyRight.
 struct Pairing {
     std::vector<TablePair> pairs; // in the order of the left design
     std::vector<uint32_t> onlyLeft;
     std::vector<uint32_t> onlyRight;
-    uint64_t numKeysTwice = 0; // cells whose key another cell of their design has, too
+    uint64_t numKeysTwice = 0; // right tables with the key of an earlier cell
 };
 
 enum class PairWays { All, Key };
 
-// By path, else by output net, else by key; or by key alone. A path that a program made up
-// ("$abc$12") is looked at after the net: two runs give it to different cells.
+// Pairs by path, else by output net, else by key; or by key alone. A path that a program made up
+// ("$abc$12") is tried after the net, because two runs give it to different cells.
 Pairing PairTables(const Design& left, const Design& right, const NameMatch& match,
                    const NetMap& nets, PairWays ways);
 
-// Pairs what is left by output nets that have become known since; gives back how many pairs came.
+// Pairs left-over tables by output nets that have become known since. Returns the number of new
+// pairs.
 size_t PairRest(const Design& left, const Design& right, const NetMap& nets, Pairing& pairing);
 
 } // namespace booleq

@@ -13,10 +13,10 @@ namespace {
 
 constexpr unsigned int kMaxRounds = 64;
 
-// What pairs of tables say about which nets are the same.
+// Counts the votes of pairs of tables about which nets are the same.
 class Votes {
   public:
-    // A net that has a name in common with another one needs two votes for anything else.
+    // A net that shares a name with another one needs two votes to be joined.
     explicit Votes(const NetPairs& doubtful)
     {
         for (const auto& pair : doubtful) {
@@ -27,8 +27,7 @@ class Votes {
 
     void Add(NetId left, NetId right) { ++m_counts[uint64_t(left) << 32 | right]; }
 
-    // Joins each net with the one that most are for, where that is so seen from both sides. The
-    // votes are gone afterwards.
+    // Joins two nets if each has the most votes for the other. Clears the votes.
     void Join(NetMap& nets, NetPairs& joined)
     {
         std::unordered_map<NetId, Favourite> lefts;
@@ -119,7 +118,7 @@ bool HasUnknownInput(const Design& left, const DesignTable& table, const NetMap&
                        [&nets](NetId net) { return !nets.IsKnownLeft(net); });
 }
 
-// True while the pair may tell more in another round.
+// Returns true if the pair may tell more in another round.
 bool VoteForInputs(const NetFunction& left, const NetFunction& right, const NetMap& nets,
                    Votes& votes)
 {
@@ -133,8 +132,8 @@ bool VoteForInputs(const NetFunction& left, const NetFunction& right, const NetM
     return true;
 }
 
-// Where a chain of wires begins; what is walked leads there at once afterwards. A ring ends at the
-// net that it was entered by.
+// Where a chain of wires begins. All nets on the way are then linked straight to that net. A ring
+// ends at the net where it was entered.
 NetId EndOf(NetId net, std::unordered_map<NetId, NetId>& sources)
 {
     std::vector<NetId> passed;
@@ -144,7 +143,7 @@ NetId EndOf(NetId net, std::unordered_map<NetId, NetId>& sources)
         passed.push_back(end);
         end = source->second;
         if (passed.size() > sources.size())
-            break; // a ring further on
+            break; // a ring that does not include 'net'
     }
     for (const NetId wire : passed)
         if (wire != end)

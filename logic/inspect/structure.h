@@ -1,7 +1,7 @@
-// Nets that are the same because the tables around them are: what tells nets apart that have other
-// names, or none.
-// In: pairs of tables. Out: nets joined. It fails on nothing; what it cannot tell stays unknown.
-// Cost: a look at each pair in which a net is unknown, for each round; at most kMaxRounds.
+// Finds nets that are the same because the tables around them are, for nets whose names differ or
+// are missing. In: pairs of tables. Out: nets joined.  Fails: never; nets that it cannot decide
+// stay unknown.
+// Cost: in each round, one visit to each pair with an unknown net; at most kMaxRounds rounds.
 #ifndef BOOLEQ_INSPECT_STRUCTURE_H
 #define BOOLEQ_INSPECT_STRUCTURE_H
 
@@ -18,30 +18,29 @@ namespace booleq {
 NetFunction LeftFunction(const Design& left, uint32_t table);
 NetFunction RightFunction(const Design& right, uint32_t table, const NetMap& nets);
 
-// How many ways there are to take the unknown nets of one function for those of the other one so
-// that they are equal, and the first of them.
+// How many ways there are to identify the unknown nets of one function with those of the other so
+// that the functions are equal, and the first of these ways.
 struct Assignments {
-    static constexpr unsigned int kMaxNets = 5; // more have too many orders
+    static constexpr unsigned int kMaxNets = 5; // more would have too many orders
 
-    unsigned int number = 0;                    // 2 stands for more
+    unsigned int number = 0;                    // 2 means two or more
     std::vector<std::pair<NetId, NetId>> first; // common numbers, left and right
     bool isTried = true;                        // false: too many nets
 };
 Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets);
 
-// Left and right nets that are the same.
-// Joins the outputs of pairs, then, again and again, the inputs that can be nothing else, by the
-// vote of all pairs. A net that two tables want to join with different ones stays unknown unless
-// more want one of them; of 'doubtful' nets, which a name speaks for, two tables at least must want
-// it.
+// Joins the outputs of pairs, then, round by round, the inputs that leave only one possibility, by
+// a vote of all pairs. A net for which tables vote for different nets stays unknown unless one of
+// them has more votes. 'doubtful' nets have a common name, so joining them otherwise takes at least
+// two votes. Returns the left and right nets that were joined.
 typedef std::vector<std::pair<NetId, NetId>> NetPairs;
 NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing& pairing,
                          const NetPairs& doubtful, NetMap& nets);
-// Joins those of which nothing else is known as their names say.
+// Joins doubtful nets by name if nothing else is known about them.
 void JoinDoubtful(const NetPairs& doubtful, NetMap& nets);
 
-// Tables of 'tables' that only pass a net, or are constant: whoever reads their output reads the
-// net itself from now on.
+// Bypasses those of 'tables' that only pass a net or are constant: inputs that read their output
+// now read the net itself.
 void FollowWires(Design& design, const std::vector<uint32_t>& tables);
 
 } // namespace booleq

@@ -16,7 +16,7 @@ namespace {
 constexpr uint64_t kWatchedTables = 1024;
 constexpr size_t kNumReaderRules = static_cast<size_t>(FindingCode::NumFindingCodes);
 
-// After the reader's rules, in this order.
+// These follow the reader's rules, in this order.
 enum TableRule { IdleInput, ConstantTable, WireTable, InverterTable, SameFunction };
 
 Severity SeverityOf(FindingCode code)
@@ -66,7 +66,7 @@ std::vector<FindingRule> MakeRules()
     return rules;
 }
 
-// The code's sentence after the pin or parameter that it is about.
+// The pin or parameter concerned, followed by the code's sentence.
 std::string SentenceOf(const ReadFinding& finding)
 {
     if (finding.text.empty())
@@ -148,8 +148,8 @@ class Inspector {
         LookForSame(table, {rows, m_found.nets});
     }
 
-    // Equal hashes are compared with the first table that has it; a later one is then missed only
-    // where two different functions share a hash of 64 bits.
+    // A table is compared with the first one that has the same hash. An equal table is missed only
+    // if two different functions share a hash of 64 bits.
     void LookForSame(uint32_t table, PinFunction pins)
     {
         const NetFunction function = Normalise(std::move(pins));

@@ -9,7 +9,7 @@ namespace booleq {
 
 namespace {
 
-// Whether folding leaves the table as it is: all pins are nets, all different.
+// Whether folding leaves the table as it is: all pins are wires, and all are different.
 bool IsPlain(const NetId* nets, unsigned int numNets)
 {
     for (unsigned int place = 0; place < numNets; ++place) {

@@ -1,7 +1,7 @@
-// The different functions of a design's tables, each numbered once: constant and repeated inputs
-// are folded, idle ones left out, what is left stays in the order of pins.
-// Cost: a look-up for each table; a table whose pins are all different nets is folded once for
-// its init value.
+// The distinct functions of a design's tables, each numbered once: constant and repeated inputs are
+// folded, idle ones are left out, the rest stay in the order of the pins.
+// Cost: a look-up for each table; tables whose pins are all different nets are folded only once for
+// each init value.
 #ifndef BOOLEQ_INSPECT_TABLE_FUNCTIONS_H
 #define BOOLEQ_INSPECT_TABLE_FUNCTIONS_H
 
@@ -15,14 +15,14 @@
 
 namespace booleq {
 
-constexpr unsigned int kMaxWordInputs = 6; // of a function that is one word
+constexpr unsigned int kMaxWordInputs = 6; // of a function that fits in one word
 
 class TableFunctions {
   public:
     struct Found {
         uint32_t function = 0;   // of Functions()
         std::vector<NetId> nets; // of its inputs
-        std::vector<NetId> idle; // nets that have no effect
+        std::vector<NetId> idle; // nets without effect
     };
 
     explicit TableFunctions(const Design& design);
@@ -32,7 +32,7 @@ class TableFunctions {
     const std::vector<Rows>& Functions() const { return m_functions; }
 
   private:
-    // A folded init value: its function, and which of its inputs that has.
+    // A folded init value: its function, and which inputs of the rows the function has.
     struct Folded {
         uint32_t function = UINT32_MAX;
         uint32_t support = 0; // bit k: input k of the rows matters

@@ -1,12 +1,8 @@
-// A table's upper block, the rows where its first inputs are 1, has four inputs, and the least
-// table has there the least of what any choice of first inputs, their inversions and that of the
-// output brings up, which a table of all functions of four inputs says at once. Only those choices
-// are followed that bring it up, and of the rest only what leaves that block as it is. Finding a
-// form block by block: Abdollahi and Pedram, "Symmetry detection and Boolean matching utilizing a
-// signature-based canonical form", IEEE Transactions on CAD 27(6), 2008, and Huang, Wang,
-// Nasikovskiy and Mishchenko, "Fast Boolean matching based on NPN classification", FPT 2013. The
-// exchange of one input at a time goes through all choices as combinations do in the revolving-door
-// order, Knuth, The Art of Computer Programming 4A, section 7.2.1.3.
+// Canonical forms, found block by block: Abdollahi and Pedram, "Symmetry detection and Boolean
+// matching utilizing a signature-based canonical form", IEEE Transactions on CAD 27(6), 2008, and
+// Huang, Wang, Nasikovskiy and Mishchenko, "Fast Boolean matching based on NPN classification", FPT
+// 2013. Choices of first inputs follow the revolving-door order of combinations, which exchanges
+// one input at a time: Knuth, The Art of Computer Programming 4A, section 7.2.1.3.
 #include "canonical.h"
 
 #include <algorithm>
@@ -22,15 +18,15 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kPartSize = 1024; // tables in a millisecond or so
+constexpr size_t kPartSize = 1024; // tables; takes about a millisecond
 constexpr unsigned int kMaxFirsts = kMaxCanonicalInputs - kMaxBlockInputs;
 constexpr unsigned int kMaxChoices = 15; // of two first inputs of six
 constexpr unsigned int kMaxBlocks = 1u << kMaxFirsts;
 constexpr unsigned int kBlockRows = 1u << kMaxBlockInputs;
 constexpr uint64_t kBlockMask = 0xffff;
 
-// A choice of first inputs: an order of all inputs that begins with them, and how it comes from the
-// choice before by exchanging two.
+// A choice of first inputs: an order of all inputs that begins with them, and the two bits whose
+// exchange makes it from the choice before.
 struct Choice {
     LutTransformation order;
     unsigned int low = 0; // bits of the row number
@@ -40,7 +36,7 @@ struct Choice {
 // Requires: 5 or 6 inputs.
 std::vector<Choice> MakeChoices(unsigned int numInputs)
 {
-    // Each shares all but one with the one before.
+    // Each choice differs from the one before in one input.
     static const std::vector<std::vector<uint8_t>> kFives = {{0}, {1}, {2}, {3}, {4}};
     static const std::vector<std::vector<uint8_t>> kSixes = {
         {0, 1}, {1, 2}, {0, 2}, {0, 3}, {1, 3}, {2, 3}, {3, 4}, {2, 4},
@@ -63,24 +59,28 @@ std::vector<Choice> MakeChoices(unsigned int numInputs)
         }
         choices.push_back(choice);
     }
-    choices.erase(choices.begin()); // where it started, which is the first choice as well
+    choices.erase(choices.begin()); // the start, which equals the first choice
     return choices;
 }
 
-// Part way to the form.
+// A table part of the way to its form.
 struct Candidate {
     uint64_t word = 0;  // what the table has become
     uint32_t begin = 0; // the transformations that leave its block as it is
     uint32_t end = 0;
-    uint16_t function = 0; // of the block that becomes the least
-    uint16_t toLeast = 0;  // the transformation that does it
+    uint16_t function = 0; // of the block that is made least
+    uint16_t toLeast = 0;  // index of the transformation that does that
     uint8_t choice = 0;
     uint8_t invertedFirsts = 0; // a set of places
     bool isInverted = false;
     bool areSwapped = false; // the two first inputs
 };
 
-// Finds forms one after the other.
+// Finds forms, one at a time.
+// The upper block of a table, the rows where its first inputs are 1, has four inputs. In the least
+// table it is the least that any choice of first inputs, their inversions and the output's
+// inversion can make of it; a table of all functions of four inputs gives that at once. Only the
+// choices that make this least block are followed, and after that only what keeps it as it is.
 class Canonicaliser {
   public:
     // Requires: 5 or 6 inputs.
@@ -113,14 +113,14 @@ class Canonicaliser {
                 }
             }
         }
-        assert(best != nullptr); // a candidate has a transformation at least
+        assert(best != nullptr); // a candidate has at least one transformation
         found.transformation = TransformationOf(*best, bestIndex);
         assert(Transform(found.transformation, table, m_num_inputs) == found.form);
         return found;
     }
 
   private:
-    // Candidates of the least upper block.
+    // Collects the candidates with the least upper block.
     void FollowBestChoices(uint64_t table)
     {
         const unsigned int topBlock = m_num_blocks - 1;
@@ -148,7 +148,7 @@ class Canonicaliser {
                         Follow(place, block, isInverted);
     }
 
-    // Brings a block up.
+    // Makes a block the upper one.
     void Follow(size_t choice, unsigned int block, bool isInverted)
     {
         Candidate candidate;
@@ -171,8 +171,9 @@ class Canonicaliser {
         Keep(candidate);
     }
 
-    // Keeps a candidate if none with a lesser bound is there. Blocks that are constants stay as
-    // they are, whatever is done to the inputs of blocks; the next becomes the least there is.
+    // Keeps a candidate unless one with a lesser bound is known. Constant blocks stay as they are,
+    // whatever is done to the inputs of the blocks; the first block that is not constant becomes
+    // the least of its class.
     void Keep(Candidate candidate)
     {
         unsigned int block = m_num_blocks;
@@ -193,8 +194,8 @@ class Canonicaliser {
         m_candidates[m_num_candidates++] = candidate;
     }
 
-    // Makes the block that the bound ends with the least, and leaves out candidates that became
-    // one.
+    // Makes the block with which the bound ends the least of its class, and drops candidates whose
+    // words are now equal.
     void FinishCandidates()
     {
         for (size_t place = 0; place < m_num_candidates; ++place) {
@@ -222,7 +223,7 @@ class Canonicaliser {
                                 begin);
     }
 
-    // From the table to what was found: the choice, its inversions, and two transformations of the
+    // From the table to the form: the choice, its inversions, and two transformations of the
     // blocks' inputs.
     LutTransformation TransformationOf(const Candidate& candidate, uint16_t index) const
     {
@@ -238,7 +239,7 @@ class Canonicaliser {
         return Compose(result, OfAllInputs(index));
     }
 
-    // A transformation of the blocks' inputs, the last ones, as one of all.
+    // A transformation of the blocks' inputs, which are the last ones, as one of all inputs.
     LutTransformation OfAllInputs(uint16_t index) const
     {
         const LutTransformation& ofBlock = m_tables.transformations[index].meaning;
@@ -259,12 +260,12 @@ class Canonicaliser {
     // Of the table at hand:
     std::array<uint64_t, kMaxChoices> m_words;
     std::array<std::array<uint16_t, 2 * kMaxBlocks>, kMaxChoices> m_leasts;
-    uint64_t m_bound = 0; // the least that a form can be by the blocks that are settled
+    uint64_t m_bound = 0; // the least form that the settled blocks allow
     std::array<Candidate, size_t(4) * kMaxBlocks * kMaxChoices> m_candidates;
     size_t m_num_candidates = 0;
 };
 
-// Up to four inputs: the tables say it.
+// Up to four inputs: the form is in the tables.
 CanonicalLut FindSmall(uint64_t wanted, unsigned int numInputs, CanonicalScope scope)
 {
     const BlockTables& tables = BlockTablesOf(numInputs, scope);

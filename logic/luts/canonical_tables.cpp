@@ -54,8 +54,8 @@ std::vector<BlockTransformation> AllTransformations(unsigned int numInputs, Cano
     return all;
 }
 
-// Functions in ascending order: one that no lesser one becomes is the least of its class, which is
-// what all transformations make of it.
+// Goes through the functions in ascending order. One that no lesser function becomes is the least
+// of its class, and the class is all that the transformations make of it.
 BlockTables MakeTables(unsigned int numInputs, CanonicalScope scope)
 {
     const size_t numFunctions = size_t(1) << (1u << numInputs);

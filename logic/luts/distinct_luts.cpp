@@ -12,15 +12,15 @@ namespace booleq {
 
 namespace {
 
-// Watch() at every so many steps.
+// Calls Watch() once in 65536 steps.
 void WatchAt(size_t step)
 {
     if (step % 65536 == 0)
         Watch();
 }
 
-// Tables that were met, found by a hash: open addressing, at most half full. Elements of the table
-// of hashes are places among the distinct ones, one more than that; 0 is free.
+// Tables met so far, found by their hash: open addressing, at most half full. A slot holds a place
+// among the distinct tables plus one; 0 is a free slot.
 template <class Word>
 class Meeting {
   public:
@@ -50,7 +50,7 @@ class Meeting {
     uint64_t Count(size_t distinct) const { return m_counts[distinct]; }
 
   private:
-    // A multiplication by an odd constant near the golden ratio of 2^64 mixes into the upper bits.
+    // Multiplying by an odd constant near 2^64 divided by the golden ratio mixes the upper bits.
     size_t SlotOf(Word word) const
     {
         constexpr uint64_t kMix = 0x9e3779b97f4a7c15;
@@ -72,13 +72,13 @@ class Meeting {
         }
     }
 
-    std::vector<size_t> m_slots; // a power of two of them
+    std::vector<size_t> m_slots; // their number is a power of two
     std::vector<Word> m_words;
     std::vector<uint64_t> m_first_places;
     std::vector<uint64_t> m_counts;
 };
 
-// The places of the words in ascending order of these.
+// The places of the words, in ascending order of the words.
 template <class Word>
 std::vector<size_t> SortedPlaces(const std::vector<Word>& words)
 {

@@ -1,8 +1,8 @@
-// Very many look-up tables of one width, as they lie in memory: the form in which arrays of Python,
-// netlists and canonical forms hand tables to each other. It owns nothing.
+// Many look-up tables of one width in a caller's memory: the form in which Python arrays, netlists
+// and canonical forms hand tables to each other. It owns nothing.
 // Input 0 is the most significant bit of a row's number, row k is bit k of the table, as in rows.h;
 // a table of seven inputs is two words of 64 bits, rows 0 to 63 first.
-// Fails: nothing does; who makes an array sees to its invariants.
+// Fails: never; whoever makes an array must keep its invariants.
 #ifndef BOOLEQ_LUTS_LUT_ARRAY_H
 #define BOOLEQ_LUTS_LUT_ARRAY_H
 
@@ -15,11 +15,11 @@ namespace booleq {
 constexpr unsigned int kMaxLutInputs = 7;
 constexpr size_t kNoLut = SIZE_MAX; // instead of a place in an array
 
-// How work on an array is done: by some threads at once, where it is long enough for more than one.
-// The calling thread calls Watch() (watch.h) every few milliseconds, the others never; what that
-// throws ends them all, and results are then partly written.
+// How work on an array is done: by several threads at once if the array is long enough. The calling
+// thread calls Watch() (watch.h) every few milliseconds, the others never. What Watch() throws ends
+// them all, and the results are then partly written.
 struct LutWork {
-    unsigned int numThreads = 0; // 0: as many as there are processors
+    unsigned int numThreads = 0; // 0: one for each processor
 };
 
 // Tables to be read.
@@ -33,13 +33,14 @@ struct LutArray {
     unsigned int tableBytes;
 };
 
-// The fewest bytes that a table takes: 1 up to three inputs, 16 for seven.
+// The fewest bytes that hold a table: 1 up to three inputs, 16 for seven.
 constexpr unsigned int LutBytes(unsigned int numInputs)
 {
     return numInputs <= 3 ? 1u : 1u << (numInputs - 3);
 }
 
-// One word of 64 bits a table, two of seven inputs.
+// Words of 64 bits as an array: one word for each table, two for seven inputs. Owns nothing:
+// 'words' must outlive the result.
 LutArray LutsOf(const std::vector<uint64_t>& words, unsigned int numInputs);
 
 // Whether numInputs and tableBytes go together (invariant 1).

@@ -1,6 +1,6 @@
-// Kernels over tables of any word. Counting ones adds neighbours of ever more bits, see H. S.
-// Warren, Hacker's Delight, 2nd edition, section 5-1: without an instruction of its own that is
-// what a compiler makes vectors of.
+// Kernels over tables of any word. Ones are counted by adding neighbouring fields of more and more
+// bits (H. S. Warren, Hacker's Delight, 2nd edition, section 5-1): a compiler can vectorise that
+// where the processor has no instruction for it.
 #include "lut_kernels.h"
 
 #include <algorithm>
@@ -29,7 +29,7 @@ void ForEachLut(const LutArray& luts, Result* results, const LutWork& work, cons
     });
 }
 
-// The same with results of the tables' own word.
+// The same for results that have the tables' word.
 template <class Make>
 void MapLuts(const LutArray& luts, void* results, const LutWork& work, const Make& make)
 {
@@ -79,21 +79,21 @@ uint8_t NumOnes(TwoWords word)
     return static_cast<uint8_t>(NumOnes(word.lower) + NumOnes(word.upper));
 }
 
-// The half of a word where input 'bit' of the row number is fixed, in the rows where it is 0; other
-// bits are whatever they were.
+// The half of a word in which bit 'bit' of the row number is 'value', moved to the rows where that
+// bit is 0; the other bits of the result are undefined.
 template <class Word>
 Word Selected(Word word, unsigned int bit, bool value)
 {
     return value ? static_cast<Word>(word >> (1u << bit)) : word;
 }
 
-// The rows where bit 'bit' of the number is 0, close together: each step brings blocks of twice the
-// rows together (Hacker's Delight, section 7-4).
+// The rows where bit 'bit' of the number is 0, packed together: each step joins blocks of twice as
+// many rows (Hacker's Delight, section 7-4).
 uint64_t Compress(uint64_t word, unsigned int bit)
 {
     word &= ~BitPattern(bit);
     for (unsigned int step = bit; step < 5; ++step) {
-        // Blocks of 2^step rows lie at every second place; those of an odd number move down.
+        // Blocks of 2^step rows lie at every second place; the odd-numbered ones move down.
         const uint64_t odd = word & BitPattern(step + 1);
         word = (word ^ odd) | odd >> (1u << step);
     }

@@ -1,7 +1,7 @@
-// What is asked of, and done to, all tables of an array. In: tables, and one argument for all or
-// one each; out: arrays that the caller has, one element for each table. 'results' has tables of
-// the shape of the input and may be the same memory, but not overlap it otherwise. Fails:
-// std::bad_alloc, and what Watch() throws.  Cost: in step with the tables; some nanoseconds each.
+// Questions about, and changes to, all tables of an array. In: tables, and one argument for all or
+// one for each; out: the caller's arrays, one element for each table. 'results' has tables of the
+// input's shape and may be the same memory, but may not overlap it otherwise.
+// Fails: std::bad_alloc, and what Watch() throws.  Cost: some nanoseconds for each table.
 #ifndef BOOLEQ_LUTS_LUT_KERNELS_H
 #define BOOLEQ_LUTS_LUT_KERNELS_H
 
@@ -19,15 +19,15 @@ constexpr uint8_t AllLutInputs(unsigned int numInputs)
 // significant bit.  Requires: row < 2^numInputs.
 void EvaluateLuts(const LutArray& luts, uint8_t row, uint8_t* values,
                   const LutWork& work = LutWork());
-// The same in a row each.  Requires: every row < 2^numInputs.
+// The same with a row for each table.  Requires: every row < 2^numInputs.
 void EvaluateLutsEach(const LutArray& luts, const uint8_t* rows, uint8_t* values,
                       const LutWork& work = LutWork());
 
-// Input k of the result is input order[k] of the table, as PermuteInputs of rows.h has it.
+// Input k of the result is input order[k] of the table, as for PermuteInputs (rows.h).
 // Requires: order is a permutation of the numInputs inputs.
 void PermuteLuts(const LutArray& luts, const uint8_t* order, void* results,
                  const LutWork& work = LutWork());
-// The same with an order each: those of a table are numInputs elements in a row.
+// The same with an order for each table: numInputs consecutive elements of 'orders'.
 // Requires: FirstBadOrder finds none.
 void PermuteLutsEach(const LutArray& luts, const uint8_t* orders, void* results,
                      const LutWork& work = LutWork());
@@ -37,15 +37,15 @@ size_t FirstBadOrder(const uint8_t* orders, size_t count, unsigned int numInputs
 
 // Every row's value is inverted.
 void InvertLuts(const LutArray& luts, void* results, const LutWork& work = LutWork());
-// The function with an input fixed, over the other inputs: 'results' has tables of one input less,
-// which take resultBytes each.  Requires: input < numInputs; HasLutShape(numInputs - 1,
-// resultBytes); other memory than the tables.
+// The function of the other inputs when one input is fixed: 'results' has tables of one input less,
+// resultBytes each.  Requires: input < numInputs; HasLutShape(numInputs - 1, resultBytes);
+// 'results' is not the tables' memory.
 void FixLutInput(const LutArray& luts, unsigned int input, bool value, void* results,
                  unsigned int resultBytes, const LutWork& work = LutWork());
 
-// The inputs that matter, as a set; the idle ones are the others.
+// The inputs that matter, as a set; all others are idle.
 void FindLutSupports(const LutArray& luts, uint8_t* inputs, const LutWork& work = LutWork());
-// In how many rows a table is 1, at most 128.
+// The number of rows in which a table is 1, at most 128.
 void CountLutOnes(const LutArray& luts, uint8_t* counts, const LutWork& work = LutWork());
 
 } // namespace booleq

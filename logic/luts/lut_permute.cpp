@@ -1,5 +1,5 @@
-// Orders of inputs as exchanges of two bits of all row numbers, at most one less than there are
-// inputs; each is one SwapLutBits.
+// An order of inputs is applied as exchanges of two bits in all row numbers, at most one fewer than
+// there are inputs; each exchange is one SwapLutBits.
 #include <algorithm>
 #include <array>
 #include <cassert>
@@ -16,18 +16,18 @@ namespace {
 constexpr size_t kPartSize = 32768;
 constexpr size_t kBlockSize = 512; // tables that stay in the fastest cache between two exchanges
 
-// Bits of the row number, low <= high; the same twice exchange nothing.
+// Bits of the row number, low <= high; if they are equal, nothing is exchanged.
 struct BitSwap {
     unsigned int low;
     unsigned int high;
 };
 
-// Calls exchange(BitSwap) once for each place but the last, without a branch on the order.
+// Calls exchange(BitSwap) once for each place except the last, without branching on the order.
 // Requires: order is a permutation.
 template <class Exchange>
 void ForEachSwap(const uint8_t* order, unsigned int numInputs, const Exchange& exchange)
 {
-    // Four bits each: the input of the table that stands at a place so far, and where an input is.
+    // Four bits for each: the table's input that is now at a place, and the place of an input.
     uint32_t inputAt = 0x76543210;
     uint32_t placeOf = 0x76543210;
     for (unsigned int place = 0; place + 1 < numInputs; ++place) {
@@ -39,7 +39,7 @@ void ForEachSwap(const uint8_t* order, unsigned int numInputs, const Exchange& e
         placeOf ^= (place ^ from) << (4 * leaving);
         exchange(BitSwap{numInputs - 1 - from, numInputs - 1 - place});
     }
-    // The places that are settled are not looked at again, so they are not written.
+    // Settled places are never read again, so they are not written.
     assert(numInputs == 0 || (inputAt >> (4 * (numInputs - 1)) & 7u) == order[numInputs - 1]);
 }
 

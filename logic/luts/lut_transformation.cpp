@@ -1,4 +1,4 @@
-// Inputs trade places by the delta swap of H. S. Warren, Hacker's Delight, 2nd edition, section
+// Inputs are exchanged by the delta swap of H. S. Warren, Hacker's Delight, 2nd edition, section
 // 7-1.
 #include "lut_transformation.h"
 
@@ -24,7 +24,7 @@ uint64_t InvertInputs(uint64_t table, unsigned int inputs, unsigned int numInput
 // Input k of the result is input order[k] of the table.
 uint64_t Reorder(uint64_t table, const uint8_t* order, unsigned int numInputs)
 {
-    uint8_t at[kMaxTransformedInputs] = {0, 1, 2, 3, 4, 5}; // the input that stands at a place
+    uint8_t at[kMaxTransformedInputs] = {0, 1, 2, 3, 4, 5}; // the input that is now at a place
     for (unsigned int place = 0; place < numInputs; ++place) {
         unsigned int from = place;
         while (at[from] != order[place])

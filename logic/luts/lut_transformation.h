@@ -1,4 +1,4 @@
-// An order of inputs with inversions, and what it makes of a table of up to six inputs.
+// An order of inputs with inversions, applied to tables of up to six inputs.
 #ifndef BOOLEQ_LUTS_LUT_TRANSFORMATION_H
 #define BOOLEQ_LUTS_LUT_TRANSFORMATION_H
 
@@ -10,7 +10,7 @@ constexpr unsigned int kMaxTransformedInputs = 6;
 
 // result(x) = table(y), inverted if invertsOutput, where y[order[k]] is x[k], inverted if bit k of
 // invertedInputs is set: input k of the result is input order[k] of the table.
-// Invariants: order is a permutation; places beyond the inputs hold themselves and are not
+// Invariants: order is a permutation; places after the last input hold their own number and are not
 // inverted.
 struct LutTransformation {
     uint8_t order[kMaxTransformedInputs] = {0, 1, 2, 3, 4, 5};
@@ -22,7 +22,7 @@ static_assert(sizeof(LutTransformation) == 8, "arrays of them are arrays of byte
 // What a transformation makes of a table.
 // Requires, here and below: at most six inputs; no bit beyond the last row.
 uint64_t Transform(const LutTransformation& transformation, uint64_t table, unsigned int numInputs);
-// The table that a transformation makes 'result' of.
+// The table of which a transformation makes 'result'.
 uint64_t TransformBack(const LutTransformation& transformation, uint64_t result,
                        unsigned int numInputs);
 // One after the other: what 'second' makes of what 'first' makes.

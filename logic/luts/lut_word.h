@@ -1,5 +1,5 @@
-// Tables as words that kernels are written for once: unsigned integers, and two words of 64 bits as
-// one of 128.
+// Tables as words, so that each kernel is written once: unsigned integers, and two words of 64 bits
+// as one of 128.
 #ifndef BOOLEQ_LUTS_LUT_WORD_H
 #define BOOLEQ_LUTS_LUT_WORD_H
 
@@ -44,7 +44,7 @@ constexpr bool operator<(TwoWords left, TwoWords right)
 {
     return left.upper != right.upper ? left.upper < right.upper : left.lower < right.lower;
 }
-// Requires, in both: distance < 128.
+// Requires, for both: distance < 128.
 constexpr TwoWords operator>>(TwoWords word, unsigned int distance)
 {
     if (distance >= 64)
@@ -58,7 +58,7 @@ constexpr TwoWords operator<<(TwoWords word, unsigned int distance)
     return {word.lower << distance, word.upper << distance | word.lower >> 1 >> (63 - distance)};
 }
 
-// How a table of words of 64 bits is the same table as a Word, and back.
+// Converts a table between words of 64 bits and a Word.
 template <class Word>
 struct LutWord {
     static constexpr Word Of(uint64_t lower, uint64_t /*upper*/)
@@ -91,7 +91,7 @@ constexpr Word LutMask(unsigned int numInputs)
     return LutWord<Word>::Of(RowMask(numInputs), numInputs > 6 ? ~uint64_t(0) : 0);
 }
 
-// Two inputs of a table trade places; 'low' and 'high' are bits of the row number.
+// Exchanges two inputs of a table; 'low' and 'high' are bits of the row number.
 // Requires: low <= high; if they are the same, nothing moves.
 template <class Word>
 constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
@@ -101,7 +101,7 @@ constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
     return DeltaSwapped(word, movers, distance);
 }
 
-// An input of a table is inverted; 'bit' is its bit of the row number.
+// Inverts an input of a table; 'bit' is its bit of the row number.
 template <class Word>
 constexpr Word InvertLutBit(Word word, unsigned int bit)
 {

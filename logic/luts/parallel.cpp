@@ -15,7 +15,7 @@ namespace booleq {
 
 namespace {
 
-// Parts are handed out in order, to whoever asks next.
+// Hands out parts in order to the threads that ask for the next one.
 class Parts {
   public:
     Parts(size_t count, size_t partSize, const PartRunner& run)
@@ -23,7 +23,7 @@ class Parts {
     {
     }
 
-    // Until no part is left or somebody has failed.  'before' is called before each part.
+    // Runs parts until none is left or a thread has failed.  'before' is called before each part.
     template <class Before>
     void Run(const Before& before)
     {
@@ -54,7 +54,7 @@ class Parts {
     const size_t m_count;
     const size_t m_part_size;
     const PartRunner& m_run;
-    std::atomic<size_t> m_next{0}; // at most partSize beyond the count for each thread
+    std::atomic<size_t> m_next{0}; // passes the count by at most partSize for each thread
     std::atomic<bool> m_has_failed{false};
     std::mutex m_mutex; // guards m_failure
     std::exception_ptr m_failure;
@@ -79,7 +79,7 @@ void RunInParts(size_t count, size_t partSize, const LutWork& work, const PartRu
                 parts.Run([] {});
             });
     } catch (const std::system_error&) {
-        // The others do it.
+        // The threads that did start do all parts.
     }
     parts.Run(Watch);
     for (std::thread& helper : helpers)

@@ -1,4 +1,4 @@
-// Work on an array by several threads, some elements at a time.
+// Work on an array by several threads, a part of the array at a time.
 #ifndef BOOLEQ_LUTS_PARALLEL_H
 #define BOOLEQ_LUTS_PARALLEL_H
 
@@ -8,17 +8,17 @@
 
 namespace booleq {
 
-// Calls 'run' with parts begin to end of 0 to count, each of at most 'partSize' elements, until all
-// are done; the calling thread takes part, and calls Watch() before each of its own.
+// Splits 0 to count into parts of at most 'partSize' elements and calls 'run' with the begin and
+// end of each. The calling thread works too, and calls Watch() before each of its parts.
 // Requires: partSize > 0; 'run' may be called by several threads at once, for parts that do not
 // overlap. Choose partSize for about a millisecond.
 // Fails: what 'run' or Watch() throws first ends the work of all, and is thrown when all have
-// ended. A thread that the system does not give is done without.
+// ended. If the system refuses a thread, the other threads do its work.
 typedef std::function<void(size_t begin, size_t end)> PartRunner;
 void RunInParts(size_t count, size_t partSize, const LutWork& work, const PartRunner& run);
 
-// The least place from 0 to count that 'find' finds in a part, kNoLut when it finds none: 'find'
-// gives the first place of its part, the part's end for none.
+// The least place from 0 to count that 'find' finds in any part; kNoLut if there is none. 'find'
+// returns the first place found in its part, or the part's end if it finds none.
 typedef std::function<size_t(size_t begin, size_t end)> PartFinder;
 size_t FindFirstInParts(size_t count, size_t partSize, const LutWork& work, const PartFinder& find);
 

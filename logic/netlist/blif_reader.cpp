@@ -1,7 +1,6 @@
-// Makes a network of a BLIF text, which is read as any netlist is. Of what such a file may say it
-// takes what a network has room for: one model, one output, tables alone, each signal defined
-// before its use. Fails: false, 'network' is as it was.  Cost: in step with the text and the rows
-// of the tables.
+// Makes a network of a BLIF text, which is read like any netlist. It accepts what a network can
+// hold: one model, one output, only tables, each signal defined before it is used.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text and the rows of the tables.
 #include <algorithm>
 
 #include "fold.h"
@@ -26,7 +25,7 @@ class DesignNetwork {
         const bool isSound = std::all_of(
             m_design.findings.begin(), m_design.findings.end(), [](const ReadFinding& finding) {
                 return finding.code == FindingCode::Buffer ||
-                       finding.code == FindingCode::ConstantNet; // another name, a constant
+                       finding.code == FindingCode::ConstantNet; // a second name, or a constant
             });
         if (!isSound || !m_design.unread.empty() || m_design.numCells != m_design.tables.size() ||
             m_design.scopes.size() != 1)

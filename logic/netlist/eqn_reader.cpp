@@ -1,6 +1,6 @@
-// Reads files of equations: orders of inputs and outputs, then "signal = expression;", each defined
-// before it is used, the one output last.
-// Fails: false, 'network' is as it was.  Cost: in step with the text.
+// Reads files of equations: the orders of inputs and outputs, then "signal = expression;" lines,
+// each signal defined before it is used and the one output last.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text.
 #include <sstream>
 
 #include "foreign_tree.h"
@@ -19,7 +19,7 @@ class EqnReader {
         for (std::string statement; std::getline(statements, statement, ';');) {
             const size_t sign = statement.find('=');
             if (sign == std::string::npos)
-                return true; // the line end after the last statement
+                return true; // only the line end after the last statement
             const std::vector<std::string> target = SplitWords(statement.substr(0, sign));
             if (target.size() != 1 || !ReadStatement(target[0], statement.substr(sign + 1)))
                 return false;

@@ -1,5 +1,5 @@
-// Functions as networks of signals: what logic synthesis reads. Writers for three file formats and
-// the readers that check them.
+// Functions as networks of signals, as logic synthesis programs read them: writers for three file
+// formats, and the readers that check what was written.
 #ifndef BOOLEQ_NETLIST_NETWORK_H
 #define BOOLEQ_NETLIST_NETWORK_H
 
@@ -19,12 +19,12 @@ struct UnitNames {
 
 // One gate for each operator, named so that nothing collides.
 std::string WriteBlif(const Expression& expression, const UnitNames& names);
-// One equation; an operand of an exclusive or that is more than a name gets an equation of its own.
+// One equation; an operand of an exclusive-or that is more than a name gets its own equation.
 std::string WriteEqn(const Expression& expression, const UnitNames& names);
 // A sum of products.
 std::string WritePla(const std::vector<Cube>& cubes, const UnitNames& names);
 
-// What a text in one of the formats says about its one output, over its inputs in their order.
+// The one output of a text in one of the formats, over its inputs in their order.
 // Invariant: a definition uses inputs and signals defined before it.
 struct Network {
     struct Definition {
@@ -37,7 +37,7 @@ struct Network {
     uint32_t output = 0;
 };
 
-// Read what the writers write, and as much of the formats as that needs.
+// Read the part of the formats that the writers use.
 // Fails: false for anything else.
 bool ReadBlif(const std::string& text, Network& network);
 bool ReadEqn(const std::string& text, Network& network);

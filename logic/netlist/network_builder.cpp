@@ -61,7 +61,8 @@ bool SumOfRows::Add(const std::string& row, const std::vector<uint32_t>& signals
 {
     if (row.size() != signals.size())
         return false;
-    // Nodes are in post-order and evaluated by place, so an operator follows its second operand.
+    // Nodes are in post-order and are evaluated by their place, so an operator follows its second
+    // operand.
     const auto addOperator = [this](Operator op) { m_sum.nodes.push_back({op, 0, 0, 0}); };
     const bool isFirstRow = m_sum.nodes.empty();
     bool isFirst = true;

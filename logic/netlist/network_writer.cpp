@@ -10,7 +10,7 @@ namespace booleq {
 
 namespace {
 
-// Names for signals inside, "n1" and on, that no input has.
+// Names for inner signals, "n1" and so on, that neither an input nor the output has.
 class FreshNames {
   public:
     explicit FreshNames(const UnitNames& names) : m_used(names.inputs.begin(), names.inputs.end())
@@ -70,7 +70,7 @@ const char* BlifRows(Operator op)
 
 // Writes an expression as equations of AND, OR and NOT.
 //
-// Invariant: m_nodes holds the operands that wait for their operator, one after the other, each in
+// Invariant: m_nodes holds the operands that wait for their operator, one after another, each in
 // post-order and starting at its element of m_starts. Links are not set.
 class EqnWriter {
   public:
@@ -111,7 +111,7 @@ class EqnWriter {
 
     void Append(Operator op) { m_nodes.push_back({op, 0, 0, 0}); }
 
-    // Both operands are needed twice, so what is more than one node becomes a signal.
+    // Both operands are needed twice, so an operand of more than one node becomes a signal.
     void AddExclusive(Operator op, size_t rightStart)
     {
         const size_t leftStart = m_starts.back();
@@ -221,7 +221,7 @@ std::string WritePla(const std::vector<Cube>& cubes, const UnitNames& names)
         }
         text += " 1\n";
     }
-    // Some readers do not expect a table without rows; one whose result is 0 adds nothing.
+    // Some readers do not accept a table without rows; a row with result 0 adds nothing.
     if (cubes.empty())
         text += std::string(numInputs, '-') + " 0\n";
     return text + ".e\n";

@@ -1,6 +1,6 @@
-// Makes a network of a table of products. Of what PLA files may say it takes what a network has
-// room for: one output, names for all, nothing free.
-// Fails: false, 'network' is as it was.  Cost: in step with the text.
+// Makes a network of a table of products. It accepts what a network can hold: one output, names for
+// everything, no don't-cares.
+// Fails: false, and 'network' is unchanged.  Cost: linear in the text.
 #include <numeric>
 
 #include "network_builder.h"

@@ -1,11 +1,11 @@
 #!/usr/bin/env python3
-"""What eval_many, tables of look-up tables and equations in bulk take, beside NumPy, in one run.
+"""Times eval_many, arrays of look-up tables and equations in bulk, next to NumPy, in one run.
 
 usage: ./dev python python/bench/bench_arrays.py [REPEATS]
 
-Beside eval_many stands NumPy in its strongest form: the formula as Python writes it, without a
+eval_many is compared with NumPy in its strongest form: the formula as Python code, without a
 parser, on contiguous columns of uint8. Results are compared before they are timed. Times are the
-least of REPEATS (5). Prints the tables that docs/python.md shows.
+minimum of REPEATS (5). Prints the tables that docs/python.md shows.
 """
 import sys
 import time

@@ -1,11 +1,11 @@
 #!/usr/bin/env python3
-"""How much more work two threads do than one, for calls that give up the interpreter's lock.
+"""How much more work two threads do than one, for calls that release the interpreter's lock.
 
 usage: ./dev python python/bench/bench_threads.py [SECONDS]
 
-Each kind of call is repeated in one thread for SECONDS (1), then in two, and the best of three rounds
-counts. Calls that use all processors by themselves, such as eval_many, are not here. Prints the table
-that docs/python.md shows.
+Each kind of call is repeated in one thread for SECONDS (1), then in two; the best of three rounds
+counts. Calls that use all processors by themselves, such as eval_many, are left out. Prints the
+table that docs/python.md shows.
 """
 import random
 import sys
@@ -26,7 +26,7 @@ def products(num_inputs: int, count: int) -> str:
 
 
 def calls() -> Dict[str, Callable[[], Any]]:
-    """They share their equations: different objects would be as good."""
+    """The calls of all threads share their equations; separate objects would do as well."""
     long_text = " & ".join(f"x{k % 1000}" for k in range(20_000))
     wide, many = Equation(products(20, 200)), Equation(products(40, 300))
     init = Equation.from_init(int.from_bytes(np.random.default_rng(1).bytes(8), "little"),
@@ -45,7 +45,7 @@ def calls() -> Dict[str, Callable[[], Any]]:
 
 
 def rate(call: Callable[[], Any], num_threads: int, seconds: float) -> float:
-    """Calls in a second, of all threads together."""
+    """Calls per second, of all threads together."""
     begun = threading.Barrier(num_threads + 1)
     numbers = [0] * num_threads
     ends = [0.0] * num_threads

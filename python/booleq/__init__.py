@@ -30,7 +30,7 @@ __all__ = ["Assignment", "Canonical", "CellCount", "Conversion", "Described", "D
            "Satisfiability", "Syntax", "TableDifference", "Target", "__version__", "batch",
            "equations", "minimize_pla", "read_netlist"]
 
-for _name in __all__:  # where users import it from, for help() and pickles
+for _name in __all__:  # the place users import it from, for help() and pickles
     if isinstance(globals()[_name], type):
         globals()[_name].__module__ = __name__
 for _function in (batch, equations, minimize_pla, read_netlist):

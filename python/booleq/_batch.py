@@ -1,4 +1,4 @@
-"""A table of functions completed: what the tool's command 'batch' does to a file."""
+"""Completes a table of functions, as the tool's command 'batch' does with a file."""
 from __future__ import annotations
 
 from typing import TYPE_CHECKING, Any, Dict, List, Mapping, Sequence, overload
@@ -15,7 +15,7 @@ COLUMNS = ("inputs", "equation", "init")
 
 
 def _listed(column: Any, name: str) -> List[Any]:
-    """The cells in a list of its own, which is written to."""
+    """The cells as a new list, which is written to."""
     if isinstance(column, (str, bytes)) or not hasattr(column, "__iter__"):
         raise TypeError(f"column {name} must be a sequence, not {type(column).__name__}")
     cells = column.tolist() if hasattr(column, "tolist") else column
@@ -29,14 +29,14 @@ def batch(table: Mapping[str, Sequence[Any]]) -> Dict[str, List[Any]]: ...
 
 
 def batch(table: Any) -> Any:
-    """A table of functions, what is missing filled in, and what is given compared.
+    """Completes a table of functions: fills in missing cells, and compares given ones.
 
     The table, a DataFrame or a mapping of names to sequences, has some of the columns "inputs",
     "equation" and "init", a function in each row: inputs are a text with commas or a list of names,
-    init values a text or, where inputs are listed, an int. None, NaN and "" are missing. The answer
-    is such a table with all three, the other columns, "result" and "message": "ok" where all was
-    given and agrees, "filled", "differs", "incomplete" or "refused" with the reason. All processors
-    are used.
+    init values a text or, if inputs are listed, an int. None, NaN and "" are missing. The answer is
+    such a table with all three columns, the other columns, "result" and "message". The result is
+    "ok" if all was given and agrees, else "filled", "differs", "incomplete" or "refused" with the
+    reason. All processors are used.
 
     >>> import booleq
     >>> done = booleq.batch({"inputs": ["A,B", "A,B"], "equation": ["A & B", "A | B"],

@@ -1,4 +1,4 @@
-"""What eval_many takes, as columns that the compiled half reads."""
+"""Turns what eval_many takes into columns that the compiled half reads."""
 from __future__ import annotations
 
 from typing import TYPE_CHECKING, Any, List, Mapping, Optional, Sequence, Tuple, Union
@@ -20,12 +20,12 @@ Mask = npt.NDArray[np.bool_]
 
 
 def is_frame(table: Any) -> bool:
-    """A DataFrame, which is known by what it has: pandas need not be there."""
+    """Whether it is a DataFrame, known by its attributes: pandas need not be installed."""
     return hasattr(table, "columns") and hasattr(table, "iloc")
 
 
 def _without_mask(values: Any) -> Tuple[Any, Optional[Mask]]:
-    """Values with something harmless where they are missing, and where that is."""
+    """The values with a harmless one for each that is missing, and a mask of the missing ones."""
     if isinstance(values, np.ma.MaskedArray):
         mask = np.ma.getmaskarray(values)
         return values.filled(0) if mask.any() else values.data, mask
@@ -33,7 +33,7 @@ def _without_mask(values: Any) -> Tuple[Any, Optional[Mask]]:
     if hasattr(extension, "isna") and not isinstance(extension, np.ndarray):
         mask = np.asarray(extension.isna())
         kind = getattr(extension.dtype, "kind", "O")
-        if mask.any() and kind not in "fO":  # nullable types; of others not a number is a fault
+        if mask.any() and kind not in "fO":  # nullable types; in other types NaN is a fault
             return extension.to_numpy(dtype=extension.dtype.numpy_dtype, na_value=0), mask
         if kind in "biu":
             return extension.to_numpy(dtype=getattr(extension.dtype, "numpy_dtype", None)), None
@@ -41,7 +41,7 @@ def _without_mask(values: Any) -> Tuple[Any, Optional[Mask]]:
 
 
 def _readable(values: Any, where: str) -> Tuple[Column, Optional[Mask]]:
-    """An array of a type that the compiled half knows, in this machine's order, and what is masked."""
+    """An array of a type that the compiled half knows, in native byte order, and its mask."""
     plain, mask = _without_mask(values)
     array: Column = np.asarray(plain)
     kind = array.dtype.kind
@@ -69,7 +69,7 @@ def _readable(values: Any, where: str) -> Tuple[Column, Optional[Mask]]:
 
 
 def missing_value() -> Any:
-    """pandas' NA where pandas is in use."""
+    """pandas' NA if pandas has been imported, else None."""
     import sys
     pandas = sys.modules.get("pandas")
     return getattr(pandas, "NA", None)
@@ -143,7 +143,7 @@ def _by_position(equation: Equation, table: Any) -> npt.NDArray[np.uint8]:
 
 
 def evaluate(equation: Equation, table: Table) -> npt.NDArray[np.uint8]:
-    """What Equation.eval_many does."""
+    """Does the work of Equation.eval_many."""
     if type(table) is np.ndarray and table.dtype.names is None:
         return _by_position(equation, table)
     if is_frame(table):

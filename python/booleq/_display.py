@@ -1,5 +1,5 @@
-"""Equations and reports in notebooks: tables, shortened where they are long, and a picture of the
-tree by Graphviz for who asks for it."""
+"""Equations and reports in notebooks: tables, shortened if they are long, and on demand a picture
+of the tree, made by Graphviz."""
 from __future__ import annotations
 
 import html as _html
@@ -16,7 +16,7 @@ if TYPE_CHECKING:
     from ._results import KarnaughMap, Report
 
 MAX_ROWS = 64
-MAX_COLUMNS = 24  # inputs of a table that somebody looks at
+MAX_COLUMNS = 24  # inputs; a wider table is not shown
 MAX_TEXT = 500
 MAX_ITEMS = 40
 MAX_DEPTH = 4
@@ -24,7 +24,7 @@ DOT_SECONDS = 10
 
 
 def _escape(text: str) -> str:
-    """For HTML; bytes that are no UTF-8 become U+FFFD."""
+    """Escapes a text for HTML; bytes that are not UTF-8 become U+FFFD."""
     shown = text if len(text) <= MAX_TEXT else f"{text[:MAX_TEXT]}... ({len(text):,} characters)"
     return _html.escape(shown.encode("utf-8", "surrogateescape").decode("utf-8", "replace"))
 
@@ -34,7 +34,7 @@ def _row(tag: str, cells: Iterable[str]) -> str:
 
 
 def equation_html(equation: Equation) -> str:
-    """Text and truth table, 64 rows at most."""
+    """The text and the truth table, at most 64 rows."""
     text = f"<code>{_escape(equation.text)}</code>"
     inputs = equation.inputs
     if len(inputs) > MAX_COLUMNS:
@@ -87,12 +87,12 @@ def _fields_html(report: Any, depth: int) -> str:
 
 
 def report_html(report: Report) -> str:
-    """Any report as a table of what it says."""
+    """Any report as a table of its fields."""
     return _fields_html(report, 0)
 
 
 def luts_html(luts: LutArray) -> str:
-    """The first tables of an array, with how often they are 1."""
+    """The first tables of an array, with the number of rows in which each is 1."""
     head = luts[:MAX_ITEMS]
     lines = ["<table>", _row("th", ["place", "init value", "ones"])]
     for place, ones in enumerate(head.count_ones()):
@@ -104,7 +104,7 @@ def luts_html(luts: LutArray) -> str:
 
 
 def svg(dot: str) -> Optional[str]:
-    """The graph as a picture; None without Graphviz, or where it takes too long."""
+    """The graph as a picture; None without Graphviz, or if it takes too long."""
     program = shutil.which("dot")
     if program is None:
         return None

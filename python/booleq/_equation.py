@@ -1,4 +1,4 @@
-"""The class Equation: what users read about, in front of the compiled half that does the work."""
+"""The class Equation: what users see; the compiled half does the work."""
 from __future__ import annotations
 
 from typing import (TYPE_CHECKING, Any, Dict, Iterable, List, Literal, Mapping, Optional,
@@ -21,16 +21,16 @@ __all__ = ["Equation", "Operand", "Syntax", "Target", "equations", "minimize_pla
 Syntax = Literal["primary", "alt1", "alt2", "alt3", "expression"]
 Target = Literal["primary", "alt1", "alt2", "alt3", "paren", "verilog", "vhdl", "c", "python",
                  "liberty", "blif", "pla", "eqn"]
-#: What an operator takes beside an equation: an equation, a text, 0 or 1.
+#: The other operand of an operator: an equation, a text, 0 or 1.
 Operand = Union["Equation", str, SupportsIndex]
 Bit = Union[SupportsIndex, "np.bool_"]
 
-MAX_REPR = 200  # characters of a text that repr() shows whole
+MAX_REPR = 200  # characters; repr() shortens a longer text
 LINT_SECONDS = 10.0  # for each reader
 
 
 def _seconds(seconds: Optional[float]) -> float:
-    """0 is for ever inside."""
+    """The limit for the compiled half, where 0 means none."""
     if seconds is None:
         return 0.0
     if not isinstance(seconds, (int, float)):
@@ -44,9 +44,9 @@ def _seconds(seconds: Optional[float]) -> float:
 class Equation(_booleq.Core):
     """A Boolean equation, as text or as an init value over listed inputs: a value that never changes.
 
-    text is an expression in any accepted syntax, or with inputs also an init value: "0x8", "0b1000"
-    or "4'h8". inputs are names, the most significant first; names that only the text has follow
-    them. lsb_first takes the first input of an init value for bit 0 of the row number.
+    text is an expression in any accepted syntax or, with inputs, an init value: "0x8", "0b1000" or
+    "4'h8". inputs are names, the most significant first; names that occur only in the text follow
+    them. With lsb_first the first input of an init value is bit 0 of the row number.
 
     >>> from booleq import Equation
     >>> eq = Equation("A & ~B")
@@ -59,8 +59,8 @@ class Equation(_booleq.Core):
     >>> Equation("0x4", ["A", "B"]).expression
     '( A & ~ B )'
 
-    A text that is refused raises ParseError, which knows the place and often the hint. A name that
-    is none, or is listed twice, is a ValueError.
+    A text that is refused raises ParseError, which has the place and often a hint. A name that is
+    not legal, or is listed twice, raises ValueError.
 
     >>> Equation("A && B")
     Traceback (most recent call last):
@@ -68,8 +68,8 @@ class Equation(_booleq.Core):
     booleq.ParseError: refused at character 3: the operator '&' has no operand on its right; write '&' instead of '&&'
 
     Equations are equal when their texts are, however operators are spelled, over the same inputs in
-    the same order; so equal ones have equal init values. Whether two are one function is
-    equivalent()'s matter. They can be sorted, and be keys of a dictionary.
+    the same order; so equal ones have equal init values. equivalent() tells whether two are the
+    same function. Equations can be sorted, and can be keys of a dictionary.
 
     >>> Equation("A & B") == Equation("A .AND. B"), Equation("A & B") == Equation("B & A")
     (True, False)
@@ -96,8 +96,8 @@ class Equation(_booleq.Core):
                   lsb_first: bool = False) -> Equation:
         """The equation of an init value: "0x...", "0b...", a sized literal "8'hca", or an int.
 
-        Bit k of the value is the result of row k. A text that is not an init value over so many inputs
-        is a ParseError, an int that does not fit a ValueError.
+        Bit k of the value is the result of row k. A text that is not an init value over so many
+        inputs raises ParseError, an int that does not fit raises ValueError.
 
         >>> from booleq import Equation
         >>> Equation.from_init(0b0100, ["A", "B"]).alt1
@@ -110,7 +110,7 @@ class Equation(_booleq.Core):
     @classmethod
     def from_inits(cls, values: Any, inputs: Iterable[str],
                    lsb_first: bool = False) -> List[Equation]:
-        """Many at once: an array of integers, or a list of ints and texts, as LutArray takes them.
+        """Many equations, from an array of integers or a list of ints and texts as for LutArray.
 
         >>> from booleq import Equation
         >>> Equation.from_inits([0x8, 0xe], ["A", "B"])
@@ -124,9 +124,9 @@ class Equation(_booleq.Core):
 
     @classmethod
     def from_verilog(cls, text: str, inputs: Optional[Iterable[str]] = None) -> Equation:
-        """The equation of an expression of Verilog, with Verilog's precedences and vectors of bits.
+        """The equation of a Verilog expression, with Verilog's precedences and bits of vectors.
 
-        Names that are not words here get quotes. ParseError for what is not read.
+        Names that are not plain names here get quotes. A text that is not read raises ParseError.
 
         >>> from booleq import Equation
         >>> Equation.from_verilog(r"a | \\b[0] & ~c")
@@ -136,23 +136,23 @@ class Equation(_booleq.Core):
 
     @classmethod
     def from_vhdl(cls, text: str, inputs: Optional[Iterable[str]] = None) -> Equation:
-        """The equation of an expression of VHDL."""
+        """The equation of a VHDL expression."""
         return cls(_booleq.from_notation("vhdl", text), inputs)
 
     @classmethod
     def from_python(cls, text: str, inputs: Optional[Iterable[str]] = None) -> Equation:
-        """The equation of an expression of Python, true and false being 1 and 0."""
+        """The equation of a Python expression, with True and False for 1 and 0."""
         return cls(_booleq.from_notation("python", text), inputs)
 
     @classmethod
     def from_liberty(cls, text: str, inputs: Optional[Iterable[str]] = None) -> Equation:
-        """The equation of a function of a Liberty file, such as "A B + !C"."""
+        """The equation of a function in a Liberty file, such as "A B + !C"."""
         return cls(_booleq.from_notation("liberty", text), inputs)
 
     @classmethod
     def from_sympy(cls, expression: sympy.Basic,
                    inputs: Optional[Iterable[str]] = None) -> Equation:
-        """The equation of a Boolean expression of SymPy, whose symbols are the inputs."""
+        """The equation of a Boolean SymPy expression, whose symbols are the inputs."""
         from ._sympy import to_text
         return cls(to_text(expression), inputs)
 
@@ -161,8 +161,8 @@ class Equation(_booleq.Core):
     def render(self, syntax: Syntax = "primary", spaces: bool = True) -> str:
         """The equation as text: "primary", "alt1", "alt2", "alt3" or "expression".
 
-        spaces=False leaves out the blanks between tokens; "~ |" may then close up to "~|", which is
-        another operator.
+        spaces=False leaves out the blanks between tokens; "~ |" may then become "~|", which is a
+        different operator.
 
         >>> from booleq import Equation
         >>> Equation("A & ~B").render("alt3", spaces=False)
@@ -197,10 +197,10 @@ class Equation(_booleq.Core):
 
     def convert(self, to: Target, *, name: Optional[str] = None, short: bool = False,
                 seconds: Optional[float] = 10) -> Conversion:
-        """The equation as text for another program, read again and compared before it is given out.
+        """The equation as text for another program, read back and compared before it is returned.
 
         name puts a module, an entity, a function or a cell of that name around it; short writes a
-        short expression of the function in place of the one given.
+        short expression of the function instead of the one given.
 
         >>> from booleq import Equation
         >>> print(Equation("a | b & ~c").convert("verilog"))
@@ -214,8 +214,7 @@ class Equation(_booleq.Core):
     def hex_init(self, lsb_first: bool = False) -> str:
         """The results as one hexadecimal number, bit k being row k, leading zeros kept.
 
-        With lsb_first the first input counts as bit 0 of k. ValueError without inputs or with more
-        than 30.
+        With lsb_first the first input is bit 0 of k. ValueError without inputs or with over 30.
 
         >>> from booleq import Equation
         >>> Equation("A & ~B").hex_init(), Equation("A & ~B").hex_init(lsb_first=True)
@@ -233,7 +232,7 @@ class Equation(_booleq.Core):
         return _booleq.binary_init(self, lsb_first)
 
     def sized_init(self, lsb_first: bool = False) -> str:
-        """The init value as a literal with its size, as hardware languages write it.
+        """The init value as a sized literal, as hardware languages write it.
 
         >>> from booleq import Equation
         >>> Equation("S & A | (~S & B)").sized_init()
@@ -242,7 +241,7 @@ class Equation(_booleq.Core):
         return _booleq.sized_init(self, lsb_first)
 
     def __str__(self) -> str:
-        """A text that reads back, over the same inputs, as the same function."""
+        """A text that reads back as the same function over the same inputs."""
         return _booleq.readable(self)
 
     def __repr__(self) -> str:
@@ -261,7 +260,7 @@ class Equation(_booleq.Core):
         return f"Equation({', '.join(words)})"
 
     def __format__(self, spec: str) -> str:
-        """A syntax or a target of convert() by its name, or "hex", "binary" or "sized".
+        """The equation in a syntax, for a target of convert(), or as "hex", "binary" or "sized".
 
         >>> from booleq import Equation
         >>> f"{Equation('a | b & ~c'):vhdl}"
@@ -278,10 +277,10 @@ class Equation(_booleq.Core):
         conversion = self.convert(spec)  # type: ignore[arg-type]
         return conversion.text
 
-    # --- equations made of equations ----------------------------------------------------------
+    # --- equations made from equations --------------------------------------------------------
 
     def __and__(self, other: Operand) -> Equation:
-        """Both; the inputs are those of the left one and then what only the right one has.
+        """The AND of both. The inputs are those of the left one, then the others of the right one.
 
         >>> from booleq import Equation
         >>> Equation("a | b") & "c | d"
@@ -293,26 +292,26 @@ class Equation(_booleq.Core):
         return _booleq.join(other, "&", self)
 
     def __or__(self, other: Operand) -> Equation:
-        """Either."""
+        """The OR of both."""
         return _booleq.join(self, "|", other)
 
     def __ror__(self, other: Operand) -> Equation:
         return _booleq.join(other, "|", self)
 
     def __xor__(self, other: Operand) -> Equation:
-        """One of the two, and not both."""
+        """The exclusive-or of both."""
         return _booleq.join(self, "^", other)
 
     def __rxor__(self, other: Operand) -> Equation:
         return _booleq.join(other, "^", self)
 
     def __invert__(self) -> Equation:
-        """The inversion; of one it is what was inverted."""
+        """The inversion; the inversion of an inversion is the equation itself."""
         return _booleq.invert(self)
 
     def compose(self, values: Optional[Mapping[str, Operand]] = None, /,
                 **named: Operand) -> Equation:
-        """The equation with other equations in place of inputs, all at once.
+        """The equation with inputs replaced by other equations, all at once.
 
         >>> from booleq import Equation
         >>> Equation("a & b").compose(a="x | y", b="a")
@@ -330,7 +329,7 @@ class Equation(_booleq.Core):
         return _booleq.cofactor(self, _together(values, named))
 
     def rename(self, names: Mapping[str, str]) -> Equation:
-        """The equation over other names. Two inputs stay two: ValueError for one name for both.
+        """The equation over other names. ValueError if two inputs would get the same name.
 
         >>> from booleq import Equation
         >>> Equation("A & B").rename({"A": "'bus[0]'"})
@@ -339,9 +338,9 @@ class Equation(_booleq.Core):
         return _booleq.rename(self, dict(names))
 
     def permute(self, inputs: Iterable[str]) -> Equation:
-        """The same function over another order of its inputs, as an equation of its init value.
+        """The same function over another order of its inputs, as an init value.
 
-        Names that the equation does not have widen it. At most 24 inputs.
+        Names that are not inputs become further inputs. At most 24 inputs.
 
         >>> from booleq import Equation
         >>> Equation("0xca", ["S", "A", "B"]).permute(["A", "B", "S"])
@@ -353,7 +352,7 @@ class Equation(_booleq.Core):
 
     @property
     def support(self) -> Tuple[str, ...]:
-        """The inputs that change something.
+        """The inputs that have an effect.
 
         >>> from booleq import Equation
         >>> Equation("a & (b | ~b)").support
@@ -362,7 +361,7 @@ class Equation(_booleq.Core):
         return _booleq.support(self)
 
     def count_ones(self) -> int:
-        """For how many assignments of the inputs the result is 1. At most 30 that the text names.
+        """For how many assignments of the inputs the result is 1. At most 30 inputs in the text.
 
         >>> from booleq import Equation
         >>> Equation("a | b").count_ones()
@@ -372,7 +371,7 @@ class Equation(_booleq.Core):
         return num_ones << num_idle
 
     def satisfiable(self, seconds: Optional[float] = None) -> Satisfiability:
-        """Whether some assignment makes it 1, and one that does. For any number of inputs.
+        """Whether some assignment makes it 1, and one that does, for any number of inputs.
 
         TimeoutError when that takes longer than seconds.
 
@@ -396,10 +395,10 @@ class Equation(_booleq.Core):
         return _booleq.find_other(self, True, _seconds(seconds)) is None
 
     def equivalent(self, other: Operand, seconds: Optional[float] = None) -> Equivalence:
-        """Whether both are one function of their inputs, by name; if not, where they differ.
+        """Whether both are the same function of their inputs, by name; if not, where they differ.
 
-        For any number of inputs, and proved; up to 30 together it is the first row that differs.
-        TimeoutError when that takes longer than seconds.
+        The answer is proved, for any number of inputs. Up to 30 inputs together, the counterexample
+        is the first row that differs. TimeoutError if that takes longer than seconds.
 
         >>> from booleq import Equation
         >>> Equation("a | b & c").equivalent("a | (b & c)")
@@ -412,9 +411,9 @@ class Equation(_booleq.Core):
 
     def match(self, other: Operand, *, order_only: bool = False,
               seconds: Optional[float] = None) -> Match:
-        """Whether the other is this one but for the order of inputs, or for inversions too.
+        """Whether both are the same except for the order of inputs, or also inversions.
 
-        Inputs without effect have no counterpart. At most 16 with one.
+        Inputs without effect have no counterpart. At most 16 inputs with an effect.
 
         >>> from booleq import Equation
         >>> match = Equation("a & b").match("x ~| y")
@@ -427,7 +426,7 @@ class Equation(_booleq.Core):
         return Match("inversions" if found[0] else "order", found[1], found[2])
 
     def explain(self) -> Explanation:
-        """What the function is: its name, inputs without effect, a short expression.
+        """What the function is: its name, the inputs without effect, a short expression.
 
         ValueError for more than 16 inputs.
 
@@ -438,9 +437,9 @@ class Equation(_booleq.Core):
         return _booleq.explain(self)
 
     def lint(self, seconds: Optional[float] = LINT_SECONDS) -> LintReport:
-        """Who reads the text as another function, and where the library itself surprises.
+        """Which notations read the text as another function, and what may surprise here.
 
-        seconds is what each comparison may take.
+        seconds limits each comparison.
 
         >>> from booleq import Equation
         >>> report = Equation("a | b & c").lint()
@@ -453,8 +452,8 @@ class Equation(_booleq.Core):
                  seconds: Optional[float] = None) -> Minimum:
         """A smallest sum of products, proved to be the same function before it is returned.
 
-        In rows in which dont_care is 1 it may be either. exact searches until nothing smaller can
-        be, or for so many seconds.
+        In rows where dont_care is 1, the sum may be 0 or 1. exact searches until nothing smaller is
+        possible, or for so many seconds.
 
         >>> from booleq import Equation
         >>> Equation("a ^ b").minimize(dont_care="a & b").expression
@@ -463,7 +462,7 @@ class Equation(_booleq.Core):
         return _booleq.minimize(self, dont_care, exact, _seconds(seconds))
 
     def kmap(self) -> KarnaughMap:
-        """The Karnaugh map of up to six inputs; rows and columns stand in Gray code.
+        """The Karnaugh map of up to six inputs; rows and columns are in Gray code order.
 
         >>> from booleq import Equation
         >>> print(Equation("A & B | C").kmap())
@@ -475,7 +474,7 @@ class Equation(_booleq.Core):
         return _booleq.kmap(self)
 
     def tree(self) -> List[Node]:
-        """The nodes of the expression tree in pre-order, as a flat list: texts decide the depth.
+        """The nodes of the expression tree in pre-order. The list is flat: texts decide the depth.
 
         >>> from booleq import Equation
         >>> for node in Equation("a | b").tree():
@@ -496,7 +495,7 @@ class Equation(_booleq.Core):
         return svg(self.tree_dot())
 
     def to_sympy(self) -> sympy.Basic:
-        """The equation as a Boolean expression of SymPy, a symbol for each input."""
+        """The equation as a Boolean SymPy expression, with a symbol for each input."""
         from ._sympy import from_equation
         return from_equation(self)
 
@@ -506,10 +505,11 @@ class Equation(_booleq.Core):
         """The results for many assignments at once, as a uint8 array.
 
         By name: a DataFrame, a mapping of names to arrays, or a structured array, with a column for
-        every input and no other. By position: anything that is an array of two dimensions, a row
-        for each assignment, a column for each input. Values are 0 and 1: bool, integers, floats,
-        objects, pandas' nullable types. Where a value is missing or masked, so is the answer. Any
-        number of inputs will do. ValueError for other values and columns, TypeError for other types.
+        every input and no other. By position: anything that is an array of two dimensions, with a
+        row for each assignment and a column for each input. Values are 0 and 1: bool, integers,
+        floats, objects, pandas' nullable types. If a value is missing or masked, the answer is
+        masked. Any number of inputs is allowed. ValueError for other values and columns, TypeError
+        for other types.
 
         >>> from booleq import Equation
         >>> Equation("A & ~B").eval_many({"B": [0, 1], "A": [1, 1]})
@@ -520,7 +520,7 @@ class Equation(_booleq.Core):
         return _evaluate(self, assignments)
 
     def truth_table(self) -> npt.NDArray[np.uint8]:
-        """All rows as a uint8 array: the inputs' values and, last, the result.
+        """All rows as a uint8 array: the values of the inputs, then the result.
 
         ValueError with more than 30 inputs, MemoryError for a table that does not fit.
 
@@ -545,7 +545,7 @@ class Equation(_booleq.Core):
     def packed_column(self) -> npt.NDArray[np.uint64]:
         """The results of all rows, packed: row k is bit k % 64 of word k // 64 of a uint64 array.
 
-        ValueError with more than 30 inputs. The library's own memory is handed out, without a copy.
+        ValueError with more than 30 inputs. The array shows the library's memory, without a copy.
 
         >>> from booleq import Equation
         >>> Equation("A & ~B").packed_column()
@@ -573,7 +573,7 @@ _booleq.set_equation_class(Equation)
 
 
 def _together(values: Optional[Mapping[str, Any]], named: Dict[str, Any]) -> Dict[str, Any]:
-    """What a mapping and names say, as one dict."""
+    """The items of a mapping and named arguments, as one dict."""
     if values is None:
         return named
     if isinstance(values, str) or not hasattr(values, "keys"):
@@ -588,7 +588,7 @@ def _together(values: Optional[Mapping[str, Any]], named: Dict[str, Any]) -> Dic
 
 def equations(texts: Iterable[str], inputs: Optional[Iterable[str]] = None,
               lsb_first: bool = False) -> List[Equation]:
-    """The equations of many texts, read on all processors; inputs are for all of them.
+    """The equations of many texts, read on all processors; inputs apply to all of them.
 
     The first text that is refused raises ParseError.
 
@@ -600,7 +600,7 @@ def equations(texts: Iterable[str], inputs: Optional[Iterable[str]] = None,
 
 
 def minimize_pla(text: str, *, exact: bool = False, seconds: Optional[float] = None) -> str:
-    r"""The text of a PLA file minimised, as one of type f. A fault is a ValueError that names its line.
+    r"""A PLA file's text, minimised, as a text of type f. ValueError for a fault, with its line.
 
     >>> import booleq
     >>> print(booleq.minimize_pla(".i 2\n.o 1\n01 1\n11 1\n"), end="")

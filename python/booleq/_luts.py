@@ -32,7 +32,7 @@ def _empty(size: int, num_inputs: int) -> Words:
 
 
 def _from_two_words(words: Places, num_inputs: int) -> Words:
-    """Rows of two words, of which the second is 0 below seven inputs, as tables of that width."""
+    """Rows of two words as tables of that width; below seven inputs, the second word must be 0."""
     if num_inputs == 7:
         return words
     limit = 1 << (1 << num_inputs)
@@ -63,11 +63,11 @@ def _from_array(values: npt.NDArray[Any], num_inputs: int) -> Words:
 
 @final
 class LutArray:
-    """Look-up tables of 1 to 7 inputs: values that never change, one word each, two of 7 inputs.
+    """Look-up tables of 1 to 7 inputs, which never change: one word each, two words for 7 inputs.
 
-    values is an array of integers, or a list of ints and of texts: "0xca", "0b11001010", "8'hca".
-    Bit k is the result of row k, in whose number the first input is the most significant bit;
-    lsb_first takes it for the least.
+    values is an array of integers, or a list of ints and texts: "0xca", "0b11001010", "8'hca". Bit
+    k is the result of row k. The first input is the most significant bit of the row number, or with
+    lsb_first the least.
 
     >>> from booleq import LutArray
     >>> luts = LutArray([0xca, "0xe4", "8'h96"], 3)
@@ -130,7 +130,7 @@ class LutArray:
 
     @property
     def words(self) -> Words:
-        """The tables: uint16 up to 4 inputs, uint32, uint64; of 7 inputs a row of two words each."""
+        """The tables: uint16 up to 4 inputs, uint32, uint64; for 7 inputs, rows of two words."""
         return self._words
 
     def __array__(self, dtype: Any = None) -> npt.NDArray[Any]:
@@ -140,19 +140,19 @@ class LutArray:
         return len(self._words)
 
     def __getitem__(self, key: Any) -> Any:
-        """One table as an init value; with a slice, or an array of places or bools, tables."""
+        """One table as an init value; with a slice, or an array of places or bools, a LutArray."""
         if isinstance(key, (int, np.integer)):
             return self._hex(self._words[key])
         return LutArray._of(np.ascontiguousarray(self._words[key]), self._num_inputs)
 
-    __iter__ = None  # a loop over a million tables: use arrays, or equations()
+    __iter__ = None  # it would loop over a million tables: use arrays, or equations()
 
     def _hex(self, word: Any) -> str:
         value = int(word) if self._num_inputs < 7 else int(word[0]) | int(word[1]) << 64
         return f"0x{value:0{max(1, (1 << self._num_inputs) // 4)}x}"
 
     def __eq__(self, other: object) -> bool:
-        """Whether all tables are the same. Of which ones are: luts.words == others.words."""
+        """Whether all tables are the same. To see which ones are: luts.words == others.words."""
         return (isinstance(other, LutArray) and self._num_inputs == other._num_inputs and
                 np.array_equal(self._words, other._words))
 
@@ -178,9 +178,9 @@ class LutArray:
     # --- values -------------------------------------------------------------------------------
 
     def evaluate(self, assignment: npt.ArrayLike) -> npt.NDArray[np.uint8]:
-        """The value of every table: for one assignment of the inputs, or for one each.
+        """The value of every table, for one assignment of the inputs or for one each.
 
-        assignment has a 0 or 1 for each input, in a row for each table where they differ.
+        assignment has a 0 or 1 for each input, or such a row for each table.
 
         >>> from booleq import LutArray
         >>> LutArray([0x8, 0xe], 2).evaluate([1, 0])
@@ -193,7 +193,7 @@ class LutArray:
             raise ValueError(f"an assignment has {self._num_inputs} values, in one row or in "
                              f"{len(self)}, not the shape {bits.shape}")
         rows = np.zeros(bits.shape[:-1], np.uint8)
-        for place in range(self._num_inputs):  # seven at most, whole columns at a time
+        for place in range(self._num_inputs):  # at most seven, whole columns at a time
             rows = (rows << 1 | bits[..., place].astype(np.uint8)).astype(np.uint8)
         results = np.empty(len(self), np.uint8)
         _booleq.lut_evaluate(self._words, self._num_inputs, np.array(rows), results)
@@ -206,7 +206,7 @@ class LutArray:
         return results
 
     def support(self) -> Flags:
-        """Which inputs matter: a row for each table, a column for each input.
+        """Which inputs matter, with a row for each table and a column for each input.
 
         >>> from booleq import LutArray
         >>> LutArray([0xc, 0x6], 2).support()
@@ -218,16 +218,16 @@ class LutArray:
         return results
 
     def idle(self) -> Flags:
-        """Which inputs change nothing: the others than support()."""
+        """Which inputs have no effect: the opposite of support()."""
         return ~self.support()
 
     # --- other tables -------------------------------------------------------------------------
 
     def permute(self, order: npt.ArrayLike) -> LutArray:
-        """Over another order of the inputs, or over one each.
+        """The tables over another order of the inputs, or over one each.
 
-        order has a place of an input for each new one, the most significant first: 0 is what was
-        the most significant. A row for each table where they differ.
+        order has the old place of each new input, the most significant first: 0 is the input that
+        was the most significant. It may have such a row for each table.
         """
         places: npt.NDArray[Any] = np.asarray(order)
         if places.shape not in ((self._num_inputs,), (len(self), self._num_inputs)):
@@ -245,7 +245,7 @@ class LutArray:
         return LutArray._of(results, self._num_inputs)
 
     def invert(self) -> LutArray:
-        """Every table with the other values; also ~luts."""
+        """Every table inverted; also ~luts."""
         results = np.empty_like(self._words)
         _booleq.lut_invert(self._words, self._num_inputs, results)
         return LutArray._of(results, self._num_inputs)
@@ -253,7 +253,7 @@ class LutArray:
     __invert__ = invert
 
     def cofactor(self, place: int, value: int) -> LutArray:
-        """The tables over the other inputs, this one being fixed; at least two inputs.
+        """The tables with this input fixed, over the other inputs; at least two inputs.
 
         >>> from booleq import LutArray
         >>> LutArray([0xca], 3).cofactor(0, 1)
@@ -268,7 +268,7 @@ class LutArray:
         return LutArray._of(results, self._num_inputs - 1)
 
     def unique(self) -> Distinct:
-        """The tables that are there, each once."""
+        """The distinct tables, each once."""
         return self._distinct(*_booleq.lut_distinct(self._words, self._num_inputs))
 
     def _distinct(self, words: Places, first: Places, counts: Places, inverse: Places) -> Distinct:
@@ -278,8 +278,8 @@ class LutArray:
         return Distinct(luts, first.astype(np.intp), counts.astype(np.intp), inverse.astype(np.intp))
 
     def canonical(self, scope: Literal["npn", "order"] = "npn") -> Canonical:
-        """One form for all tables that are one up to the order of inputs and inversions ("npn"),
-        or up to the order alone. Exact, up to six inputs.
+        """One form for all tables that are the same function up to the order of inputs and
+        inversions ("npn"), or up to the order alone. Exact, up to six inputs.
 
         >>> from booleq import LutArray
         >>> LutArray([0x8, 0xe, 0x1], 2).canonical().forms
@@ -301,7 +301,7 @@ class LutArray:
     # --- words for people ---------------------------------------------------------------------
 
     def explain(self, inputs: Iterable[str]) -> Described:
-        """Name and short expression of each distinct function over these inputs.
+        """The name and a short expression of each distinct function over these inputs.
 
         >>> from booleq import LutArray
         >>> found = LutArray([0xca, 0xca, 0x96], 3).explain(["S", "A", "B"])
@@ -333,8 +333,8 @@ class LutArray:
 class Distinct:
     """The distinct tables of an array, in ascending order.
 
-    first has the place of each in the array, counts how often it is there, and inverse its place
-    among the distinct ones for each table of the array.
+    first has the first place of each in the array, counts how often it occurs, and inverse has, for
+    each table of the array, its place among the distinct ones.
     """
 
     luts: LutArray
@@ -347,8 +347,8 @@ class Distinct:
 class Canonical:
     """Canonical forms, and how each table becomes its form.
 
-    Input k of the form is input orders[:, k] of the table, inverted where inverted[:, k] is set;
-    the result is inverted where output_inverted is.
+    Input k of the form is input orders[:, k] of the table, inverted if inverted[:, k] is set; the
+    result is inverted if output_inverted is set.
     """
 
     forms: LutArray
@@ -359,10 +359,10 @@ class Canonical:
 
 @dataclass(frozen=True, eq=False)
 class Described:
-    """What the distinct tables of an array are; None for one without a name, or an expression.
+    """What the distinct tables of an array are; None for one without a name or an expression.
 
-    kinds are common names, functions those with their inputs, expressions texts for Equation,
-    operands how often these mention inputs, minimal whether no shorter one exists.
+    kinds are common names, functions add the inputs, expressions are texts for Equation, operands
+    count the inputs in these, and minimal tells whether no shorter one exists.
     """
 
     distinct: Distinct

@@ -25,14 +25,14 @@ __all__ = ["CellCount", "FunctionCount", "LoneTable", "Netlist", "NetlistDiff", 
 Numbers = npt.NDArray[np.uint32]
 Words = npt.NDArray[np.uint64]
 Source = Union[str, "os.PathLike[str]", IO[str], IO[bytes]]
-MAX_TABLE_INPUTS = 16  # a wider one is a finding, and not read
+MAX_TABLE_INPUTS = 16  # a wider table is a finding and is not read
 
 
 class NetlistError(ValueError):
-    """A file that is not a netlist, or not a whole one.
+    """A file that is not a netlist, or not a complete one.
 
-    file is the name as it was given, None for a text; line is where, None where no line is known;
-    reason is what is wrong.
+    file is the name as given, None for a text; line is the line, None if it is not known; reason is
+    what is wrong.
 
     >>> import io, booleq
     >>> try:
@@ -54,10 +54,10 @@ class NetlistError(ValueError):
 
 
 class NetlistTable(NamedTuple):
-    """A table: path of its cell, type, output net, nets of its inputs and init value.
+    """A table: the path of its cell, its type, output net, input nets and init value.
 
     The first input is the most significant; a constant is "1'b0" or "1'b1". key is the value of the
-    attribute that the netlist was read with, line the place in the file where the format tells.
+    attribute that the netlist was read with, line the line in the file if the format has lines.
     """
 
     path: str
@@ -73,9 +73,9 @@ class NetlistTable(NamedTuple):
 class NetlistTables:
     """All tables of one width as arrays.
 
-    places are those in the netlist; words has a row for each, 64 rows of the table to a word.
-    outputs are numbers of nets, inputs rows of them, the most significant pin first; types are
-    places in Netlist.types, lines those of the file, 0 where the format does not tell.
+    places are places in the netlist; words has a row for each table, with 64 rows of the table to a
+    word. outputs are numbers of nets, inputs rows of such numbers, the most significant pin first;
+    types are places in Netlist.types; lines are lines of the file, 0 if the format has none.
     """
 
     num_inputs: int
@@ -99,7 +99,7 @@ class NetlistTables:
 
 
 class CellCount(NamedTuple):
-    """How many cells of a type there are, what they are, and why they are not read."""
+    """How many cells of a type there are, their role, and why they are not read if they are not."""
 
     type: str
     role: str
@@ -108,7 +108,7 @@ class CellCount(NamedTuple):
 
 
 class FunctionCount(NamedTuple):
-    """How many tables are one function over inputs A, B, C and so on."""
+    """How many tables are the same function, given over inputs A, B, C and so on."""
 
     tables: int
     inputs: Tuple[str, ...]
@@ -120,9 +120,9 @@ class FunctionCount(NamedTuple):
 
 @dataclass(frozen=True, repr=False)
 class NetlistStats(Report):
-    """What a netlist is made of, as 'booleq netlist stats --json' answers.
+    """What a netlist consists of, as 'booleq netlist stats --json' answers.
 
-    by_pins has a width and how many tables have it; by_inputs counts the inputs that matter.
+    by_pins has pairs of a width and the number of tables; by_inputs counts only inputs that matter.
     """
 
     format: str
@@ -145,7 +145,7 @@ class NetlistStats(Report):
 
 
 class NetlistFinding(NamedTuple):
-    """What is odd about a table: a stable word, "error", "warning" or "note", where, a sentence."""
+    """Something odd about a table: a word, "error", "warning" or "note", the place, a sentence."""
 
     code: str
     severity: str
@@ -155,7 +155,7 @@ class NetlistFinding(NamedTuple):
 
 
 class LoneTable(NamedTuple):
-    """A table of one netlist only; wire says what it passes if it is only a wire."""
+    """A table that only one netlist has; wire says what it passes if it is only a wire."""
 
     path: str
     net: str
@@ -163,7 +163,7 @@ class LoneTable(NamedTuple):
 
 
 class RenamedNet(NamedTuple):
-    """A net that has another name in the other netlist, in so many tables."""
+    """A net that has another name in the other netlist, and the number of tables that use it."""
 
     left: str
     right: str
@@ -172,10 +172,10 @@ class RenamedNet(NamedTuple):
 
 @dataclass(frozen=True, repr=False)
 class TableDifference(Report):
-    """A table that differs: where first, both equations, and what would explain it.
+    """A table that differs: the first difference, both equations, and possible causes.
 
-    assignment and values are None for the same function on another output net. causes are a stable
-    word and a sentence each; should_be is the init value with which the right table would be right.
+    assignment and values are None for the same function on another output net. Each cause is a
+    stable word and a sentence; should_be is the init value that would make the right table correct.
     """
 
     left: str
@@ -194,10 +194,10 @@ class TableDifference(Report):
 class NetlistDiff(Report):
     """How two netlists differ, table by table; true in a condition when they do.
 
-    same counts tables, same_but_for_names those whose nets have other names; different describes
-    as many of the num_different as were asked for. names is "gone" if names of nets were not looked
-    at; matched_nets are those that are known to be the same, compared_by_order the tables that are
-    the same in some order of inputs that nothing tells apart.
+    same counts tables, same_but_for_names those whose nets have other names; different describes as
+    many of the num_different as were asked for. names is "gone" if names of nets were ignored;
+    matched_nets counts the nets known to be the same, compared_by_order the tables that are the
+    same in some order of indistinguishable inputs.
     """
 
     is_same: bool
@@ -228,8 +228,8 @@ def _difference(left: str, right: str, matched_by: Any, net: str, assignment: An
 class Netlist:
     """Every look-up table of a netlist file with its nets: a value that never changes.
 
-    read_netlist makes it. len() is the number of tables; one of them is netlist[place], all of a
-    width are netlist.tables(width), all of them a DataFrame, netlist.frame().
+    read_netlist makes it. len() is the number of tables. netlist[place] is one of them,
+    netlist.tables(width) all of a width, and netlist.frame() all of them as a DataFrame.
 
     >>> import io, booleq
     >>> netlist = booleq.read_netlist(io.StringIO(
@@ -265,7 +265,7 @@ class Netlist:
 
     @property
     def file(self) -> Optional[str]:
-        """The file's name as it was given, None for a text."""
+        """The file's name as given, None for a text."""
         return self._file
 
     @property
@@ -275,12 +275,12 @@ class Netlist:
 
     @property
     def top(self) -> Optional[str]:
-        """The module that is the design, None where it has no name."""
+        """The top module, None if it has no name."""
         return self._core.top()
 
     @property
     def key(self) -> Optional[str]:
-        """The attribute that it was read with."""
+        """The attribute that the netlist was read with."""
         return self._key
 
     def __len__(self) -> int:
@@ -316,7 +316,7 @@ class Netlist:
 
     @property
     def types(self) -> Tuple[str, ...]:
-        """The types of cells that the file has, those that are not tables too."""
+        """The types of cells in the file, including those that are not tables."""
         return self._core.types()
 
     @property
@@ -329,7 +329,7 @@ class Netlist:
 
     @property
     def paths(self) -> Tuple[str, ...]:
-        """The path of each table, of a cell with several outputs with the pin: "u1 (O5)"."""
+        """The path of each table; of a cell with several outputs, also the pin: "u1 (O5)"."""
         if self._paths is None:
             object.__setattr__(self, "_paths", tuple(self._core.paths()))
         assert self._paths is not None
@@ -354,7 +354,8 @@ class Netlist:
 
     def frame(self) -> pd.DataFrame:
         """A DataFrame with a row for each table: path, type, output, inputs (tuples of nets, the
-        most significant pin first), width, init; with a key also key, and line where there are any.
+        most significant pin first), width, init; also key if the netlist has one, and line if the
+        file has lines.
         """
         import pandas as pd
         size = len(self)
@@ -362,7 +363,7 @@ class Netlist:
         types, outputs, lines = (np.zeros(size, np.uint32) for _ in range(3))
         widths = np.zeros(size, np.uint8)
         inputs, inits = np.empty(size, object), np.empty(size, object)
-        for width in self.widths:  # 17 at most
+        for width in self.widths:  # at most 17
             group = self.tables(width)
             places, texts, names = self._core.columns(width, self.nets)
             types[places], outputs[places] = group.types, group.outputs
@@ -382,14 +383,14 @@ class Netlist:
     # --- answers ------------------------------------------------------------------------------
 
     def stats(self) -> NetlistStats:
-        """What it is made of: tables by width and type, different functions and the commonest."""
+        """What it consists of: tables by width and type, distinct and commonest functions."""
         answer = self._core.stats()
         answer["types"] = tuple(map(CellCount._make, answer["types"]))
         answer["commonest"] = tuple(map(FunctionCount._make, answer["commonest"]))
         return NetlistStats(**answer)
 
     def check(self) -> Tuple[NetlistFinding, ...]:
-        """What is odd about its tables, empty if nothing is; pandas.DataFrame takes the answer.
+        """What is odd about its tables, empty if nothing is; pandas.DataFrame accepts the answer.
 
         >>> import io, booleq
         >>> netlist = booleq.read_netlist(io.StringIO(".model m\\n.names a b y\\n1- 1\\n.end\\n"))
@@ -405,10 +406,11 @@ class Netlist:
         """Whether each table is the same function in the other netlist, and why not.
 
         Tables are matched by path, else by output net, else by the key that both were read with.
-        renames has a net of this one and the other's name for it. names says whether nets of one
-        name are one: "gone" leaves the key alone, "auto" decides by the pairs. open_inputs is what
-        an input reads that nothing is connected to. allow_wires allows tables that only pass a net
-        or a constant on one side only. max_described bounds how many differences are described.
+        renames maps nets of this netlist to the other's names for them. names says whether nets
+        with the same name are the same: "gone" matches by key only, "auto" decides by the pairs
+        found. open_inputs is the value of an input that is not connected. allow_wires allows tables
+        that only pass a net or a constant to be in one netlist only. max_described limits how many
+        differences are described.
 
         >>> import io, booleq
         >>> text = ".model m\\n.inputs a b\\n.outputs y\\n.names a b y\\n10 1\\n.end\\n"
@@ -440,7 +442,7 @@ class Netlist:
 
 
 def _objects(values: List[Any]) -> npt.NDArray[Any]:
-    """An array of the objects themselves, tuples too."""
+    """An array of the objects themselves, even if they are tuples."""
     array = np.empty(len(values), object)
     array[:] = values
     return array
@@ -455,7 +457,7 @@ def _refuse(fault: str, file: Optional[str], spoken: str) -> NetlistError:
 
 
 def _find(path: str) -> None:
-    """Python's own exceptions for a file that cannot be opened. A pipe is not opened twice."""
+    """Raises Python's exceptions for an unreadable file without opening it: it may be a pipe."""
     os.stat(path)
     if os.path.isdir(path):
         raise IsADirectoryError(errno.EISDIR, os.strerror(errno.EISDIR), path)
@@ -467,14 +469,13 @@ def read_netlist(source: Source, *, key: Optional[str] = None,
                  cells: Union[None, str, os.PathLike[str]] = None,
                  top: Optional[str] = None) -> Netlist:
     r"""The netlist of a file: Yosys JSON, BLIF, EDIF 2.0.0 or structural Verilog, also compressed
-    by gzip; the content tells which.
+    by gzip; the content decides the format.
 
     source is a path, "-" for standard input, or a file object that is read to its end. Verilog is
-    read by the program yosys. key is an attribute of cells that diff() can match tables by, cells a
-    file with more types of cells, top the module that is the design where the file does not say so.
+    read by the program yosys. key is an attribute of cells by which diff() can match tables, cells
+    a file with more types of cells, top the top module if the file does not mark one.
 
-    Fails with an OSError for a file that cannot be opened, with NetlistError for one that is not
-    a netlist.
+    Raises OSError for a file that cannot be opened, NetlistError for one that is not a netlist.
 
     >>> import io, booleq
     >>> text = ".model m\n.inputs a b\n.outputs y\n.names a b y\n11 1\n.end\n"

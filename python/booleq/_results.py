@@ -1,4 +1,4 @@
-"""Plain values that equations answer with, and the exception of a refused text.
+"""The plain values that equations answer with, and the exception for a refused text.
 
 All are immutable and can be keys of a dictionary. Each has a form for notebooks, and a repr that
 stays short when equations are long.
@@ -21,7 +21,7 @@ _short.maxdict = 20
 
 
 class Report:
-    """What reports share: how they are shown."""
+    """How all reports are shown."""
 
     __slots__ = ()
 
@@ -116,9 +116,9 @@ class Node(typing.NamedTuple):
 
 @dataclass(frozen=True, repr=False)
 class Equivalence(Report):
-    """Whether two equations are one function; true in a condition when they are.
+    """Whether two equations are the same function; true in a condition when they are.
 
-    If not, counterexample is an assignment where they differ, and values what they are there.
+    If not, counterexample is an assignment where they differ, and values are their values there.
     """
 
     equal: bool
@@ -144,8 +144,8 @@ class Satisfiability(Report):
 class Match(Report):
     """How one equation becomes the other; true in a condition when it does.
 
-    mapping has an input of the first, the input of the second in its place, and whether that is
-    inverted; output_inverted is about the result.
+    mapping has, for each input of the first, the input of the second that takes its place and
+    whether it is inverted; output_inverted is about the result.
     """
 
     level: Optional[Literal["order", "inversions"]]
@@ -160,8 +160,8 @@ class Match(Report):
 class Conversion(Report):
     """An equation as text of another program; str() is that text.
 
-    names has an input and its name in the text. proved says that the text, read again, is the same
-    function; otherwise doubt says why that is not known.
+    names has pairs of an input and its name in the text. proved says that the text, read back, is
+    the same function; otherwise doubt says why that is not known.
     """
 
     target: str
@@ -178,7 +178,7 @@ class Conversion(Report):
 
 @dataclass(frozen=True, repr=False)
 class KarnaughMap(Report):
-    """A Karnaugh map: cells has a tuple for each row; str() is a picture of letters."""
+    """A Karnaugh map: cells has a tuple for each row; str() draws it with characters."""
 
     row_inputs: Tuple[str, ...]
     column_inputs: Tuple[str, ...]
@@ -203,7 +203,7 @@ class KarnaughMap(Report):
 
 @dataclass(frozen=True, repr=False)
 class Explanation(Report):
-    """What Equation.explain() finds out; None where there is no common name, or no expression."""
+    """What Equation.explain() finds; None if there is no common name, or no expression."""
 
     inputs: Tuple[str, ...]
     hex: str
@@ -231,7 +231,7 @@ class Minimum(Report):
 
 @dataclass(frozen=True, repr=False)
 class Difference(Report):
-    """The first assignment for which another notation reads another value."""
+    """The first assignment for which another notation gives another value."""
 
     assignment: Assignment
     here: int
@@ -243,7 +243,7 @@ class Difference(Report):
 
 @dataclass(frozen=True, repr=False)
 class Reading(Report):
-    """How another notation reads the text; refusal says why it does not."""
+    """How another notation reads the text; refusal says why it cannot."""
 
     notation: str
     reads: bool
@@ -256,7 +256,7 @@ class Reading(Report):
 
 @dataclass(frozen=True, repr=False)
 class Finding(Report):
-    """Where the library itself does what the writer of the text may not expect."""
+    """Something the library itself does that the writer of the text may not expect."""
 
     code: str
     message: str
@@ -265,7 +265,7 @@ class Finding(Report):
 
 @dataclass(frozen=True, repr=False)
 class LintReport(Report):
-    """Who reads the text as another function, and what surprises here."""
+    """Which notations read the text as another function, and what may surprise here."""
 
     inputs: Tuple[str, ...]
     grouping: str

@@ -1,4 +1,4 @@
-"""Equations as expressions of SymPy, and back. Only who calls this needs SymPy."""
+"""Equations as SymPy expressions, and back. SymPy is needed only when this is called."""
 from __future__ import annotations
 
 from typing import TYPE_CHECKING, Any, Dict, List
@@ -10,7 +10,7 @@ if TYPE_CHECKING:
 
 
 def from_equation(equation: Equation) -> sympy.Basic:
-    """Node by node from the last: operands come after their operator in the list."""
+    """Makes nodes from the last to the first: operands follow their operator in the list."""
     import sympy
     from sympy.logic import boolalg
     nodes = equation.tree()
@@ -28,7 +28,7 @@ def from_equation(equation: Equation) -> sympy.Basic:
             if node.type in binary:
                 assert node.right is not None
                 made[node.id] = binary[node.type](left, made[node.right])
-            else:  # an inversion; a group and an init value are what is inside
+            else:  # an inversion; a group or an init value stands for its content
                 made[node.id] = boolalg.Not(left) if node.type == "NOT" else left
     result: sympy.Basic = made[0]
     return result
@@ -50,7 +50,7 @@ def _join(operator: str, operands: List[str], empty: str) -> str:
 
 
 def to_text(expression: sympy.Basic) -> str:
-    """A text for Equation. TypeError for what is not a Boolean expression."""
+    """A text for Equation. TypeError for anything but a Boolean expression."""
     import sympy
     from sympy.logic import boolalg
     texts: Dict[Any, str] = {}
@@ -78,4 +78,4 @@ def to_text(expression: sympy.Basic) -> str:
         else:
             raise TypeError(f"{type(part).__name__} is not a Boolean operator: {part}")
     text = texts[expression]
-    return text[1:-1] if text.startswith("(") else text  # which then closes at the end
+    return text[1:-1] if text.startswith("(") else text  # the matching ')' is the last character

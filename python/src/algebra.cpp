@@ -1,5 +1,6 @@
-// Equations made of equations: operators, others in place of inputs, inputs fixed, renamed and
-// reordered. An init value stays one where rows say it all; beside an expression it becomes one.
+// Equations made from equations: by operators, by replacing, fixing, renaming and reordering
+// inputs. An init value stays an init value if the rows suffice; together with an expression it
+// becomes an expression.
 #include <algorithm>
 #include <cassert>
 #include <set>
@@ -28,14 +29,14 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kMaxShortenedInputs = 6; // an init value has a short form at once
+constexpr size_t kMaxShortenedInputs = 6; // the short form of an init value is quick up to here
 constexpr size_t kMaxExpandedInputs = 16; // an init value stands for at most a million operands
 
-// A result on its way to Python, made without the interpreter's lock.
+// A result for Python, made without the interpreter's lock.
 struct Made {
     SharedContent content;
     std::string text;
-    bool isListed; // the order of the inputs is not that of the text
+    bool isListed; // the inputs have another order than in the text
 };
 
 Made Read(std::string text, const std::vector<std::string>& names, bool isListed)
@@ -58,8 +59,8 @@ booleq::Function FunctionOf(const Content& content)
     return function;
 }
 
-// Whether the digits are the function. Over a split name the library reads the expression that
-// they stand for, and that is what such an equation is.
+// Whether the equation consists of digits. If an input has a split name, the library reads the
+// expression that the digits stand for instead, and such an equation is that expression.
 bool IsDigits(const Content& content)
 {
     return content.IsInit() && booleq::FirstSplitName(booleq::InputNames(content.equation)).empty();
@@ -94,7 +95,7 @@ Made FromNodes(const booleq::Expression& expression)
 
 Made FromFunction(const booleq::Function& function);
 
-// Of a function with split names, which only stand in the list of inputs.
+// Makes an equation of a function with split names, which may occur only in the list of inputs.
 Made FromIdleNames(const booleq::Function& function)
 {
     std::vector<std::string> names;
@@ -120,7 +121,7 @@ Made FromIdleNames(const booleq::Function& function)
     return FromNodes(expression);
 }
 
-// An init value where the names of the inputs allow one.
+// Makes an init value if the names of the inputs allow one.
 Made FromFunction(const booleq::Function& function)
 {
     if (function.NumInputs() == 0)
@@ -187,7 +188,7 @@ booleq::Operator OperatorOf(char name)
     return name == '|' ? booleq::Operator::Or : booleq::Operator::Xor;
 }
 
-// NotImplemented for what is not an equation, text, 0 or 1.
+// NotImplemented for an operand that is not an equation, a text, 0 or 1.
 py::object JoinObjects(const py::object& left, char op, const py::object& right)
 {
     const py::object own = ToEquation(left);
@@ -218,7 +219,7 @@ size_t RequireInput(const std::vector<std::string>& inputs, const py::handle& na
         (inputs.empty() ? "; there are none" : "; the inputs are " + booleq::Join(inputs, ", ")));
 }
 
-// 'items' are pairs of a name and what stands for it: an equation, a text, 0 or 1.
+// 'items' maps names to their replacements: an equation, a text, 0 or 1.
 py::object Compose(const py::object& self, const py::dict& items)
 {
     const SharedContent content = Own(self).Shared();

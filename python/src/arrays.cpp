@@ -1,5 +1,5 @@
-// Many rows at once: arrays of assignments, truth tables and columns. NumPy is used through its
-// Python interface and the buffers of its arrays, so any version of it does.
+// Many rows at once: arrays of assignments, truth tables and columns. NumPy is used only through
+// its Python interface and the buffers of its arrays, so any version of it works.
 #include <algorithm>
 #include <atomic>
 #include <cassert>
@@ -22,12 +22,12 @@ namespace booleq_python {
 
 namespace {
 
-constexpr size_t kPartRows = 16 * kBlockRows; // of a thread at a time
-constexpr size_t kNodesLikeLookUps = 1500;    // steps that take as long as a look-up in a column
-constexpr size_t kMaxCopiedInputs = 16;       // whose column is copied at once, whatever is asked
+constexpr size_t kPartRows = 16 * kBlockRows; // rows that a thread takes at a time
+constexpr size_t kNodesLikeLookUps = 1500;    // nodes that take as long as a look-up in a column
+constexpr size_t kMaxCopiedInputs = 16;       // up to here, the column is always copied
 constexpr size_t kNoRow = static_cast<size_t>(-1);
 
-// A packed column that an array shows.
+// A packed column behind a NumPy array.
 struct Words {
     booleq::Rows rows;
 };
@@ -63,7 +63,7 @@ ItemKind KindOf(const py::buffer_info& info)
     }
 }
 
-// What is evaluated: a column for each input, or bytes row by row.
+// The assignments to evaluate: a column for each input, or bytes row by row.
 struct Assignments {
     size_t numRows = 0;
     std::vector<ValueColumn> columns;
@@ -86,7 +86,7 @@ struct Assignments {
 // How a function is evaluated for blocks of assignments.
 class Evaluator {
   public:
-    // Cost: that of the column, where one is taken.
+    // Cost: that of the column if one is used.
     Evaluator(const Content& content, size_t numRows) : m_num_inputs(content.NumInputs())
     {
         const bool hasColumn = m_num_inputs <= booleq::kMaxFunctionInputs;
@@ -113,7 +113,7 @@ class Evaluator {
             m_program = std::make_unique<WordProgram>(expression);
     }
 
-    // Results of the rows that are packed in the block, as bytes.
+    // The results of the rows packed in the block, as bytes.
     void Run(std::vector<uint64_t>& block, size_t numRows, uint8_t* results) const
     {
         if (m_program) {
@@ -157,14 +157,15 @@ class Evaluator {
         }
     }
 
-    // One of the three: a program, an init value that is asked row by row, or its column.
+    // One of three: a program, an init value that is evaluated row by row, or a column.
     size_t m_num_inputs;
     std::unique_ptr<WordProgram> m_program;
     const Kq_BoolEquation* m_digits = nullptr;
     booleq::Rows m_rows;
 };
 
-// Evaluates all rows; gives back the first block with a value that is neither 0 nor 1, or kNoRow.
+// Evaluates all rows. Returns the first row of the first block that has a value other than 0 and 1,
+// or kNoRow.
 size_t EvaluateAll(const Evaluator& evaluator, const Assignments& assignments, uint8_t* results)
 {
     std::atomic<size_t> fault{kNoRow};
@@ -185,7 +186,7 @@ size_t EvaluateAll(const Evaluator& evaluator, const Assignments& assignments, u
     return fault;
 }
 
-// Results as an array, or the row and the input of the first value that is neither 0 nor 1.
+// The results as an array, or the row and the input of the first value that is neither 0 nor 1.
 py::object Evaluate(const Equation& equation, const Assignments& assignments)
 {
     py::object results = NewArray(py::make_tuple(assignments.numRows));
@@ -214,8 +215,8 @@ py::object Evaluate(const Equation& equation, const Assignments& assignments)
     return py::none();
 }
 
-// 'columns' are one-dimensional arrays of this machine's order, a column for each input, all of one
-// length, 'numRows'; or one array of two dimensions.
+// 'columns' are one-dimensional arrays in this machine's byte order, one for each input, each of
+// length 'numRows'.
 py::object EvalColumns(const py::object& self, const py::list& columns, size_t numRows)
 {
     const Equation& equation = Own(self);
@@ -300,8 +301,8 @@ py::object PackedColumn(const py::object& self)
     return NumPy().attr("frombuffer")(py::cast(std::move(owner)), "uint64");
 }
 
-// 0 and 1 of an array of objects as bytes; 2 for anything else, 3 for None and what is not itself
-// (not a number, pandas' NA).
+// An array of objects as bytes: 0 and 1 as they are, 3 for None and 'missing' (pandas' NA), and 2
+// for anything else, not-a-number included.
 py::object NarrowObjects(const py::object& array, const py::object& missing)
 {
     const py::tuple values(array.attr("tolist")());
@@ -329,7 +330,7 @@ py::object NarrowObjects(const py::object& array, const py::object& missing)
 
 void BindArrays(py::module_& module)
 {
-    // What owns a packed column while an array shows it; nobody makes one by hand.
+    // Owns a packed column while an array shows it; Python code never makes one.
     py::class_<Words>(module, "_Words", py::buffer_protocol(), py::module_local())
         .def_buffer([](Words& self) {
             return py::buffer_info(self.rows.Words(), static_cast<py::ssize_t>(self.rows.Size()));

@@ -1,4 +1,4 @@
-// Tables of functions, completed row by row as the tool's command 'batch' does it.
+// Tables of functions, completed row by row as by the tool's command 'batch'.
 #include "batch.h"
 
 #include <cassert>
@@ -22,7 +22,7 @@ constexpr size_t kPart = 512; // rows that a thread takes at a time
 typedef std::vector<booleq::BatchRow> BatchRows;
 typedef std::vector<booleq::BatchResult> BatchResults;
 
-// None, not a number, pandas' NA, or a text of nothing but blanks.
+// Whether a cell is None, not-a-number, pandas' NA, or a text of only blanks.
 bool IsMissing(const py::handle& cell, const py::object& missing)
 {
     if (cell.is_none() || cell.is(missing))
@@ -40,7 +40,7 @@ std::string Where(const char* column, size_t row)
     return std::string(column) + "[" + std::to_string(row) + "]";
 }
 
-// Requires: there is a cell.
+// The text of a cell.  Requires: the cell is not missing.
 std::string TextOf(const py::handle& cell, const char* column, size_t row)
 {
     std::string text =
@@ -50,7 +50,7 @@ std::string TextOf(const py::handle& cell, const char* column, size_t row)
     return text;
 }
 
-// A list of names, or a text with commas.  Fails: false for a quote that is not closed.
+// Takes a list of names, or a text with commas.  Fails: false for a quote that is not closed.
 bool TakeInputs(const py::handle& cell, size_t row, std::vector<std::string>& inputs)
 {
     if (PyUnicode_Check(cell.ptr()))
@@ -64,7 +64,7 @@ bool TakeInputs(const py::handle& cell, size_t row, std::vector<std::string>& in
                          TypeName(cell));
 }
 
-// An int as digits of all rows of so many inputs; a text as it is.
+// An int as the digits of all rows of so many inputs; a text as it is.
 std::string InitOf(const py::handle& cell, size_t numInputs, size_t row)
 {
     if (!PyIndex_Check(cell.ptr()))
@@ -90,7 +90,7 @@ struct Columns {
     py::list inits;
 };
 
-// Rows with what is given, and the outcome of those that cannot be read.
+// Fills the rows with the given cells, and sets the outcome of rows that cannot be read.
 void ReadRows(const Columns& columns, const py::object& missing, BatchRows& rows,
               BatchResults& results)
 {
@@ -119,7 +119,7 @@ void CompleteRows(BatchRows& rows, BatchResults& results)
     });
 }
 
-// Fills the cells that were missing, and gives back the outcomes and the messages.
+// Fills the missing cells, and returns the outcomes and the messages.
 py::tuple Batch(const py::list& inputs, const py::list& equations, const py::list& inits,
                 const py::object& missing)
 {

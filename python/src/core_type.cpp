@@ -1,5 +1,5 @@
-// The type that booleq.Equation is derived from: construction, values, comparison, and what it was
-// made of. Everything else is a function of the module that Python's half calls.
+// The type from which booleq.Equation is derived: construction, values, comparison, and the given
+// arguments. Everything else is a function of the module that the Python half calls.
 #include <cstddef>
 #include <cstring>
 #include <new>
@@ -26,10 +26,11 @@ struct CoreObject : CoreHead {
     Equation value;
 };
 
-PyTypeObject* coreType = nullptr;      // owned, for ever
-PyTypeObject* equationClass = nullptr; // owned, for ever; what new objects are
+PyTypeObject* coreType = nullptr;      // owned, never released
+PyTypeObject* equationClass = nullptr; // owned, never released; the class of new objects
 
-// Runs 'work' as a function of C does: an exception becomes the interpreter's.
+// Calls 'work' for a C function: a C++ exception becomes a Python exception, and 'failure' is
+// returned.
 template <class Result, class Work>
 Result Guarded(Result failure, const Work& work)
 {
@@ -103,7 +104,7 @@ std::string Listed(const std::vector<std::string>& names)
         (inputs.empty() ? "; there are none" : "; the inputs are " + Listed(inputs)));
 }
 
-// Values of inputs by name, as they are collected.
+// Collects the values of inputs by name.
 class Values {
   public:
     explicit Values(const Equation& equation)
@@ -154,8 +155,8 @@ class Values {
         m_values[input] = RequireBit(value, name);
     }
 
-    // Names that are not the inputs' own objects' equals: other strs of the same bytes (escaped
-    // bytes that together are UTF-8 are listed as the character), and what is not an input.
+    // Takes names that are not equal to an input as str: other strs of the same bytes (escaped
+    // bytes that together are UTF-8 are listed as the character), and names that are not inputs.
     void TakeOthers(PyObject* values)
     {
         PyObject* name = nullptr;
@@ -183,7 +184,7 @@ class Values {
     std::vector<unsigned int> m_values;
 };
 
-// The one argument by position is taken by hand, so that every name may be an input's.
+// The one positional argument is taken by hand, so that an input may have any name.
 PyObject* Call(PyObject* self, PyObject* arguments, PyObject* named)
 {
     return Guarded<PyObject*>(nullptr, [&] {
@@ -340,9 +341,10 @@ void SetEquationClass(const py::object& type)
         PyType_IsSubtype(reinterpret_cast<PyTypeObject*>(type.ptr()), coreType) == 0)
         throw py::type_error("a class that is derived from Core");
     equationClass = reinterpret_cast<PyTypeObject*>(type.inc_ref().ptr());
-    // Classes written in Python are the garbage collector's matter. Equations hold texts and names
-    // and never each other, and a million of them would make it run through all memory again and
-    // again.  Requires: no objects yet.
+    // The garbage collector tracks objects of classes written in Python. Equations hold texts and
+    // names and never each other, and a million of them would make it scan all memory again and
+    // again.
+    // Requires: no objects exist yet.
     equationClass->tp_flags &= ~Py_TPFLAGS_HAVE_GC;
     equationClass->tp_traverse = nullptr;
     equationClass->tp_clear = nullptr;

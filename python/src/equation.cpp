@@ -69,8 +69,8 @@ bool AreSame(const Content& left, const Content& right)
     return left.equation == right.equation;
 }
 
-// What sorting goes by after the kind: of texts the tokens, of init values the digits, the highest
-// row first.
+// The first key for sorting, after the kind: for texts the tokens, for init values the digits, the
+// highest row first.
 std::string FirstKey(const Content& content)
 {
     booleq::Function function;
@@ -79,7 +79,7 @@ std::string FirstKey(const Content& content)
     return booleq::ToStd(content.equation.GetEquationAlt1(true));
 }
 
-// And then: of texts how the tokens are grouped, and the names, in either case.
+// The further keys: for texts the grouping of the tokens, and in both cases the names.
 std::vector<std::string> OtherKeys(const Content& content)
 {
     std::vector<std::string> keys;
@@ -91,7 +91,7 @@ std::vector<std::string> OtherKeys(const Content& content)
     return keys;
 }
 
-// Below or above 0.  Requires: they are not the same.
+// Below or above 0.  Requires: the two are not the same.
 int Order(const Content& left, const Content& right)
 {
     if (left.IsInit() != right.IsInit())
@@ -105,7 +105,7 @@ int Order(const Content& left, const Content& right)
     return own < other ? -1 : 1;
 }
 
-// Null for a text that is refused.
+// Null if the text is refused.
 SharedContent Read(const std::string& bytes, const booleq::Reading& reading)
 {
     const booleq::NoMessages silence;
@@ -131,8 +131,8 @@ booleq::Reading ReadingOf(const py::object& givenInputs, bool lsbFirst)
 unsigned int ValueOf(Kq_BoolEquation& equation, const std::vector<unsigned int>& values)
 {
     assert(values.size() == equation.GetNumVariables());
-    // The handle is a cached number, which any equation with so many variables honours. One asked
-    // for by name would list all places of the name, and so make the tree of an init value.
+    // The handle is only a cached number, valid in any equation with so many variables. Asking for
+    // one by name would list all places of the name, which makes the tree of an init value.
     static const Kq_BoolEquation::Handle first = Kq_BoolEquation("A").GetVariableHandle("A");
     Kq_BoolEquation::Handle handle = first;
     for (size_t input = 0; input < values.size(); ++input) {
@@ -177,9 +177,11 @@ bool Equation::IsLargeText() const
 
 Length Equation::GetLength() const
 {
-    constexpr size_t kLongRows = 10;    // inputs whose rows take longer than a switch of threads
-    constexpr size_t kEndlessRows = 22; // whose rows are memory that takes a while to get
-    constexpr size_t kEndlessTree = 12; // whose init value has a tree of 100,000 nodes
+    // Numbers of inputs: for more, the rows take longer than a switch of threads, allocating the
+    // rows takes a while, or the tree of an init value has some 100,000 nodes or more.
+    constexpr size_t kLongRows = 10;
+    constexpr size_t kEndlessRows = 22;
+    constexpr size_t kEndlessTree = 12;
     const size_t numInputs = NumInputs();
     const bool hasRows = numInputs <= booleq::kMaxFunctionInputs;
     const Length ofText = LengthOfText(static_cast<size_t>(PyUnicode_GET_LENGTH(m_text.ptr())));
@@ -199,7 +201,7 @@ Length LengthOfText(size_t numCharacters)
 unsigned int Equation::Evaluate(const std::vector<unsigned int>& values) const
 {
     assert(values.size() == NumInputs());
-    if (IsLargeText() && !IsInit()) { // without the lock, so with a copy that no other call knows
+    if (IsLargeText() && !IsInit()) { // without the lock, so on a copy that no other call uses
         Kq_BoolEquation copy(Get());
         return Freely([&] { return ValueOf(copy, values); });
     }
@@ -212,7 +214,7 @@ bool Equation::IsSame(const Equation& other) const
 {
     if (this == &other)
         return true;
-    const SharedContent own = Shared(); // the lock is given up: nobody else may keep them
+    const SharedContent own = Shared(); // keeps them alive while the lock is released
     const SharedContent theirs = other.Shared();
     return own == theirs || Run(std::min(GetLength(), other.GetLength()),
                                 [own, theirs] { return AreSame(*own, *theirs); });
@@ -224,7 +226,7 @@ int Equation::Compare(const Equation& other) const
         return 0;
     const SharedContent own = Shared();
     const SharedContent theirs = other.Shared();
-    CheckSignals(); // sorting asks very often, and nobody else
+    CheckSignals(); // sorting calls this very often and checks nowhere else
     return Run(std::max(GetLength(), other.GetLength()),
                [own, theirs] { return Order(*own, *theirs); });
 }
@@ -243,7 +245,7 @@ py::tuple RequireInputs(const py::object& inputs)
 {
     py::tuple names = RequireNames(inputs);
     const std::vector<std::string> encoded = EncodeAll(names);
-    // The library would read such a name up to the NUL.
+    // The library would read such a name only up to the NUL.
     for (const std::string& name : encoded)
         if (name.find('\0') != std::string::npos)
             throw py::value_error("inputs: '" + booleq::Excerpt(name) + "' is not a name");

@@ -9,7 +9,7 @@ namespace booleq_python {
 
 namespace {
 
-// A text of as many bytes as 'text' has characters, with the same line ends.
+// A text with a byte for each character of 'text' and the same line ends.
 std::string ByteForCharacter(const py::str& text)
 {
     const int kind = PyUnicode_KIND(text.ptr());

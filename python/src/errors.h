@@ -1,4 +1,4 @@
-// Refusals as exceptions.
+// Raises exceptions for refusals.
 #ifndef BOOLEQ_PYTHON_ERRORS_H
 #define BOOLEQ_PYTHON_ERRORS_H
 
@@ -12,13 +12,13 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Raises booleq.ParseError for a text that is refused when it is read so.
+// Raises booleq.ParseError for a text that is refused when it is read that way.
 [[noreturn]] void RaiseParseError(const py::str& text, const std::string& bytes,
                                   const booleq::Reading& reading);
 // The report counts bytes, the exception characters.
 [[noreturn]] void RaiseParseError(const py::str& text, const booleq::RefusalReport& report);
 
-// The class of that name among the results that are written in Python.
+// The class of that name in booleq/_results.py.
 py::object ResultClass(const char* name);
 
 } // namespace booleq_python

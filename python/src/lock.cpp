@@ -17,13 +17,13 @@ typedef std::chrono::steady_clock Clock;
 
 constexpr std::chrono::milliseconds kBetweenChecks(10);
 
-thread_local PyThreadState* released = nullptr; // of a thread that has given up the lock
+thread_local PyThreadState* released = nullptr; // set on a thread that has released the lock
 thread_local Clock::time_point lastCheck;
-thread_local const std::atomic<bool>* abandoned = nullptr; // of a thread that runs beside
+thread_local const std::atomic<bool>* abandoned = nullptr; // set on a thread of StartBeside
 
 std::atomic<unsigned long> mainThread{0};
 
-// Threads that run beside. Never destroyed: they may outlive static objects.
+// Counts the threads of StartBeside. Never destroyed, because they may outlive static objects.
 struct Helpers {
     std::mutex mutex;
     std::condition_variable isFewer;
@@ -56,11 +56,11 @@ void CountHelper(bool isNew)
     helpers.isFewer.notify_all();
 }
 
-// A child has the one thread that forked.
+// A forked child has only the thread that forked.
 void ForgetThreads()
 {
     mainThread = PyThread_get_thread_ident();
-    new (&GetHelpers()) Helpers(); // its mutex may be held by a thread that is not there
+    new (&GetHelpers()) Helpers(); // its mutex may be held by a thread that is gone
 }
 
 } // namespace
@@ -117,10 +117,10 @@ void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work)
         std::thread([isAbandoned, work = std::move(work)]() mutable {
             abandoned = isAbandoned.get();
             work();
-            work = nullptr; // what it holds goes before anybody thinks that it has ended
+            work = nullptr; // frees what it holds before the thread counts as ended
             CountHelper(false);
         }).detach();
-    } catch (...) { // no thread is to be had, which is a lack of memory as a rule
+    } catch (...) { // the system refused a thread, usually for lack of memory
         CountHelper(false);
         throw std::bad_alloc();
     }

@@ -1,6 +1,6 @@
-// The interpreter's lock: given up while the library works, taken again to ask whether to go on.
-// In: work that touches no object of Python; out: what it gives.
-// Fails: what the work throws, and what a signal's handler raises, within a twentieth of a second.
+// The interpreter's lock: released while the library works, and taken again to check for signals.
+// In: work that touches no Python object; out: its result.
+// Fails: what the work throws, and what a signal handler raises, within a twentieth of a second.
 #ifndef BOOLEQ_PYTHON_LOCK_H
 #define BOOLEQ_PYTHON_LOCK_H
 
@@ -18,11 +18,12 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Work that takes no longer than this in nanoseconds, roughly, keeps the lock: giving it up may
-// cost a switch to another thread.
+// Work that takes no more than about so many nanoseconds keeps the lock: releasing it may cost a
+// switch to another thread.
 constexpr double kShortWork = 20e3;
 
-// Gives up the lock while it lives.  Requires: this thread has it, and no other Unlocked.
+// Releases the lock for its own lifetime.  Requires: this thread holds the lock and has no other
+// Unlocked.
 class Unlocked {
   public:
     Unlocked();
@@ -31,18 +32,19 @@ class Unlocked {
     Unlocked& operator=(const Unlocked&) = delete;
 };
 
-// A handler raised; the exception waits in the thread's state.
+// Thrown when a signal handler raised; the Python exception is in the thread's state.
 struct Interrupted {};
 
-// Runs the handlers of signals that came, at most every few milliseconds: the watcher of logic/.
-// Does nothing on threads that Python does not know.
-// Fails: Interrupted on a thread without the lock, otherwise the exception itself.
+// Runs the handlers of pending signals, at most every ten milliseconds; it is what Watch() calls.
+// On other threads than the main one, it only checks whether the work is abandoned.
+// Fails: Interrupted on a thread without the lock or an abandoned one, otherwise the exception
+// itself.
 void CheckSignals();
 
-// Makes CheckSignals the watcher, and knows main thread and forks. Once.
+// Makes Watch() call CheckSignals, and keeps track of the main thread and of forks. Call it once.
 void PrepareInterrupts();
 
-// Calls 'work' with the lock given up.
+// Calls 'work' with the lock released.
 template <class Work>
 auto Freely(const Work& work) -> decltype(work())
 {
@@ -54,7 +56,7 @@ auto Freely(const Work& work) -> decltype(work())
     }
 }
 
-// The same for short work, which keeps the lock.
+// The same, except that short work keeps the lock.
 template <class Work>
 auto FreelyIf(bool isLong, const Work& work) -> decltype(work())
 {
@@ -63,14 +65,14 @@ auto FreelyIf(bool isLong, const Work& work) -> decltype(work())
     return work();
 }
 
-// Starts a thread that the interpreter waits for when it ends. Once 'isAbandoned' is set, what asks
-// the watcher on that thread ends by Interrupted.
+// Starts a thread; the interpreter waits for it before it ends. Once 'isAbandoned' is set, Watch()
+// throws Interrupted on that thread.
 typedef std::shared_ptr<std::atomic<bool>> AbandonFlag;
 void StartBeside(const AbandonFlag& isAbandoned, std::function<void()> work);
 
-// Calls work, parts of which cannot be ended, on a thread of its own. When a handler raises, nobody
-// waits for its result any more.
-// Requires: it has copies of, or shares, all that it uses.
+// Runs work that cannot always be interrupted on a separate thread. If a handler raises, the result
+// is abandoned.
+// Requires: 'work' owns or shares everything that it uses.
 template <class Work>
 auto Beside(const Work& work) -> decltype(work())
 {
@@ -91,11 +93,11 @@ auto Beside(const Work& work) -> decltype(work())
     });
 }
 
-// How long work takes: no longer than kShortWork; longer, but with a check of signals every few
-// milliseconds; or with steps between two checks that somebody would wait for.
+// How long work takes: at most kShortWork; longer, but checking signals every few milliseconds; or
+// with so long between two checks that a user would notice.
 enum class Length { Short, Long, Endless };
 
-// Calls work with the lock, without it, or beside.  Requires: as of Beside.
+// Calls 'work' with the lock, without it, or on a separate thread.  Requires: as for Beside.
 template <class Work>
 auto Run(Length length, const Work& work) -> decltype(work())
 {
@@ -104,7 +106,7 @@ auto Run(Length length, const Work& work) -> decltype(work())
     return FreelyIf(length == Length::Long, work);
 }
 
-// The same for what is never short.
+// The same for work that is never short.
 template <class Work>
 auto RunLong(Length length, const Work& work) -> decltype(work())
 {

@@ -1,5 +1,5 @@
-// Arrays of look-up tables: what booleq/_luts.py hands to the kernels of logic/luts. Tables and
-// results are buffers of NumPy, made and checked there; they are dense and aligned.
+// Arrays of look-up tables: passes what booleq/_luts.py gives to the kernels of logic/luts. Tables
+// and results are NumPy buffers, made and checked there; they are dense and aligned.
 #include <algorithm>
 #include <cassert>
 #include <cstring>
@@ -24,7 +24,7 @@ namespace booleq_python {
 
 namespace {
 
-// A dense buffer; a one of two dimensions has a table or an order in each row.
+// A dense buffer; one of two dimensions has a table or an order in each row.
 struct Dense {
     explicit Dense(const py::buffer& buffer, bool isWritten = false)
         : info(buffer.request(isWritten))
@@ -55,15 +55,15 @@ booleq::LutArray LutsOf(const Dense& tables, unsigned int numInputs)
     return {tables.Bytes(), tables.Count(), numInputs, tableBytes};
 }
 
-// Results and arguments have an element for each table.
+// Results and arguments must have an element for each table.
 void RequireCount(const Dense& dense, size_t count, size_t rowBytes)
 {
     if (dense.Count() != count || dense.RowBytes() != rowBytes)
         throw py::value_error("an array of another shape");
 }
 
-// Calls work(luts) with the lock given up.
-// 'results' has an element of 'rowBytes' for each table; 0: as many as a table.
+// Calls work(luts) with the lock released. 'results' has an element of 'rowBytes' bytes for each
+// table; 0: as many as a table has.
 template <class Work>
 void WithLuts(const py::buffer& tables, unsigned int numInputs, const Dense& results,
               size_t rowBytes, const Work& work)
@@ -89,7 +89,7 @@ void Evaluate(const py::buffer& tables, unsigned int numInputs, const py::buffer
     });
 }
 
-// Gives back the place of the first order that is none.
+// Returns the place of the first order that is not a permutation, or None.
 py::object Permute(const py::buffer& tables, unsigned int numInputs, const py::buffer& orders,
                    const py::buffer& results)
 {
@@ -134,14 +134,14 @@ void Fix(const py::buffer& tables, unsigned int numInputs, unsigned int input, b
     });
 }
 
-// A byte for each input, 1 where it is in the set.
+// Writes a byte for each input: 1 if it is in the set.
 void SpreadSet(unsigned int set, unsigned int numInputs, uint8_t* bytes)
 {
     for (unsigned int input = 0; input < numInputs; ++input)
         bytes[input] = static_cast<uint8_t>(set >> input & 1u);
 }
 
-// What is quickly done with each table.
+// Runs work that is quick for each table.
 void InParts(size_t count, const booleq::PartRunner& run)
 {
     booleq::RunInParts(count, 65536, booleq::LutWork(), run);
@@ -167,7 +167,7 @@ void CountOnes(const py::buffer& tables, unsigned int numInputs, const py::buffe
              [&](const booleq::LutArray& luts) { booleq::CountLutOnes(luts, out.Bytes()); });
 }
 
-// Words of the distinct tables, their first places, their counts, and which one each table is.
+// The words of the distinct tables, their first places, their counts, and which one each table is.
 py::tuple Distinct(const py::buffer& tables, unsigned int numInputs)
 {
     booleq::DistinctLuts distinct;
@@ -181,7 +181,7 @@ py::tuple Distinct(const py::buffer& tables, unsigned int numInputs)
                           ArrayOf(distinct.counts), ArrayOf(places));
 }
 
-// Writes forms, orders (a row each), inversions of inputs (the same) and of outputs.
+// Writes forms, orders (a row for each table), inversions of inputs (likewise) and of outputs.
 void Canonical(const py::buffer& tables, unsigned int numInputs, bool hasInversions,
                const py::buffer& forms, const py::buffer& orders, const py::buffer& inverted,
                const py::buffer& outputs)
@@ -248,7 +248,7 @@ unsigned int DigitValue(char digit)
     return lower >= 'a' && lower <= 'f' ? static_cast<unsigned int>(lower - 'a') + 10 : 16;
 }
 
-// The rows of "0x..." and "0b..." with all their digits, and of sized literals.
+// Reads the rows of "0x..." and "0b..." with all their digits, and of sized literals.
 void ReadText(const std::string& text, unsigned int numInputs, size_t place, uint64_t* words)
 {
     const booleq::InitLiteral literal = booleq::ReadInitLiteral(text, numInputs);
@@ -293,7 +293,7 @@ void ReadNumber(const py::handle& value, unsigned int numInputs, size_t place, u
         words[index / 8] |= static_cast<uint64_t>(bytes[index]) << (8 * (index % 8));
 }
 
-// Ints and texts as tables: a row of two words each.
+// Reads ints and texts as tables of two words each.
 void ReadValues(const py::sequence& values, unsigned int numInputs, const py::buffer& results)
 {
     const Dense out(results, true);

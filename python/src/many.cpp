@@ -1,5 +1,5 @@
-// Equations by the thousand. Texts are read on all processors, each once, to see that they are
-// accepted; the objects of Python hold them and no trees, and equal texts are one object.
+// Equations by the thousand. Texts are read on all processors, each once, to check that they are
+// accepted. The Python objects hold the texts but no trees, and equal texts share an object.
 #include <algorithm>
 #include <atomic>
 #include <cassert>
@@ -26,8 +26,8 @@ namespace {
 constexpr size_t kPart = 2048; // texts that a thread takes at a time
 constexpr size_t kNowhere = booleq::kNoLut;
 
-// Where something stood lately, by its hash, for finding it again. What is put in late takes the
-// place of what was put in early.  Threads: any at any time.
+// Remembers where something was seen recently, by its hash. A new entry replaces an older one when
+// its places are full.  Threads: any at any time.
 class Recent {
   public:
     explicit Recent(size_t size)
@@ -41,7 +41,7 @@ class Recent {
             m_entries[entry].store(0, std::memory_order_relaxed);
     }
 
-    // The place of one that 'isSame' says is the same, or kNowhere.
+    // The place of an entry for which 'isSame' is true, or kNowhere.
     template <class IsSame>
     size_t Find(uint64_t hash, const IsSame& isSame) const
     {
@@ -64,16 +64,15 @@ class Recent {
     }
 
   private:
-    static constexpr size_t kWays = 4;                     // entries that something may be in
-    static constexpr size_t kMaxEntries = size_t(1) << 16; // what stays in a processor's cache
-    static constexpr uint64_t kPlaces = (uint64_t(1) << 48) - 1; // above them part of the hash
+    static constexpr size_t kWays = 4;                     // entries where something may be
+    static constexpr size_t kMaxEntries = size_t(1) << 16; // these stay in a processor's cache
+    static constexpr uint64_t kPlaces = (uint64_t(1) << 48) - 1; // part of the hash is above
 
     size_t m_mask;
     std::unique_ptr<std::atomic<uint64_t>[]> m_entries;
 };
 
-// Texts as the library reads them. Those of letters that take a byte each are used where Python
-// has them.
+// Texts as the library reads them. ASCII texts are used in place, in Python's memory.
 class Texts {
   public:
     explicit Texts(const py::object& texts)
@@ -84,7 +83,7 @@ class Texts {
             PySequence_Fast(texts.ptr(), "texts must be an iterable of texts"));
         if (!fast)
             throw py::error_already_set();
-        // A list of our own: the caller's may change while the lock is given up.
+        // A copy of the list: the caller's may change while the lock is released.
         m_objects = py::reinterpret_steal<py::object>(PySequence_List(fast.ptr()));
         if (!m_objects)
             throw py::error_already_set();
@@ -102,7 +101,7 @@ class Texts {
     {
         return PyList_GET_ITEM(m_objects.ptr(), static_cast<Py_ssize_t>(place));
     }
-    // A zero byte follows them.
+    // A zero byte follows the bytes.
     std::string_view Bytes(size_t place) const { return m_bytes[place]; }
     bool HasLarge() const { return m_has_large; }
 
@@ -126,20 +125,20 @@ class Texts {
         m_has_large = m_has_large || m_bytes.back().size() > kLargeText;
     }
 
-    py::object m_objects; // holds the bytes
+    py::object m_objects; // owns the bytes of the ASCII texts
     std::vector<std::unique_ptr<std::string>> m_encoded;
     std::vector<std::string_view> m_bytes;
     bool m_has_large = false;
 };
 
-// What was found of texts without the interpreter's lock.
+// What was found about the texts, without the interpreter's lock.
 struct Found {
-    size_t refused = kNowhere;           // the first one
-    std::vector<size_t> sources;         // of each the place of an equal one that was read
-    std::vector<SharedContent> contents; // of the large ones; empty where there are none
+    size_t refused = kNowhere;           // the first refused one
+    std::vector<size_t> sources;         // for each, the place of an equal one that was read
+    std::vector<SharedContent> contents; // of the large texts; empty if there are none
 };
 
-// Reads texts one after another into one object.
+// Reads texts one after another into the same object.
 class Reader {
   public:
     explicit Reader(const booleq::Reading& reading)
@@ -153,7 +152,7 @@ class Reader {
             return false;
         if (m_reading.hasInputs)
             return booleq::SetOverTerms(equation, std::string(text), m_reading, m_terms);
-        equation.Clear(); // over the variables of another text this one may be an init value
+        equation.Clear(); // over the variables of the previous text this one might be an init value
         return equation.SetEquation(text.data());
     }
 
@@ -193,7 +192,7 @@ Found ReadAll(const Texts& texts, const booleq::Reading& reading)
     return found;
 }
 
-// An object for each place, the one at its source.
+// A list with an object for each place, which is the one of its source.
 template <class Make>
 py::list GiveAll(size_t size, const std::vector<size_t>& sources, const Make& make)
 {
@@ -255,8 +254,8 @@ py::object TextOf(const uint64_t* words, unsigned int numInputs)
     return text;
 }
 
-// Each element of 'words' is a function: 'numWords' words of 64 rows, row k in bit k % 64 of word
-// k / 64, over the inputs.
+// Each row of 'words' is a function over the inputs: words of 64 rows, with row k in bit k % 64 of
+// word k / 64.
 py::list FromWords(const py::buffer& words, const py::object& inputs)
 {
     const py::tuple given = RequireInputs(inputs);
@@ -283,7 +282,7 @@ py::list FromWords(const py::buffer& words, const py::object& inputs)
             recent.Put(hash ^ hash >> 32, place);
         }
     }
-    // Over others the library reads the expression that the digits stand for.
+    // With a split name the library reads the expression that the digits stand for.
     const bool arePlain = booleq::FirstSplitName(EncodeAll(given)).empty();
     return GiveAll(size, sources, [&](size_t place) {
         py::object text = TextOf(tables + place * numWords, numInputs);

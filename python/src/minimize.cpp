@@ -1,4 +1,4 @@
-// Smallest sums of products: of an equation with free rows, and of a PLA file.
+// Smallest sums of products, of an equation with don't-cares and of a PLA file.
 #include <algorithm>
 #include <memory>
 #include <string>
@@ -18,7 +18,7 @@ namespace {
 
 using namespace pybind11::literals; // "name"_a
 
-// 'seconds' is 0 for as long as it takes.
+// 'seconds' of 0 means no limit.
 booleq::SumOptions Options(const py::object& isExact, double seconds)
 {
     booleq::SumOptions options;

@@ -1,5 +1,5 @@
-// The compiled half of the package booleq: what booleq/*.py calls. Long work gives up the
-// interpreter's lock (lock.h); the library underneath may be used by any number of threads.
+// The compiled half of the package booleq, which booleq/*.py calls. Long work releases the
+// interpreter's lock (lock.h); any number of threads may use the library underneath.
 #include <pybind11/pybind11.h>
 
 #include "bind.h"
@@ -34,8 +34,8 @@ void Fill(py::module_ module)
     BindReports(module);
 }
 
-// What an interpreter does that imports the module. pybind11 keeps what it knows of types once in a
-// process, so another interpreter than the main one would use what belongs to that.
+// Runs when an interpreter imports the module. pybind11 keeps its data about types once for the
+// process, so any other interpreter would use objects that belong to the main one.
 int Import(PyObject* self)
 {
     if (PyInterpreterState_Get() != PyInterpreterState_Main()) {
@@ -71,7 +71,7 @@ PyModuleDef definition = {PyModuleDef_HEAD_INIT,
 
 extern "C" PYBIND11_EXPORT PyObject* PyInit__booleq();
 
-// In two steps, so that each interpreter that imports the module runs Import.
+// Multi-phase initialisation, so that each interpreter that imports the module runs Import.
 PyObject* PyInit__booleq()
 {
     return PyModuleDef_Init(&definition);

@@ -1,5 +1,5 @@
-// Netlists: what booleq/_netlists.py calls. Everything is an answer of the second library's class,
-// made into objects of Python a column at a time; the lock is given up while it works.
+// Netlists, for booleq/_netlists.py. Every answer comes from the second library's class and is
+// turned into Python objects a column at a time. The lock is released while that class works.
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -17,7 +17,7 @@ namespace {
 
 using kq_logic::Netlist;
 
-constexpr size_t kPart = 4096; // objects that are made from one look at signals to the next
+constexpr size_t kPart = 4096; // objects made between two checks of signals
 
 // A list with an element for each of 'count' places.
 template <class Make>
@@ -50,7 +50,7 @@ std::string BytesOf(const py::bytes& bytes)
     return std::string(bytes);
 }
 
-// None, or why it is not read.
+// None, or why the netlist is not read.
 template <class Read>
 py::object ReadWith(const Read& read, const py::str& key, const py::bytes& cells,
                     const py::str& top)
@@ -108,7 +108,7 @@ py::list Nets(const Netlist& netlist)
                   [&](size_t net) { return py::object(Decode(netlist.NetAt(net))); });
 }
 
-// Places, words, inputs, outputs, types and lines of the tables of one width.
+// The places, words, inputs, outputs, types and lines of the tables of one width.
 py::tuple Arrays(const Netlist& netlist, unsigned int width)
 {
     const kq_logic::NetlistArrays arrays = Freely([&] { return netlist.Arrays(width); });
@@ -116,7 +116,7 @@ py::tuple Arrays(const Netlist& netlist, unsigned int width)
                           ArrayOf(arrays.outputs), ArrayOf(arrays.types), ArrayOf(arrays.lines));
 }
 
-// Init values as texts; one that stands often is one object.
+// Init values as texts; equal ones share an object.
 py::list HexTexts(const kq_logic::NetlistArrays& arrays, unsigned int width)
 {
     std::vector<std::string> inputs;
@@ -138,8 +138,8 @@ py::list HexTexts(const kq_logic::NetlistArrays& arrays, unsigned int width)
     });
 }
 
-// What a frame has for the tables of one width: their places, init values, and tuples of nets,
-// which are those of 'nets'.
+// The columns of a frame for the tables of one width: places, init values, and tuples of elements
+// of 'nets'.
 py::tuple Columns(const Netlist& netlist, unsigned int width, const py::tuple& nets)
 {
     const kq_logic::NetlistArrays arrays = Freely([&] { return netlist.Arrays(width); });
@@ -154,7 +154,7 @@ py::tuple Columns(const Netlist& netlist, unsigned int width, const py::tuple& n
     return py::make_tuple(ArrayOf(arrays.tables), HexTexts(arrays, width), inputs);
 }
 
-// Values of the key attribute, None where a cell has none.
+// The values of the key attribute; None for a cell without one.
 py::list Keys(const Netlist& netlist)
 {
     return ListOf(netlist.NumTables(),
@@ -172,7 +172,7 @@ py::tuple Counted(const std::vector<uint64_t>& counts)
     return py::tuple(pairs);
 }
 
-// By the names of the report's fields.
+// A dict by the names of the fields of the report.
 py::dict Stats(const Netlist& netlist)
 {
     const kq_logic::NetlistStats stats = Freely([&] { return netlist.Stats(); });
@@ -256,7 +256,7 @@ kq_logic::NetlistNames NamesOf(const std::string& word)
     return word == "kept" ? kq_logic::NetlistNames::Kept : kq_logic::NetlistNames::Gone;
 }
 
-// By the names of the report's fields.
+// A dict by the names of the fields of the report.
 py::dict Compare(const Netlist& left, const Netlist& right, const py::list& renames,
                  const std::string& names, bool allowsWires, int openInputs,
                  const py::object& maxDescribed)

@@ -1,4 +1,4 @@
-// Numbers as an array of NumPy, which is used by its Python interface and by buffers only.
+// Numbers as a NumPy array. NumPy is used only through its Python interface and buffers.
 #ifndef BOOLEQ_PYTHON_NUMBER_ARRAY_H
 #define BOOLEQ_PYTHON_NUMBER_ARRAY_H
 
@@ -10,7 +10,7 @@
 
 namespace booleq_python {
 
-// Of uint64 or uint32, a copy.
+// A copy, as an array of uint64 or uint32.
 template <class Number>
 pybind11::object ArrayOf(const std::vector<Number>& numbers)
 {

@@ -23,7 +23,7 @@ constexpr size_t kWordRows = 64;
     return word;
 }
 
-// 64 bytes, each 0 or 1, as a word; 'seen' gets all bits that any byte has.
+// Packs 64 bytes, each 0 or 1, into a word; sets bit 1 of 'seen' if any byte is above 1.
 #ifdef __SSE2__
 uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
 {
@@ -48,7 +48,7 @@ uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
     for (unsigned int part = 0; part < 8; ++part) {
         const uint64_t values = LoadBytes(bytes + 8 * part);
         all |= values;
-        // Byte k to bit k; the partial products do not meet, so nothing carries.
+        // Byte k goes to bit k; the partial products do not overlap, so nothing carries.
         word |= ((values & kLowBits) * 0x0102040810204080 >> 56) << (8 * part);
     }
     seen = static_cast<uint8_t>(seen | ((all & ~kLowBits) != 0 ? 2 : 0));
@@ -64,14 +64,14 @@ Value Load(const uint8_t* item)
     return value;
 }
 
-// The values as bytes; 2 stands for every one that is neither 0 nor 1.
+// The values as bytes, with 2 for every value that is neither 0 nor 1.
 template <class Value>
 void Narrow(const uint8_t* item, std::ptrdiff_t stride, size_t numRows, uint8_t* bytes)
 {
     const auto narrowed = [](Value value) {
         return static_cast<uint8_t>(value == Value(0) ? 0 : (value == Value(1) ? 1 : 2));
     };
-    if (stride == sizeof(Value)) { // which the compiler has vectors for
+    if (stride == sizeof(Value)) { // the compiler can vectorise this loop
         for (size_t row = 0; row < numRows; ++row)
             bytes[row] = narrowed(Load<Value>(item + row * sizeof(Value)));
         return;

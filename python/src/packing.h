@@ -1,5 +1,5 @@
-// Values that lie a byte each, or wider, in arrays, packed into bits and back. Bit r of a packed
-// word is row r of its 64 rows, on every machine.
+// Packs values of a byte or more each into bits, and back. Bit r of a packed word is row r of its
+// 64 rows, on every machine.
 #ifndef BOOLEQ_PYTHON_PACKING_H
 #define BOOLEQ_PYTHON_PACKING_H
 
@@ -8,27 +8,27 @@
 
 namespace booleq_python {
 
-// How a value lies in memory, in this machine's order.
+// The format of a value in memory, in this machine's byte order.
 enum class ItemKind : uint8_t { Byte, Word16, Word32, Word64, Float32, Float64 };
 
-// Values of one input, each 0 or 1; they need not be aligned.
+// The values of one input, each 0 or 1; they need not be aligned.
 struct ValueColumn {
     const uint8_t* data;
     std::ptrdiff_t stride; // in bytes
     ItemKind kind;
 };
 
-// Packs rows 'first' to first + numRows - 1; bits of the last word beyond them are 0.
-// Fails: false, for another value than 0 and 1; the words are then of no use.
+// Packs rows 'first' to first + numRows - 1; bits of the last word beyond these rows are 0.
+// Fails: false for a value other than 0 and 1; the words are then meaningless.
 bool PackColumn(const ValueColumn& column, size_t first, size_t numRows, uint64_t* words);
 
-// The value in row 'row' is neither 0 nor 1.
+// Whether the value in row 'row' is neither 0 nor 1.
 bool IsFault(const ValueColumn& column, size_t row);
 
-// Bytes that lie row by row, the columns of a row side by side.
+// Bytes stored row by row, the columns of a row side by side.
 struct ByteRows {
     const uint8_t* data;
-    size_t numRows; // of the whole array: nothing beyond it is read
+    size_t numRows; // of the whole array: nothing after them is read
     size_t numColumns;
     std::ptrdiff_t rowStride; // in bytes, numColumns or more
 };

@@ -1,4 +1,4 @@
-// What is decided, counted and matched.
+// Decisions, counts and matches.
 #include <algorithm>
 #include <set>
 #include <stdexcept>
@@ -34,7 +34,7 @@ kq_logic::Limits LimitsOf(double seconds)
     throw py::error_already_set();
 }
 
-// None, or the pairs of inputs and values where the answer is different, and both sides there.
+// None, or an assignment of the inputs for which the sides differ, and the values of both sides.
 py::object Differing(const kq_logic::Decision& decision)
 {
     if (decision.verdict == kq_logic::Verdict::Undecided)
@@ -60,7 +60,7 @@ py::object FindDifference(const py::object& self, const py::object& other, doubl
     }));
 }
 
-// Where the equation has another value than this one.
+// An assignment for which the equation does not have this value.
 py::object FindOther(const py::object& self, bool value, double seconds)
 {
     const SharedContent content = Own(self).Shared();
@@ -113,7 +113,7 @@ py::tuple Support(const py::object& self)
 }
 
 struct Counted {
-    uint64_t numOnes = 0; // over the inputs that the text names
+    uint64_t numOnes = 0; // over the inputs in the text
     size_t numIdle = 0;   // the other inputs
 };
 
@@ -148,7 +148,8 @@ py::tuple CountOnes(const py::object& self)
     return py::make_tuple(counted.numOnes, counted.numIdle);
 }
 
-// None without a match; otherwise whether it takes inversions, the pairs, and the output's.
+// None without a match; otherwise whether it needs inversions, the pairs, and whether the output is
+// inverted.
 py::object Match(const py::object& self, const py::object& other, const py::object& hasOrderOnly,
                  double seconds)
 {

@@ -1,4 +1,4 @@
-// Trees, maps, explanations and what lint finds, as the plain values of _results.py.
+// Trees, maps, explanations and lint findings, as the plain values of _results.py.
 #include <string>
 #include <vector>
 
@@ -21,7 +21,7 @@ namespace {
 
 using namespace pybind11::literals; // "name"_a
 
-constexpr size_t kMaxMapInputs = 6; // more are too many to look at
+constexpr size_t kMaxMapInputs = 6; // more are too many to read
 
 py::object Link(size_t index)
 {
@@ -59,7 +59,7 @@ py::str TreeDot(const py::object& self)
     }));
 }
 
-// The text, or None where it is empty.
+// The text, or None if it is empty.
 py::object OrNone(const std::string& text)
 {
     if (text.empty())

@@ -1,6 +1,6 @@
-// Bytes that lie row by row, packed 64 rows at a time: first each row to bits, 8 columns to a byte,
-// then the bytes of 64 rows to a word for each column. Four columns side by side are turned as
-// bytes.
+// Packs bytes stored row by row, 64 rows at a time: first each row to bits, 8 columns to a byte,
+// then the bytes of 64 rows to a word for each column. Four adjacent columns are transposed as
+// bytes instead.
 #include "packing.h"
 
 #include <algorithm>
@@ -18,7 +18,7 @@ namespace booleq_python {
 namespace {
 
 constexpr size_t kWordRows = 64;
-constexpr size_t kMaxLoad = 16; // bytes that are read of a row at once
+constexpr size_t kMaxLoad = 16; // bytes read from a row at once
 
 __m128i Load(const uint8_t* bytes)
 {
@@ -31,7 +31,7 @@ unsigned int LowBits(__m128i bytes)
     return static_cast<unsigned int>(_mm_movemask_epi8(_mm_slli_epi16(bytes, 7)));
 }
 
-// Bit c of byte r is the value of column c in row r: 64 rows.
+// Bit c of byte r is the value of column c in row r, for 64 rows.
 struct alignas(16) RowBits {
     uint8_t bytes[kWordRows];
 };
@@ -49,12 +49,12 @@ void TakeColumns(const RowBits& bits, size_t numColumns, uint64_t* words, size_t
                 word = word << 16 | static_cast<unsigned int>(_mm_movemask_epi8(rows[part]));
             words[column * wordStride] = word;
         }
-        for (__m128i& part : rows) // what comes in from the byte below never gets to the top
+        for (__m128i& part : rows) // bits that come in from the byte below never reach the top
             part = _mm_slli_epi16(part, 1);
     }
 }
 
-// 64 rows of up to 16 columns, of which 16 bytes may be read each.
+// Packs 64 rows of up to 16 columns; 16 bytes of each row must be readable.
 void PackWide(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uint64_t* words,
               size_t wordStride, __m128i& seen)
 {
@@ -71,7 +71,7 @@ void PackWide(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uin
     TakeColumns(upper, numColumns - 8, words + 8 * wordStride, wordStride);
 }
 
-// 64 rows of up to 8 columns, of which 8 bytes may be read each.
+// Packs 64 rows of up to 8 columns; 8 bytes of each row must be readable.
 void PackNarrow(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, uint64_t* words,
                 size_t wordStride, __m128i& seen)
 {
@@ -88,7 +88,7 @@ void PackNarrow(const uint8_t* rows, std::ptrdiff_t stride, size_t numColumns, u
     TakeColumns(bits, numColumns, words, wordStride);
 }
 
-// 64 rows of 4 columns without gaps.
+// Packs 64 rows of 4 columns without gaps.
 void PackFour(const uint8_t* rows, uint64_t* words, size_t wordStride, __m128i& seen)
 {
     uint64_t packed[4] = {0, 0, 0, 0};
@@ -96,8 +96,8 @@ void PackFour(const uint8_t* rows, uint64_t* words, size_t wordStride, __m128i& 
         __m128i bytes[4] = {Load(rows), Load(rows + 16), Load(rows + 32), Load(rows + 48)};
         seen = _mm_or_si128(
             seen, _mm_or_si128(_mm_or_si128(bytes[0], bytes[1]), _mm_or_si128(bytes[2], bytes[3])));
-        // The number of a byte is four bits of its row and two of its column. Each step puts the
-        // highest bit last, so that in the end those of the column come first.
+        // The number of a byte consists of four bits of its row and two of its column. Each step
+        // moves the highest bit to the end, so that finally the column's bits come first.
         for (unsigned int step = 0; step < 4; ++step) {
             const __m128i next[4] = {
                 _mm_unpacklo_epi8(bytes[0], bytes[2]), _mm_unpackhi_epi8(bytes[0], bytes[2]),
@@ -111,7 +111,7 @@ void PackFour(const uint8_t* rows, uint64_t* words, size_t wordStride, __m128i& 
         words[column * wordStride] = packed[column];
 }
 
-// Whether the first 'numColumns' bytes are 0 and 1.
+// Whether the first 'numColumns' bytes are only 0 and 1.
 bool AreBits(__m128i seen, size_t numColumns)
 {
     uint8_t bytes[16];

@@ -1,4 +1,4 @@
-// How equations are written, as texts and init values, and read from other notations.
+// Writes equations as texts and init values, and reads other notations.
 #include <algorithm>
 #include <string>
 #include <vector>
@@ -56,21 +56,22 @@ py::str Render(const py::object& self, const py::object& syntax, const py::objec
                           "'; there are primary, alt1, alt2, alt3, expression");
 }
 
-// The text, unless the equation is another one once its blanks are what the library makes them:
-// then one with the parentheses that it needs.
+// The text, unless it would be a different equation with the blanks that the library writes; then a
+// text with the parentheses that it needs.
 std::string ReadableText(const Content& content, const std::string& text,
                          const booleq::Reading& reading)
 {
     const std::string typed = booleq::ToStd(content.equation.GetEquation(true));
     Kq_BoolEquation again;
     if (booleq::SetFromText(again, typed, reading) && again == content.equation)
-        return text.size() > 2 && text[0] == '0' ? "(" + text + ")"
-                                                 : text; // or it is an init value
+        // A text of three or more characters that begins with 0 would be read as an init value.
+        return text.size() > 2 && text[0] == '0' ? "(" + text + ")" : text;
     return WriteOwn(booleq::ToExpression(content.equation), booleq::OwnSyntax::AsTyped,
                     booleq::Parentheses::Clear);
 }
 
-// Digits of the rows as a str, the highest row first, without a second copy: 30 inputs have 2^30.
+// The digits of the rows as a str, the highest row first, without a second copy: 30 inputs have
+// 2^30 rows.
 py::str Digits(const booleq::Rows& rows, const std::string& prefix, unsigned int rowsPerDigit)
 {
     static constexpr char kDigits[] = "0123456789abcdef";
@@ -84,7 +85,7 @@ py::str Digits(const booleq::Rows& rows, const std::string& prefix, unsigned int
     digit = std::copy(prefix.begin(), prefix.end(), digit);
     const unsigned int mask = (1u << rowsPerDigit) - 1;
     const uint64_t* const words = rows.Words();
-    FreelyIf(numRows > 4096, [&] { // nobody else has the str yet
+    FreelyIf(numRows > 4096, [&] { // no other code has the str yet
         for (size_t row = numRows; row > 0;) {
             const size_t chunk = std::min<size_t>(row, 65536);
             for (const size_t end = row - chunk; row > end;) {
@@ -133,7 +134,7 @@ py::str Str(const py::object& self)
     return Decode(Run(equation.GetLength(), write));
 }
 
-// An int as the digits of all rows.
+// An int as a text with the digits of all rows.
 py::str DigitsOf(const py::object& value, size_t numInputs)
 {
     if (numInputs == 0)
@@ -195,7 +196,7 @@ constexpr Reader kReaders[] = {{"verilog", booleq::VerilogNotation},
                                {"python", booleq::PythonNotation},
                                {"liberty", booleq::LibertyNotation}};
 
-// Another notation's text as one of ours over its names.
+// Rewrites a text of another notation in ours, over the same names.
 py::str FromNotation(const std::string& notation, const py::object& given)
 {
     const py::str text = RequireStr(given, "text");
@@ -225,7 +226,7 @@ py::str FromNotation(const std::string& notation, const py::object& given)
     throw py::value_error("there is no reader for " + booleq::Excerpt(notation));
 }
 
-// The short form in place of the equation.
+// The short form of the equation, as an equation.
 Kq_BoolEquation Shortened(const Equation& equation)
 {
     const kq_logic::Function function = FunctionOf(equation);

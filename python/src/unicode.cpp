@@ -6,7 +6,7 @@ namespace booleq_python {
 
 namespace {
 
-// How many bytes Encode makes of a character.
+// The number of bytes that Encode makes of a character.
 size_t NumBytes(Py_UCS4 character)
 {
     const bool standsForByte = character >= 0xdc80 && character <= 0xdcff;
@@ -125,7 +125,7 @@ Span InCharacters(const py::str& text, const Span& inBytes)
     const Py_ssize_t size = PyUnicode_GET_LENGTH(text.ptr());
     const size_t endInBytes = inBytes.offset + inBytes.length;
     Span span = {0, 0};
-    size_t position = 0; // of the character, in bytes
+    size_t position = 0; // of the current character, in bytes
     for (Py_ssize_t index = 0; index < size; ++index) {
         const size_t next = position + NumBytes(PyUnicode_READ(kind, data, index));
         if (next <= inBytes.offset)

@@ -1,5 +1,5 @@
-// Between str and the bytes that the library reads: UTF-8, every byte that is none as a lone
-// surrogate, so that each byte string has a str and back.
+// Converts between str and the bytes that the library reads: UTF-8, with a lone surrogate for every
+// byte that is not valid, so that each byte string has a str and converts back to itself.
 #ifndef BOOLEQ_PYTHON_UNICODE_H
 #define BOOLEQ_PYTHON_UNICODE_H
 
@@ -13,14 +13,14 @@ namespace booleq_python {
 
 namespace py = pybind11;
 
-// Fails: UnicodeEncodeError for a surrogate that stands for no byte.
+// Fails: UnicodeEncodeError for a surrogate that does not stand for a byte.
 std::string Encode(const py::str& text);
 py::str Decode(const std::string& bytes);
-// What Decode makes of its bytes; null for a surrogate that stands for no byte.
+// What Decode makes of the text's bytes; null for a surrogate that does not stand for a byte.
 py::object SameInBytes(const py::str& text);
-// Any object for a message, not too long, a name as it is, others as repr.
+// Any object as a message shows it, shortened: a str as it is, others as their repr.
 std::string Shown(const py::handle& value);
-// The same with quotes around a str, as Python's own messages show values.
+// The same with quotes around a str, as in Python's own messages.
 std::string ShownValue(const py::handle& value);
 std::string TypeName(const py::handle& value);
 py::tuple DecodeAll(const std::vector<std::string>& names);
@@ -30,11 +30,11 @@ py::str RequireStr(const py::handle& value, const char* what);
 // Fails: TypeError that begins with 'what'.
 bool RequireFlag(const py::handle& value, const char* what);
 // The names of an iterable.  Fails: TypeError for a str, which would be taken letter by letter, for
-// what is not an iterable, and for an element that is not a str.
+// an object that is not iterable, and for an element that is not a str.
 py::tuple RequireNames(const py::object& names);
 std::vector<std::string> EncodeAll(const py::tuple& names);
 
-// A place in bytes as one in characters: all that have a byte there.
+// Converts a place in bytes to one in characters: all characters that have a byte there.
 struct Span {
     size_t offset;
     size_t length;

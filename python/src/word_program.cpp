@@ -10,7 +10,7 @@ namespace {
 using booleq::Expression;
 using booleq::Operator;
 
-// How many columns each node needs at once besides the inputs' own.
+// How many columns each node needs at once, in addition to the inputs'.
 std::vector<uint32_t> Needs(const Expression& expression)
 {
     std::vector<uint32_t> needs;
@@ -33,7 +33,7 @@ template <class Combine>
 void Apply(uint64_t* target, const uint64_t* left, const uint64_t* right, size_t numWords,
            const Combine& combine)
 {
-    if (numWords == kBlockWords) { // a constant that the compiler has vectors for
+    if (numWords == kBlockWords) { // a constant, so the compiler can vectorise the loop
         for (size_t word = 0; word < kBlockWords; ++word)
             target[word] = combine(left[word], right[word]);
         return;
@@ -72,7 +72,7 @@ WordProgram::WordProgram(const Expression& expression) : m_num_inputs(expression
         if (hasOperands && !visit.hasOperands) {
             pending.push_back({visit.node, true});
             const bool isLeftFirst = !isBinary || needs[node.left] >= needs[node.right];
-            if (isBinary) // what is pushed last comes first
+            if (isBinary) // the one pushed last is visited first
                 pending.push_back({isLeftFirst ? node.right : node.left, false});
             pending.push_back({isLeftFirst ? node.left : node.right, false});
             continue;
@@ -138,7 +138,7 @@ const uint64_t* WordProgram::Run(uint64_t* block, size_t numWords) const
 
 namespace {
 
-// Appends the function of 'rows' over its own inputs, the first of which is input 'first'. At most
+// Appends the function of 'rows', whose first input is input 'first' of the expression. At most
 // kMaxExpandedInputs deep. NOLINTNEXTLINE(misc-no-recursion)
 uint32_t Expand(const booleq::Rows& rows, uint32_t first, Expression& expression)
 {

@@ -1,8 +1,8 @@
 // An expression as steps over blocks of packed rows. In: an expression, or the rows of a function;
 // out: the results of up to 64 words of rows at a time.  Fails: std::bad_alloc only.
-// Cost: in step with the operators; what waits for its operator is kept small by working on the
-// operand first that needs more room (Sethi and Ullman, "The Generation of Optimal Code for
-// Arithmetic Expressions", J. ACM 17(4), 1970), so its depth does not count.
+// Cost: linear in the operators. Few operands wait for their operator, because the operand that
+// needs more room is computed first (Sethi and Ullman, "The Generation of Optimal Code for
+// Arithmetic Expressions", J. ACM 17(4), 1970), so depth does not matter.
 #ifndef BOOLEQ_PYTHON_WORD_PROGRAM_H
 #define BOOLEQ_PYTHON_WORD_PROGRAM_H
 
@@ -18,15 +18,16 @@ namespace booleq_python {
 constexpr size_t kBlockWords = 64;
 constexpr size_t kBlockRows = 64 * kBlockWords;
 
-// Threads: any number at once, each with a block of its own.
+// Threads: any number at once, each with its own block.
 class WordProgram {
   public:
     // Requires: the expression has a node.
     explicit WordProgram(const booleq::Expression& expression);
 
-    // Words of a block: the inputs' columns first, kBlockWords to each, then what is worked with.
+    // Words of a block: the inputs' columns first, kBlockWords each, then the working columns.
     size_t BlockSize() const { return kBlockWords * (m_num_inputs + m_num_slots); }
-    // The results of the first 'numWords' words of each column; the pointer is into the block.
+    // Computes the first 'numWords' words of each column. The pointer to the results is into the
+    // block.
     const uint64_t* Run(uint64_t* block, size_t numWords) const;
 
   private:
@@ -43,7 +44,8 @@ class WordProgram {
     std::vector<Step> m_steps;
 };
 
-// The function of the rows, in which an input decides between what is left of them.
+// The function of the rows as an expression, in which each input in turn selects a half of the
+// rows.
 // Requires: at most kMaxExpandedInputs inputs.
 constexpr unsigned int kMaxExpandedInputs = 8;
 booleq::Expression Expanded(const booleq::Rows& rows);

@@ -3,8 +3,9 @@
 
 usage: check_pip.py ROOT VERSION
 
-Two ways: 'pip install ROOT', and a wheel, which must be the same bytes each time. What is installed
-must not depend on the tree that it was built in. A source distribution must hold what it takes.
+Two ways: 'pip install ROOT', and a wheel, which must have the same bytes each time. The
+installation must not depend on the tree in which it was built. A source distribution must hold all
+that building takes.
 """
 import hashlib
 import os
@@ -39,7 +40,7 @@ print("fine")
 
 
 def without_network() -> List[str]:
-    """The start of a command that is cut off, where this user may do that."""
+    """The start of a command that runs without the network, if this user may do that."""
     for command in (["unshare", "-n"], ["unshare", "-r", "-n"]):
         if subprocess.run([*command, "true"], stderr=subprocess.DEVNULL,
                           check=False).returncode == 0:
@@ -75,7 +76,7 @@ def check_wheel(path: Path, root: Path) -> None:
         metadata = wheel.read(f"{info}/METADATA").decode()
         assert "\nRequires-Dist: numpy" in metadata and "\nLicense: MIT\n" in metadata
         own = wheel.read(f"{info}/LICENSE").decode()
-        solver = wheel.read(f"{info}/LICENSE.cadical").decode() # its code is linked in statically
+        solver = wheel.read(f"{info}/LICENSE.cadical").decode() # its code is linked statically
         assert "\nLicense-File: LICENSE\nLicense-File: LICENSE.cadical\n" in metadata
         assert "\nCopyright 2016-2021 Armin Biere, Johannes Kepler University Linz" in solver
         assert solver.count("\nCopyright ") == 4 and "(c)" not in solver

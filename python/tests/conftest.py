@@ -1,4 +1,4 @@
-"""What the tests share."""
+"""Fixtures that the tests share."""
 import concurrent.futures
 import random
 import time
@@ -28,7 +28,7 @@ def parity_of_products() -> Callable[[int, int], str]:
 
 @pytest.fixture
 def longest_pause() -> Callable[[Callable[[], object]], float]:
-    """How long this thread stood still, at most, in seconds while another one did the work."""
+    """The longest time in seconds that this thread was blocked while another one did the work."""
 
     def measure(work: Callable[[], object]) -> float:
         with concurrent.futures.ThreadPoolExecutor(1) as other:

@@ -1,4 +1,4 @@
-"""What users get wrong, each an error that mypy must report: a test of the types, never run.
+"""Users' mistakes, each an error that mypy must report: a test of the types, never run.
 
 mypy runs with warn_unused_ignores, so an error that is not reported fails as well.
 """
@@ -24,7 +24,7 @@ eq < 3  # type: ignore[operator]
 eq.render("verilog")  # type: ignore[arg-type]
 eq.convert("html")  # type: ignore[arg-type]
 eq.convert()  # type: ignore[call-arg]
-eq.hex_init  # a method without a call is not an error of types
+eq.hex_init  # a method without a call is not a type error
 int(eq.hex_init)  # type: ignore[call-overload]
 eq.cofactor(A="0")  # type: ignore[arg-type]
 eq.compose(A=None)  # type: ignore[arg-type]

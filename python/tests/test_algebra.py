@@ -1,4 +1,4 @@
-"""Equations made of equations, and exact questions: against columns of all rows, and SymPy."""
+"""Equations made from equations, and exact questions, against columns of all rows and SymPy."""
 import functools
 import itertools
 import operator
@@ -19,7 +19,7 @@ sympy: Any = sympy_module
 
 @st.composite
 def equations(draw: st.DrawFn, max_inputs: int = 4) -> Equation:
-    """Of a text, or an init value over some names."""
+    """From a text, or an init value over some names."""
     if draw(st.booleans()):
         return Equation(draw(trees.texts(draw(trees.trees(max_inputs=max_inputs)))))
     names = draw(st.lists(st.sampled_from(trees.NAMES), min_size=1, max_size=max_inputs,
@@ -118,7 +118,7 @@ def test_compose_cofactor_rename(data: st.DataObject) -> None:
     assert renamed.rename({new: old for old, new in new_names.items()}).equivalent(equation)
 
 
-#: Legal names that a text reads as a name and more, so that they only stand in lists of inputs.
+#: Legal names that a text reads as a name and more, so they occur only in lists of inputs.
 split_names = st.builds("'{}'{}".format, st.sampled_from(["a", "b", "x y"]),
                         st.text("+~&|^()b' 1", min_size=1, max_size=4)) \
     .filter(lambda name: not name[1:].endswith("'") or name.count("'") != 2)
@@ -126,7 +126,7 @@ split_names = st.builds("'{}'{}".format, st.sampled_from(["a", "b", "x y"]),
 
 @st.composite
 def equations_over_split_names(draw: st.DrawFn) -> Equation:
-    """Of a text, or an init value that stands for what its names say."""
+    """From a text, or an init value whose split names stand for expressions."""
     names = draw(st.permutations(["A", "b", "'a'"]))[:draw(st.integers(0, 3))]
     names += draw(st.lists(split_names, min_size=1, max_size=2, unique=True))
     names = draw(st.permutations(names))
@@ -135,7 +135,7 @@ def equations_over_split_names(draw: st.DrawFn) -> Equation:
             return Equation(draw(st.sampled_from(["A & b", "A", "1", "b ^ 'a' | A", "~'a'"])), names)
         return Equation.from_init(draw(st.integers(0, 2 ** 2 ** len(names) - 1)), names)
     except ParseError:
-        reject() # of the expression that it stands for, 'a'~ & b
+        reject() # the expression that it stands for is refused: 'a'~ & b
 
 
 @examples(200)

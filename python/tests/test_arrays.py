@@ -19,7 +19,7 @@ def all_rows(num_inputs: int) -> npt.NDArray[np.uint8]:
 
 
 def chain(num_inputs: int) -> str:
-    """An equation in which the order of inputs and the grouping count."""
+    """An equation for which the order of inputs and the grouping matter."""
     return " ".join(f"x{k} {'&|^'[k % 3]}" for k in range(num_inputs - 1)) + f" ~x{num_inputs - 1}"
 
 
@@ -216,14 +216,14 @@ class TestMemory:
 @pytest.mark.parametrize("gap", [0, 1, 3])
 @pytest.mark.parametrize("num_inputs", [1, 2, 3, 4, 5, 7, 8, 9, 15, 16, 17, 24, 25, 33])
 def test_rows_of_bytes(num_inputs: int, gap: int) -> None:
-    """Rows with and without gaps, whole words of them and some more, up to the end of memory."""
+    """Rows with and without gaps, in whole words and a few more, up to the end of the memory."""
     generator = np.random.default_rng(num_inputs)
     names = [f"x{k}" for k in range(num_inputs)]
     equation = Equation(" ^ ".join(f"({name} & {names[(7 * k + 1) % num_inputs]})"
                                    for k, name in enumerate(names)) + " ^ x0", names)
     for num_rows in (1, 15, 16, 63, 64, 65, 127, 128, 200, 70_001):
         wide = generator.integers(0, 2, (num_rows, num_inputs + gap), dtype=np.uint8)
-        wide[:, num_inputs:] = 7  # nobody's
+        wide[:, num_inputs:] = 7  # gaps, which must not be read
         rows = wide[:, :num_inputs]
         products = rows & rows[:, (7 * np.arange(num_inputs) + 1) % num_inputs]
         expected = np.bitwise_xor.reduce(products, axis=1) ^ rows[:, 0]

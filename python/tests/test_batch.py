@@ -1,4 +1,4 @@
-"""Tables of functions completed: booleq.batch beside the tool's command, and what tables may be."""
+"""Completed tables of functions: booleq.batch against the tool's command; what tables may be."""
 import json
 import random
 import subprocess

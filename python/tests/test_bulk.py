@@ -1,4 +1,4 @@
-"""Equations by the thousand: booleq.equations and from_inits, beside one made alone."""
+"""Equations by the thousand: booleq.equations and from_inits, against equations made one by one."""
 import gc
 import random
 import threading
@@ -40,7 +40,7 @@ def test_equal_texts_are_one_object() -> None:
 
 
 def test_texts_are_read_without_the_inputs_of_others() -> None:
-    """Over the inputs of the text before it, this one would be an init value."""
+    """Over the inputs of the text before it, this text would be an init value."""
     with pytest.raises(ParseError) as caught:
         booleq.equations(["A & B", "0x8"])
     with pytest.raises(ParseError) as alone:
@@ -70,7 +70,7 @@ def test_what_texts_may_be() -> None:
 
 
 def test_a_list_that_changes_meanwhile() -> None:
-    """What is read is what was there at the call, whatever another thread does to the list."""
+    """The texts at the time of the call are read, whatever another thread does to the list."""
     texts = [f"a{k} & b" for k in range(50_000)]
     expected = list(texts)
     done = threading.Event()
@@ -109,7 +109,7 @@ def test_init_values_of_more_inputs_than_arrays_have() -> None:
 
 
 def test_init_values_over_names_that_are_not_one_token() -> None:
-    """Such a name is read as the expression that it is, so each value is."""
+    """Such a name is read as an expression, so each value is one, too."""
     names = ["'a'+b", "c"]
     for eq, value in zip(LutArray([1, 6, 9], 2).equations(names), (1, 6, 9)):
         assert eq.hex_init() == Equation.from_init(value, names).hex_init()
@@ -117,7 +117,7 @@ def test_init_values_over_names_that_are_not_one_token() -> None:
 
 
 def bytes_each(make: Callable[[], List[Equation]]) -> float:
-    make()  # names stay
+    make()  # so that the names exist already
     gc.collect()
     before = resident_bytes()
     made = make()

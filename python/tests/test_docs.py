@@ -1,4 +1,4 @@
-"""Docstrings: every member has one, their examples are true, signatures can be read."""
+"""Docstrings: every member has one, their examples are true, and signatures can be read."""
 import doctest
 import inspect
 from typing import Any, List

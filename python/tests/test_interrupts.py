@@ -1,4 +1,4 @@
-"""Long calls end by an interrupt, and what they worked on stays usable."""
+"""An interrupt ends long calls, and what they worked on stays usable."""
 import signal
 import subprocess
 import sys
@@ -12,7 +12,7 @@ import pytest
 from booleq import Equation, LutArray
 
 SECONDS_BEFORE = 0.2
-SECONDS_AFTER = 0.5  # on a loaded machine; it is some hundredths as a rule
+SECONDS_AFTER = 0.5  # for a loaded machine; usually it is a few hundredths
 
 Products = Callable[[int, int], str]
 
@@ -74,7 +74,7 @@ def test_eval_many_by_the_column(parity_of_products: Products) -> None:
 
 
 def test_equivalent() -> None:
-    # No thirteen pigeons fit into twelve holes, each alone: solvers take hours to see it.
+    # Thirteen pigeons do not fit into twelve holes, one in each: solvers take hours to prove it.
     pigeons, holes = range(13), range(12)
     everyone = " & ".join("(" + " | ".join(f"p{p}_{h}" for h in holes) + ")" for p in pigeons)
     alone = " & ".join(f"~(p{p}_{h} & p{q}_{h})" for h in holes for p in pigeons for q in range(p))
@@ -88,7 +88,7 @@ def test_equivalent() -> None:
 def test_explain() -> None:
     bits = np.random.default_rng(1).integers(0, 2, 2 ** 16)
     equation = Equation.from_init(int("".join(map(str, bits)), 2), [f"x{k}" for k in range(16)])
-    interrupted(equation.explain, before=0.01)  # of some 0.2 s: nothing takes it longer
+    interrupted(equation.explain, before=0.01)  # of about 0.2 s: no function takes longer
     check_usable(equation)
     assert Equation("A & B").explain().kind == "AND"
 
@@ -107,7 +107,7 @@ def test_tree() -> None:
 
 
 def test_an_interrupt_from_outside() -> None:
-    """As a terminal does it: another process sends the signal."""
+    """As from a terminal: another process sends the signal."""
     script = """
 import random, sys
 from booleq import Equation, LutArray
@@ -171,12 +171,12 @@ LONG_STEPS: Mapping[str, Callable[[], object]] = {
 
 @pytest.mark.parametrize("name", LONG_STEPS)
 def test_checks_are_not_far_apart(name: str) -> None:
-    """Between two of them this thread never works for as long as somebody would notice."""
+    """Between two checks this thread never works so long that a user would notice."""
     longest = last = 0.0
 
     def check(number: int, frame: Optional[FrameType]) -> None:
         nonlocal longest, last
-        now = time.thread_time()  # whatever else the machine does
+        now = time.thread_time()  # processor time, so that a busy machine does not matter
         longest, last = max(longest, now - last), now
 
     old = signal.signal(signal.SIGALRM, check)

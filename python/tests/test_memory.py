@@ -1,5 +1,5 @@
-"""Nothing is kept that nobody holds: memory of the process and reference counts over many cycles,
-arrays that outlive their equation, callbacks that fail or come back in.
+"""Nothing unused is kept: memory of the process and reference counts over many cycles, arrays that
+outlive their equation, callbacks that fail or re-enter.
 
 tracemalloc does not see what C++ allocates, so the process itself is measured. Names are the same in
 each cycle: the library keeps a name for the life of the process.
@@ -23,10 +23,11 @@ from booleq import Equation, LutArray, ParseError
 TEXT = "(a & b | c) ^ ~(d ~& 'e[0]') .NOR. (f & g)"
 NAMES = ["a", "b", "c", "d", "'e[0]'", "f", "g"]
 ROWS = np.zeros((200, 7), np.uint8)
-# The smallest leak is a reference: an object of some 50 bytes a cycle. Some pages are noise.
+# The smallest leak is a reference: an object of some 50 bytes for each cycle. A few pages are
+# noise.
 NUM_CYCLES = 8000
 MAX_GROWTH = 32 * NUM_CYCLES
-BLOCK_SIZE = 48  # of Python's allocator, at least, for an object with a reference
+BLOCK_SIZE = 48  # the least that Python's allocator uses for an object with a reference
 
 
 def resident_bytes() -> int:
@@ -35,8 +36,8 @@ def resident_bytes() -> int:
 
 
 def growth(cycle: Callable[[], object], num_cycles: int) -> int:
-    """How much the process has grown over so many cycles, the first ones not counted. Python's own
-    blocks may lie in pages that the process had before, so they count by their number as well."""
+    """How much the process has grown over so many cycles, not counting the first ones. Python's own
+    blocks may be in pages that the process had before, so their number counts as well."""
     trim = getattr(ctypes.CDLL(None), "malloc_trim", lambda _: 0)
 
     def measure() -> Tuple[int, int]:
@@ -61,7 +62,7 @@ def refused(action: Callable[[], object], error: Any) -> None:
 
 
 class Broken(Mapping[str, int]):
-    """A mapping that fails when it is asked."""
+    """A mapping that fails when it is used."""
 
     def __getitem__(self, name: str) -> int:
         raise ZeroDivisionError(name)
@@ -143,11 +144,11 @@ def test_no_cycle_leaves_anything(name: str) -> None:
 
 @pytest.mark.parametrize("name", SLOW_CYCLES)
 def test_no_slow_cycle_leaves_anything(name: str) -> None:
-    assert growth(SLOW_CYCLES[name], 400) < 2 ** 17  # some pages
+    assert growth(SLOW_CYCLES[name], 400) < 2 ** 17  # a few pages
 
 
 def test_a_leak_would_be_found() -> None:
-    """One equation a cycle, and a packed column of two words, are more than the bound."""
+    """One equation for each cycle, or a packed column of two words, is more than the bound."""
     kept: List[object] = []
     assert growth(lambda: kept.append(Equation(TEXT)), NUM_CYCLES) > MAX_GROWTH
     column: List[object] = []
@@ -171,7 +172,7 @@ QUESTIONS: Mapping[str, Callable[[Equation], object]] = {
 
 @pytest.mark.parametrize("name", QUESTIONS)
 def test_no_question_makes_the_tree_of_an_init_value(name: str) -> None:
-    """Of 16 inputs it has a million nodes, which stay as long as the equation."""
+    """For 16 inputs it has a million nodes, which stay as long as the equation."""
     value = int.from_bytes(np.random.default_rng(1).bytes(2 ** 13), "little")
     QUESTIONS[name](Equation.from_init(value ^ 1, WIDE))
     equation = Equation.from_init(value, WIDE)
@@ -189,7 +190,7 @@ def test_a_tree_would_be_found() -> None:
 
 
 def test_large_columns_go_with_their_arrays() -> None:
-    """8 MB each, by an array, a view of it and an exception that holds neither."""
+    """8 MB each, held by an array and a view of it, but not by an exception."""
     equation = Equation("^".join(f"n{place}" for place in range(26)))
     keep = equation.packed_column()
     before = resident_bytes()
@@ -199,7 +200,7 @@ def test_large_columns_go_with_their_arrays() -> None:
         del array
         assert int(view[1]) == int(keep[2])
         del view
-    assert resident_bytes() - before < 6 * keep.nbytes  # of the twelve some pages may stay
+    assert resident_bytes() - before < 6 * keep.nbytes  # a few pages of the twelve may stay
 
 
 WITHOUT_A_THREAD = """
@@ -217,7 +218,7 @@ except MemoryError:
 
 
 def test_a_thread_that_cannot_start_is_a_memory_error() -> None:
-    """And nobody waits for it when the interpreter ends."""
+    """And the interpreter does not wait for it at its end."""
     done = subprocess.run([sys.executable, "-c", WITHOUT_A_THREAD], stdout=subprocess.PIPE, text=True,
                           timeout=60, check=True)
     assert done.stdout == "no memory\n"
@@ -230,7 +231,7 @@ def test_arrays_outlive_their_equation() -> None:
     alive = weakref.ref(equation)
     del equation
     assert alive() is None
-    for _ in range(1000):  # what was freed is written to again
+    for _ in range(1000):  # freed memory is written to again
         Equation(TEXT).packed_column()
     assert packed.tolist() == [0xfedcba9876543210]
     bits = [0xfedcba9876543210 >> row & 1 for row in range(64)]
@@ -243,7 +244,7 @@ def test_reference_counts_stay() -> None:
     watched: List[Any] = [text, names, *names, array, array.dtype, None, True, Equation, ParseError,
                           np.dtype("uint8"), np.dtype("uint64"), type(EQUATION.explain()), EQUATION,
                           type(INIT.equivalent(INIT)), 1, (), ""]
-    gc.collect()  # what earlier tests left in circles holds some of these
+    gc.collect()  # reference cycles of earlier tests hold some of these
     before = [sys.getrefcount(item) for item in watched]
     num_cycles, no_bit = 500, cast(int, None)
     for _ in range(num_cycles):
@@ -279,7 +280,7 @@ def test_an_exception_holds_no_equation() -> None:
 
 
 class ComesBack:
-    """A value that uses the equation while the equation asks for it."""
+    """A value that uses the equation while the equation reads it."""
 
     def __init__(self, equation: Equation, value: int) -> None:
         self.equation, self.value = equation, value

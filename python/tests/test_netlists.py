@@ -1,4 +1,4 @@
-"""Netlists in Python: what the class gives, and that the tool answers the same of random ones."""
+"""Netlists in Python: what the class gives, and that the tool answers the same for random ones."""
 import copy
 import gzip
 import io
@@ -87,7 +87,7 @@ def names_for(tables: List[Table], last: str = "") -> Dict[int, str]:
 
 @st.composite
 def pairs(draw: st.DrawFn) -> Tuple[str, str]:
-    """A design, and one like it: tables changed, gone, or with another net."""
+    """A design, and a similar one: with tables changed, missing, or on another net."""
     left = draw(designs())
     right = list(left)
     change = draw(st.sampled_from(["none", "rows", "swap", "gone", "name", "pin"]))
@@ -107,7 +107,7 @@ def pairs(draw: st.DrawFn) -> Tuple[str, str]:
 
 
 def tool(*arguments: str) -> Any:
-    """The tool's JSON: an object, or with 'list' an object for each line."""
+    """The tool's JSON: an object, or for 'list' an object for each line."""
     assert TOOL is not None
     done = subprocess.run([TOOL, "netlist", *arguments], env=PLAIN, stdout=subprocess.PIPE,
                           stderr=subprocess.PIPE, timeout=300, check=False)
@@ -346,7 +346,7 @@ def test_an_interrupt_ends_it(tmp_path: pathlib.Path) -> None:
 def test_a_pipe_that_nobody_writes(tmp_path: pathlib.Path) -> None:
     pipe = tmp_path / "pipe"
     os.mkfifo(pipe)
-    with open(os.open(pipe, os.O_RDWR), "wb"):  # it is open, and nothing comes
+    with open(os.open(pipe, os.O_RDWR), "wb"):  # it is open, but nothing is written
         interrupted(lambda: read_netlist(pipe))
 
 
@@ -425,7 +425,7 @@ def test_the_tool_says_the_same_of_two(tmp_path: pathlib.Path) -> None:
 @trees.examples(60)
 @given(designs())
 def test_luts_are_the_tables(tables: List[Table]) -> None:
-    """Row by row, as the file says it."""
+    """Row by row, as written in the file."""
     netlist = read(write_json(tables, names_for(tables)))
     numbers = {name: net for net, name in names_for(tables).items()}
     for width in netlist.widths:

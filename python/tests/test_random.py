@@ -1,5 +1,5 @@
 """Random equations: every answer of an Equation against SymPy's functions of the same trees, and
-against answers of its own that must agree."""
+against its own other answers, which must agree."""
 import copy
 import itertools
 import pickle
@@ -23,12 +23,12 @@ INTEGERS = ("bool", "int8", "uint8", "int16", "uint16", "int32", "uint32", "int6
 
 
 def number_of(column: npt.NDArray[np.uint8]) -> int:
-    """Row k as bit k."""
+    """The number whose bit k is row k."""
     return sum(int(value) << row for row, value in enumerate(column))
 
 
 def as_listed(text: str) -> str:
-    """The text where inputs are listed: one that begins with 0 would be taken for an init value."""
+    """The text for listed inputs: one that begins with 0 would be taken for an init value."""
     return "(" + text + ")" if text.startswith("0") else text
 
 
@@ -99,7 +99,7 @@ def test_init_values_are_those_of_sympy(data: st.DataObject) -> None:
     num_rows = 2 ** num_inputs
     value = data.draw(st.integers(0, 2 ** num_rows - 1))
     lsb_first = data.draw(st.booleans())
-    # The minterms of the value as SymPy counts them: the first symbol is the most significant.
+    # The minterms of the value as SymPy numbers them: the first symbol is the most significant.
     order = names[::-1] if lsb_first else names
     minterms = [row for row in range(num_rows) if value >> row & 1]
     function = sum_of_products([symbol(name) for name in order], minterms)
@@ -163,7 +163,7 @@ def test_copies_pickles_and_repr(data: st.DataObject) -> None:
 @examples(150)
 @given(st.data())
 def test_equal_equations_have_equal_hashes(data: st.DataObject) -> None:
-    """Equal exactly when the trees are, in types, names and groups."""
+    """Equations are equal exactly when their trees are, in types, names and groups."""
     first, second = (data.draw(trees.trees(names=("A", "b", "'A'"), max_inputs=2))
                      for _ in range(2))
     equations = [Equation(data.draw(trees.texts(tree)))
@@ -233,7 +233,7 @@ def test_permute_and_explain(data: st.DataObject) -> None:
 
 
 def arrays_of(rows: npt.NDArray[np.uint8], kind: str) -> List[npt.NDArray[Any]]:
-    """The rows as arrays of one kind of integer, in every order and with every kind of stride."""
+    """The rows as arrays of one kind of integer, in every byte order and kind of stride."""
     array = rows.astype(kind)
     num_rows, num_columns = array.shape
     wide = np.full((2 * num_rows, 2 * num_columns + 1), 1, dtype=kind)
@@ -241,7 +241,7 @@ def arrays_of(rows: npt.NDArray[np.uint8], kind: str) -> List[npt.NDArray[Any]]:
     backwards = np.ascontiguousarray(array[::-1, ::-1])[::-1, ::-1]
     item = array.dtype.itemsize
     shifted: npt.NDArray[Any] = np.ndarray(array.shape, kind, bytearray(array.nbytes + item + 1), offset=1)
-    shifted[...] = array  # at an address that is not a multiple of anything
+    shifted[...] = array  # at an unaligned address
     frozen = array.copy()
     frozen.flags.writeable = False
     record = np.zeros(num_rows, dtype=[("a", "u1"), ("row", kind, (num_columns,))])
@@ -265,7 +265,7 @@ def test_eval_many_takes_every_array(kind: str, num_inputs: int) -> None:
     for equation in equations:
         for num_rows in (0, 1, 63, 64, 65, 300):
             rows = rng.integers(0, 2, (num_rows, num_inputs), dtype=np.uint8)
-            # A single value of an init value of 16 inputs takes milliseconds.
+            # Evaluating an init value of 16 inputs once takes milliseconds.
             some = rows[:70] if equation is equations[0] else rows[:2]
             expected = np.array([evaluate(equation, row) for row in some], dtype=np.uint8)
             whole = equation.eval_many(rows)
@@ -317,7 +317,7 @@ def test_what_is_too_large_is_refused_before_it_is_made() -> None:
     for question in questions:
         with pytest.raises(ValueError, match="30|24"):
             question()
-    assert many.equivalent(many)  # is decided without rows
+    assert many.equivalent(many)  # this is decided without rows
 
 
 def test_no_equation_without_a_text() -> None:
@@ -330,7 +330,7 @@ def test_no_equation_without_a_text() -> None:
 
 
 def test_threads() -> None:
-    """Several threads make, ask, refuse, pickle and drop equations, shared ones too."""
+    """Several threads make, query, refuse, pickle and drop equations, including shared ones."""
     shared = [Equation.from_init(number * 40503 % 65536, ["A", "B", "C", "D"])
               for number in range(16)]
     columns = [equation.column() for equation in shared]
@@ -358,7 +358,7 @@ def test_threads() -> None:
                     faults.append(f"pickle of {text}")
                 with pytest.raises(ValueError):
                     Equation(f"t{worker}_{step} & &")
-        except Exception as error:  # the thread that started this one reports it
+        except Exception as error:  # reported by the thread that started this one
             faults.append(repr(error))
 
     threads = [threading.Thread(target=work, args=(worker,)) for worker in range(6)]

@@ -1,4 +1,4 @@
-"""eval_many by name, and of what data comes in: pandas, structured and masked arrays, mappings."""
+"""eval_many by name, for all forms of data: pandas, structured and masked arrays, mappings."""
 from typing import Any
 
 import numpy as np
@@ -13,7 +13,7 @@ EXPECTED = np.where(ROWS[:, 0] == 1, ROWS[:, 1], ROWS[:, 2])
 
 
 def frame(dtype: Any = None) -> pd.DataFrame:
-    """Its columns are in another order than the inputs."""
+    """A frame whose columns are in another order than the inputs."""
     table = pd.DataFrame(ROWS[:, ::-1], columns=["B", "A", "S"])
     return table if dtype is None else table.astype(dtype)
 
@@ -148,7 +148,7 @@ class TestLuts:
             2 ** 2 ** num_inputs - 1)
         luts = LutArray(values, num_inputs)
         found = luts.canonical()
-        # Undone by what the arrays say, through the kernels of LutArray alone.
+        # The arrays are enough to undo it, using only the kernels of LutArray.
         turned = luts.permute(found.orders)
         rows = generator.integers(0, 2, (200, num_inputs))
         assert np.array_equal(found.forms.evaluate(rows),

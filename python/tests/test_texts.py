@@ -1,4 +1,4 @@
-"""How equations are made, refused, written, compared and copied."""
+"""Making, refusing, writing, comparing and copying equations."""
 import copy
 import pickle
 from typing import Any, List, Optional
@@ -202,7 +202,7 @@ class TestText:
         assert eval(repr(equation)) == equation
 
     def test_strs_of_the_same_bytes_are_one_name(self) -> None:
-        """Two escaped bytes that together are UTF-8 come back as the character."""
+        """Two escaped bytes that together are valid UTF-8 come back as the character."""
         equation = Equation("A & '\udcc3\udcbc'")
         assert equation.inputs == ("A", "'\u00fc'")
         for name in equation.inputs[1], "'\udcc3\udcbc'":
@@ -361,7 +361,7 @@ class TestEquality:
 
     @pytest.mark.parametrize("text", ["B & A", "A | B", "(A & B)", "A & C", "A & ~B", "(0 & A)"])
     def test_inputs_count(self, text: str) -> None:
-        """Equal equations have equal init values, so a cache may answer for both."""
+        """Equal equations have equal init values, so a cache may use one answer for both."""
         assert Equation(text, ["A", "B", "C"]) != Equation(text, ["C", "B", "A"])
         assert Equation(text, ["A", "B", "C"]) != Equation(text, ["A", "B", "C", "D"])
 

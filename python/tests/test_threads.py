@@ -1,4 +1,4 @@
-"""Threads that work side by side, processes, interpreters, and calls that end by an interrupt."""
+"""Threads that work side by side, processes, interpreters, and calls ended by an interrupt."""
 import multiprocessing
 import os
 import signal
@@ -13,12 +13,12 @@ import numpy as np
 import pytest
 from booleq import Equation, LutArray
 
-SECONDS_AFTER = 0.5  # on a machine that does much else; it is some hundredths as a rule
+SECONDS_AFTER = 0.5  # for a busy machine; usually it is a few hundredths
 HARD = "".join(f"(x{k} & x{(k * 7 + 3) % 20} | x{(k * 5 + 1) % 20}) ^ " for k in range(20)) + "x0"
 
 
 def test_the_lock_is_given_up(longest_pause: Callable[[Callable[[], object]], float]) -> None:
-    """While a column is made, this thread counts on."""
+    """While a column is made, this thread keeps running."""
     equation = Equation(" ^ ".join(f"(x{k} & x{(k * 11 + 5) % 29} & x{(k * 3 + 1) % 29})"
                                    for k in range(29)))
 
@@ -65,7 +65,7 @@ def hexadecimal(equation: Equation) -> str:
 @pytest.mark.parametrize("method", ["fork", "spawn"])
 def test_processes(method: str) -> None:
     equations = [Equation("A & ~B"), Equation("0xca", ["S", "A", "B"])]
-    booleq.equations(["a & b"] * 5000)  # threads that a child does not have
+    booleq.equations(["a & b"] * 5000)  # starts threads that a forked child does not have
     with multiprocessing.get_context(method).Pool(2) as pool:
         assert pool.map(hexadecimal, equations) == ["0x4", "0xca"]
         assert pool.map(len, [booleq.equations(["a"] * 5000)]) == [5000]
@@ -88,7 +88,7 @@ except interpreters.RunFailedError as error:
 
 
 def ended(call: Callable[[], Any], before: float) -> float:
-    """How long after a SIGINT from another thread the call ends."""
+    """How long the call takes to end after a SIGINT from another thread."""
     sent: List[float] = []
 
     def send() -> None:
@@ -100,14 +100,14 @@ def ended(call: Callable[[], Any], before: float) -> float:
     thread.start()
     with pytest.raises(KeyboardInterrupt):
         call()
-        time.sleep(60)  # a call that has ended by itself takes the signal here
+        time.sleep(60)  # if the call has ended by itself, the signal comes here
     after = time.monotonic() - sent[0]
     thread.join()
     return after
 
 
 def test_interrupts_end_what_cannot_be_ended_inside() -> None:
-    """Reading, writing and refusing millions of characters goes on beside, to its end."""
+    """Reading, writing and refusing millions of characters goes on to the end on another thread."""
     text = " & ".join(f"x{k % 1000}" for k in range(3_000_000))
     assert ended(lambda: Equation(text), 0.1) < SECONDS_AFTER
     assert ended(lambda: Equation(text + " &&"), 0.1) < SECONDS_AFTER

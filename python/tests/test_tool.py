@@ -1,4 +1,4 @@
-"""The module and the tool booleq answer alike: many texts, each command once over all of them.
+"""The module and the tool booleq give the same answers: many texts, each command once for all.
 
 The tool is BOOLEQ_TOOL, the one built with the module, or booleq on the PATH; without one the tests
 are skipped.
@@ -21,10 +21,11 @@ from hypothesis import strategies as st
 
 BUILT = pathlib.Path(booleq.__file__).absolute().parents[2] / "tools/booleq/booleq"
 TOOL = os.environ.get("BOOLEQ_TOOL") or shutil.which(str(BUILT)) or shutil.which("booleq")
-# The locale in which the tool shows bytes beyond ASCII as characters, as the module does.
+# The locale in which the tool shows bytes outside ASCII as characters, as the module does.
 PLAIN = {**os.environ, "LC_ALL": "C.UTF-8"}
 LISTED = ["S", "A", "'a,b'", "b"]
-# What a mutation puts into a text: pieces of tokens, characters of one to four bytes, stray bytes.
+# What a mutation inserts into a text: pieces of tokens, characters of one to four bytes, stray
+# bytes.
 PIECES = ["&", "&&", "|", "~", "!", "^", "(", ")", "()", "'", "''", ".", ".XNOR.", ".and.", ".NOT.",
           "0", "1", "2", "0x", "A", " ", "\t", "\r", "[0]", "=", "$", "\u00e4", "\u20ac",
           "\U0001f600", "\udcff", "\udcc3", "\x7f", "\x00", ";", "\ufeff"]
@@ -34,7 +35,7 @@ pytestmark = pytest.mark.skipif(TOOL is None, reason="no tool booleq; BOOLEQ_TOO
 
 
 def collect(strategy: st.SearchStrategy[Item], count: int) -> List[Item]:
-    """So many examples, to be asked about all at once."""
+    """So many examples, for one call with all of them."""
     found: List[Item] = []
 
     @trees.examples(count)
@@ -47,13 +48,13 @@ def collect(strategy: st.SearchStrategy[Item], count: int) -> List[Item]:
 
 
 def is_line(text: str) -> bool:
-    """Whether a file has the text as it is: no comment, no mark, no end of a line of another system."""
+    """Whether a file can hold the text as it is: no comment, byte order mark, foreign line end."""
     return bool(text.strip()) and not text.endswith("\r") and text.lstrip()[0] not in "#\ufeff"
 
 
 def ask(path: pathlib.Path, texts: Sequence[str], command: str,
         *arguments: str) -> List[Dict[str, Any]]:
-    """The tool's object for each text; a text is a line of one file."""
+    """The tool's object for each text; each text is a line of one file."""
     assert TOOL is not None
     path.write_bytes(b"".join(text.encode("utf-8", "surrogateescape") + b"\n" for text in texts))
     done = subprocess.run([TOOL, command, "--json", "--file", str(path), *arguments],
@@ -66,12 +67,12 @@ def ask(path: pathlib.Path, texts: Sequence[str], command: str,
 
 
 def shown(text: str) -> str:
-    """As JSON has it, where bytes that are no UTF-8 are replaced."""
+    """The text as in JSON, where bytes that are not UTF-8 are replaced."""
     return text.encode("utf-8", "surrogateescape").decode("utf-8", "replace")
 
 
 def as_bytes(text: str) -> bytes:
-    """Without escapes: Python and the C library do not agree on what can be printed."""
+    """The text without escapes: Python and the C library disagree about what is printable."""
     return re.sub(rb"\\x([0-9a-f]{2})", lambda found: bytes.fromhex(found[1].decode()),
                   text.encode("utf-8", "surrogateescape"))
 
@@ -90,7 +91,7 @@ def all_shown(value: Any) -> Any:
 
 
 def in_characters(text: str, offset: int, length: int) -> Tuple[int, int]:
-    """A place in bytes as one in characters."""
+    """Converts a place in bytes to one in characters."""
     data = text.encode("utf-8", "surrogateescape")
     starts = [len(text[:place].encode("utf-8", "surrogateescape")) for place in range(len(text))]
     start = sum(begin < offset for begin in starts)
@@ -158,7 +159,7 @@ def bad_texts(draw: st.DrawFn) -> str:
 
 @st.composite
 def init_texts(draw: st.DrawFn) -> str:
-    """Init values over LISTED, or nearly: too short, too long, with foreign digits."""
+    """Init values over LISTED, valid or nearly: too short, too long, with wrong digits."""
     base = draw(st.sampled_from(("0x", "0X", "0b", "0B")))
     digits = "01" if base in ("0b", "0B") else "0123456789abcdefABCDEF"
     lengths = (16, 16, 16, 9, 15, 1, 17, 0) if digits == "01" else (4, 4, 4, 3, 1, 5, 0)

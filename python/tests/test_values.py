@@ -1,4 +1,4 @@
-"""Values of inputs, and the result for them; that an equation never changes."""
+"""Values of inputs and the result for them; and that an equation never changes."""
 import collections.abc
 from typing import Any, Dict
 
@@ -100,7 +100,7 @@ class TestCall:
 
 
 class TestIsNoContainer:
-    """What NumPy and pandas ask before they take something apart."""
+    """What NumPy and pandas check before they take an object apart."""
 
     def test_no_mapping_and_no_sequence(self, equation: Equation) -> None:
         for kind in (collections.abc.Mapping, collections.abc.Iterable, collections.abc.Sized,

@@ -1,8 +1,8 @@
-"""Random equations as trees: what they mean is known from the tree, never from reading the text.
+"""Random equations as trees: their meaning is known from the tree, never from reading the text.
 
 The same tree is written as a text in this library's syntax and built as a function of SymPy.
 Hypothesis draws the trees; its profile is fixed, so that a run can be repeated:
-BOOLEQ_EXAMPLES=N draws N times as many, and then other ones in each run.
+BOOLEQ_EXAMPLES=N draws N times as many, and different ones in each run.
 """
 import importlib
 import os
@@ -24,7 +24,7 @@ OPERATORS = tuple(name for name in SPELLINGS if name != "NOT")
 
 
 def examples(count: int) -> settings:
-    """So many examples, the same in every run; more and others with BOOLEQ_EXAMPLES."""
+    """So many examples, the same in every run; more and different ones with BOOLEQ_EXAMPLES."""
     return settings(max_examples=count * FACTOR, derandomize=FACTOR == 1, deadline=None,
                     database=None, suppress_health_check=list(HealthCheck))
 
@@ -86,7 +86,7 @@ def trees(draw: st.DrawFn, names: Sequence[str] = NAMES, max_inputs: int = 6,
 
 
 def names_of(tree: Tree) -> List[str]:
-    """In the order of the text, each once."""
+    """The names in the order of the text, each once."""
     if isinstance(tree, Name):
         return [tree.name]
     if isinstance(tree, Constant):
@@ -126,11 +126,11 @@ def texts(draw: st.DrawFn, tree: Tree, blanks: bool = True) -> str:
         if isinstance(part, Behind):
             found = write(part.first)
             for place, (operator, operand) in enumerate(part.rest):
-                # The negation stands apart, or it would be part of the operator.
+                # The negation needs blanks, or it would be part of the operator.
                 found += f" {spelled('NOT')} " if place == 0 else blank()
                 found += spelled(operator) + blank() + grouped(operand)
             return found
-        # Operators group from the left, so what is on the left may do without a group.
+        # Operators group from the left, so the left operand needs no group.
         is_bare = isinstance(part.left, Binary) and draw(st.booleans())
         left = write(part.left) if is_bare else grouped(part.left)
         return left + blank() + spelled(part.operator) + blank() + grouped(part.right)
@@ -138,7 +138,7 @@ def texts(draw: st.DrawFn, tree: Tree, blanks: bool = True) -> str:
     return write(tree)
 
 
-# SymPy says nothing of its types, and reading all of it would take mypy long.
+# SymPy has no type hints, and mypy would take long to read all of it.
 sympy: Any = importlib.import_module("sympy")
 boolalg: Any = importlib.import_module("sympy.logic.boolalg")
 symbol, sum_of_products, truth_table = sympy.Symbol, sympy.SOPform, boolalg.truth_table
@@ -162,7 +162,7 @@ def to_sympy(tree: Tree) -> Any:
 
 
 def all_rows(num_inputs: int) -> npt.NDArray[np.uint8]:
-    """Every assignment, row k being the binary number k."""
+    """Every assignment; row k is the binary number k."""
     numbers = np.arange(2 ** num_inputs, dtype=np.uint32)[:, None]
     places = np.arange(num_inputs - 1, -1, -1, dtype=np.uint32)[None, :]
     return (numbers >> places & 1).astype(np.uint8)

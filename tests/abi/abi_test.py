@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-"""Changes a small library in one way at a time; the check of the exported interface must tell
-changes that break programs built before from those that do not.
+"""Changes a small library in one way at a time; the check of the exported interface must
+distinguish changes that break programs built earlier from others.
 
 usage: abi_test.py [UNITTEST OPTION...] CHECK COMPILER
 """
@@ -65,7 +65,7 @@ class Abi(unittest.TestCase):
         return done.returncode, done.stdout
 
     def changed(self, before, after):
-        """The check's answer when 'before' has become 'after' in header and source."""
+        """The check's answer after 'before' was replaced by 'after' in header and source."""
         self.assertIn(before, HEADER + SOURCE)
         self.build(HEADER.replace(before, after), SOURCE.replace(before, after))
         return self.check()

@@ -26,7 +26,7 @@ def draw(rng, names, depth, operators=tuple(BINARY)):
         return ("name", rng.choice(names))
     if kind < 0.27:
         return ("not", draw(rng, names, depth - 1, operators))
-    # With few operators to draw from, a text is meant to be read elsewhere too.
+    # With a limited choice of operators, the text must be readable in other languages too.
     if kind < 0.37 and len(operators) == len(BINARY):
         rest = [(rng.choice(operators), draw(rng, names, depth - 1))
                 for _ in range(rng.randrange(1, 3))]
@@ -51,7 +51,7 @@ def value(tree, values):
 
 
 def names_of(tree):
-    """In the order of the text."""
+    """The names in the order of the text."""
     if tree[0] == "name":
         return [tree[1]]
     if tree[0] == "const":
@@ -67,7 +67,7 @@ def names_of(tree):
 
 
 def column(tree):
-    """Values of all rows, row 0 first; the first input is the most significant."""
+    """The values of all rows, row 0 first; the first input is the most significant."""
     names = names_of(tree)
     rows = []
     for row in range(2 ** len(names)):
@@ -77,7 +77,7 @@ def column(tree):
 
 
 class Style:
-    """How texts are written: 'spellings' picks among an operator's, None for any."""
+    """How texts are written: 'spellings' chooses among an operator's spellings, None for any."""
 
     def __init__(self, rng, spelling=None, inversion=None, blanks=True):
         self.rng, self.spelling, self.inversion = rng, spelling, inversion
@@ -103,7 +103,7 @@ def text(tree, style):
         for place, (name, part) in enumerate(tree[2]):
             spelled = style.operator(name)
             if place == 0:
-                # The inversion stands apart, or it would be part of the operator.
+                # The inversion needs blanks, or it would be part of the operator.
                 found += f" {style.invert()} {spelled}"
             else:
                 found += f" {spelled}"

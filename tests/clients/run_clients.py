@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # Random equations through every export of the tool and the real program that reads it: the columns
-# that it computes must be those that the equations were made with. Without the program the status
-# is 77, which counts as skipped.
+# that the program computes must be those of the equations. If the program is missing, the status is
+# 77, which counts as skipped.
 import argparse
 import itertools
 import json
@@ -31,7 +31,7 @@ def run(command, **options):
 
 
 class Bench:
-    """The equations, the tool, and a directory for what passes between programs."""
+    """The equations, the tool, and a directory for files passed between programs."""
 
     def __init__(self, tool, cases, directory):
         self.tool, self.cases, self.directory = tool, cases, directory
@@ -65,8 +65,9 @@ def num_inputs(case):
     return len(case[1])
 
 
-# Modules f_1 and on below modules w_1 and on, whose inputs are one vector i, its highest bit the
-# first input. One more bit than inputs, so that there is always a vector.
+# Modules f_1, f_2, ... inside modules w_1, w_2, ..., whose inputs are one vector i with the first
+# input as its highest bit. It has one more bit than there are inputs, so that it is always a
+# vector.
 def verilog_wrappers(bench, names=None):
     text = ""
     for number, case in enumerate(bench.cases, 1):
@@ -209,13 +210,13 @@ def pla_column(path, names):
 
 
 def split_files(text, start):
-    """Texts that each begin with a line 'start', comments before it included."""
+    """Texts that each begin with a line 'start', including the comments before it."""
     return re.findall(rf"(?:^#.*\n)*^{re.escape(start)}(?:(?!^#|^{re.escape(start)}).*\n)*", text,
                       re.M)
 
 
 def check_abc(bench, target, start):
-    # A constant has no inputs, so no rows of a sum of products to be written.
+    # A constant has no inputs, so no rows of a sum of products to write.
     numbers = [number for number, case in enumerate(bench.cases) if num_inputs(case) > 0]
     kept = [bench.cases[number] for number in numbers]
     own = Bench(bench.tool, kept, bench.directory)
@@ -226,7 +227,7 @@ def check_abc(bench, target, start):
     for number, text in enumerate(files):
         path = own.write(f"in{number}.{target}", text)
         result = os.path.join(own.directory, f"out{number}.pla")
-        # A file that is refused must not leave the network before it.
+        # After a refused file, the previous network must not be used.
         script += f"empty\nread {path}\nstrash\ncollapse\nsop\nwrite_pla {result}\n"
     log = run(["berkeley-abc", "-f", own.write("commands.abc", script)])
     columns = []
@@ -259,7 +260,7 @@ def check_library(bench):
 # --- how lint reads texts of the library's syntax as other languages ---------------------------
 
 def lint_cases(bench, notation):
-    """Cases that lint reads in 'notation', with the column it sees, and texts that it does not."""
+    """Cases that lint reads in 'notation', with the column that it finds, and texts it refuses."""
     answers = subprocess.run([bench.tool, "lint", "--json", "--file", bench.texts], check=False,
                              capture_output=True, text=True, timeout=TIMEOUT_SECONDS).stdout
     read, refused = [], []
@@ -302,7 +303,7 @@ def lint_icarus(bench):
         return subprocess.run(["iverilog", "-t", "null", source], capture_output=True,
                               check=False).returncode == 0
 
-    # Some tools take "~&" and "~|" between operands, which the language has not.
+    # Some tools accept "~&" and "~|" between operands, which are not in the language.
     texts = [case for case in refused if not re.search(r"[~!][&|]", case[0])]
     must_refuse("lint of Verilog, Icarus Verilog", texts[:60], accepts)
 
@@ -362,7 +363,7 @@ def lint_python(bench):
     must_refuse("lint of Python, Python", refused, accepts)
 
 
-# By name: the programs that it takes, and the check; it is one of lint where the name says so.
+# By name: the required programs, and the check, which is one of lint if the name says so.
 CHECKS = {
     "library": ([], check_library),
     "icarus": (["iverilog", "vvp"], check_icarus),
@@ -384,7 +385,7 @@ SKIPPED = 77
 
 
 def lint_equations(seed, count):
-    """Names and operators that other languages have too, and some that they have not."""
+    """Names and operators that other languages also have, and some that they do not have."""
     cases = []
     names = ["a", "b", "c", "d"]
     for spelling in (0, 1):

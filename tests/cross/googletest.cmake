@@ -1,4 +1,4 @@
-# GoogleTest for another machine, from the sources that Debian has for that.
+# GoogleTest for another machine, from the sources that Debian provides.
 set(INSTALL_GTEST OFF CACHE BOOL "")
 set(BUILD_GMOCK OFF CACHE BOOL "")
 add_subdirectory(/usr/src/googletest "${CMAKE_BINARY_DIR}/googletest" EXCLUDE_FROM_ALL SYSTEM)

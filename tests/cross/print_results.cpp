@@ -1,6 +1,6 @@
-// Prints all that random texts give, for a comparison byte by byte with another machine's output.
-// Arguments: seed, number of texts. Every answer is printed in a form that does not depend on the
-// machine: words as digits, bytes outside ASCII as \xNN.
+// Prints all answers about random texts, for comparison byte by byte with another machine's output.
+// Arguments: seed, number of texts. The form of the answers does not depend on the machine: words
+// are printed as digits, bytes outside ASCII as \xNN.
 #include <cinttypes>
 #include <cstdio>
 #include <cstdlib>
@@ -73,7 +73,7 @@ void PrintResults(const Kq_BoolEquation& equation)
     std::printf("\n");
 }
 
-// Every assignment; the row numbers go through all variables as the table does.
+// Every assignment, in the order of the table's rows.
 void PrintEvaluations(Kq_BoolEquation equation)
 {
     const unsigned int numVariables = equation.GetNumVariables();
@@ -107,7 +107,7 @@ void PrintTable(const Kq_BoolEquation& equation)
     }
 }
 
-// The init value reads back over the same names, in both orders of the terms.
+// Prints what the init value reads back as over the same names, in both orders of the terms.
 void PrintReadBack(const Kq_BoolEquation& equation)
 {
     std::vector<Port::StringBase<char>> terms;
@@ -165,7 +165,7 @@ int main(int argc, char** argv)
     support::Capture capture;
     for (unsigned long index = 0; index < numTexts; ++index) {
         PrintAll(AnyText(random), capture);
-        // Init values too, which are set over terms.
+        // Includes init values, which are set over terms.
         Kq_BoolEquation equation;
         const size_t numTerms = 1 + random.Below(10);
         std::vector<Port::StringBase<char>> terms;

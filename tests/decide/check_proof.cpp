@@ -1,5 +1,6 @@
-// Checks a proof that nothing satisfies some clauses: check_proof CLAUSES PROOF, files in the
-// formats DIMACS and DRAT. Exit status 0: it is one, 1: it is not, and why, 2: not to be read.
+// Checks a proof that clauses are unsatisfiable: check_proof CLAUSES PROOF, files in the formats
+// DIMACS and DRAT. Exit status 0: it is a proof, 1: it is not, with the reason, 2: a file cannot be
+// read.
 #include <cstdio>
 #include <fstream>
 #include <sstream>

@@ -1,6 +1,6 @@
 // Decides random pairs and writes them for other programs: decide_pairs DIRECTORY FIRST LAST.
-// For each pair a line "NUMBER VERDICT PROOF REWRITTEN MICROSECONDS", and in the directory
-// NUMBER.cnf, NUMBERa.blif, NUMBERb.blif, and the texts NUMBERa.txt, NUMBERb.txt.
+// Prints for each pair a line "NUMBER VERDICT PROOF REWRITTEN MICROSECONDS", and writes to the
+// directory NUMBER.cnf, NUMBERa.blif, NUMBERb.blif, and the texts NUMBERa.txt, NUMBERb.txt.
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>

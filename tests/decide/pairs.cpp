@@ -12,8 +12,8 @@ using booleq::Expression;
 using booleq::IsBinary;
 using booleq::Operator;
 
-// A tree with shared parts, so that rules that copy an operand are cheap; 'size' is its size as a
-// tree.
+// A tree with shared parts, so that rules that copy an operand are cheap. 'size' counts shared
+// parts each time.
 struct Part {
     Operator op;
     uint32_t left;
@@ -63,7 +63,7 @@ class Rewriter {
         return Add(op, left, right, m_parts[left].size + m_parts[right].size + 1);
     }
 
-    // Copies of an operand are affordable.
+    // Whether copying an operand is affordable.
     bool MayCopy(uint32_t part)
     {
         if (m_copied + m_parts[part].size > m_max_size || m_parts[part].size > 60)
@@ -75,7 +75,7 @@ class Rewriter {
     uint32_t Binary(Operator op, uint32_t left, uint32_t right)
     {
         const bool isInverted = op >= Operator::Nand;
-        if (isInverted && Chance(2)) // an inversion of its own
+        if (isInverted && Chance(2)) // keep the inversion separate
             return Not(Binary(static_cast<Operator>(static_cast<int>(op) - 3), left, right));
         if (op == Operator::Xor && Chance(3) && MayCopy(left) && MayCopy(right))
             return Plain(Operator::Or, Plain(Operator::And, left, Not(right)),
@@ -87,7 +87,7 @@ class Rewriter {
             if (Chance(2))
                 std::swap(left, right);
             const Part inner = m_parts[right];
-            if (inner.op == op && Chance(2)) // another grouping
+            if (inner.op == op && Chance(2)) // regroup
                 return Plain(op, Plain(op, left, inner.left), inner.right);
             const bool distributes =
                 (op == Operator::And && (inner.op == Operator::Or || inner.op == Operator::Xor)) ||
@@ -151,7 +151,7 @@ Expression RandomExpression(std::mt19937_64& random, uint32_t numInputs, uint32_
         expression.names.push_back("v" + std::to_string(input));
     struct Task {
         uint32_t numOperators;
-        Operator op; // to append now, or Zero: a tree of so many operators is to be made
+        Operator op; // append it now; Zero: make a tree of so many operators
     };
     std::vector<Task> tasks = {{numOperators, Operator::Zero}};
     std::vector<uint32_t> made;

@@ -10,7 +10,7 @@ namespace decide_pairs {
 
 namespace {
 
-typedef uint32_t Literal; // 2 * variable, and 1 more for its inversion
+typedef uint32_t Literal; // 2 * variable, plus 1 for its inversion
 typedef std::vector<Literal> Clause;
 
 constexpr uint32_t kNone = UINT32_MAX;
@@ -21,7 +21,7 @@ Literal Inverted(Literal literal)
     return literal ^ 1u;
 }
 
-// Lines of numbers, the format of both files.
+// Reads lines of numbers, the format of both files.
 class NumberReader {
   public:
     explicit NumberReader(const std::string& text) : m_text(text) {}
@@ -41,7 +41,7 @@ class NumberReader {
         return false;
     }
 
-    // Takes the character when it comes next.
+    // Takes the character if it comes next.
     bool Take(char character)
     {
         if (!SkipBlanks() || m_text[m_place] != character)
@@ -52,7 +52,7 @@ class NumberReader {
 
     void SkipLine() { m_place = std::min(m_text.find('\n', m_place), m_text.size()); }
 
-    // Fails: false, for anything else.
+    // Fails: false for anything else.
     bool Number(long& number)
     {
         if (!SkipBlanks())
@@ -100,13 +100,13 @@ class NumberReader {
     size_t m_line = 1;
 };
 
-// The clauses that count now, and what follows from them by unit propagation.
+// The clauses that are not deleted, and what follows from them by unit propagation.
 // Invariants:
-// 1. Clauses of two literals and more are watched by their first two. When nothing is left to
-//    propagate and there is no conflict, a watched literal is false only where the other is true.
-// 2. The trail has the true literals in the order in which they followed; each one's reason is a
-//    clause of which all others are false before it, or kNone for an assumption.
-// 3. Outside of IsImplied there are no assumptions.
+// 1. Clauses of two or more literals are watched by their first two. When nothing is left to
+//    propagate and there is no conflict, a watched literal is false only if the other one is true.
+// 2. The trail has the true literals in the order in which they followed. The reason for each is a
+//    clause whose other literals became false before it, or kNone for an assumption.
+// 3. There are no assumptions outside IsImplied.
 class Clauses {
   public:
     void Add(const Clause& clause)
@@ -122,7 +122,7 @@ class Clauses {
         Propagate();
     }
 
-    // Fails: false, when there is no such clause.
+    // Fails: false if there is no such clause.
     bool Delete(Clause clause)
     {
         std::sort(clause.begin(), clause.end());
@@ -134,7 +134,7 @@ class Clauses {
         if (found->second.empty())
             m_indices.erase(found);
         m_clauses[index].isThere = false;
-        // What followed from it, and what came later, must follow again without it.
+        // What followed from it, and what came later, must be derived again without it.
         if (m_has_conflict) {
             m_has_conflict = false;
             Restart(0);
@@ -146,8 +146,8 @@ class Clauses {
         return true;
     }
 
-    // Whether the clause follows: by unit propagation, or else because nothing that was satisfiable
-    // becomes unsatisfiable by it, as its resolvents on its first literal show.
+    // Whether the clause may be added: it follows by unit propagation, or else its resolvents on
+    // its first literal show that it keeps satisfiable clauses satisfiable.
     bool IsImplied(const Clause& clause, bool& isByResolvents)
     {
         isByResolvents = false;
@@ -202,7 +202,7 @@ class Clauses {
         m_num_propagated = std::min(m_num_propagated, numTrue);
     }
 
-    // Forgets what is true from a place on, and finds again what follows.
+    // Forgets the true literals from a place on, and derives again what follows.
     void Restart(size_t numTrue)
     {
         Undo(numTrue);
@@ -223,7 +223,7 @@ class Clauses {
             MakeTrue(literals.front(), index);
     }
 
-    // Requires: no assumptions, so what follows at once stays.
+    // Requires: no assumptions, so what follows immediately stays.
     void Attach(uint32_t index)
     {
         Clause& literals = m_clauses[index].literals;
@@ -232,7 +232,7 @@ class Clauses {
             AttachShort(index);
             return;
         }
-        // Those that are not false come first.
+        // Puts literals that are not false first.
         std::stable_partition(literals.begin(), literals.end(),
                               [this](Literal literal) { return !IsFalse(literal); });
         m_watches[literals[0]].push_back(index);
@@ -243,15 +243,14 @@ class Clauses {
             MakeTrue(literals[0], index);
     }
 
-    // Makes true what the clauses leave no choice in.  Fails: m_has_conflict, for a clause that is
-    // false.
+    // Makes true all literals that follow.  Fails: sets m_has_conflict for a clause that is false.
     void Propagate()
     {
         while (!m_has_conflict && m_num_propagated < m_trail.size())
             Visit(Inverted(m_trail[m_num_propagated++]));
     }
 
-    // The clauses that watch a literal that has become false.
+    // Visits the clauses that watch a literal that has become false.
     void Visit(Literal falseLiteral)
     {
         std::vector<uint32_t>& watches = m_watches[falseLiteral];
@@ -285,7 +284,7 @@ class Clauses {
         watches.resize(numKept);
     }
 
-    // Whether a conflict follows when all literals but one are false. The assumptions stay.
+    // Whether a conflict follows if all literals except one are false. The assumptions stay.
     bool Refutes(const Clause& clause, Literal except)
     {
         assert(!m_has_conflict);
@@ -302,12 +301,12 @@ class Clauses {
         return hasConflict;
     }
 
-    // Requires: the clause of the literal is assumed to be false, and nothing is in conflict.
+    // Requires: the clause of the literal is assumed to be false, and there is no conflict.
     bool AllResolventsFollow(Literal literal)
     {
         const size_t numTrue = m_trail.size();
         for (size_t index = 0; index < m_clauses.size(); ++index) {
-            // Propagation moves literals about.
+            // A copy, because propagation reorders literals
             const Clause clause = m_clauses[index].isThere ? m_clauses[index].literals : Clause();
             if (std::find(clause.begin(), clause.end(), Inverted(literal)) == clause.end())
                 continue;
@@ -320,12 +319,12 @@ class Clauses {
     }
 
     std::vector<Entry> m_clauses;
-    std::map<Clause, std::vector<uint32_t>> m_indices; // of those that are there, literals sorted
-    std::vector<uint32_t> m_short;                     // clauses of a literal or none
+    std::map<Clause, std::vector<uint32_t>> m_indices; // of existing clauses, sorted literals
+    std::vector<uint32_t> m_short;                     // clauses of one literal or none
     std::vector<std::vector<uint32_t>> m_watches;      // by literal
     std::vector<int8_t> m_values;                      // by literal: 1 true, -1 false, 0 neither
     std::vector<uint32_t> m_reasons;                   // by variable
-    std::vector<size_t> m_places;                      // by variable: where on the trail
+    std::vector<size_t> m_places;                      // by variable: the place on the trail
     std::vector<Literal> m_trail;
     size_t m_num_propagated = 0;
     bool m_has_conflict = false;

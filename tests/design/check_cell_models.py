@@ -1,9 +1,10 @@
-"""The types of cells in cells.txt say what Yosys' simulation models of those cells do.
+"""Checks that the cell types in cells.txt agree with Yosys' simulation models of the cells.
 
 usage: check_cell_models.py SHOW_DESIGN CELLS
 
-Every model of every table is simulated by Icarus Verilog with random init values for all values of
-its pins; the same cell in a netlist, read here, has the same rows. Status 77: a program is missing.
+Icarus Verilog simulates every model of every table with random init values for all values of its
+pins; the same cell in a netlist, read here, must have the same rows. Status 77: a program is
+missing.
 """
 
 import json
@@ -29,7 +30,7 @@ class Type:
 
 
 def read_types(file):
-    """Names, pins and parameters only; which bits mean what is the reader's to say."""
+    """Only names, pins and parameters; the reader decides what the bits mean."""
     types = []
     for line in pathlib.Path(file).read_text().splitlines():
         words = line.split("#")[0].split()
@@ -65,14 +66,14 @@ def has_pins(text, pins):
 
 
 def literal(value, bits, own_text, parameter):
-    """Some models take a string of hexadecimal digits."""
+    """Some models need a string of hexadecimal digits."""
     if re.search(rf'parameter\s+{parameter}\s*=\s*"0x', own_text):
         return f'"0x{value:0{bits // 4}x}"'
     return f"{bits}'h{value:x}"
 
 
 def spelled(value, bits, rng):
-    """One of the spellings that netlists have."""
+    """One of the spellings that occur in netlists."""
     forms = [f"{value:0{bits}b}", f"{bits}'h{value:x}", f"{bits}'d{value}", f"{bits}'b{value:b}"]
     if bits >= 4:
         forms += [f"0x{value:0{bits // 4}x}", f"0x{value:0{bits // 4}X}"]
@@ -82,7 +83,7 @@ def spelled(value, bits, rng):
 
 
 def simulate(kind, text, own_text, inits, file, folder):
-    """The outputs of each repetition by the value of the pins."""
+    """The outputs of each repetition, by the value of the pins."""
     bench = ["`timescale 1ns/1ps", "module bench;", f"reg [{len(kind.inputs)}:0] row;"]
     for index, values in enumerate(inits):
         parameters = ", ".join(
@@ -155,7 +156,7 @@ def check(show, kind, file, modules, folder, rng):
         for place, pin in enumerate(kind.outputs):
             rows, pins = tables[f"out{index}_{pin}"]
             for row, line in enumerate(lines):
-                # The pin that stands last is the least significant one.
+                # The last pin is the least significant one.
                 number = 0
                 for name in pins:
                     number = number << 1 | (row >> kind.inputs.index(name) & 1)

@@ -1,10 +1,11 @@
-"""One design in four formats has the same tables.
+"""Checks that one design has the same tables in four formats.
 
 usage: check_formats.py [--booleq BOOLEQ] SHOW_DESIGN [FOLDER]
 
-Yosys writes a design as JSON, BLIF, EDIF and Verilog; all four, read here, are the same functions of
-the same nets. Without FOLDER the design is a small one with hierarchy, else each BLIF file of it,
-which is compared as it is, too. With BOOLEQ its 'netlist diff' must say so as well. Status 77: Yosys or the folder is not there.
+Yosys writes a design as JSON, BLIF, EDIF and Verilog; all four, read here, must be the same
+functions of the same nets. Without FOLDER the design is a small one with hierarchy. With FOLDER
+each BLIF file in it is a design, and the file itself is compared, too. With BOOLEQ its 'netlist
+diff' must agree. Status 77: Yosys or the folder is missing.
 """
 
 import argparse
@@ -30,7 +31,7 @@ module top(input [7:0] a, input [7:0] b, input [1:0] select, output [7:0] y, out
 endmodule
 """
 
-# $lut as instances, for write_verilog has no other way to say them.
+# $lut as instances, because write_verilog cannot write it in any other way.
 MAP = """
 (* techmap_celltype = "$lut" *)
 module map_lut(A, Y);
@@ -121,7 +122,7 @@ def main():
                 + WRITE_MAPPED,
                 folder,
             )
-            # BLIF without names of cells has none for instances of modules.
+            # BLIF without cell names has no names for instances of modules either.
             print(compare(arguments, folder, ["plain.json", "plain.edif"] + mapped, 40), "tables")
             yosys(
                 "read_verilog design.v; synth -flatten -top top; abc -lut 6; clean; " + plain, folder

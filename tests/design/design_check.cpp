@@ -67,7 +67,7 @@ std::string BrokenInit(const Design& design, const InitValue& init)
     return "";
 }
 
-// What the reference shows for each net that has a name in common with one of its nets.
+// The name that the reference shows for each net that shares a name with one of its nets.
 std::vector<std::string> ReferenceNames(const Design& design, const Design& reference)
 {
     std::unordered_map<std::string, std::string> shown;

@@ -1,4 +1,4 @@
-// Folding against a model that looks each row up.
+// Folding, against a model that looks up each row.
 #include <random>
 
 #include <gtest/gtest.h>
@@ -12,7 +12,7 @@ using namespace booleq;
 
 typedef std::mt19937_64 Random;
 
-// A design of one table with random bits, whose nets are few, so that they repeat.
+// A design of one table with random bits. It has few nets, so that they repeat.
 Design MakeDesign(unsigned int numInputs, Random& random)
 {
     Design design;
@@ -29,14 +29,14 @@ Design MakeDesign(unsigned int numInputs, Random& random)
     return design;
 }
 
-// The values of the folded inputs, one for each element, as the values of the pins.
+// The pins' value for a row over the folded inputs, which are 'nets'.
 uint64_t PinsOf(const Design& design, const std::vector<NetId>& nets, uint64_t row)
 {
     const DesignTable& table = design.tables[0];
     const auto numNets = static_cast<unsigned int>(nets.size());
     const auto valueOf = [&](unsigned int place) { return row >> (numNets - 1 - place) & 1u; };
     uint64_t pins = 0;
-    unsigned int numOpen = 0; // open and unknown pins so far, each with an input of its own
+    unsigned int numOpen = 0; // open and unknown pins so far, each with its own input
     for (unsigned int pin = 0; pin < design.NumInputs(table); ++pin) {
         const NetId net = design.Inputs(table)[pin];
         uint64_t value = net == kNetOne ? 1 : 0;

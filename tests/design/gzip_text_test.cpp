@@ -1,4 +1,4 @@
-// Netlists that are compressed by gzip, whole and spoilt.
+// Netlists compressed by gzip, intact and damaged.
 #include <cstdint>
 #include <string>
 
@@ -32,7 +32,7 @@ class GzipText : public testing::Test {
             GTEST_SKIP() << "a build without zlib";
     }
 
-    // Empty for a text that is read.
+    // The fault; empty if the text is read.
     std::string FaultOf(const std::string& text)
     {
         std::string fault;
@@ -54,7 +54,7 @@ TEST_F(GzipText, MembersOfAFileAreOneText)
     EXPECT_EQ(FaultOf(kHead), "test: line 3: the text ends inside model 'm', without .end");
 }
 
-// Every way to cut it off.
+// Cuts the file off at every place.
 TEST_F(GzipText, AFileThatIsNotWholeIsRefused)
 {
     const std::string whole = kHead + kRest;
@@ -65,7 +65,8 @@ TEST_F(GzipText, AFileThatIsNotWholeIsRefused)
     EXPECT_EQ(FaultOf(whole.substr(0, 2)), "test: the compressed file is truncated");
 }
 
-// Every bit: of the data and of its sum; the name, time and system in the head say nothing.
+// Flips every bit of the data and of its checksum; the name, time and system in the header do not
+// matter.
 TEST_F(GzipText, ADamagedFileIsRefused)
 {
     const std::string whole = kHead + kRest;
@@ -92,7 +93,7 @@ TEST_F(GzipText, NothingAndWhatIsCompressedTwiceAreNoNetlists)
     EXPECT_EQ(FaultOf(OfHex("1f8b080000000000020303000000000000000000")), "test: it is empty");
     EXPECT_EQ(FaultOf(std::string("\x1f\x8b", 2) + std::string(100, 'x')),
               "test: the compressed file is damaged");
-    std::string stored = OfHex("1f8b08000000000002030103"); // a block that is stored: 3 bytes
+    std::string stored = OfHex("1f8b08000000000002030103"); // a stored block of 3 bytes
     stored += OfHex("00fcff1f8b08");
     EXPECT_NE(FaultOf(stored + std::string(8, '\0')), "");
 }

@@ -1,4 +1,4 @@
-// Init values in every spelling that netlists have.
+// Init values in every spelling that occurs in netlists.
 #include <gtest/gtest.h>
 
 #include "init_digits.h"
@@ -38,13 +38,13 @@ TEST(InitDigits, EverySpellingIsRead)
         {"18446744073709551615", BareDigits::Decimal, 64, UINT64_MAX, 0, ""},
         {" 0xca ", BareDigits::Binary, 8, 0xca, 0, ""},
         {"0x2", BareDigits::Binary, 2, 2, 0, ""},
-        // Digits that nobody knows.
+        // Unknown digits.
         {"1x0z", BareDigits::Binary, 4, 8, 5, ""},
         {"4'b1x0Z", BareDigits::Binary, 4, 8, 5, ""},
         {"8'hcx", BareDigits::Binary, 8, 0xc0, 0x0f, ""},
         {"8'bx", BareDigits::Binary, 8, 0, 0xff, ""},
         {"0x10", BareDigits::Binary, 4, 2, 4, ""}, // as many digits as bits: x is one of them
-        // Another number of digits than bits.
+        // More or fewer digits than bits.
         {"0xCA", BareDigits::Binary, 16, 0xca, 0, "short"},
         {"1010", BareDigits::Binary, 8, 0xa, 0, "short"},
         {"8'hCA", BareDigits::Binary, 16, 0xca, 0, "short"},

@@ -1,7 +1,7 @@
-// Changes small netlists at random, byte by byte and piece by piece, and reads them: each one ends
-// in a design whose invariants hold or in a message, within the items allowed. usage:
-// mutate_netlists COUNT [SEED] Exit status: 1 with the first text that is treated wrongly, on
-// standard output.
+// Changes small netlists at random, byte by byte and piece by piece, and reads them: each must give
+// a design whose invariants hold, or a message, within the limit on items.
+// usage: mutate_netlists COUNT [SEED]
+// Exit status: 1 if a text is treated wrongly; the first one is printed on standard output.
 #include <cstdio>
 #include <cstdlib>
 #include <random>
@@ -80,7 +80,8 @@ size_t Below(Random& random, size_t end)
     return static_cast<size_t>(random() % end);
 }
 
-// One change: a byte, a piece doubled, moved or left out, a number that is too large, an end.
+// Makes one change: a byte, a piece doubled, moved or left out, a number that is too large, or an
+// early end.
 void Mutate(std::string& text, Random& random)
 {
     static const char* const kPieces[] = {"99999999999999999999",
@@ -150,7 +151,7 @@ int main(int argc, char** argv)
         std::string text = kTexts[file % 3];
         for (size_t changes = 1 + Below(random, 4); changes-- > 0;)
             Mutate(text, random);
-        // A text that begins like Verilog would go to another program.
+        // A text that begins like Verilog would go to another program
         const size_t first = text.find_first_not_of(" \t\r\n");
         if (first != std::string::npos &&
             std::string("m/`(").find(text[first]) != std::string::npos &&

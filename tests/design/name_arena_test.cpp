@@ -1,4 +1,4 @@
-// Names kept once each, by numbers.
+// Names are kept once each and have numbers.
 #include <string>
 #include <vector>
 
@@ -20,7 +20,7 @@ TEST(NameArena, ANameHasOneNumber)
     EXPECT_EQ(names.Add("a"), first);
     EXPECT_EQ(names.Text(first), "a");
     EXPECT_EQ(names.Text(second), "b");
-    EXPECT_EQ(names.Size(), 3u); // with the empty one
+    EXPECT_EQ(names.Size(), 3u); // including the empty one
 }
 
 TEST(NameArena, TheEmptyNameIsZero)
@@ -42,7 +42,7 @@ TEST(NameArena, AnUnknownNameIsNotFoundAndNotAdded)
     EXPECT_EQ(names.Size(), 2u);
 }
 
-// Of all lengths about the eight bytes that are hashed at a time, and with bytes of zero.
+// Names of all lengths around the eight bytes hashed at a time, and with zero bytes.
 TEST(NameArena, NamesThatAreAlikeAreKeptApart)
 {
     NameArena names;

@@ -1,4 +1,4 @@
-// What each reader makes of a small text, and what it refuses.
+// What each reader makes of small texts, and what it refuses.
 #include <cstdlib>
 #include <fstream>
 
@@ -29,7 +29,7 @@ std::string FaultOf(const std::string& text, const ReadOptions& options = ReadOp
     std::string fault;
     EXPECT_FALSE(ReadDesignText(text, "test", options, design, fault)) << text.substr(0, 5000);
     EXPECT_TRUE(design.tables.empty());
-    EXPECT_EQ(design.names.Size(), 1u); // no result
+    EXPECT_EQ(design.names.Size(), 1u); // the reader gave no result
     return fault;
 }
 
@@ -130,7 +130,7 @@ TEST(JsonReader, AModuleInItselfIsRefused)
     EXPECT_EQ(FaultOf(inner), "test: module 'sub' contains itself");
 }
 
-// Each level has the one below it twice: 2^40 tables.
+// Each level contains the one below it twice: 2^40 tables.
 TEST(JsonReader, HierarchyThatExplodesIsRefused)
 {
     std::string text =
@@ -211,7 +211,8 @@ TEST(CellTypes, HalvesAndTreesOfTablesAreRead)
     EXPECT_EQ(tests::TableLines(tree), Lines{"u CC_L2T4: y = 8ff8(b, a, b, a)"});
 }
 
-// A mode without a table output leaves the table, whose output goes to the flip-flop beside it.
+// Even in a mode without a table output the table is read; its output goes to the flip-flop of the
+// cell.
 TEST(CellTypes, ATableBesideAFlipFlopIsRead)
 {
     const std::string pins = "\"I0\": [2], \"I1\": [3], \"O\": [4]";
@@ -430,7 +431,7 @@ TEST(EdifReader, AMillionParenthesesTakeNoStack)
     EXPECT_NE(FaultOf("(edif a (library b (cell c " + deep + std::string(1000000, ')') + ")))"),
               "");
     EXPECT_NE(FaultOf("{\"modules\": " + std::string(1000000, '[')), "");
-    // What is not asked for is skipped, however deep.
+    // Unused content is skipped, however deeply nested.
     MustRead("{\"modules\": {\"m\": {\"x\": " + std::string(1000000, '[') +
              std::string(1000000, ']') + "}}}");
 }
@@ -460,7 +461,7 @@ TEST(NetlistFiles, AByteOrderMarkIsSkipped)
               tests::TableLines(MustRead(kBlif)));
 }
 
-// A file that says it has 10 GB costs nothing.
+// Refusing a file whose size is 10 GB costs nothing.
 TEST(NetlistFiles, HugeFilesAreRefusedBeforeTheyAreRead)
 {
     const std::string file = testing::TempDir() + "huge_netlist.json";
@@ -476,7 +477,7 @@ TEST(NetlistFiles, HugeFilesAreRefusedBeforeTheyAreRead)
     std::remove(file.c_str());
 }
 
-// A short file could ask for any memory: each of these tables is 8 KB.
+// A short file could ask for any amount of memory: each of these tables takes 8 KB.
 TEST(NetlistFiles, ManyWideTablesAreRefusedAtALimit)
 {
     const auto text = [](unsigned int count) {

@@ -1,7 +1,7 @@
 // Reads a netlist and prints it, for tests that compare netlists.
 // usage: show_design FILE [REFERENCE], show_design --count FILE
-// Without a reference: its tables, cell by cell. With one: its tables as functions of nets, which
-// have the names that they have there.
+// Without a reference: its tables, cell by cell. With one: its tables as functions of nets, under
+// the names that the nets have in the reference.
 #include <cstdio>
 
 #include "design_check.h"
@@ -27,7 +27,7 @@ int main(int argc, char** argv)
 {
     booleq::Design design;
     booleq::Design reference;
-    if (argc == 3 && std::string(argv[1]) == "--count") { // only reads, for measurements
+    if (argc == 3 && std::string(argv[1]) == "--count") { // only reads the file, for measurements
         std::string fault;
         const bool isRead = ReadDesign(argv[2], booleq::ReadOptions(), design, fault);
         std::printf("%zu tables %s\n", design.tables.size(), fault.c_str());

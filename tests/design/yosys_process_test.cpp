@@ -1,5 +1,5 @@
-// Verilog by the program yosys: what becomes of the text when the program is missing, fails, is
-// ended, does not end, or writes too much. A script stands in for it.
+// Verilog by the program yosys: what happens if the program is missing, fails, is killed, does not
+// end, or writes too much. A script replaces it.
 #include <chrono>
 #include <csignal>
 #include <cstdlib>
@@ -48,7 +48,8 @@ class YosysProcess : public testing::Test {
         std::filesystem::remove_all(m_folder);
     }
 
-    // What runs as yosys, with the text as /dev/fd/3 and the netlist as /dev/fd/4.
+    // Installs the commands that run as yosys, with the text as /dev/fd/3 and the netlist as
+    // /dev/fd/4.
     void Install(const std::string& commands)
     {
         const std::filesystem::path program = m_folder / "yosys";
@@ -57,7 +58,7 @@ class YosysProcess : public testing::Test {
         chmod(program.c_str(), 0755);
     }
 
-    // Empty for a text that is read.
+    // The fault; empty if the text is read.
     std::string FaultOf(const std::string& text, double seconds = 60)
     {
         ReadOptions options;
@@ -75,7 +76,7 @@ class YosysProcess : public testing::Test {
         EXPECT_GT(process, 0);
         if (kill(process, 0) != 0)
             return false;
-        std::string status; // "12 (sleep) S ...": Z has ended, and nobody has asked for its status
+        std::string status; // "12 (sleep) S ...": Z has ended, but was not waited for
         std::ifstream stream("/proc/" + std::to_string(process) + "/stat");
         std::getline(stream, status);
         return status.find(") Z ") == std::string::npos;
@@ -150,7 +151,7 @@ TEST_F(YosysProcess, WhatDoesNotEndIsEnded)
     EXPECT_FALSE(IsRunning());
 }
 
-// Files of which no block is written: they take no room.
+// The files are sparse, so they take no space.
 TEST_F(YosysProcess, OutputThatIsTooLongEndsIt)
 {
     Install("truncate -s 5000000000 /dev/fd/4; exec sleep 100");
@@ -162,7 +163,7 @@ TEST_F(YosysProcess, OutputThatIsTooLongEndsIt)
     EXPECT_EQ(FaultOf(kVerilog), "test: yosys wrote more than 4,294,967,000 bytes");
 }
 
-// Whoever ends this process ends yosys, and no file is left.
+// If this process is killed, yosys is killed too, and no file is left.
 TEST_F(YosysProcess, ItEndsWithUs)
 {
     Install("exec sleep 100");

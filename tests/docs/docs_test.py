@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Builds the documentation as it is, and from copies in which one thing is wrong.
+"""Builds the documentation as it is, and from copies with one fault each.
 
 usage: docs_test.py [UNITTEST OPTION...] ROOT
 """
@@ -43,7 +43,7 @@ class Documentation(unittest.TestCase):
             stream.write(text)
 
     def add_members(self, text):
-        """Puts members in front of Dbg of the facade, after a blank line."""
+        """Inserts members before Dbg of the facade, after a blank line."""
         path = self.copy / HEADER
         header = path.read_text(encoding="utf-8")
         comment = header.index("    void Dbg() const; // writes all")

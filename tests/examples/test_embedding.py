@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""The example embedding: its whole log for the rules beside it, traces whole and cut, bad input.
+"""The example embedding: its whole log for the rules next to it, traces whole and cut, bad input.
 
 usage: test_embedding.py PROGRAM EXAMPLE
 """

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-# Runs the example that reports on look-up tables, on its design and on lines that are refused.
+# Runs the example that reports on look-up tables on its design and on lines that it must refuse.
 # usage: test_lut_report.py PROGRAM SOURCES
 import pathlib
 import subprocess

@@ -52,7 +52,7 @@ def map_by_abc(source, directory):
 
 
 class Netlist:
-    """A second reader and evaluator of these files, which shares nothing with the program."""
+    """A second reader and evaluator of these files, which shares no code with the program."""
 
     def __init__(self, text):
         text = re.sub(r"#.*", "", text).replace("\\\n", " ")
@@ -69,7 +69,7 @@ class Netlist:
                 self.blocks[-1][1].append(words)
 
     def column(self, name, columns, everywhere):
-        """Values of all rows as the bits of one number; 'columns' has those of the inputs."""
+        """The values of all rows as the bits of one number; 'columns' has those of the inputs."""
         if name in columns:
             return columns[name]
         signals, rows = next(block for block in self.blocks if block[0][-1] == name)
@@ -89,7 +89,7 @@ class Netlist:
 
 
 def input_columns(names):
-    """Row k is bit k, the first name the most significant bit of k; and all rows."""
+    """The inputs' columns, row k as bit k, the first name being k's highest bit; and all rows."""
     num_rows = 2 ** len(names)
     columns = {name: sum(1 << row for row in range(num_rows) if row >> place & 1)
                for place, name in enumerate(reversed(names))}
@@ -101,7 +101,7 @@ def plain(name):
 
 
 def spoiled(text):
-    """The netlist with one block after the other turned into its opposite."""
+    """The netlist with one block after another inverted."""
     lines = text.split("\n")
     starts = [place for place, line in enumerate(lines) if line.startswith(".names")]
     for start in starts:
@@ -148,7 +148,7 @@ class Example:
                    netlist.column(signals[-1], *input_columns(signals[:-1])), int(init, 0))
 
     def check_spoiled(self, path):
-        """Each opposite is found exactly where the two netlists first differ."""
+        """Each inverted block is found exactly where the two netlists first differ."""
         text = path.read_text(encoding="utf-8")
         good = Netlist(text)
         expected_of = good.outputs_of_all_rows()
@@ -171,7 +171,7 @@ class Example:
                 value = expected >> row & 1
                 head, assignment = verdict.split(" at ")
                 expect(what, f"DIFFERS, the equation is {value} and the netlist {1 - value}", head)
-                # The first one that differs, over the inputs that count: all others are 0 in it.
+                # The first row that differs, over the inputs that matter: all others are 0 in it.
                 given = dict(part.rsplit("=", 1) for part in assignment.split())
                 bits = {plain(wire): str(row >> place & 1)
                         for place, wire in enumerate(reversed(good.inputs))}
@@ -182,7 +182,7 @@ class Example:
 
 
 FRAME = ".model m\n.inputs a b\n.outputs y\n%s.end\n"
-# A netlist, and what is said about it after "bad.blif"; equations are "y = a & b".
+# A netlist, and the message about it after "bad.blif"; the equation is "y = a & b".
 MALFORMED = [
     ("", ":1: there is no .model; is this a BLIF file?"),
     (FRAME % ".names a b y\n11 1\n0 1\n",
@@ -211,7 +211,7 @@ MALFORMED = [
     (FRAME % ".wire a\n",
      ":4: .wire is not known; blocks are .model .inputs .outputs .names .end"),
     (FRAME % ".names a b \\\n",
-     None),  # the continuation takes .end, which then drives nothing
+     None),  # the continuation includes .end, so nothing drives y
     (".model m\n.inputs a b\n.outputs y\n.names a b \\",
      ":4: the file ends within a line that '\\' continues; it is cut off"),
     (FRAME % ".names a it's y\n11 1\n",
@@ -219,7 +219,7 @@ MALFORMED = [
     (FRAME % (".names " + " ".join(f"i{number}" for number in range(17)) + " y\n"),
      ":4: y has 17 inputs, more than 16; map the design to look-up tables first"),
 ]
-# Lines of equations for a netlist of y = a & b, and what is said after "bad.eqn".
+# Lines of equations for a netlist of y = a & b, and the message after "bad.eqn".
 MALFORMED_EQUATIONS = [
     ("y a & b\n", ":1: there is no '='; write NAME = EQUATION"),
     ("\n# c\n = a & b\n", ":3: there is no name before '='; write NAME = EQUATION"),
@@ -258,7 +258,7 @@ def check_malformed(example):
 
 
 def check_forms(example):
-    """Off-sets, constants, buffers and one model's other forms, each with its equation."""
+    """Off-sets, constants, buffers and other forms of a model, each with its equation."""
     for block, equation, init in [
             (".names a b y\n0- 0\n-0 0\n", "a & b", "0x8"), (".names a b y\n", "0", "0x0"),
             (".names a b y\n-- 1\n", "1", "0xf"), (".names a y\n0 1\n", "~a", "0b01"),

@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-"""Runs the notebook's cells with nbclient; its assertions decide. Then once more with a wrong init
-value in it, which must fail.
+"""Runs the notebook's cells with nbclient; its assertions decide. Then runs it again with a wrong
+init value, which must fail.
 
 usage: test_notebook.py NOTEBOOK
 Exit status 77, which counts as skipped: nbclient, ipykernel, NumPy or pandas is missing.
@@ -32,7 +32,7 @@ def run(text):
 
 
 def use_this_interpreter(directory):
-    """A kernel that is this interpreter, whatever kernels the machine knows."""
+    """A kernel that is this interpreter, whatever kernels the machine has."""
     kernel = pathlib.Path(directory, "kernels/tested/kernel.json")
     kernel.parent.mkdir(parents=True)
     kernel.write_text(json.dumps({

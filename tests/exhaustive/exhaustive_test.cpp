@@ -1,6 +1,6 @@
 // Every text up to a size, library against the reference model: acceptance, messages, tree,
 // renderings, variables and results. The numbers of accepted and refused texts are asserted, so
-// that a loop which stops early cannot pass. Only the first differences are reported.
+// that a loop that stops early cannot pass. Only the first differences are reported.
 #include <gtest/gtest.h>
 
 #include <functional>
@@ -45,7 +45,7 @@ class Checker {
     Kq_BoolEquationImp& Library() { return m_library; }
     support::Capture& Messages() { return m_capture; }
 
-    // Counts the text that stands in the objects; a text checked by hand calls it itself.
+    // Counts the text that the objects hold; code that checks a text by hand calls this itself.
     void Count()
     {
         if (m_has_text)
@@ -89,7 +89,7 @@ void CheckAll(Checker& checker, const Texts& alphabet, size_t minLength, size_t 
                     [&checker](const std::string& text) { checker.Check(text); });
 }
 
-// One spelling of each kind of token; the blank keeps "~" from closing up with an operator.
+// One spelling of each kind of token; the blank keeps "~" from joining with an operator.
 const Texts kOneOfEachKind = {"A ", "B ", "1", "~ ", "&", "|", "(", ")"};
 const Texts kOneBinaryOperator = {"A ", "~ ", "&", "(", ")"};
 const Texts kAllOperators = {"A", "B", "0", "1", "~", "(", ")", "&", "|", "^", "~&", "~|", "~^"};
@@ -179,7 +179,8 @@ Texts FirstNames(size_t numNames)
     return Texts(kNames.begin(), kNames.begin() + static_cast<std::ptrdiff_t>(numNames));
 }
 
-// One init value over the first names, set plainly and with explicit terms in all four orders.
+// One init value over the first names, set without terms and with explicit terms, in all four
+// orders.
 void CheckInitValue(Checker& checker, size_t numNames, const std::string& text)
 {
     checker.Model().Clear();

@@ -1,5 +1,5 @@
-// Dumps and traces, byte for byte: each scenario's messages against the .ok file of its name.
-// A new or changed file is made by running with KQ_GOLDEN_WRITE set, and reviewed like code.
+// Dumps and traces, byte for byte: each scenario's messages against the .ok file of the same name.
+// To make a new or changed file, run with KQ_GOLDEN_WRITE set, and review it like code.
 #include <cstdlib>
 #include <fstream>
 #include <sstream>
@@ -24,7 +24,7 @@ std::string ReadFile(const std::string& path)
     return text.str();
 }
 
-// Compares what 'play' issues with the scenario's file.
+// Compares the messages that 'play' issues with the scenario's file.
 template <class Play>
 void ExpectGolden(const std::string& scenario, Play play)
 {

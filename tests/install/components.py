@@ -1,6 +1,5 @@
 #!/usr/bin/env python3
-# Packages are made by component, so each installed file belongs to exactly one component, and none
-# is left over.
+# Packages are made by component, so each installed file must belong to exactly one component.
 # usage: components.py CMAKE BUILD SCRATCH
 import collections
 import os
@@ -50,7 +49,7 @@ def main():
         failures += 1
     counts = collections.Counter(owner for file in owners for owner in owners[file])
     print(f"{len(everything)} files;", ", ".join(f"{name} {counts[name]}" for name in COMPONENTS))
-    for component in ("library", "development", "documentation"): # always there
+    for component in ("library", "development", "documentation"): # always present
         if not counts[component]:
             print(f"component {component} has no file")
             failures += 1

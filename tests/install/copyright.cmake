@@ -1,5 +1,5 @@
-# The copyright files of the packages name who wrote what is in them: the solver's authors where it is
-# linked in, and nowhere else. BUILD, SCRATCH, HAS_SOLVER.
+# The copyright files of the packages name the authors of their content: the solver's authors if it
+# is linked in, and only then. Variables: BUILD, SCRATCH, HAS_SOLVER.
 cmake_minimum_required(VERSION 3.25)
 
 include("${BUILD}/CPackConfig.cmake")

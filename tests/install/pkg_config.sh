@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Builds and runs SOURCE with what pkg-config says about PACKAGE as it is installed in PREFIX.
+# Builds and runs SOURCE with the flags that pkg-config gives for PACKAGE, installed in PREFIX.
 # usage: pkg_config.sh PREFIX COMPILER SOURCE OUTPUT PACKAGE
 set -euo pipefail
 

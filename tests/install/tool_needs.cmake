@@ -1,6 +1,6 @@
-# Without CLI11 or nlohmann-json configuring ends with a message that says what to install, unless the
-# tool was switched off; as part of another project the library is built without it. SOURCE, SCRATCH,
-# CMAKE_CXX_COMPILER.
+# Without CLI11 or nlohmann-json, configuring ends with a message that says what to install, unless
+# the tool is switched off; as part of another project the library is built without the tool.
+# Variables: SOURCE, SCRATCH, CMAKE_CXX_COMPILER.
 cmake_minimum_required(VERSION 3.25)
 
 file(REMOVE_RECURSE "${SCRATCH}")

@@ -1,4 +1,4 @@
-// The second library through its public headers alone: values, limits and refusals.
+// The second library, only through its public headers: values, limits and refusals.
 #include <chrono>
 #include <random>
 
@@ -58,7 +58,7 @@ TEST(LogicFunction, StaysAsItWasWhenRefused)
     EXPECT_FALSE(function.Set(Kq_BoolEquation()));
     EXPECT_FALSE(function.Set(Kq_BoolEquation(Parity(31).c_str())));
     EXPECT_FALSE(function.Set({"A", "A"}, {1}));
-    EXPECT_FALSE(function.Set({"A"}, {4})); // a bit beyond the last row
+    EXPECT_FALSE(function.Set({"A"}, {4})); // a bit after the last row
     EXPECT_FALSE(function.Set({"A"}, {}));
     EXPECT_FALSE(function.Set({"A"}, {1, 0}));
     EXPECT_FALSE(function.Set(std::vector<std::string>(31, "A"), {1}));

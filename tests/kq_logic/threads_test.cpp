@@ -1,5 +1,5 @@
-// Four threads ask everything at once, about objects of their own and about shared ones; each
-// answer is that of one thread. The thread sanitizer sees what they share inside.
+// Four threads ask everything at once, about their own objects and about shared ones; each answer
+// must be that of a single thread. The thread sanitizer sees what they share inside.
 #include <functional>
 #include <random>
 #include <string>

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Breaks one rule at a time in a copy of the sources; each check must report exactly that.
+"""Breaks one rule at a time in a copy of the sources; the check must report exactly that.
 
 usage: checks_can_fail.py [UNITTEST OPTION...] ROOT COMPILER
 """
@@ -40,7 +40,7 @@ class Includes(InCopy):
         status, output = run(sys.executable, ROOT / "scripts/check_includes.py", self.copy)
         return status, output.splitlines()
 
-    # What the sources violate as they are is the business of another test.
+    # Violations in the sources as they are belong to another test.
     def find_new(self):
         status, lines = self.check()
         self.assertEqual(status, 1 if lines else 0)
@@ -63,7 +63,7 @@ class Includes(InCopy):
         path.write_text(text + path.read_text(encoding="utf-8"), encoding="utf-8")
 
     def test_public_header_that_looks_up(self):
-        path = self.copy / "include/Kq_BoolEquation.h"  # a line more could be one too many
+        path = self.copy / "include/Kq_BoolEquation.h"  # one more line could be too many
         path.write_text(path.read_text(encoding="utf-8").replace(
             "#include <vector>", "#include <Kq_BoolEquationImp.h>"), encoding="utf-8")
         self.expect("include/Kq_BoolEquation.h", "may not include")

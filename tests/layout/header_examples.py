@@ -1,10 +1,10 @@
 #!/usr/bin/env python3
-"""Compiles and runs the example that each public header opens with; what it prints must be what the
-comments after its lines say.
+"""Compiles and runs the example at the top of each public header; it must print what the comments
+after its lines say.
 
 usage: header_examples.py COMPILER INCLUDE SCRATCH HEADER... -- LINK_OPTION...
 
-Exit status: 1 when a header has no example, or one does not do what it says.
+Exit status: 1 if a header has no example, or an example does not do what it says.
 """
 import pathlib
 import re
@@ -15,7 +15,7 @@ SAYS = re.compile(r"<< '\\n'; // (.*)$|\.text; // (.*)$")
 
 
 def example_of(header):
-    """The indented lines of the comment at the top, and what they print."""
+    """The indented lines of the comment at the top, and what they must print."""
     lines = []
     for line in header.read_text(encoding="utf-8").splitlines():
         if not line.startswith("//"):

@@ -1,6 +1,6 @@
-// The library is loaded and unloaded with a plug-in, again and again: it goes completely, leaves
-// nothing there, and reads the debug switch each time; by several threads as well. This program
-// itself is not linked to it.
+// The library is loaded and unloaded with a plug-in, again and again: it is removed completely,
+// leaves nothing behind, and reads the debug switch each time. Several threads do this as well.
+// This program itself is not linked to the library.
 #include <atomic>
 #include <condition_variable>
 #include <cstdlib>
@@ -24,8 +24,8 @@ bool IsLoaded(const char* path)
     return library != nullptr;
 }
 
-// The loader has a lock too, but the thread sanitizer does not know it: without this one it would
-// take two lives of the library at one address for one.
+// The loader has a lock too, but the thread sanitizer does not know it. Without this one, it would
+// mistake two lives of the library at the same address for one.
 std::mutex s_loader;
 
 class Plugin {
@@ -70,12 +70,12 @@ TEST(Loading, LoadedAndUnloadedManyTimes)
             ASSERT_TRUE(IsLoaded(KQ_TEST_HOST_LIBRARY));
             EXPECT_TRUE(plugin.Use(round));
         }
-        if (round == 20) // what the loader itself keeps is there by now
+        if (round == 20) // by now the loader has what it keeps
             numBytes = mallinfo2().uordblks;
     }
     EXPECT_FALSE(IsLoaded(KQ_TEST_LIBRARY));
     EXPECT_FALSE(IsLoaded(KQ_TEST_HOST_LIBRARY)) << "nothing in it is unique in the process";
-    // A life of the library that left its pool of names behind would cost a kilobyte.
+    // Each life of the library that leaked its pool of names would cost a kilobyte.
     EXPECT_LE(mallinfo2().uordblks, numBytes + 80 * 100);
 }
 
@@ -90,7 +90,7 @@ TEST(Loading, StaysWhileSomebodyHasIt)
     EXPECT_TRUE(first.Use(2));
 }
 
-// Now one thread has it, now another, now several or none.
+// Sometimes one thread holds the library, sometimes another, several or none.
 TEST(LoadingThreads, LoadUseAndUnload)
 {
     std::atomic<int> numWrong{0};
@@ -110,13 +110,14 @@ TEST(LoadingThreads, LoadUseAndUnload)
     EXPECT_FALSE(IsLoaded(KQ_TEST_HOST_LIBRARY));
 }
 
-// A thread that has used the library runs on, and ends when the library is no more: what was kept
-// for it must not need any code then, and must not pile up while it lives.
+// A thread that has used the library continues, and ends after the library was unloaded. What was
+// kept for the thread must not need the library's code then, and must not pile up while the thread
+// lives.
 TEST(LoadingThreads, OutliveTheLibrary)
 {
     std::mutex lock;
     std::condition_variable changed;
-    int numLoaded = 0; // odd while it is loaded
+    int numLoaded = 0; // odd while the library is loaded
     const Plugin* current = nullptr;
     std::atomic<int> numWrong{0};
     const int kNumRounds = 100;

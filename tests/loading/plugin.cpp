@@ -1,5 +1,5 @@
-// What a host program loads at run time: it brings the library with it, and has an equation as a
-// static object, made while the plug-in is loaded and destroyed while it is unloaded.
+// A plug-in that a host program loads at run time. It brings the library with it, and has an
+// equation as a static object, made while the plug-in is loaded and destroyed while it is unloaded.
 #include <string>
 
 #include <Kq_BoolEquation.h>

@@ -1,4 +1,4 @@
-// An equation that is a static object of another source than 'main'.
+// An equation that is a static object in a different source than 'main'.
 #include "loading/static_equation.h"
 
 #include <cstdio>
@@ -6,7 +6,7 @@
 
 namespace {
 
-// Made before the equation, so it goes after it: the library works up to the very end.
+// Made before the equation, so destroyed after it: the library works to the very end.
 struct Last {
     ~Last()
     {

@@ -1,5 +1,5 @@
 // What the two sources of the program share. The objects of static_equation.cpp are made first and
-// destroyed last, as the program is linked in that order.
+// destroyed last, because the program is linked in that order.
 #ifndef STATIC_EQUATION_H
 #define STATIC_EQUATION_H
 

@@ -1,5 +1,5 @@
-// Equations used before 'main' and after it, by static objects of two sources that share nodes.
-// usage: static_program on|off: what the debug switch must be found to be. Prints "all is well".
+// Equations used before and after 'main', by static objects of two sources that share nodes.
+// usage: static_program on|off: the expected state of the debug switch. Prints "all is well".
 #include <string>
 
 #include <Kq_BoolEquationImp.h>

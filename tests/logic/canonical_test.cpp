@@ -1,5 +1,5 @@
-// Canonical forms: against every order and inversion tried row by row, by the number of classes,
-// and on functions that no transformation tells apart quickly.
+// Canonical forms: against all orders and inversions tried row by row, by the number of classes,
+// and on functions whose inputs are hard to distinguish.
 #include <algorithm>
 #include <numeric>
 #include <random>
@@ -15,8 +15,7 @@ namespace {
 
 using namespace booleq;
 
-// The model: a function is its rows as a vector; a transformation is applied as its definition
-// says.
+// The model: a function is its rows as a vector, and transformations are applied by definition.
 typedef std::vector<bool> Values;
 
 Values ValuesOf(uint64_t table, unsigned int numInputs)
@@ -151,7 +150,7 @@ TEST(Canonical, IsTheLeastOfAllTransformationsOfFiveAndSixInputs)
     }
 }
 
-// Functions whose inputs hardly anything tells apart: linear, bent, symmetric ones, and sparse ones
+// Functions whose inputs are hard to distinguish: linear, bent and symmetric ones, and sparse ones
 // with many upper blocks of zeros.
 TEST(Canonical, IsTheLeastWhereInputsAreAlike)
 {
@@ -176,7 +175,7 @@ TEST(Canonical, IsTheLeastWhereInputsAreAlike)
     }
 }
 
-// Every word and width gives what single tables give, whoever shares the work.
+// Arrays of every word and width give what single tables give, however threads share the work.
 TEST(Canonical, OfAnArrayIsThatOfEachTable)
 {
     std::mt19937_64 random(15);

@@ -1,4 +1,4 @@
-// Texts for other notations: parentheses, names, and readers that see what was written.
+// Texts for other notations: parentheses, names, and readers for what was written.
 #include <gtest/gtest.h>
 
 #include "convert.h"
@@ -61,7 +61,7 @@ TEST(Names, AreSpelledOrChangedAndStayDifferent)
               (std::vector<std::string>{"A_1", "A", "a_1", "a", "A_0", "and", "n", "n1"}));
     EXPECT_EQ(TargetNamer(&VerilogNotation()).NameInputs(inputs),
               (std::vector<std::string>{"A_1", "A", "a_1", "a", "\\A[0] ", "\\and ", "n", "\\1 "}));
-    // Case does not count, but for names between backslashes.
+    // Case does not matter, except for names between backslashes.
     EXPECT_EQ(TargetNamer(&VhdlNotation()).NameInputs(inputs),
               (std::vector<std::string>{"\\A\\", "A", "\\a\\", "a_1", "\\A[0]\\", "\\and\\", "n",
                                         "\\1\\"}));
@@ -86,7 +86,7 @@ TEST(Convert, ProvesTextsOfAnyNumberOfInputs)
          {"verilog", "vhdl", "c", "python", "liberty", "blif", "eqn", "alt3"}) {
         const Conversion conversion = Converted(Parsed(text), target, "");
         EXPECT_EQ(conversion.fault, "");
-        // Without a solver only what groups the operands in the same way is proved.
+        // Without a solver, only texts that group the operands in the same way are proved.
         if (Solver::IsThere())
             EXPECT_TRUE(conversion.isProved) << conversion.doubt;
         else
@@ -104,7 +104,7 @@ TEST(Convert, TakesDeepExpressions)
         EXPECT_EQ(Converted(Parsed(text), target, "").fault, "") << target;
 }
 
-// What a notation reads: the column over the tree's names, or why not.
+// What a notation reads: the column over the tree's names, or why it does not read the text.
 std::string Seen(const Notation& notation, const std::string& text)
 {
     ForeignTree tree;
@@ -134,12 +134,12 @@ TEST(Reader, GoesByTheNotationsPrecedence)
 
 TEST(Reader, KnowsHowWideValuesAre)
 {
-    // "~" of an int is never 0 for 0 and 1; of a single bit it is.
+    // "~" of the ints 0 and 1 is never 0; of a single bit it can be.
     EXPECT_EQ(Seen(CNotation(), "~a"), "11");
     EXPECT_EQ(Seen(PythonNotation(), "~a"), "11");
     EXPECT_EQ(Seen(VerilogNotation(), "~a"), "10");
     EXPECT_EQ(Seen(CNotation(), "~a & 1"), "10");
-    // A sum of bits is 2, and its lowest bit 0.
+    // The sum of two ones is 2, and its lowest bit is 0.
     EXPECT_EQ(Seen(CNotation(), "a + b"), "0111");
     EXPECT_EQ(Seen(CNotation(), "(a + b) & 1"), "0110");
     EXPECT_EQ(Seen(VerilogNotation(), "a + b"), "0110");

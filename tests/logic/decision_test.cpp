@@ -1,5 +1,5 @@
-// Whether two expressions are one function: against all rows for small ones, by construction for
-// large ones.
+// Whether two expressions are the same function: small ones against all rows, large ones by
+// construction.
 #include "decision.h"
 
 #include <algorithm>
@@ -118,7 +118,7 @@ TEST(Decision, AgreesWithAllRowsOnSmallPairs)
     EXPECT_LT(numEqual, 15000u);
 }
 
-// Of the sizes in between every row can still be tried, but the decision takes another way.
+// For medium sizes every row can still be tried, but the decision works differently.
 TEST(Decision, FindsTheFirstRowAlsoWhereTheSolverMustHelp)
 {
     std::mt19937_64 random(3);
@@ -242,7 +242,7 @@ TEST(GateGraph, FoldsToWhatTheOperandsSay)
     }
 }
 
-// What only the solver decides.
+// Questions that only the solver decides.
 class SolverDecision : public testing::Test {
   protected:
     void SetUp() override
@@ -298,7 +298,7 @@ TEST_F(SolverDecision, EndsWhenTheTimeIsOverAndWhenItIsInterrupted)
     const Expression pigeons = Parsed(Pigeons(14));
     auto start = std::chrono::steady_clock::now();
     const Decision decision = DecideConstant(pigeons, false, {0.1});
-    EXPECT_LT(SecondsSince(start), 1.0); // on a machine that does other things too
+    EXPECT_LT(SecondsSince(start), 1.0); // allows for a busy machine
     EXPECT_EQ(decision.verdict, Verdict::Undecided);
     EXPECT_TRUE(decision.isTimeOver);
     EXPECT_EQ(decision.reason, "out of time");
@@ -338,7 +338,7 @@ TEST(Clauses, SayWhatTheirAssignmentsMean)
                              "-6 4 5 0\n-6 -4 -5 0\n6 -4 5 0\n6 4 -5 0\n6 0\n");
 }
 
-// Each assignment of the inputs that has the value can be completed, and no other.
+// The assignments of the inputs that have the value can be completed, and no others.
 TEST(Clauses, AreSatisfiedByTheAssignmentsOfTheValue)
 {
     std::mt19937_64 random(11);

@@ -1,4 +1,4 @@
-// Expressions: made from library equations, evaluated, written in the library's syntaxes.
+// Expressions: made from equations, evaluated, written in the library's syntaxes.
 #include <gtest/gtest.h>
 
 #include "expression.h"

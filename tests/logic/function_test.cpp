@@ -1,4 +1,4 @@
-// Functions as columns: against the library, input order by input order, and init texts as the
+// Functions as columns: against the library, for each order of inputs; and init texts as the
 // library reads them.
 #include <algorithm>
 #include <random>
@@ -15,7 +15,7 @@ namespace {
 using namespace booleq;
 using namespace logic_support;
 
-// The value for an assignment that is given by the row over 'inputs'.
+// The value for the assignment given as a row over 'inputs'.
 bool ValueFor(const Function& function, const std::vector<std::string>& inputs, uint64_t row)
 {
     uint64_t own = 0;

@@ -1,4 +1,4 @@
-// Init values as people write them give the rows that the library's own spelling gives.
+// Init values as people write them give the same rows as the library's own spelling.
 #include "init_literal.h"
 
 #include <gtest/gtest.h>

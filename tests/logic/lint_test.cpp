@@ -1,4 +1,4 @@
-// Findings about texts: each once where it is, and none where nothing is.
+// Findings about texts: each is reported once in its place, and none without a cause.
 #include <algorithm>
 #include <random>
 
@@ -66,7 +66,7 @@ TEST(Lint, TellsWhoGroupsDifferently)
 TEST(Lint, FindsABlankThatChangesTheMeaning)
 {
     EXPECT_EQ(Codes(Linted("P & X ~ | Y")), (Words{"blank", "unspaced-rendering"}));
-    // Between two operands the blank changes nothing, but the rendering closes up all the same.
+    // Between two operands the blank changes nothing, but the rendering still removes it.
     EXPECT_EQ(Codes(Linted("X ~ | Y")), Words{});
     EXPECT_EQ(Codes(Linted("'a ~ | b' & Y")), Words{});
 }
@@ -106,7 +106,7 @@ TEST(Lint, SaysWhatAnInversionOfNumbersIs)
     EXPECT_TRUE(ReadingOf(report, "Verilog").decision.IsEqual());
 }
 
-// "x0 & !x1 & x2 ...": 1 for one assignment of so many inputs.
+// "x0 & !x1 & x2 ...": 1 for one assignment of that many inputs.
 std::string Literals(const std::string& name, int numInputs)
 {
     std::string text;
@@ -133,7 +133,7 @@ TEST(Lint, SeesADifferenceThatNoSampleMeets)
 
 TEST(Lint, ComputesWithNumbersOfAnyNumberOfInputs)
 {
-    // "+" adds: in Verilog two ones are 0, in C they are not.
+    // "+" adds: in Verilog two ones give 0, in C they do not.
     std::string sum = "v0";
     for (int input = 1; input < 40; ++input)
         sum += " + v" + std::to_string(input);
@@ -195,7 +195,7 @@ TEST(Lint, NamesTwoReasonsWhereNoneExplainsAlone)
                   kInversionReason);
 }
 
-// Whether 'notation' has this library's function for the text.
+// Whether 'notation' reads the text as the same function as this library.
 bool Agrees(const std::string& text, const Notation& notation, const Expression& expression)
 {
     ForeignTree tree;

@@ -1,4 +1,4 @@
-// What the tests of logic/ share.
+// Helpers that the tests of logic/ share.
 #ifndef LOGIC_SUPPORT_H
 #define LOGIC_SUPPORT_H
 
@@ -30,7 +30,7 @@ inline std::vector<std::string> Names(size_t numInputs)
     return names;
 }
 
-// The function that the library reads an init value as.
+// The function as which the library reads an init value.
 inline booleq::Function FromInit(const std::string& text, const std::vector<std::string>& inputs)
 {
     booleq::Reading reading;
@@ -53,8 +53,8 @@ inline booleq::Function RandomFunction(const std::vector<std::string>& inputs,
     return {inputs, rows};
 }
 
-// One pigeon more than holes, each in a hole and no two in one: never 1, and hard for every search
-// that resolves clauses (Haken, "The intractability of resolution", 1985).
+// One more pigeon than holes, each in a hole and no two in the same: never 1, and hard for every
+// search that resolves clauses (Haken, "The intractability of resolution", 1985).
 inline std::string Pigeons(int numHoles)
 {
     const auto sits = [](int pigeon, int hole) {

@@ -1,4 +1,4 @@
-// Texts of many tables: each is what is said of its function alone.
+// Texts for many tables: each is the text for its function alone.
 #include <random>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-// Arrays of look-up tables: every kernel, for every word, against the same written row by row.
+// Arrays of look-up tables: every kernel, for every word, against the same operation row by row.
 #include <algorithm>
 #include <bitset>
 #include <cstring>
@@ -15,10 +15,10 @@ namespace {
 
 using namespace booleq;
 
-// The model: a table is its rows as a vector; an array is a vector of those.
+// The model: a table is its rows as a vector; an array is a vector of tables.
 typedef std::vector<bool> Values;
 
-// An array of tables in memory of its own.
+// An array of tables that owns its memory.
 struct OwnedLuts {
     OwnedLuts(unsigned int numInputs, unsigned int tableBytes, size_t count)
         : words((tableBytes * count + 7) / 8), luts{words.data(), count, numInputs, tableBytes}
@@ -32,7 +32,7 @@ struct OwnedLuts {
     {
         return reinterpret_cast<unsigned char*>(words.data()) + place * luts.tableBytes;
     }
-    // The machine's words have their lowest byte first.
+    // This machine's words have their lowest byte first.
     bool At(size_t place, unsigned int row)
     {
         return (Bytes(place)[row / 8] >> (row % 8) & 1u) != 0;
@@ -275,7 +275,7 @@ TEST(Luts, DistinctOnesAreSortedAndCounted)
     });
 }
 
-// Arrays of several parts, which threads share: each result stands in its own place.
+// Arrays of several parts, shared by threads: each result is in its own place.
 TEST(Luts, ManyAreDoneByThreadsAsByOne)
 {
     constexpr unsigned int kNumInputs = 6;

@@ -1,5 +1,5 @@
-// Sums of products: against a search through all of them for small tables, and by rows for larger
-// ones. What a table says of a row is read from its cubes here, digit by digit.
+// Sums of products: small tables against a search through all sums, larger ones by rows. The tests
+// read the value of a row from the table's cubes, digit by digit.
 #include <algorithm>
 #include <random>
 
@@ -48,7 +48,7 @@ bool HasRow(const CubeSpace& space, const uint64_t* cube, size_t row)
     return true;
 }
 
-// The first row at which the sum breaks what the rows say; SIZE_MAX for none.
+// The first row where the sum contradicts the rows; SIZE_MAX if there is none.
 size_t FirstMistake(const CubeSpace& space, const Rows& rows, const CubeList& sum, bool isInverted)
 {
     for (size_t output = 0; output < rows.size(); ++output)
@@ -75,7 +75,8 @@ Rows RandomRows(size_t numInputs, size_t numOutputs, std::mt19937_64& random)
     return rows;
 }
 
-// The cheapest cover by going through all of them: no cube calculus, no bounds but the best so far.
+// Finds the cheapest cover by trying all of them: no cube calculus, no bound except the best so
+// far.
 class PlainSearch {
   public:
     PlainSearch(const Rows& rows, size_t numInputs, uint64_t termCost, uint64_t literalCost)
@@ -124,7 +125,7 @@ class PlainSearch {
             m_cubes.push_back({covered, cost});
     }
 
-    // A product is of no use beside one that covers as much at no more cost.
+    // Drops products if another one covers as much at no more cost.
     void DropReplaced()
     {
         std::vector<std::pair<uint64_t, uint64_t>> useful;
@@ -191,8 +192,8 @@ TEST(Minimise, ExactHasTheFewestTermsThenLiteralsOfAllSums)
     }
 }
 
-// What an exact search for terms, then literals, finds for one output, checked against the plain
-// one.
+// Checks an exact search for the fewest terms, then literals, for one output, against the plain
+// search.
 void ExpectFewest(const Rows& rows, size_t numInputs)
 {
     SumOptions options;
@@ -229,7 +230,7 @@ uint32_t Renamed(uint32_t function, const std::vector<size_t>& order, size_t inv
     return renamed;
 }
 
-// Renaming inputs and inverting them changes no cost, so one function of each class is enough.
+// Renaming or inverting inputs does not change the cost, so one function of each class is enough.
 TEST(Minimise, ExactHasTheFewestOfEveryFunctionOfFourInputs)
 {
     std::vector<uint8_t> isKnown(65536, 0);

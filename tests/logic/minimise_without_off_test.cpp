@@ -1,4 +1,4 @@
-// Sums of products where the rows that are 0 are too many to be written down as cubes.
+// Sums of products for tables with too many rows that are 0 to be listed as cubes.
 #include <random>
 
 #include <gtest/gtest.h>
@@ -19,7 +19,7 @@ Pla DisjointTerms(size_t numInputs)
         std::string row(numInputs, '-');
         row[input] = row[input + 1] = '1';
         text += row + " 1\n";
-        row[(input + 2) % numInputs] = '0'; // and a piece of it that is not needed
+        row[(input + 2) % numInputs] = '0'; // and a redundant part of it
         text += row + " 1\n";
     }
     Pla table;
@@ -30,7 +30,7 @@ Pla DisjointTerms(size_t numInputs)
 
 TEST(MinimiseWithoutOff, TermsOfManyInputsNeedNoOffSet)
 {
-    const Pla table = DisjointTerms(36); // 2^18 cubes, twice what is tried
+    const Pla table = DisjointTerms(36); // 2^18 cubes, twice the number that is tried
     for (const Goal goal : {Goal::Terms, Goal::Literals}) {
         SumOptions options;
         options.goal = goal;
@@ -58,7 +58,7 @@ TEST(MinimiseWithoutOff, SaysWhatItCannotDoWithoutOffSet)
     EXPECT_NE(fault.message.find("product of sums"), std::string::npos) << fault.message;
 }
 
-// The same sums with the off-set and without: primes, irredundant, and the function itself.
+// Sums without the off-set are as good as with it: primes, irredundant, and the same function.
 TEST(MinimiseWithoutOff, GrowsByTautologyToPrimesToo)
 {
     for (unsigned int seed = 1; seed <= 50; ++seed) {

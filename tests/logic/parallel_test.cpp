@@ -1,4 +1,4 @@
-// Work shared by threads: all of it once, and how it ends early.
+// Work shared by threads: each part is done once; and how work ends early.
 #include <algorithm>
 #include <chrono>
 #include <new>
@@ -52,7 +52,7 @@ TEST(Parallel, TheWatcherEndsItAndIsCalledByTheCallerAlone)
             throw 10;
     });
     const auto run = [](size_t, size_t) {
-        Watch(); // in whatever thread
+        Watch(); // in any thread
         std::this_thread::sleep_for(std::chrono::microseconds(100));
     };
     EXPECT_THROW(RunInParts(1000000000, 1, LutWork{3}, run), int);

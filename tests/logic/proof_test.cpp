@@ -21,7 +21,7 @@ using decide_pairs::CheckProof;
 using decide_pairs::ProofVerdict;
 using namespace logic_support;
 
-// Neither of two variables can have a value.
+// Two variables, none of whose four assignments is allowed.
 constexpr const char* kFour = "c nothing\np cnf 2 4\n1 2 0\n-1 2 0\n1 -2 0\n-1 -2 0\n";
 
 std::string ReasonOf(const std::string& clauses, const std::string& proof)
@@ -36,7 +36,7 @@ TEST(ProofCheck, FollowsUnitsAndDeletions)
     EXPECT_EQ(ReasonOf(kFour, "1 0\n0\n"), "");
     EXPECT_EQ(ReasonOf(kFour, "1 0\nd 1 2 0\nd -2 1 0\n0\n"), "");
     EXPECT_EQ(ReasonOf(kFour, "1 0\nd 1 0\n0\n"), "proof, line 3: the clause does not follow");
-    // What followed from a clause is gone with it, although it was propagated before.
+    // What followed from a deleted clause is gone, although it was propagated before.
     EXPECT_EQ(ReasonOf("p cnf 3 4\n1 0\n-1 2 0\n-2 3 0\n-3 -2 0\n", "0\n"), "");
     EXPECT_EQ(ReasonOf("p cnf 3 4\n1 0\n-1 2 0\n-2 3 0\n-3 -2 0\n", "d -1 2 0\n0\n"),
               "proof, line 2: the clause does not follow");
@@ -47,7 +47,7 @@ TEST(ProofCheck, FollowsUnitsAndDeletions)
 
 TEST(ProofCheck, TakesResolventsWherePropagationDoesNotDo)
 {
-    // 3 is new, and is defined as 1 AND 2; what cannot be satisfied has other variables.
+    // 3 is new and defined as 1 AND 2; the unsatisfiable clauses have other variables.
     const ProofVerdict verdict = CheckProof("p cnf 5 5\n1 2 0\n4 5 0\n-4 5 0\n4 -5 0\n-4 -5 0\n",
                                             "3 -1 -2 0\n-3 1 0\n-3 2 0\n4 0\n0\n");
     EXPECT_TRUE(verdict.isAccepted) << verdict.reason;
@@ -78,7 +78,7 @@ TEST(ProofCheck, RefusesWhatIsNoProof)
     EXPECT_EQ(ReasonOf("p cnf 1 1\n1 0\n-1 0\n", "0\n"), "clauses, line 3: more than was said");
 }
 
-// What the solver writes, into a file that is removed.
+// Proofs that the solver writes, to a file that is removed.
 class SolverProof : public testing::Test {
   protected:
     void SetUp() override
@@ -101,7 +101,7 @@ class SolverProof : public testing::Test {
     std::string m_path;
 };
 
-// Clauses without one of them, counted in the head.
+// The clauses without one of them; the header has the right count.
 Cnf Without(const Cnf& cnf, size_t dropped)
 {
     Cnf fewer(cnf);
@@ -132,10 +132,11 @@ TEST_F(SolverProof, IsOneForRandomPairs)
         ASSERT_TRUE(verdict.isAccepted) << number << ": " << verdict.reason;
         numAdded += verdict.numAdded;
         numDeleted += verdict.numDeleted;
-        // Without the demand that the sides differ something satisfies the others: whatever stands
-        // in a proof, it shows nothing of them.
+        // Without the clause that demands a difference, the others are satisfiable, so no proof may
+        // be accepted for them.
         ASSERT_FALSE(CheckProof(ToDimacs(Without(cnf, cnf.numClauses - 1)), proof).isAccepted);
-        // Without any other clause the solver says whether that is so, and the checker agrees.
+        // Without any other clause, the solver says whether the rest is satisfiable, and the
+        // checker must agree.
         const Cnf fewer = Without(cnf, random() % cnf.numClauses);
         if (WriteProof(fewer, m_path, {}) != ProofEnd::Satisfiable)
             continue;
@@ -154,7 +155,7 @@ TEST_F(SolverProof, IsNoneWhenItIsSpoilt)
     const std::string proof = ProofOf(cnf);
     const ProofVerdict whole = CheckProof(clauses, proof);
     ASSERT_TRUE(whole.isAccepted) << whole.reason;
-    // Its end alone, its start alone, and each clause with a literal the other way round.
+    // Only its end, only its start, and each clause with one literal inverted.
     EXPECT_NE(ReasonOf(clauses, "0\n"), "");
     EXPECT_NE(ReasonOf(clauses, proof.substr(proof.size() / 2)), "");
     EXPECT_NE(ReasonOf(clauses, proof.substr(0, proof.find('\n', proof.size() / 2) + 1)), "");
@@ -171,7 +172,7 @@ TEST_F(SolverProof, IsNoneWhenItIsSpoilt)
             spoilt.insert(number, "-");
         numRefused += CheckProof(clauses, spoilt).isAccepted ? 0 : 1;
     }
-    EXPECT_GT(numRefused, numTried / 10); // of a fifth; the other clauses can do without
+    EXPECT_GT(numRefused, numTried / 10); // about a fifth; the other changes do no harm
 }
 
 TEST_F(SolverProof, IsOneForLargeQuestions)

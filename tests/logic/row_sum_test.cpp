@@ -1,4 +1,4 @@
-// Sums by rows: against the rows as they were drawn, and against growth by cubes.
+// Sums by rows: against the rows that were drawn, and against growth by cubes.
 #include <random>
 
 #include <gtest/gtest.h>
@@ -11,7 +11,7 @@ namespace {
 
 using namespace booleq;
 
-// A row for each assignment; digits 0, 1 and, a quarter of them, '-'.
+// A row for each assignment; digits are 0, 1 and, for a quarter of them, '-'.
 std::string RandomTable(size_t numInputs, size_t numOutputs, size_t percentOn,
                         std::mt19937_64& random)
 {
@@ -36,7 +36,7 @@ Pla Parsed(const std::string& text)
     return table;
 }
 
-// Whether a product can lose an output or a literal, or the whole can do without it.
+// Whether a product can lose an output or a literal, or can be dropped.
 bool IsLoose(const Pla& table, const RowTable& rows, const CubeList& sum, Work& work)
 {
     for (size_t term = 0; term < sum.Size(); ++term) {

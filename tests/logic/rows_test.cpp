@@ -1,4 +1,4 @@
-// Packed rows: every operation against the same one written row by row.
+// Packed rows: every operation against the same one row by row.
 #include <algorithm>
 #include <numeric>
 #include <random>
@@ -160,7 +160,7 @@ TEST(Rows, InputsMoveAndAreInverted)
 TEST(Rows, RestrictionKeepsTheInputsThatMatter)
 {
     ForRandomRows([](const Rows& rows, std::mt19937_64& random) {
-        // Idle inputs go in anywhere, and out again.
+        // Idle inputs can be added anywhere and removed again.
         Rows wide = rows;
         std::vector<unsigned int> order(rows.NumInputs());
         std::iota(order.begin(), order.end(), 3u);
@@ -181,7 +181,7 @@ TEST(Rows, OfSixInputsAndFewerAreOneWord)
 {
     EXPECT_EQ(Rows::OfWord(2, 0x8), Rows(2, {0x8}));
     EXPECT_EQ(Rows::OfWord(6, ~uint64_t(0)), ConstantRows(6, true));
-    EXPECT_NE(Rows(1), Rows(2)); // other rows
+    EXPECT_NE(Rows(1), Rows(2)); // they have different numbers of rows
     EXPECT_TRUE(IsOne(ConstantRows(9, true)) && IsZero(ConstantRows(9, false)));
 }
 

@@ -1,5 +1,5 @@
-// What is searched for: short expressions, names of functions, matches. Small sizes are tried
-// whole.
+// Searches for short expressions, names of functions and matches. Small sizes are tested
+// completely.
 #include <map>
 #include <random>
 
@@ -47,8 +47,8 @@ size_t CountInputs(const Expression& expression)
     return count;
 }
 
-// The fewest operands of every function of three inputs, by going through all trees of operators by
-// their number of operands, inversions tried everywhere.
+// The fewest operands for every function of three inputs: goes through all trees of operators by
+// their number of operands, with inversions everywhere.
 std::map<unsigned int, size_t> FewestOperands()
 {
     std::map<unsigned int, size_t> fewest;
@@ -212,7 +212,7 @@ TEST(FindKind, KnowsAMultiplexerOfFour)
     EXPECT_EQ(FindKind(function).kind, "multiplexer");
 }
 
-// By trying every order and every inversion.
+// Tries every order and every inversion.
 bool MatchesSomehow(const Function& first, const Function& second, bool allowInversions)
 {
     std::vector<unsigned int> order(first.NumInputs());
@@ -270,7 +270,8 @@ TEST(Match, FindsShuffledFunctionsOfTenInputs)
 
 TEST(Match, IsQuickForInputsThatAreAlike)
 {
-    // A majority against itself with one row changed: every order fails for the same reason.
+    // A majority function against itself with one row changed: every order fails for the same
+    // reason.
     Rows rows(12);
     for (size_t row = 0; row < rows.NumRows(); ++row)
         rows.Set(row, __builtin_popcountll(row) > 6);
@@ -315,8 +316,8 @@ TEST(Match, FindsAMappingOfFourInputsWheneverThereIsOne)
     EXPECT_GT(numMatches, 10u);
 }
 
-// Sixteen inputs, alike in all that a single one or a pair shows: two strongly regular graphs with
-// the same numbers, an OR of the edges' products.
+// Sixteen inputs that look alike one by one and in pairs: two strongly regular graphs with the same
+// parameters; the function is an OR of the products of the edges.
 Function OfGraph(bool isShrikhande)
 {
     const auto isEdge = [isShrikhande](unsigned int one, unsigned int other) {
@@ -347,7 +348,7 @@ TEST(Match, TellsLargeRandomFunctionsApart)
     std::mt19937_64 random(6);
     const Function first = RandomFunction(Names(16), random);
     Rows rows = first.GetRows();
-    // As many ones, but two rows have traded places.
+    // As many ones, but two rows are exchanged.
     rows.Words()[0] ^= uint64_t(1) << __builtin_ctzll(rows.Words()[0]);
     rows.Words()[1] ^= uint64_t(1) << __builtin_ctzll(~rows.Words()[1]);
     EXPECT_FALSE(Match(first, Function(first.Inputs(), rows), true).isFound);
@@ -377,7 +378,7 @@ TEST(Spectrum, IsTheSumOfItsDefinition)
                 sum += function.At(row) != parity ? -1 : 1;
                 if (set == 0 || (row & set) != 0)
                     continue;
-                bool difference = false; // over all rows that differ from this one in 'set' only
+                bool difference = false; // over all rows that differ from this one only in 'set'
                 for (uint64_t part = set;; part = (part - 1) & set) {
                     difference = difference != function.At(row | part);
                     if (part == 0)

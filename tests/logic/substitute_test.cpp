@@ -1,4 +1,4 @@
-// Expressions made of expressions, against the columns of what they are made of.
+// Expressions made from expressions, against the columns of their parts.
 #include "substitute.h"
 
 #include <gtest/gtest.h>

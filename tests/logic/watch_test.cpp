@@ -1,4 +1,4 @@
-// Long work can be ended from outside wherever it asks, and does the same work again afterwards.
+// Long work can be interrupted wherever it calls Watch(), and works the same again afterwards.
 #include <functional>
 #include <random>
 #include <stdexcept>
@@ -32,7 +32,8 @@ void CountAndEnd()
         throw Interrupt();
 }
 
-// What 'work' gives is the same after it was ended at each of some calls, and it makes calls.
+// 'work' must call Watch(), and give the same result after it was interrupted at each of several
+// calls.
 void ExpectItCanBeEnded(const std::function<std::string()>& work)
 {
     const std::string expected = work();
@@ -51,8 +52,8 @@ void ExpectItCanBeEnded(const std::function<std::string()>& work)
     EXPECT_EQ(expected, work());
 }
 
-// The table behind the search grows with the first questions, so this needs a process of its own,
-// as every test has that ctest starts.
+// The table of the search grows with the first questions, so this needs its own process, as every
+// test started by ctest has.
 TEST(Watch, EndsTheSearchForTheShortestAndItsTableStaysWhole)
 {
     const Rows hard = Rows::OfWord(4, 0x1668);
@@ -72,7 +73,7 @@ TEST(Watch, EndsTheSearchForTheShortestAndItsTableStaysWhole)
     if (numEnded == 0)
         GTEST_SKIP() << "the table is there already";
     EXPECT_GT(numEnded, 10u);
-    // Of all functions together, as it is when nothing is interrupted.
+    // For all functions together, as without an interrupt.
     size_t numLiterals = 0;
     for (uint64_t column = 0; column < 65536; ++column)
         numLiterals += CountLiterals(FindShortest(Rows::OfWord(4, column)));

@@ -1,5 +1,5 @@
-// The number of classes of functions of five inputs: functions that are their own canonical form
-// are counted. If two functions of a class were, or none, the number would be another.
+// The number of classes of functions of five inputs: counts the functions that are their own
+// canonical form. If a class had two such functions, or none, the number would be different.
 #include <algorithm>
 #include <numeric>
 #include <random>
@@ -17,11 +17,11 @@ constexpr unsigned int kUpperInputs = 4;
 constexpr size_t kNumUppers = 65536;
 // Harrison, "The number of equivalence classes of Boolean functions under groups containing
 // negation", 1963.
-constexpr size_t kNumUpperClasses = 402; // of four inputs up to order and inversions of inputs
+constexpr size_t kNumUpperClasses = 402; // for four inputs, up to order and inversions of inputs
 constexpr size_t kNumClasses =
-    616126; // of five up to order, inversions of inputs and of the output
+    616126; // for five inputs, up to order and inversions of inputs and output
 
-// Functions of four inputs that no order or inversion of inputs makes less, row by row.
+// Functions of four inputs that no order or inversion of inputs makes less, found row by row.
 std::vector<uint32_t> LeastUppers()
 {
     std::vector<bool> isMade(kNumUppers);
@@ -61,8 +61,8 @@ size_t CountFixed(const std::vector<uint64_t>& tables)
 
 TEST(CanonicalOfFiveInputs, HasTheKnownNumberOfClasses)
 {
-    // The rows where input 0 is 1 are the upper half of a number: one that can be made less is not
-    // form.
+    // The rows where input 0 is 1 are the upper half of the number. If that half can be made less,
+    // the number is not a form.
     const std::vector<uint32_t> uppers = LeastUppers();
     ASSERT_EQ(uppers.size(), kNumUpperClasses);
     size_t numFixed = 0;

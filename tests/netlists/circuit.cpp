@@ -22,7 +22,7 @@ bool DependsOnAll(const CircuitTable& table)
     return true;
 }
 
-// Row 'row' of a table with one pin more at the place 'pin', without that pin.
+// The row that 'row' of a table with one more pin, at the place 'pin', is without that pin.
 size_t WithoutPin(size_t row, size_t pin)
 {
     const size_t low = row & ((size_t(1) << pin) - 1);
@@ -185,7 +185,7 @@ std::string WriteJson(const Circuit& circuit, const char* key)
            cells + "}, \"netnames\": {" + names + "}}}}\n";
 }
 
-// A pin that is a constant becomes a net with a table of its own, without inputs.
+// A constant pin becomes a net with its own table without inputs.
 std::string WriteBlif(const Circuit& circuit)
 {
     std::string text = ".model top\n.inputs";

@@ -1,5 +1,5 @@
-// Small netlists made at random, as tables over numbered nets; what they say is computed row by
-// row, with nothing of the code under test. They are written as Yosys JSON or BLIF.
+// Small random netlists, as tables over numbered nets. Their functions are computed row by row,
+// without the code under test. They are written as Yosys JSON or BLIF.
 #ifndef TESTS_NETLISTS_CIRCUIT_H
 #define TESTS_NETLISTS_CIRCUIT_H
 
@@ -10,7 +10,7 @@
 
 typedef std::mt19937_64 Random;
 
-// Up to, but without, 'end'.
+// A random number below 'end'.
 size_t Pick(Random& random, size_t end);
 
 constexpr int kZeroPin = -1; // a pin tied to a constant
@@ -19,7 +19,7 @@ constexpr int kOnePin = -2;
 struct CircuitTable {
     std::string name;
     std::vector<int> pins;  // nets, the least significant first
-    std::vector<bool> rows; // by the pins' value
+    std::vector<bool> rows; // by the value of the pins
     int output = 0;
     std::string place; // an attribute
 };
@@ -29,20 +29,22 @@ struct Circuit {
     std::vector<CircuitTable> tables;
 };
 
-// One to eight tables of up to six pins, over nets of their own and each other's; every table
+// One to eight tables of up to six pins, over inputs and each other's outputs; every table
 // depends on all its pins.
 Circuit MakeCircuit(Random& random);
 
 // The value for an assignment of all nets.
 bool ValueOf(const CircuitTable& table, const std::vector<bool>& values);
-// Whether two tables are one function of nets.  Cost: an assignment of all nets of both.
+// Whether two tables are the same function of nets.  Cost: tries all assignments of the nets of
+// both.
 bool IsSameFunction(const CircuitTable& left, const CircuitTable& right);
 
-// Changes that leave the function alone.
+// Changes that leave the function as it is.
 void ShufflePins(CircuitTable& table, Random& random);
 void AddIdlePin(CircuitTable& table, int net, Random& random);
-// A pin that is a constant, or a net that the table has on another pin, with anything in the rows
-// that never count; or, where the rows shall be as if the pin were idle, a constant.
+// Adds a pin that is a constant, or a net that is on another pin already, with arbitrary values in
+// the rows that are never reached; or, unless 'isAnything', a constant, with rows as if the pin
+// were idle.
 void AddFixedPin(CircuitTable& table, bool isAnything, Random& random);
 
 std::string WriteJson(const Circuit& circuit, const char* key);

@@ -1,5 +1,5 @@
-// Pairs of netlists, equal or with one fault, compared: whether the verdict is right, and whether
-// the cause that is named is the fault that was put in.
+// Compares pairs of netlists, equal or with one fault: the verdict must be right, and the named
+// cause must be the fault that was put in.
 //
 // usage: netlist_pairs [COUNT [SEED]]
 #include <algorithm>
@@ -17,7 +17,7 @@ namespace {
 
 using namespace booleq;
 
-// What was done to one table of the right netlist.
+// The change made to one table of the right netlist.
 enum class Fault {
     None,
     OutputInverted,
@@ -56,7 +56,8 @@ CauseCode CodeOf(Fault fault)
     return codes.at(fault);
 }
 
-// Causes that say the same of the table, only more plainly, and are named in place of the fault's.
+// Whether the named cause says the same about the table, only more simply, and so may replace the
+// fault's.
 bool StandsFor(CauseCode named, Fault fault)
 {
     return (named == CauseCode::HalvesExchanged && fault == Fault::InputInverted) ||
@@ -67,11 +68,11 @@ struct PairOfCircuits {
     Circuit left;
     Circuit right;
     Fault fault = Fault::None;
-    size_t table = 0;    // of both, that the fault is in
-    std::string renamed; // of NetRenamed, the net
+    size_t table = 0;    // of both netlists; it has the fault
+    std::string renamed; // for NetRenamed, the net
 };
 
-// What a fault of the init value leaves in row 'row'.
+// The value of row 'row' after a fault of the init value.
 bool FaultyRow(const std::vector<bool>& rows, size_t row, Fault fault, size_t pin, size_t count,
                size_t digit)
 {
@@ -104,7 +105,7 @@ void ChangeRows(CircuitTable& table, Fault fault, Random& random)
     const size_t digit = numRows >= 8 ? 4 : 1;
     size_t count = digit * (1 + Pick(random, numRows / digit - 1));
     if (fault == Fault::DigitsRotated && 2 * count == numRows)
-        count = digit; // half way round is the exchange of halves
+        count = digit; // rotating by half would be the exchange of halves
     const size_t numPins = table.pins.size();
     const size_t pin = fault == Fault::HalvesExchanged ? numPins - 1 : Pick(random, numPins);
     for (size_t row = 0; row < numRows; ++row)
@@ -137,8 +138,8 @@ void PutFault(CircuitTable& table, Fault fault, const Circuit& circuit, Random& 
     }
 }
 
-// Pins in another order, with some that do not count; what a shift brings in from rows that never
-// count cannot be known, so these rows are then as they would be.
+// Reorders the pins and adds some that do not matter. What a shift brings in from unreached rows
+// cannot be known, so for shifts these rows have the values as if the pin were idle.
 void Disguise(CircuitTable& table, const Circuit& circuit, bool isAnything, Random& random)
 {
     ShufflePins(table, random);
@@ -168,7 +169,7 @@ bool IsOfOneTable(Fault fault)
 size_t MinPins(Fault fault)
 {
     if (fault == Fault::DigitsRotated)
-        return 4; // of two digits, either way round is the exchange of halves
+        return 4; // with two digits, a rotation would be the exchange of halves
     if (fault == Fault::BitOrder)
         return 3;
     return fault == Fault::InputInverted || fault == Fault::PinsSwapped ? 2 : 1;
@@ -185,7 +186,7 @@ PairOfCircuits MakePair(Random& random)
     if (pair.left.tables[pair.table].pins.size() < MinPins(pair.fault))
         pair.fault = Fault::OutputInverted;
     CircuitTable& faulty = pair.right.tables[pair.table];
-    const bool isLast = Pick(random, 2) == 0; // pins are changed first, then spoilt
+    const bool isLast = Pick(random, 2) == 0; // change the pins first, then apply the fault
     if (IsOfOneTable(pair.fault) && !isLast)
         PutFault(faulty, pair.fault, pair.right, random);
     for (CircuitTable& table : pair.right.tables)
@@ -211,11 +212,11 @@ PairOfCircuits MakePair(Random& random)
 }
 
 struct Judge {
-    std::map<std::string, uint64_t> counts; // by fault, of those that were judged
-    uint64_t numFirst = 0;                  // causes that were named first
+    std::map<std::string, uint64_t> counts; // of judged pairs, by fault
+    uint64_t numFirst = 0;                  // right causes that were named first
     uint64_t numNamed = 0;
 
-    // Empty when everything is right; otherwise what is not.
+    // Empty if everything is right; otherwise what is wrong.
     std::string Look(const PairOfCircuits& pair, const Comparison& comparison);
 
   private:
@@ -278,7 +279,7 @@ bool ReadBoth(const std::string& leftText, const std::string& rightText, Design&
     return isRead;
 }
 
-// Pairs of which the names tell; half of the right ones with their tables under other paths.
+// Pairs matched by names; in half of the right netlists the tables have other paths.
 bool TestPair(uint64_t seed, Judge& judge)
 {
     Random random(seed);
@@ -301,8 +302,8 @@ bool TestPair(uint64_t seed, Judge& judge)
     return false;
 }
 
-// The right netlist has other names throughout, and places: equal ones are the same; of spoilt ones
-// the table is found where no order of its pins hides the fault.
+// The right netlist has other names everywhere, and places: equal pairs must compare as the same;
+// in damaged ones the table must be found if no order of its pins hides the fault.
 bool TestNameless(uint64_t seed, Judge& judge)
 {
     Random random(seed);
@@ -314,7 +315,7 @@ bool TestNameless(uint64_t seed, Judge& judge)
     }
     const size_t spoilt = Pick(random, right.tables.size());
     const bool isSpoilt = Pick(random, 2) == 0;
-    // An odd number of rows that are 1 becomes an even one: no order of pins does that.
+    // Changes the parity of the number of rows that are 1: no order of pins does that.
     if (isSpoilt)
         right.tables[spoilt].rows[Pick(random, right.tables[spoilt].rows.size())].flip();
     const bool isEqual = IsSameFunction(left.tables[spoilt], right.tables[spoilt]);

@@ -18,7 +18,7 @@ void Issue(const char* text)
     Port_MsgManData::createObject("Kq", "a file", 7, "a revision").issueStatus("%s", text);
 }
 
-// Puts the default sink back, whatever a test does.
+// Restores the default sink, whatever a test does.
 class Messages : public testing::Test {
   protected:
     ~Messages() override { Port_MsgManData::setSink(Port_MsgManData::Sink()); }
@@ -71,7 +71,7 @@ TEST_F(Messages, AreFormattedAsPrintfDoes)
     EXPECT_EQ(m_texts.back(), "   7 ab    |005\n");
 }
 
-// A wide character that no byte sequence stands for cannot be printed; a null format says nothing.
+// A wide character without a byte sequence cannot be printed; a null format prints nothing.
 TEST_F(Messages, WhatCannotBeFormattedIsNotIssued)
 {
     Port_MsgManData::setSink(Collect());
@@ -149,7 +149,7 @@ TEST_F(Messages, ASinkMayIssueAMessage)
     EXPECT_EQ(m_texts, (std::vector<std::string>{"7outer", "8inner", "end inner", "end outer"}));
 }
 
-// What a sink has captured must live until it returns.
+// What a sink has captured must live until the sink returns.
 TEST_F(Messages, ASinkMayReplaceItself)
 {
     const std::string captured(1000, 'c');
@@ -165,7 +165,7 @@ TEST_F(Messages, ASinkMayReplaceItself)
     EXPECT_EQ(m_texts, std::vector<std::string>{"to the second"});
 }
 
-// Objects with static storage report before 'main' and after it; the second is seen only by its
+// Objects with static storage report before 'main' and after it; the second report shows only by
 // not crashing.
 struct Early {
     Early()

@@ -1,5 +1,6 @@
 // The default host's message manager with several threads: whole texts, one at a time, whatever a
-// sink does. What must be alone is a plain variable here, so the thread sanitizer sees it too.
+// sink does. What must not be concurrent uses a plain variable here, so that the thread sanitizer
+// sees it too.
 #include <atomic>
 #include <chrono>
 #include <functional>
@@ -25,7 +26,7 @@ void Issue(int line, const std::string& text)
         .issueStatus("%s", text.c_str());
 }
 
-// One letter for each thread; some texts are longer than what is formatted in place.
+// One letter for each thread; some texts are too long to be formatted in place.
 std::string TextOf(int thread, int number)
 {
     return std::string(number % 10 == 0 ? 700 : 1 + static_cast<size_t>(number % 40),
@@ -55,7 +56,7 @@ class MessagesOfThreads : public testing::Test {
 
 TEST_F(MessagesOfThreads, ArriveWholeAndOneAtATime)
 {
-    // Not protected by anything: the host's lock has to do.
+    // Not protected by anything: the host's lock must be enough.
     std::vector<int> numTexts(kNumThreads, 0);
     int numInside = 0;
     int numWrong = 0;
@@ -65,7 +66,7 @@ TEST_F(MessagesOfThreads, ArriveWholeAndOneAtATime)
             const int thread = line / kNumTexts;
             numWrong += std::string(id) + file + revision != "Kqa filea revision";
             numWrong += text != TextOf(thread, line % kNumTexts);
-            // In the order in which the thread has issued them.
+            // Texts must be in the order in which the thread issued them.
             numWrong += line % kNumTexts != numTexts[static_cast<size_t>(thread)]++;
             --numInside;
         });
@@ -94,7 +95,7 @@ TEST_F(MessagesOfThreads, ReachStandardErrorWhole)
     EXPECT_EQ(0u, numMixed);
 }
 
-// Each thread fills in a report while the other does; nothing is issued in between.
+// Threads fill in reports at the same time; each report has its own thread's origin.
 TEST_F(MessagesOfThreads, OriginsAreEachThreadsOwn)
 {
     int numWrong = 0;
@@ -129,7 +130,7 @@ TEST_F(MessagesOfThreads, ASinkMayIssueMessagesItself)
         for (int number = 0; number < kNumTexts / 10; ++number)
             Issue(2, std::string(1, static_cast<char>('a' + thread)));
     });
-    // What a sink issues belongs between its own beginning and end, and nobody else's does.
+    // Between the beginning and end of a sink come only the messages that it issues itself.
     ASSERT_EQ(log.size(), size_t(kNumThreads * kNumTexts / 10 * 9));
     for (size_t begin = 0; begin < log.size(); begin += 9) {
         const std::string name(1, log[begin + 1]);
@@ -139,7 +140,7 @@ TEST_F(MessagesOfThreads, ASinkMayIssueMessagesItself)
 
 TEST_F(MessagesOfThreads, ASinkMayReplaceItself)
 {
-    // Two sinks that install each other: each text reaches the one whose turn it is.
+    // Two sinks that install each other: each text reaches the sink whose turn it is.
     std::vector<int> sinks;
     Port_MsgManData::Sink toEven;
     const auto toOdd = [&](const char*, const char*, int, const char*, const char*) {
@@ -182,7 +183,7 @@ TEST_F(MessagesOfThreads, AThrowingSinkReleasesTheLock)
     EXPECT_EQ(numTexts, numCaught);
 }
 
-// Whoever has exchanged a sink may let go what it referred to: it runs nowhere any more.
+// After a sink is exchanged, what it referred to may be destroyed: it no longer runs in any thread.
 TEST_F(MessagesOfThreads, AreReportedWhileTheSinkIsExchanged)
 {
     std::atomic<bool> isDone{false};
@@ -215,7 +216,7 @@ TEST_F(MessagesOfThreads, AreReportedWhileTheSinkIsExchanged)
     EXPECT_EQ((kNumThreads - 1) * kNumTexts, numReceived);
 }
 
-// What a sink keeps; a report changes one half, then the other.
+// The state of a sink; a report changes one half, then the other.
 struct Halves {
     explicit Halves(std::atomic<int>& numTorn) : m_numTorn(&numTorn) {}
     Halves(const Halves& other) : m_numTorn(other.m_numTorn), m_first(other.m_first)
@@ -239,7 +240,7 @@ struct Halves {
     int m_second = 0;
 };
 
-// A sink is copied for whoever gets it back, and never while it runs in another thread.
+// A sink is copied when it is returned to a caller, and never while it runs in another thread.
 TEST_F(MessagesOfThreads, ASinkIsCopiedBetweenReports)
 {
     std::atomic<int> numTorn{0};
@@ -264,7 +265,7 @@ struct Fates {
     std::vector<std::future<void>> reports;
 };
 
-// Finds out, when it goes, whether another thread can report.
+// On destruction, finds out whether another thread can report.
 struct Witness {
     explicit Witness(Fates& fates) : m_fates(&fates) {}
     ~Witness()
@@ -273,7 +274,7 @@ struct Witness {
             std::async(std::launch::async, [] { Issue(0, "from the witness"); });
         m_fates->numLocked +=
             report.wait_for(std::chrono::seconds(20)) != std::future_status::ready;
-        m_fates->reports.push_back(std::move(report)); // to wait for it would be to wait forever
+        m_fates->reports.push_back(std::move(report)); // waiting for it would never end
         ++m_fates->numGone;
     }
     Witness(const Witness&) = delete;
@@ -296,7 +297,8 @@ TEST_F(MessagesOfThreads, AReplacedSinkGoesWithoutTheLock)
     Port_MsgManData::setSink(Ignore);
     EXPECT_EQ(1, fates.numGone) << "replaced by somebody else";
 
-    // It installs another one that is replaced in turn: two go when it has ended, not before.
+    // It installs another sink, which is replaced in turn: two are destroyed after it has ended,
+    // not before.
     int numGoneInside = 0;
     Port_MsgManData::setSink(HoldWitness(fates, [&] {
         Port_MsgManData::setSink(HoldWitness(fates, [] {}));
@@ -307,7 +309,7 @@ TEST_F(MessagesOfThreads, AReplacedSinkGoesWithoutTheLock)
     EXPECT_EQ(1, numGoneInside);
     EXPECT_EQ(3, fates.numGone);
 
-    // The message of a sink is received by another one, which ends before the first has.
+    // The message of one sink is received by another, which ends before the first one does.
     Port_MsgManData::setSink(HoldWitness(fates, [&] {
         Port_MsgManData::setSink(HoldWitness(fates, [] { Port_MsgManData::setSink(Ignore); }));
         Issue(0, "to the second");

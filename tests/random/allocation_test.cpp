@@ -1,6 +1,6 @@
 // The n-th allocation fails, for every n until an operation succeeds: only std::bad_alloc comes
-// out, every object is still safe to ask, assign and destroy, and nothing is leaked.
-// Situations and promises; operations_test.cpp goes through every exported member.
+// out, every object is still safe to use, assign and destroy, and nothing is leaked. This file has
+// special situations and promises; operations_test.cpp goes through every exported member.
 #include <cstdio>
 #include <functional>
 #include <new>
@@ -32,7 +32,7 @@ void Prepare(Objects& objects)
     objects.handle = objects.a.GetVariableHandle("B");
 }
 
-// Asks everything that must answer whatever happened before.
+// Asks everything that must answer, whatever happened before.
 void Use(Objects& objects)
 {
     for (Kq_BoolEquation* equation : {&objects.a, &objects.b}) {
@@ -40,7 +40,7 @@ void Use(Objects& objects)
         equation->GetEquation(true);
         equation->GetEquationAlt2(false);
         equation->GetVariable("B");
-        // A failure may leave variables behind; a table of many of them is not a test of safety.
+        // A failure may leave variables; tabulating many of them would not test safety.
         if (equation->GetNumVariables() <= 6) {
             equation->GetEquationAsHexInitValue(false);
             equation->GetTruthTable().GetRows();
@@ -58,7 +58,7 @@ void Use(Objects& objects)
 }
 
 // How often the operation failed before it succeeded. In debug mode a host may allocate for each of
-// many thousand messages: there every allocation fails up to the 256th, then one in sixteen.
+// many thousand messages: then each of the first 256 allocations fails, after that one in sixteen.
 size_t FailEach(const Operation& operation, bool debugMode)
 {
     for (size_t failing = 0;; failing += debugMode && failing >= 256 ? failing / 16 : 1) {
@@ -83,7 +83,7 @@ size_t FailEach(const Operation& operation, bool debugMode)
 void ExpectSafe(const char* name, const Operation& operation)
 {
     for (const bool debugMode : {false, true}) {
-        // The first round fills what the process keeps: names, spellings.
+        // The first round fills what the process keeps: names and spellings.
         FailEach(operation, debugMode);
         const size_t numLive = memory::NumLive();
         const size_t numFailures = FailEach(operation, debugMode);
@@ -118,7 +118,7 @@ TEST(Allocation, SettingIsSafeWhateverFails)
         std::string chain = "P";
         for (unsigned int count = 0; count < 150; ++count)
             chain += "&P";
-        Kq_BoolEquationImp::SetInternalDebugMode(false); // traces grow with the square
+        Kq_BoolEquationImp::SetInternalDebugMode(false); // the size of traces is quadratic
         o.a.SetEquation(chain.c_str());
     });
     ExpectSafe("own name", [](Objects& o) { o.a.SetEquation(o.a.GetVariables()[0].first); });
@@ -187,7 +187,7 @@ TEST(Allocation, AskingIsSafeWhateverFails)
     ExpectSafe("dump", [](Objects& o) { o.a.Dbg(); });
 }
 
-// New names, tokens, a tree that is owed, a handle.
+// Uses new names, tokens, an owed tree and a handle.
 void UseEquations()
 {
     static size_t s_number = 0;
@@ -205,7 +205,7 @@ void UseEquations()
     EXPECT_NE(nullptr, engine.GetRoot());
 }
 
-// No lock is held while memory is asked for or given back.
+// No lock is held while memory is allocated or freed.
 TEST(Allocation, WhoeverServesMemoryMayUseEquations)
 {
     const Messages messages;
@@ -329,7 +329,7 @@ TEST(Allocation, AThrowingSinkIsTreatedTheSame)
     }
 }
 
-// An init value's tree is made when somebody asks for it.
+// An init value's tree is made on demand.
 TEST(Allocation, TreeThatIsOwedIsOwedStillAfterAFailure)
 {
     const std::string expected = "(a_name_that_needs_memory|B)&(~a_name_that_needs_memory|~B)";
@@ -354,7 +354,7 @@ TEST(Allocation, TreeThatIsOwedIsOwedStillAfterAFailure)
         if (!hasFailed)
             break;
         ++numFailures;
-        // As it was, for copies and assignments too.
+        // Everything is as before, also for copies and assignments.
         EXPECT_FALSE(!equation);
         EXPECT_EQ("0x6", Std(equation.GetEquationAsHexInitValue(false)));
         EXPECT_EQ(0u, copy.Eval());
@@ -393,7 +393,8 @@ TEST(Allocation, InitValueAnswersWithoutNodes)
     EXPECT_EQ(1u, equation.GetVariableHandle("G").size());
     std::vector<uint64_t> words;
     EXPECT_TRUE(equation.GetColumn(words));
-    // Making the nodes takes memory, so there were none yet; once they are there, none is taken.
+    // Making the nodes takes memory, so there were none yet; once they exist, no more memory is
+    // taken.
     const size_t numBefore = memory::NumAllocations();
     ASSERT_NE(nullptr, copy.GetRoot());
     EXPECT_LT(numBefore, memory::NumAllocations());

@@ -3,18 +3,18 @@
 
 usage: check_operations.py [--const] LIBRARY HEADERS SOURCE...
 
-Public members are those that HEADERS, a folder, declares outside of a private part; what is private
-is reached through them. SOURCE holds the operations, named as the symbol table has them.
-With --const only members count that change nothing: those that threads may ask one object at once.
-Prints a line for each member without an operation, and for each operation whose member is no more.
-Exit status: 1 when something was found.
+Public members are those that HEADERS, a folder, declares outside private parts; private ones are
+reached through them. SOURCE contains the operations, named as in the symbol table. With --const
+only const members count: those that several threads may call on one object. Prints a line for each
+member without an operation, and for each operation without a member.
+Exit status: 1 if something was found.
 """
 import pathlib
 import re
 import subprocess
 import sys
 
-# Overloads that are private, of names that are public too.
+# Private overloads of names that are also public.
 PRIVATE = {
     "Kq_BoolEquation::Handle::Handle(std::vector<unsigned int, std::allocator<unsigned int> >)",
     "Kq_BoolEquationImp::Node::Dbg(int) const",
@@ -24,7 +24,7 @@ MEMBER = re.compile(r"(operator\s*(?:\(\)|[^\s(]+(?:\s+\w+)*\*?)|~?\w+)\s*\(")
 
 
 def public_members(headers):
-    """'Class::name' of everything that is called, in parts that are not private."""
+    """'Class::name' of every function outside private parts."""
     for path in sorted(headers.glob("*.h")):
         name, is_public = None, False
         for line in path.read_text(encoding="utf-8").splitlines():
@@ -56,7 +56,7 @@ def main():
                 if name not in PRIVATE and re.match(r"(.*?[^:\s])\(", name)[1] in public
                 and (name.endswith(") const") or not is_const)}
     text = "".join(pathlib.Path(source).read_text(encoding="utf-8") for source in sources)
-    text = re.sub(r'"\s*\n\s*"', "", text)  # names that take two lines
+    text = re.sub(r'"\s*\n\s*"', "", text)  # names on two lines
     operations = set(re.findall(r'\{"(Kq_\w+::[^"]*\)(?: const)?)",', text))
     found = [f"no operation: {name}" for name in sorted(exported - operations)]
     found += [f"no such member: {name}" for name in sorted(operations - exported)]

@@ -15,7 +15,7 @@ const Node& Root(const Objects& o)
     return *o.engine.GetRoot();
 }
 
-// More operands wait for each other, on either side, than a walk keeps in place.
+// More operands wait for each other, on either side, than a walk keeps without the heap.
 std::string Deep()
 {
     std::string text = "A";
@@ -24,7 +24,7 @@ std::string Deep()
     return text;
 }
 
-// Of another size than its base, so the class's own allocator does not serve it.
+// Its size differs from its base's, so the class's allocator does not serve it.
 struct LargerNode : Node {
     unsigned int m_more[4] = {};
 };
@@ -68,7 +68,7 @@ const std::vector<Operation> kOfEngine = {
      [](Objects& o) {
          o.other.SetEquation("0x1e");
          o.engine.SetEquation(kText);
-         if (!Engine::GetInternalDebugMode()) // its trace would be a hundred thousand messages
+         if (!Engine::GetInternalDebugMode()) // its trace would have a hundred thousand messages
              o.engine.SetEquation(Deep().c_str());
          o.engine.SetEquation(o.other.GetVariables().at(0).first);
      }},
@@ -82,7 +82,7 @@ const std::vector<Operation> kOfEngine = {
      [](Objects& o) {
          Engine made;
          made.TokenizeNodes(kText);
-         o.engine.TokenizeNodes(kText); // there are nodes already
+         o.engine.TokenizeNodes(kText); // the object has nodes already
          o.engine.Clear();
          o.engine.TokenizeNodes("A & $");
      }},
@@ -256,7 +256,7 @@ const std::vector<Operation> kOfEngineTables = {
          Node::operator delete(nullptr, sizeof(LargerNode));
          delete new LargerNode;
      }},
-    // The members that stand in the header: copies, and what a name needs.
+    // Members defined in the header: copies, and what a name needs.
     {"Kq_BoolEquationImp::Node, copied",
      [](Objects& o) {
          const Node made(o.node);
@@ -283,7 +283,7 @@ const std::vector<Operation> kOfEngineTables = {
      [](Objects& o) {
          Root(o).Eval({{"x", 1u}, {"y", 0u}, {kLongName, 1u}});
          if (Engine::GetInternalDebugMode())
-             return; // its trace would be a hundred thousand messages
+             return; // its trace would have a hundred thousand messages
          Engine deep;
          deep.SetEquation(Deep().c_str());
          deep.GetRoot()->Eval(deep.GetVariables());

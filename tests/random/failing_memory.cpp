@@ -10,7 +10,7 @@
 
 namespace {
 
-// Counted and nothing else: no order between threads may come from them, it would hide races.
+// The counters must not order threads, because that would hide races.
 constexpr std::memory_order kCountOnly = std::memory_order_relaxed;
 std::atomic<size_t> s_numAllocations{0};
 std::atomic<size_t> s_numRawAllocations{0};
@@ -58,7 +58,7 @@ void Free(void* memory) noexcept
         return;
     Use();
     s_numLive.fetch_sub(1, kCountOnly);
-    // Large blocks are given back to the system anyway.
+    // Large blocks go back to the system anyway.
     const size_t size = malloc_usable_size(memory);
     if (size <= 4096)
         std::memset(memory, 0xdd, size);
@@ -128,7 +128,7 @@ void operator delete[](void* memory, size_t) noexcept
     Free(memory);
 }
 
-// An executable's own definition comes before the host library's.
+// The executable's definition takes precedence over the host library's.
 void* mav_malloc(size_t size)
 {
     s_numRawAllocations.fetch_add(1, kCountOnly);

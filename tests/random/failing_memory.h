@@ -1,7 +1,8 @@
-// Memory whose n-th allocation fails: the global operator new and the host's raw memory, replaced
-// for the whole executable. Both count, so leaks show; freed memory is overwritten, so that what
-// is still used by mistake does not look whole.
-// Threads: any; counts are of all threads together, and each makes its own allocations fail.
+// Memory whose n-th allocation fails: replaces the global operator new and the host's raw memory
+// for the whole executable. Both are counted, so leaks show. Freed memory is overwritten, so that
+// it does not look intact if it is still used by mistake.
+// Threads: any; counts are for all threads together, and each thread makes only its own allocations
+// fail.
 #ifndef FAILING_MEMORY_H
 #define FAILING_MEMORY_H
 
@@ -9,14 +10,14 @@
 
 namespace memory {
 
-// Allocations so far, and those that have not been freed.
+// The allocations so far, and those that have not been freed.
 size_t NumAllocations();
 size_t NumLive();
 // Allocations of the host's raw memory, mav_malloc, so far.
 size_t NumRawAllocations();
 
-// While it lives, allocation number 'numBefore' of this thread, counted from 0, fails; those after
-// it do not.
+// While it lives, allocation number 'numBefore' of this thread, counted from 0, fails; later ones
+// do not.
 class FailingAllocation {
   public:
     explicit FailingAllocation(size_t numBefore);
@@ -25,8 +26,8 @@ class FailingAllocation {
     FailingAllocation& operator=(const FailingAllocation&) = delete;
 };
 
-// While it lives, 'use' runs before each allocation and each release of this thread, but for its
-// own: what a program may do that serves memory itself.
+// While it lives, 'use' runs before each allocation and release of this thread, except its own, as
+// in a program that provides memory itself.
 class UsingMemory {
   public:
     explicit UsingMemory(void (*use)());

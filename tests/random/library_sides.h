@@ -1,4 +1,4 @@
-// Engine and facade as sides of the player: what they are called there, and texts converted.
+// Engine and facade as sides of the player: their type names and conversions of texts.
 #ifndef RANDOM_LIBRARY_SIDES_H
 #define RANDOM_LIBRARY_SIDES_H
 

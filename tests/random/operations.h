@@ -1,4 +1,4 @@
-// Every exported member as an operation on objects that share what can be shared.
+// Every exported member as an operation on objects that share all they can.
 #ifndef OPERATIONS_H
 #define OPERATIONS_H
 
@@ -14,7 +14,8 @@ namespace operations {
 typedef Kq_BoolEquation Equation;
 typedef Equation::Handle Handle;
 
-// Two equations that share their nodes, two engine objects that do, and values made of them.
+// Two equations that share their nodes, two engine objects that do so too, and values made from
+// them.
 struct Objects {
     Objects();
 
@@ -33,22 +34,22 @@ struct Objects {
     Engine::StringMgr pool;
 };
 
-// For an operator whose result would be unused; the members asked are calls into the library, so
-// none is left out for that.
+// Uses the result of an operator. Calls into the library cannot be optimised away, so nothing else
+// is needed.
 template <class Result>
 void Ask(const Result&)
 {
 }
 
 struct Operation {
-    const char* name; // as the demangled symbol table of the library has it
+    const char* name; // as in the demangled symbol table of the library
     void (*run)(Objects& o);
 };
 
 extern const std::vector<Operation> kOfEquation;
-extern const std::vector<Operation> kOfTables; // of the facade, and handles
+extern const std::vector<Operation> kOfTables; // of the facade, and of handles
 extern const std::vector<Operation> kOfEngine;
-extern const std::vector<Operation> kOfEngineTables; // and nodes, and the pool of names
+extern const std::vector<Operation> kOfEngineTables; // also of nodes and the pool of names
 
 } // namespace operations
 

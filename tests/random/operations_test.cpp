@@ -1,7 +1,8 @@
-// Every exported member with its first, second, third ... allocation failing until it succeeds, of
-// the global operator new (which serves the class allocators too) and of the host's raw memory.
-// After each failure: only std::bad_alloc came out; the objects answer, take new values and are
-// destroyed; whoever shares with them has not noticed; nothing is leaked; the pool of names works.
+// Every exported member with its first, second, third ... allocation failing until it succeeds,
+// both of the global operator new (which serves the class allocators too) and of the host's raw
+// memory. After each failure: only std::bad_alloc came out; the objects answer, take new values and
+// are destroyed; objects that share with them are unchanged; nothing is leaked; the pool of names
+// works.
 #include <cstdio>
 #include <memory>
 #include <new>
@@ -24,13 +25,13 @@ std::string View(const Engine& engine)
            std::to_string(engine.Eval());
 }
 
-// Asks everything, whatever the objects are now; then gives them new values.
+// Asks everything, whatever state the objects are in; then gives them new values.
 void UseEquation(Kq_BoolEquation& equation, const char* newName)
 {
     equation.Eval();
     equation.GetEquation(true);
     equation.GetVariableHandle("B");
-    // A failure may leave variables behind; a table of many of them is not a test of safety.
+    // A failure may leave variables; tabulating many of them would not test safety.
     if (equation.GetNumVariables() <= 8) {
         equation.GetEquationAsBinaryInitValue();
         EXPECT_EQ(equation.GetTruthTable().GetRows().size(),
@@ -40,7 +41,7 @@ void UseEquation(Kq_BoolEquation& equation, const char* newName)
     const Kq_BoolEquation copy(equation);
     EXPECT_TRUE(copy == equation);
     EXPECT_EQ(VariablesOf(copy), VariablesOf(equation));
-    // The pool of names, with one that it had and one that may be new.
+    // The pool of names, with one name that it has and one that may be new.
     const std::string text = std::string("a_name_that_needs_memory & ~") + newName;
     ASSERT_TRUE(equation.SetEquation(text.c_str()));
     EXPECT_EQ(std::string("a_name_that_needs_memory0 ") + newName + "0", VariablesOf(equation));
@@ -86,8 +87,8 @@ bool FailAt(const Operation& operation, size_t failing, bool debugMode)
     const Messages messages;
     bool hasFailed = false;
     std::unique_ptr<Objects> objects(new Objects);
-    // They hold the nodes as the objects do: too low a count would free them too early, too high a
-    // one never.
+    // These share the nodes with the objects: with too low a count the nodes would be freed too
+    // early, with too high a count never.
     const Kq_BoolEquation witness(objects->a);
     const Engine engineWitness(objects->engine);
     const std::string before = View(engineWitness);
@@ -109,7 +110,7 @@ bool FailAt(const Operation& operation, size_t failing, bool debugMode)
 }
 
 // How often the operation failed before it succeeded. In debug mode there may be thousands of
-// messages, each with an allocation: there, after the 200th, one in sixteen fails.
+// messages, each with an allocation: then, after the 200th, one in sixteen fails.
 size_t FailEach(const Operation& operation, bool debugMode)
 {
     size_t numFailures = 0;
@@ -122,7 +123,7 @@ void ExpectSafe(const std::vector<Operation>& operations)
 {
     for (const Operation& operation : operations) {
         for (const bool debugMode : {false, true}) {
-            // The first round fills what the process keeps: names, spellings.
+            // The first round fills what the process keeps: names and spellings.
             FailEach(operation, debugMode);
             const size_t numLive = memory::NumLive();
             const size_t numFailures = FailEach(operation, debugMode);
@@ -169,7 +170,7 @@ TEST(Operations, OtherSizesThanTheClassesOwnComeFromTheHost)
 
 TEST(Operations, FailingMemoryIsNoticed)
 {
-    // The machinery above must see what it looks for.
+    // The helpers above must detect what they look for.
     const size_t numLive = memory::NumLive();
     void* leak = ::operator new(1);
     EXPECT_EQ(numLive + 1, memory::NumLive());

@@ -114,7 +114,7 @@ Step RandomStep(RandomText& random, bool isEngine)
     return step;
 }
 
-// An init value over variables that are there: clear, define, set.
+// An init value over existing variables: clear, define, set.
 void AppendInitValue(RandomText& random, std::vector<Step>& steps)
 {
     Step step;
@@ -132,7 +132,7 @@ void AppendInitValue(RandomText& random, std::vector<Step>& steps)
     steps.push_back(step);
 }
 
-// A text tokenized and built by hand, with some of its names defined before and after.
+// A text tokenized and built by hand, with some of its names defined before and after it.
 void AppendBuildByHand(RandomText& random, std::vector<Step>& steps)
 {
     Step step;

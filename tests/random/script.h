@@ -38,11 +38,11 @@ enum class Op {
     ReadTable,
     Tokenize, // engine only; clears first
     Build,    // engine only
-    Ask,      // one question, 'value' says which
+    Ask,      // one question; 'value' says which
     kCount
 };
 
-// Where a step's text comes from: as given, or a reference into the object that it is passed to.
+// The source of a step's text: as given, or a reference into the object to which it is passed.
 enum class Source { Given, OwnName, OwnRootToken };
 
 struct Step {
@@ -63,7 +63,7 @@ std::string Describe(const Step& step);
 // A line for each step.
 std::string Describe(const std::vector<Step>& steps);
 
-// Names that scripts use: legal ones, and others that are refused or legal all the same.
+// Names that scripts use: ordinary ones, and odd ones that are refused or nevertheless legal.
 const std::vector<std::string>& UsualNames();
 const std::vector<std::string>& OddNames();
 

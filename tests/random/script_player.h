@@ -1,5 +1,5 @@
-// Plays steps on one side, model, engine or facade, and tells every result as text.
-// A side names the types and converts texts; the steps are the same code for all sides.
+// Plays steps on one side (model, engine or facade) and returns every result as text. A side names
+// the types and converts texts; all sides run the same code for steps.
 #ifndef RANDOM_SCRIPT_PLAYER_H
 #define RANDOM_SCRIPT_PLAYER_H
 
@@ -11,7 +11,7 @@
 
 namespace script {
 
-// Limits of what is tabulated, so that a step stays short.
+// Limits for tables, so that a step stays short.
 const unsigned int kMaxTabulated = 7;
 const unsigned int kMaxTabulatedInDebugMode = 3;
 const unsigned int kMaxTableVariables = 30;
@@ -40,13 +40,13 @@ class Player {
     Player& operator=(const Player&) = delete;
 
     std::string Play(const Step& step);
-    // Makes an object a copy of one from elsewhere.
+    // Makes an object a copy of a given one.
     void Take(size_t object, const typename Side::Equation& equation)
     {
         m_may_build[object] = false;
         Replace(object, new Equation(equation));
     }
-    // What can be seen of an object without changing it or printing anything.
+    // What an object shows without being changed or printing anything.
     std::string Look(size_t object) const;
 
   private:
@@ -70,7 +70,7 @@ class Player {
     std::array<std::unique_ptr<Equation>, kNumObjects> m_objects;
     std::array<Handle, kNumHandles> m_handles;
     std::array<TruthTable, kNumTables> m_tables;
-    // Objects whose tokens may be built: nobody shares them and nothing has touched them.
+    // Objects whose tokens may be built: they are not shared and nothing has changed them.
     std::array<bool, kNumObjects> m_may_build{};
     Text m_argument;
     bool m_is_debug = false;
@@ -299,7 +299,7 @@ std::string Player<Side>::PlayByHand(const Step& step)
         equation.Clear();
         Side::Tokenize(equation, step.text);
         if (step.firstFlag)
-            Side::Tokenize(equation, "z"); // refused: there is a list already, or none was made
+            Side::Tokenize(equation, "z"); // refused: it has a list already, or none was made
         m_may_build[step.object] = true;
     } else if (m_may_build[step.object]) {
         Side::Build(equation);
@@ -307,7 +307,7 @@ std::string Player<Side>::PlayByHand(const Step& step)
     return "";
 }
 
-// One question at a time: whatever the library puts off is then asked for in every order.
+// One question at a time, so that everything the library defers is requested in every order.
 template <class Side>
 std::string Player<Side>::PlayQuestion(const Step& step)
 {
@@ -328,7 +328,7 @@ std::string Player<Side>::PlayQuestion(const Step& step)
         return TellTree(Side::Tree(equation));
     case 6:
         return std::to_string(Side::IsSameTree(equation, *m_objects[step.other]));
-    case 7: // the variables' values in reverse, and not all of them
+    case 7: // the values of some variables, in reverse order
         for (size_t index = equation.GetNumVariables(); index-- > (step.firstFlag ? 1 : 0);)
             values.push_back(equation.GetVariables()[index].second + (step.secondFlag ? 2 : 0));
         return std::to_string(Side::EvalNodes(equation, values));

@@ -1,4 +1,4 @@
-// The model as a side of the player, and the comparison of what the sides tell.
+// The model as a side of the player, and the comparison of the sides' results.
 #include "random/script_run.h"
 
 #include "random/library_sides.h"
@@ -84,7 +84,7 @@ std::string RunOn(const std::vector<Step>& steps, bool looksOften)
         std::string difference = CompareTold("result", model.Play(step), library.Play(step));
         if (difference.empty())
             difference = support::CompareMessages(reference::Log(), capture.messages);
-        // The object that the step worked on and, in turn, all others.
+        // Looks at the object of the step and at one of the others in turn.
         for (size_t object : {step.object, position % kNumObjects}) {
             if (difference.empty() && looksOften)
                 difference = compareObject(object);

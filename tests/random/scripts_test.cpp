@@ -1,7 +1,7 @@
 // Random scripts over objects that share nodes, on engine and facade, against the model. Every
-// other script looks at the objects after each step; the rest ask only what their steps ask,
-// because a look may complete what an answer has put off. A failure prints the seed and the script,
-// reduced to the steps that it needs.
+// second script looks at the objects after each step; the others ask only what their steps ask,
+// because a look may complete deferred work. A failure prints the seed and the script, reduced to
+// the necessary steps.
 #include <algorithm>
 #include <numeric>
 
@@ -46,7 +46,7 @@ script::Step WithName(script::Op op, size_t object, const std::string& name)
     return step;
 }
 
-// Sets an init value, copies it, and asks the questions in every order there is.
+// Sets an init value, copies it, and asks the questions in every possible order.
 void ExpectEveryOrderAgrees(Side side, const std::vector<std::string>& terms,
                             const std::string& text, bool termOrderFlag)
 {

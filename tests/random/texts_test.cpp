@@ -1,6 +1,6 @@
 // Random texts of up to some hundred tokens, library against the reference model: acceptance,
-// messages, tree, renderings, variables, results, and node evaluation over 32-bit tables.
-// A failure prints the seed and a shortened text that still fails.
+// messages, tree, renderings, variables, results, and evaluation of nodes over 32-bit tables. A
+// failure prints the seed and a shortened text that still fails.
 #include <gtest/gtest.h>
 
 #include <functional>

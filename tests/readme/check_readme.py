@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-# Runs what README.md, or another page, shows and compares the outputs, byte for byte:
+# Runs what README.md or another page shows, and compares the outputs byte for byte:
 #   commands  every "$ command" of a console block, with the tool on the PATH
 #   program   the C++ example, built as the CMake block and as the pkg-config block say, against
 #             an installed tree in a path with a blank, or against what the system has installed
@@ -50,7 +50,7 @@ def check_commands(readme, tool):
     environment.pop("MAV_KQ_BOOL_EQUATION_DEBUG", None)
     environment["PATH"] = os.path.dirname(tool) + os.pathsep + environment["PATH"]
     failures = count = 0
-    # One directory for all commands of a page: what one writes, a later one reads.
+    # One directory for all commands of a page, because some read what earlier ones write.
     with tempfile.TemporaryDirectory() as directory:
         for block in blocks(readme, "console"):
             for example in re.split(r"^\$ ", block, flags=re.M)[1:]:
@@ -70,8 +70,8 @@ def find_directory(root, file):
     sys.exit(f"no {file} below {root}")
 
 
-# The lines that README gives, in a folder with example.cpp. Its prefix $HOME/kq is 'prefix', which is
-# left out of them when the system has the library.
+# Runs the lines that README gives, in a folder with example.cpp. 'prefix' replaces their prefix
+# $HOME/kq; without 'prefix' the system has the library, and the prefix is removed from the lines.
 def run_lines(readme, kind, directory, prefix, compiler, flags):
     home = os.path.join(directory, "home")
     os.mkdir(home)
@@ -85,7 +85,7 @@ def run_lines(readme, kind, directory, prefix, compiler, flags):
         lines = lines.replace(" -DCMAKE_PREFIX_PATH=$HOME/kq", "")
     lines = lines.replace("c++ ", f"'{compiler}' {flags} ")
     output = must_run(["bash", "-euc", lines], cwd=directory, env=environment)
-    return "".join(output.splitlines(True)[-2:])  # CMake talks before
+    return "".join(output.splitlines(True)[-2:])  # CMake prints other lines before
 
 
 def build_with_cmake(readme, directory, *where):
@@ -106,7 +106,7 @@ def check_program(readme, build, compiler, flags):
                                                           re.M))
     failures = 0
     with tempfile.TemporaryDirectory() as top:
-        prefix = None # the system's
+        prefix = None # the library is the system's
         if build:
             prefix = os.path.join(top, "installed here")
             must_run(["cmake", "--install", build, "--prefix", prefix])

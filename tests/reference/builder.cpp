@@ -1,4 +1,4 @@
-// One cursor, the node placed last. Operands go below it, operators above it, and all binary
+// The cursor is the node placed last. Operands go below it, operators above it. All binary
 // operators have one precedence and group from the left. "X ~ & Y" becomes NOT(AND(X, Y)).
 #include "reference/builder.h"
 
@@ -38,8 +38,8 @@ class Builder {
 
     std::vector<Node>& m_nodes;
     int m_cursor = 0;
-    // For the top NOT of a negated operator that stands inside something: the node that holds it.
-    // Its own parent link points down, at the operator's first operand.
+    // For the top NOT of a negated operator inside another node: the node that holds it. The NOT's
+    // own parent link points down, to the operator's first operand.
     std::map<int, int> m_holders;
     bool m_had_inner_negation = false;
 };
@@ -58,7 +58,7 @@ int Builder::TopOf(int node)
     return node;
 }
 
-// Makes the operator the parent of 'child'; a stale parent link is thereby true again.
+// Makes the operator the parent of 'child', which also corrects a stale parent link.
 void Builder::HangUnder(int child, int operatorNode)
 {
     At(child).parent = operatorNode;
@@ -119,7 +119,8 @@ void Builder::TakePlaceOf(int node, int highest)
     HangUnder(highest, node);
 }
 
-// 'ancestor' is not an operator: an open group, or in a doomed text some operand with children.
+// 'ancestor' is not an operator but an open group or, in a text that will be refused, an operand
+// with children.
 bool Builder::InsertBelow(int node, int ancestor)
 {
     if (At(ancestor).left == m_cursor) {
@@ -162,8 +163,8 @@ bool Builder::PlaceOperator(int node)
     return true;
 }
 
-// The cursor is a NOT without an operand, hung below the operand X that stands before it:
-// "X ~ op Y" becomes "~(X op Y)".
+// The cursor is a NOT without an operand, placed below the operand X before it: "X ~ op Y" becomes
+// "~(X op Y)".
 bool Builder::PlaceNegatedOperator(int node)
 {
     int chainTop = m_cursor;

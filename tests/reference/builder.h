@@ -8,8 +8,8 @@
 
 namespace reference {
 
-// Links 'nodes', which stand in text order and are not empty, and returns the root; kNone when the
-// list is not an equation. Traces each step in debug mode, and dumps the node that breaks the tree.
+// Links 'nodes', which are in text order and not empty, and returns the root; kNone if the list is
+// not an equation. Traces each step in debug mode, and dumps the node that breaks the tree.
 int BuildTree(std::vector<Node>& nodes);
 
 } // namespace reference

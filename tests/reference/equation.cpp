@@ -1,4 +1,4 @@
-// Life of an equation: set, clear, compare, evaluate, render.
+// The life of an equation: set, clear, compare, evaluate, render.
 #include "reference/equation.h"
 
 #include <algorithm>
@@ -37,7 +37,7 @@ std::vector<int> PreOrder(const std::vector<Node>& nodes, int root)
     return order;
 }
 
-// Whether a node is there matters, which one it is does not.
+// Only the presence of a node matters, not which one it is.
 bool SameNode(const Node& a, const Node& b)
 {
     if (a.type != b.type)
@@ -81,7 +81,7 @@ void Equation::BuildTree()
 
 bool Equation::SetEquation(const std::string& givenText)
 {
-    const std::string text = givenText; // it may be this object's own
+    const std::string text = givenText; // it may belong to this object
     if (StartsLikeInitValue(text)) {
         const std::string expression = ReadInitValue(text, VariableNames(), false);
         if (!expression.empty()) {
@@ -179,7 +179,7 @@ bool Equation::operator==(const Equation& other) const
     const std::vector<int> theirs = PreOrder(other.m_store->nodes, other.m_store->root);
     if (mine.size() != theirs.size())
         return false;
-    // Equal presence of children node by node makes equal pre-orders equal trees.
+    // Equal pre-orders are equal trees if each pair of nodes has children in the same places.
     for (size_t position = 0; position < mine.size(); ++position) {
         if (!SameNode(At(mine[position]), other.At(theirs[position])))
             return false;

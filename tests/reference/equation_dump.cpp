@@ -1,4 +1,4 @@
-// What Dbg prints for equations, truth tables, rows and handles; one Emit for each piece.
+// What Dbg prints for equations, truth tables, rows and handles, with one Emit for each piece.
 #include "reference/equation.h"
 #include "reference/node_dump.h"
 

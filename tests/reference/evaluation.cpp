@@ -1,5 +1,5 @@
-// Post-order with a stack of its own. A group and a truth table take their left value; the closing
-// parenthesis is not visited.
+// Post-order with an explicit stack. A group and a truth table have their left operand's value; the
+// closing parenthesis is not visited.
 #include "reference/evaluation.h"
 
 #include <utility>
@@ -67,7 +67,7 @@ unsigned int EvalTree(const std::vector<Node>& nodes, int root,
                       const std::vector<unsigned int>& values)
 {
     std::vector<unsigned int> results(nodes.size(), 0);
-    std::vector<std::pair<int, bool>> pending; // node, its operands are done
+    std::vector<std::pair<int, bool>> pending; // node, whether its operands are done
     pending.push_back({root, false});
     while (!pending.empty()) {
         const int index = pending.back().first;

@@ -8,8 +8,8 @@
 
 namespace reference {
 
-// 'values' holds entry k for variable k; an index beyond it reads as 0. Values are not forced to 0
-// or 1. In debug mode every node visited is traced, children first.
+// 'values' has entry k for variable k; an index beyond its end reads as 0. Values are not limited
+// to 0 and 1. In debug mode every visited node is traced, children first.
 unsigned int EvalTree(const std::vector<Node>& nodes, int root,
                       const std::vector<unsigned int>& values);
 

@@ -1,5 +1,5 @@
-// The last digit is row 0. Fewer ones than zeros (or only ones) give a sum of products, everything
-// else a product of sums.
+// The last digit is row 0. Fewer ones than zeros, or only ones, give a sum of products; everything
+// else gives a product of sums.
 #include "reference/init_text.h"
 
 namespace reference {

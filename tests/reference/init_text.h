@@ -11,8 +11,9 @@ namespace reference {
 std::string HexInitValue(const std::vector<unsigned int>& column, bool upperCase);
 std::string BinaryInitValue(const std::vector<unsigned int>& column);
 
-// The expression that an init value stands for over the variables 'names'; empty when it is none.
-// 'firstIsLowest' gives the first variable bit 0 of the row number instead of the highest.
+// The expression that an init value stands for over the variables 'names'; empty if the text is not
+// an init value. With 'firstIsLowest' the first variable is bit 0 of the row number instead of the
+// highest.
 std::string ReadInitValue(const std::string& text, const std::vector<std::string>& names,
                           bool firstIsLowest);
 

@@ -1,6 +1,6 @@
-// Messages that the model says the library issues, in order, and the process-wide debug switch.
-// A message of the engine or the facade has the line kAnyLine: it comes from wherever the issuing
-// statement stands. The node module has fixed numbers.
+// The messages that the library must issue according to the model, in order, and the process-wide
+// debug switch. A message of the engine or the facade has the line kAnyLine, because its line is
+// that of the issuing statement. The node module has fixed line numbers.
 #ifndef REFERENCE_MESSAGE_H
 #define REFERENCE_MESSAGE_H
 
@@ -19,7 +19,7 @@ struct Message {
     int line;
     const char* revision;
     std::string text;
-    // Part of a dump whose choice of node is open: the library may dump another node here.
+    // Part of a dump of a node that the library may choose freely.
     bool isFree;
 };
 

@@ -1,4 +1,4 @@
-// Facts about single nodes, written as plain tables.
+// Facts about single nodes, as plain tables.
 #include "reference/node.h"
 
 namespace reference {
@@ -49,7 +49,7 @@ int TopParent(const std::vector<Node>& nodes, int start)
             return node;
         node = parent;
     }
-    // More steps than nodes: a circle.
+    // More steps than nodes: the links form a circle.
     node = start;
     for (;;) {
         const int parent = nodes[static_cast<size_t>(node)].parent;

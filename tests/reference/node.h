@@ -38,7 +38,7 @@ struct Node {
     Node(Type theType, const std::string& theToken) : type(theType), token(theToken) {}
 };
 
-// Everything but a parenthesis, a name, a NOT and a SENTINEL; constants answer true.
+// True for everything except a parenthesis, a name, a NOT and a SENTINEL; constants give true.
 bool IsBinOp(Type type);
 
 const char* TypeName(Type type);
@@ -46,8 +46,8 @@ const char* TypeName(Type type);
 // 'syntax' 0 is the token as typed; 1, 2 and 3 are the fixed syntaxes.
 std::string Spelling(const Node& node, int syntax);
 
-// What parent links lead to. Where they run in a circle: the first node on the way that its parent
-// has as neither child.
+// Where parent links lead. If they form a circle: the first node on the way that is not a child of
+// its parent.
 int TopParent(const std::vector<Node>& nodes, int start);
 
 } // namespace reference

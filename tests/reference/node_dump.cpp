@@ -1,4 +1,4 @@
-// The dump walks with a stack of its own: left subtree before right subtree, node before both.
+// The dump walks with an explicit stack: node first, then left subtree, then right subtree.
 #include "reference/node_dump.h"
 
 #include <utility>

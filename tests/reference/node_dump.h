@@ -15,7 +15,7 @@ std::string PathName(const std::vector<Node>& nodes, int node);
 // The whole subtree.
 void DumpNode(const std::vector<Node>& nodes, int node);
 
-// The dump of a node that broke a build: 256 node lines at most, then "NODE: ...\n".
+// The dump of a node that broke a build: at most 256 node lines, then "NODE: ...\n".
 void DumpFailure(const std::vector<Node>& nodes, int node);
 
 } // namespace reference

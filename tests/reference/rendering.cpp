@@ -1,5 +1,5 @@
-// A NOT writes nothing where it stands: it waits for the first token of its operand, or for the
-// operator when its operand is a binary operator.
+// A NOT writes nothing in its own place: it waits for the first token of its operand, or for the
+// operator if its operand is a binary operator.
 #include "reference/rendering.h"
 
 namespace reference {
@@ -8,7 +8,7 @@ namespace {
 
 typedef std::vector<int> Nots;
 
-// Either a subtree still to be rendered, or a node whose tokens are due now.
+// Either a subtree to be rendered, or a node whose tokens are written now.
 struct Task {
     bool writesNow;
     int node;

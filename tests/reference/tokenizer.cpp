@@ -10,7 +10,7 @@ struct Fixed {
     Type type;
 };
 
-// Longer spellings stand before their own beginnings, so the first match is the right one.
+// Longer spellings come before their own prefixes, so the first match is the right one.
 const Fixed kFixed[] = {
     {"~&", kNand},     {"!&", kNand},   {"~*", kNand},   {"!*", kNand},     {"~|", kNor},
     {"!|", kNor},      {"~+", kNor},    {"!+", kNor},    {"~^", kNxor},     {"!^", kNxor},
@@ -31,7 +31,7 @@ bool IsNamePart(char c)
     return IsNameStart(c) || (c >= '0' && c <= '9');
 }
 
-// Length of the name at 'position', 0 when there is none there or its quote is never closed.
+// The length of the name at 'position'; 0 if there is none or its quote is never closed.
 size_t NameLength(const std::string& text, size_t position)
 {
     if (text[position] == '\'') {

@@ -9,7 +9,7 @@
 
 namespace reference {
 
-// Reads 'text' up to its first NUL. False when the text is refused; 'nodes' is then meaningless.
+// Reads 'text' up to its first NUL. False if the text is refused; 'nodes' is then meaningless.
 bool Tokenize(const std::string& text, std::vector<Node>& nodes);
 
 } // namespace reference

@@ -46,7 +46,7 @@ size_t Equation::FindVariable(const std::string& name) const
 
 bool Equation::DefineVariable(const std::string& givenName, unsigned int value)
 {
-    const std::string name = givenName; // it may stand in the table
+    const std::string name = givenName; // it may be a name in the table
     if (IsVariableDefined(name) || !IsLegalName(name))
         return false;
     const unsigned int index = GetNumVariables();

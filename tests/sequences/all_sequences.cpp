@@ -1,8 +1,7 @@
-// Every sequence of tokens up to a length, library against the reference model. The library belongs
-// to one thread, so there is a process for each processor. Takes long: the tests that always run
-// have the shorter sequences.
+// Every sequence of tokens up to a length, library against the reference model, with a process for
+// each processor. It takes long; the tests that always run have the shorter sequences.
 // usage: all_sequences [SET]
-// Exit status: 1 when a text is treated differently, the numbers are others or there is no SET.
+// Exit status: 1 if a text is treated differently, if the numbers differ, or if SET is unknown.
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
@@ -40,7 +39,7 @@ const Texts kSpellings = {"&",  "*",  ".AND.", "|",     "+",  ".OR.", "^",      
                           "(",  ")",  "0",     "1",     "A",  "_b2",  "'c d'"};
 
 // One spelling of each type of token; two names with two binary operators; all spellings, in fours,
-// so that each stands before and after every other in many places.
+// so that each comes before and after every other in many places.
 const std::vector<Set> kSets = {
     {"types", {"A", "0", "1", "~", "(", ")", "&", "|", "^", "~&", "~|", "~^"}, " ", 8, 334273},
     {"names", {"A", "B", "~", "(", ")", "&", "|"}, " ", 8, 10961},
@@ -48,8 +47,8 @@ const std::vector<Set> kSets = {
     {"spellings without blanks", kSpellings, "", 4, 8821},
 };
 
-// Checks every sequence of one length whose number modulo 'numWorkers' of its first three tokens
-// is 'worker'.
+// Checks every sequence of one length for which the number of its first three tokens, modulo
+// 'numWorkers', is 'worker'.
 class Worker {
   public:
     Worker(const Set& set, size_t worker, size_t numWorkers)
@@ -111,7 +110,7 @@ class Worker {
     Counts m_counts = {0, 0, 0};
 };
 
-// The sum of what all workers count; a worker that ends in any other way counts as a difference.
+// The sum of the counts of all workers; a worker that ends in any other way counts as a difference.
 Counts RunAll(const Set& set, size_t numWorkers)
 {
     int ends[2];

@@ -1,4 +1,4 @@
-// Comparisons return at the first difference, so the fast path builds no report.
+// Comparisons return at the first difference; without one they build no report.
 #include "support/equation_compare.h"
 
 #include <algorithm>

@@ -1,4 +1,4 @@
-// Conversions and comparisons; each comparison names the first difference only.
+// Conversions and comparisons; each comparison reports only the first difference.
 #include "support/library_view.h"
 
 #include <algorithm>
@@ -121,7 +121,7 @@ std::vector<reference::FlatNode> Flatten(const Node* root)
         pending.pop_back();
         order.push_back(node);
         if (!positions.emplace(node, static_cast<int>(order.size()) - 1).second)
-            continue; // reached twice: no tree, which the comparison reports
+            continue; // reached twice: not a tree, which the comparison reports
         if (node->GetRightChild())
             pending.push_back(node->GetRightChild());
         if (node->GetLeftChild())

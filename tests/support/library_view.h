@@ -21,7 +21,7 @@ struct Captured {
     std::string text;
 };
 
-// Records every message while it lives, then gives the former sink back.
+// Records every message while it lives, then restores the former sink.
 class Capture {
   public:
     Capture();
@@ -35,7 +35,7 @@ class Capture {
     Port_MsgManData::Sink m_former;
 };
 
-// Debug mode of library and model, whatever happens, while it lives.
+// Sets the debug mode of library and model while it lives, whatever happens.
 class DebugMode {
   public:
     DebugMode();
@@ -48,14 +48,14 @@ Port::StringBase<char> ToPort(const std::string& text);
 std::string ToStd(const Port::StringBase<char>& text);
 std::vector<Port::StringBase<char>> ToPort(const std::vector<std::string>& texts);
 
-// A text that can be printed: bytes outside ASCII and NUL as \xNN.
+// A printable form of a text: bytes outside ASCII and NUL as \xNN.
 std::string Printable(const std::string& text);
 
 // The tree below 'root' as reference::Flatten gives it for the model.
 std::vector<reference::FlatNode> Flatten(const Kq_BoolEquationImp::Node* root);
 
-// What differs first, or "" when all agrees. A model line kAnyLine asks for any line above 0, and
-// messages that the model marks free stand for any messages of the node module's dump.
+// The first difference, or "" if there is none. A model line kAnyLine matches any line above 0, and
+// messages that the model marks as free match any messages of the node module's dump.
 std::string CompareMessages(const std::vector<reference::Message>& expected,
                             const std::vector<Captured>& actual);
 std::string CompareTrees(const std::vector<reference::FlatNode>& expected,

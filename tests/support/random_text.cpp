@@ -1,5 +1,5 @@
-// Texts are grown from a budget of tokens; depth is bounded only to keep this generator's own
-// recursion small.
+// Texts grow from a budget of tokens; depth is limited only to keep this generator's recursion
+// small.
 #include "support/random_text.h"
 
 #include <utility>
@@ -23,7 +23,7 @@ std::string RandomText::Blank()
     return Chance(60) ? OneOf(kBlanks) : "";
 }
 
-// One random choice for each statement: the operands of a '+' have no fixed order.
+// One random choice in each statement, because the operands of '+' are evaluated in no fixed order.
 std::string RandomText::Operand(size_t& budget, size_t depth, const std::vector<std::string>& names,
                                 bool hasNegatedOperators)
 {
@@ -59,7 +59,7 @@ std::string RandomText::Chain(size_t& budget, size_t depth, const std::vector<st
     size_t numOperators = Below(depth == 0 ? 1 + budget : 4);
     while (budget > 1 && numOperators-- > 0) {
         --budget;
-        // A group takes no negated operator: both its slots are taken.
+        // No negated operator after a group, whose two child slots are both used.
         const bool isNegated = hasNegatedOperators && text.back() != ')' && Chance(25);
         text += Blank();
         if (isNegated) {
@@ -146,7 +146,7 @@ std::string RandomText::Bytes(size_t numBytes)
 
 std::string RandomText::BinaryInitValue(size_t numDigits)
 {
-    // All ones and all zeros are kinds of their own.
+    // All ones and all zeros are separate kinds.
     const size_t percentOnes = std::vector<size_t>{0, 10, 50, 90, 100}[Below(5)];
     std::string text = Chance(80) ? "0b" : "0B";
     while (text.size() < numDigits + 2)

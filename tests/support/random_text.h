@@ -14,7 +14,7 @@ class RandomText {
   public:
     explicit RandomText(unsigned int seed) : m_engine(seed) {}
 
-    // 0 to limit - 1.  Requires: limit > 0.
+    // A number from 0 to limit - 1.  Requires: limit > 0.
     size_t Below(size_t limit) { return static_cast<size_t>(m_engine()) % limit; }
     uint32_t Any() { return static_cast<uint32_t>(m_engine()); }
     bool Chance(size_t percent) { return Below(100) < percent; }
@@ -27,13 +27,13 @@ class RandomText {
     // white space; with 'hasNegatedOperators' also "X ~ & Y".
     std::string WellFormed(size_t numTokens, const std::vector<std::string>& names,
                            bool hasNegatedOperators);
-    // Any tokens in any order, parentheses balanced in number more often than not.
+    // Any tokens in any order; usually as many opening as closing parentheses.
     std::string TokenSoup(size_t numTokens, const std::vector<std::string>& names);
     // 'text' with a few bytes removed, doubled, swapped or replaced.
     std::string Mutated(const std::string& text);
-    // Bytes that mean something here, and any others, NUL included.
+    // Bytes that have a meaning in equations, and any others, including NUL.
     std::string Bytes(size_t numBytes);
-    // "0b" or "0x" and digits; for 'numDigits' 0 just the prefix.
+    // "0b" or "0x" and digits; only the prefix if 'numDigits' is 0.
     std::string BinaryInitValue(size_t numDigits);
     std::string HexInitValue(size_t numDigits);
 

@@ -1,4 +1,4 @@
-// The library and the model are asked the same questions; the first different answer is told.
+// Asks the library and the model the same questions and reports the first different answer.
 #include "support/text_compare.h"
 
 #include "reference/evaluation.h"
@@ -9,7 +9,7 @@ namespace support {
 
 namespace {
 
-// Node evaluation for tables whose entries are any 32 bits, shorter tables included.
+// Compares node evaluation for tables of arbitrary 32-bit entries, including short tables.
 std::string CompareNodeEval(unsigned int seed, const reference::Equation& model,
                             const Kq_BoolEquationImp& library)
 {
@@ -30,7 +30,7 @@ std::string CompareNodeEval(unsigned int seed, const reference::Equation& model,
     return "";
 }
 
-// Whether a tree read back from its own rendering is the same on both sides too.
+// Compares the trees that both sides read back from their own renderings.
 std::string CompareReadBack(const reference::Equation& model, const Kq_BoolEquationImp& library)
 {
     reference::Equation modelAgain;

@@ -1,5 +1,5 @@
-// Threads that disturb each other as far as they may: a sink that is exchanged while others report,
-// memory that runs out for one of them. Whatever succeeds gives a single thread's answer.
+// Threads that disturb each other as far as allowed: a sink is exchanged while others report, or
+// memory runs out for one of them. What succeeds must give a single thread's answer.
 #include <memory>
 #include <new>
 
@@ -21,7 +21,7 @@ using threads::kNumThreads;
 using threads::Question;
 using threads::SharedObjects;
 
-// A dump of an object that the thread has for itself, and one of a text that is refused.
+// Dumps an object of this thread, and a refused text.
 void Report(size_t thread, int round)
 {
     const std::string name = "name_" + std::to_string(thread) + "_" + std::to_string(round);
@@ -53,7 +53,7 @@ TEST(Threads, ReportsWhileTheSinkIsExchanged)
         if (thread == 0) {
             while (numReporting > 0) {
                 first.Exchange();
-                threads::CountingSink brief; // gives the first one back when it goes
+                threads::CountingSink brief; // restores the first sink when it is destroyed
                 Kq_BoolEquationImp::SetInternalDebugMode(false);
                 std::this_thread::yield();
                 brief.Remove();
@@ -71,7 +71,7 @@ TEST(Threads, ReportsWhileTheSinkIsExchanged)
     EXPECT_EQ(0u, numWrong + first.GetNumWrong());
 }
 
-// The state of an equation as far as threads can tell.
+// The state of an equation as threads can see it.
 std::string View(const Engine& engine)
 {
     return Std(engine.GetEquation(true)) + " " + TreeText(engine.GetRoot()) + " " +
@@ -79,7 +79,7 @@ std::string View(const Engine& engine)
            std::to_string(engine.Eval());
 }
 
-// The objects answer and take new values, whatever has failed.
+// Checks that the objects answer and take new values, whatever has failed.
 void Use(Objects& o)
 {
     for (Kq_BoolEquation* equation : {&o.a, &o.b}) {
@@ -100,8 +100,8 @@ void Use(Objects& o)
     EXPECT_EQ("A", Std(o.pool.find("A")));
 }
 
-// Operations that fail now and then, on objects whose nodes all threads share. Returns how many
-// did.
+// Runs operations that sometimes fail, on objects whose nodes all threads share. Returns the number
+// of failures.
 size_t FailSome(size_t thread, const Objects& shared, size_t numOperations)
 {
     std::vector<Operation> all;
@@ -144,15 +144,15 @@ TEST(Threads, OperationsWhoseAllocationsFail)
         }
         for (const size_t failed : numFailed)
             EXPECT_LT(10u, failed);
-        // The first round fills what the process keeps: names, spellings.
+        // The first round fills what the process keeps: names and spellings.
         if (round == 0)
             numLive = memory::NumLive();
     }
     EXPECT_GE(numLive, memory::NumLive()) << "something leaks";
 }
 
-// Memory runs out for one thread while another asks the same: no answer is a wrong one, and what
-// was put off, a tree, say, is there for the next.
+// Memory runs out for one thread while another asks the same: no answer is wrong, and deferred
+// work, such as an owed tree, is available for the next question.
 TEST(Threads, QuestionsWhoseAllocationsFail)
 {
     const threads::CountingSink sink;
@@ -186,7 +186,7 @@ TEST(Threads, QuestionsWhoseAllocationsFail)
                     }
                 }
             });
-            // Afterwards all answers are there.
+            // Afterwards all answers are available.
             for (size_t number = 0; number < questions.size(); ++number) {
                 for (size_t position = 0; position < objects.size(); ++position)
                     EXPECT_EQ(expected[number][position], questions[number].ask(objects, position))

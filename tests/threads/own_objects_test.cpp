@@ -1,5 +1,5 @@
-// Threads with objects of their own, or copies of shared ones: every result is the one of a single
-// thread, which comes first. Inside they share names, nodes and what is kept of these.
+// Threads with their own objects, or copies of shared ones: every result must be that of a single
+// thread, which runs first. Inside they share names, nodes and what is kept for these.
 #include <memory>
 
 #include <gtest/gtest.h>
@@ -21,14 +21,15 @@ using threads::SharedObjects;
 constexpr unsigned int kNumScripts = 40;
 constexpr size_t kNumSteps = 60;
 
-// The debug mode is everybody's, so a script must not switch it; it counts only as a limit there.
+// The debug mode is shared by all threads, so a script must not switch it; its switch only changes
+// the limit of tables.
 template <class Side>
 struct Quiet : Side {
     static void SetDebugMode(bool) {}
 };
 
-// Every result of a script and, now and then, all that can be seen of an object. With shared
-// objects the script starts from copies of them and takes more on its way.
+// Every result of a script and, from time to time, all that an object shows. With shared objects
+// the script starts from copies of them and takes more copies on its way.
 template <class Side>
 std::string Play(unsigned int seed, const std::vector<typename Side::Equation>* shared)
 {
@@ -78,13 +79,13 @@ TEST(Threads, ScriptsOnCopiesOfSharedObjects)
     threads::CountingSink sink;
     const unsigned int kNumRounds = 20;
     for (unsigned int round = 0; round < kNumRounds; ++round) {
-        // Objects of their own for each thread, made the same way.
+        // Separate objects for each thread, made the same way.
         std::vector<std::string> expected;
         for (size_t thread = 0; thread < kNumThreads; ++thread) {
             const SharedObjects shared(round);
             expected.push_back(PlayBoth(SeedOf(thread, round), &shared));
         }
-        // The last one that shares the nodes frees them, whichever thread that is.
+        // The last holder of the nodes frees them, in whichever thread that is.
         std::vector<SharedObjects> copies(kNumThreads, SharedObjects(round));
         InThreads(kNumThreads, [&](size_t thread) {
             EXPECT_EQ(expected[thread], PlayBoth(SeedOf(thread, round), &copies[thread]))
@@ -117,7 +118,7 @@ std::vector<operations::Operation> AllOperations()
     return all;
 }
 
-// All operations in an order of the thread's own, each on new objects.
+// Runs all operations in a different order for each thread, each on new objects.
 std::vector<std::string> RunOperations(size_t thread)
 {
     const std::vector<operations::Operation> all = AllOperations();
@@ -142,7 +143,7 @@ TEST(Threads, EveryOperationOnOwnObjects)
               [&expected](size_t thread) { EXPECT_EQ(expected[thread], RunOperations(thread)); });
 }
 
-// Sets names that nobody has used, and tells what came of them, the names' first part left out.
+// Sets unused names, and returns the results without the first part of the names.
 std::string UseNewNames(const std::string& first, unsigned int seed)
 {
     support::RandomText random(seed);
@@ -170,7 +171,7 @@ TEST(Threads, NewNames)
 {
     for (unsigned int round = 0; round < 10; ++round) {
         const std::string number = std::to_string(100 + round);
-        // Two threads ask for the same new names in the same order, the others for names alike.
+        // Two threads use the same new names in the same order, the others similar names.
         const auto firstOf = [&number](size_t thread) {
             return std::string(thread < 2 ? "x"
                                           : std::string(1, static_cast<char>('x' + thread - 1))) +
@@ -188,7 +189,7 @@ TEST(Threads, NewNames)
     }
 }
 
-// An object goes from thread to thread; joining is all the synchronisation there is.
+// An object passes from thread to thread; joining is the only synchronisation.
 TEST(Threads, ObjectsPassFromThreadToThread)
 {
     std::vector<Kq_BoolEquation> equations;
@@ -215,7 +216,7 @@ TEST(Threads, ObjectsPassFromThreadToThread)
     EXPECT_EQ(20u, equations.size());
 }
 
-// Copies share their tokens, and each is left as if it were alone.
+// Copies share their tokens, and each ends up as if it were alone.
 TEST(Threads, BuildCopiesOfTheSameTokens)
 {
     const threads::CountingSink sink;
@@ -227,7 +228,7 @@ TEST(Threads, BuildCopiesOfTheSameTokens)
         InThreads(kNumThreads, [&](size_t thread) {
             Engine& copy = copies[thread];
             copy.BuildTree();
-            copy.TokenizeNodes("P"); // into a list that is empty, if the text was refused
+            copy.TokenizeNodes("P"); // if the text was refused, the list is empty
             copy.BuildTree();
             EXPECT_EQ(isRefused ? "P" : "AND(A, NOT(OR(B, C)))", TreeText(copy.GetRoot()));
         });

@@ -5,7 +5,7 @@ namespace threads {
 
 namespace {
 
-// Members that facade and engine have alike.
+// Members that facade and engine have in common.
 
 template <class Equation>
 std::string HexInitValue(Objects o, size_t at)
@@ -100,7 +100,7 @@ std::string TableOf(Objects o, size_t at)
     return Tell(At<Equation>(o, at).GetTruthTable().GetRows()) +
            Tell(Table(At<Equation>(o, at)) == At<Table>(o, at));
 }
-// A copy is made of an object that is only asked.
+// Copies an object that is only queried.
 template <class Equation>
 std::string CopyOf(Objects o, size_t at)
 {

@@ -1,4 +1,4 @@
-// Objects that threads share without a lock, and every question that a const member answers.
+// Objects that threads share without a lock, and every question, one for each const member.
 #ifndef THREADS_QUESTIONS_H
 #define THREADS_QUESTIONS_H
 
@@ -9,13 +9,13 @@
 
 namespace threads {
 
-// Made once, then only asked. Equation and engine object at one position have the same text, and
-// share no nodes; tables, handles and rows are those of the equation.
+// Made once, then only queried. The equation and the engine object at a position have the same text
+// but share no nodes; tables, handles and rows belong to the equation.
 struct SharedObjects {
     // The same seed gives the same objects: expressions of many sizes, init values whose tree is
     // not made yet, constants, an empty one. Nothing has been asked yet.
     // With 'hasLarge' also some that are compiled before they are evaluated, whose traces in debug
-    // mode would be a hundred thousand messages.
+    // mode would have a hundred thousand messages.
     explicit SharedObjects(unsigned int seed, bool hasLarge = true);
 
     size_t size() const { return equations.size(); }
@@ -27,16 +27,16 @@ struct SharedObjects {
     std::vector<Kq_BoolEquation::Handle> handles;
 };
 
-// One question about the objects at a position; the answer as text, "" of a dump.
+// One question about the objects at a position, answered as text; "" for a dump.
 struct Question {
-    const char* name; // as the demangled symbol table of the library has it
+    const char* name; // as in the demangled symbol table of the library
     std::string (*ask)(const SharedObjects& objects, size_t position);
 };
 
 extern const std::vector<Question> kOfEquation;
-extern const std::vector<Question> kOfTables; // of the facade, and handles
+extern const std::vector<Question> kOfTables; // of the facade, and of handles
 extern const std::vector<Question> kOfEngine;
-extern const std::vector<Question> kOfEngineTables; // and nodes
+extern const std::vector<Question> kOfEngineTables; // also of nodes
 
 // All four lists together.
 std::vector<Question> AllQuestions();

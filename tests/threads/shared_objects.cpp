@@ -11,7 +11,7 @@ void Append(SharedObjects& objects, const std::vector<String>& terms, const std:
     Engine engine;
     equation.SetEquationWithExplicitTerms(terms, support::ToPort(text), false, false);
     engine.SetEquationWithExplicitTerms(terms, support::ToPort(text), false, false);
-    // The last variable is 1. The tables have objects of their own: these are asked nothing.
+    // The last variable is 1. The tables come from separate objects, so that these are not queried.
     equation.SetVariable(NameOf(equation), 1);
     engine.SetVariable(NameOf(equation), 1);
     Facade other;

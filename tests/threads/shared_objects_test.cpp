@@ -1,5 +1,5 @@
-// Threads that ask the same objects, without a lock: every answer is the one of a single thread.
-// The objects are new in each round, as what they keep for later questions is made only once.
+// Threads that query the same objects without a lock: every answer must be that of a single thread.
+// The objects are new in each round, because what they keep for later questions is made only once.
 #include <memory>
 
 #include <gtest/gtest.h>
@@ -35,7 +35,7 @@ Answers AskAll(const SharedObjects& objects)
     return answers;
 }
 
-// Asks what 'random' chooses; few dumps, which take as long as hundreds of answers.
+// Asks what 'random' chooses, with few dumps, because a dump takes as long as hundreds of answers.
 void Ask(const SharedObjects& objects, const Answers& expected, size_t numQuestions,
          support::RandomText& random)
 {
@@ -66,7 +66,7 @@ TEST(Threads, QuestionsToSharedObjects)
     EXPECT_LT(0u, sink.GetNumMessages());
 }
 
-// All threads ask the same at the same moment, which no other order would bring about as surely.
+// All threads ask the same question at the same moment, which random questions would rarely do.
 TEST(Threads, TheSameQuestionFirst)
 {
     const threads::CountingSink sink;
@@ -82,7 +82,8 @@ TEST(Threads, TheSameQuestionFirst)
     }
 }
 
-// One thread switches, the others ask and have copies; there is more to tell, and no other answer.
+// One thread switches the debug mode while the others query and copy: more messages, but the same
+// answers.
 TEST(Threads, QuestionsWhileTheDebugModeIsSwitched)
 {
     threads::CountingSink sink;

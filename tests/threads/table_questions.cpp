@@ -16,7 +16,7 @@ std::string RowsOf(Objects o, size_t at)
 {
     return Tell(Table(At<Table>(o, at)).GetRows());
 }
-// Of the last rows of two tables; without any, of rows made here.
+// Asks about the last rows of two tables, or about rows made here if there are none.
 template <class Table>
 std::string AreRowsEqual(Objects o, size_t at)
 {
@@ -37,7 +37,7 @@ std::string RowDumped(Objects o, size_t at)
     return "";
 }
 
-// Without an equation there is a node of its own, so that there is something to ask.
+// Without an equation, a separate node is queried.
 template <std::string (*ask)(const Node& node)>
 std::string OfNode(Objects o, size_t at)
 {

@@ -1,4 +1,4 @@
-// What the lists of questions share: which object is asked, and answers as text.
+// What the lists of questions share: the choice of the object, and answers as text.
 #ifndef THREADS_TELLING_H
 #define THREADS_TELLING_H
 
@@ -34,7 +34,7 @@ inline const Facade::Handle& Of(Objects objects, size_t position, const Facade::
     return objects.handles[position];
 }
 
-// The object at a position, the one that shares its nodes, and one that shares nothing with it.
+// The object at a position, one that shares its nodes, and one that shares nothing with it.
 template <class Object>
 const Object& At(Objects objects, size_t position)
 {

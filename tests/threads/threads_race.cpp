@@ -1,5 +1,5 @@
-// Two threads, one object, and at least one of them changes it: what no program may do, and what
-// the thread sanitizer must see. usage: threads_race RACE, the name of an entry of kRaces.
+// Two threads use one object, and at least one of them changes it: no program may do that, and the
+// thread sanitizer must see it. usage: threads_race RACE, the name of an entry of kRaces.
 #include <atomic>
 #include <cstring>
 #include <thread>

@@ -19,7 +19,7 @@ void InThreads(size_t numThreads, const std::function<void(size_t thread)>& work
         thread.join();
 }
 
-// In one exchange, so that no message of another thread is lost.
+// In a single exchange, so that no message of another thread is lost.
 CountingSink::CountingSink() : m_before(Port_MsgManData::setSink(MakeSink())) {}
 
 CountingSink::~CountingSink()
@@ -48,8 +48,8 @@ void CountingSink::Receive(const char* id, const char* file, int line, const cha
 {
     const bool isAlone = ++m_numInside == 1;
     ++m_numMessages;
-    // Where it comes from belongs together; a text that another one ran into would not stay the
-    // same while it is read twice.
+    // The parts of the origin must belong together; a text that another one overwrote would change
+    // between two readings.
     m_last = text;
     const bool isNode = std::strstr(file, "ImpNode.cpp") != nullptr;
     const bool isEngine = std::strstr(file, "Imp.cpp") != nullptr;

@@ -1,4 +1,4 @@
-// Threads that start together, and a sink that several may report to.
+// Threads that start together, and a sink to which several may report.
 #ifndef THREADS_SUPPORT_H
 #define THREADS_SUPPORT_H
 
@@ -13,12 +13,12 @@ namespace threads {
 
 constexpr size_t kNumThreads = 4;
 
-// Runs work(0) to work(numThreads - 1), each in a thread of its own, all at the same time.
-// What is compared after it needs no lock: the threads have ended.
+// Runs work(0) to work(numThreads - 1), each in its own thread, all at the same time. Comparisons
+// after the call need no lock, because the threads have ended.
 void InThreads(size_t numThreads, const std::function<void(size_t thread)>& work);
 
-// Takes all messages while it lives, in place of the sink before.
-// Nothing in here is protected: the host lets in one message at a time.
+// Takes all messages while it lives, instead of the previous sink. Its state is not protected,
+// because the host lets in one message at a time.
 class CountingSink {
   public:
     CountingSink();
@@ -26,14 +26,14 @@ class CountingSink {
     CountingSink(const CountingSink&) = delete;
     CountingSink& operator=(const CountingSink&) = delete;
 
-    // Installs it once more, as a copy of its own, and takes away the one before.
+    // Installs a new copy of the sink and removes the previous one.
     void Exchange();
-    // Takes it away, so that no thread is in it any more.
+    // Removes the sink, so that no thread is inside it any more.
     void Remove();
 
-    // To be asked when it was taken away.
+    // Requires: the sink was removed.
     size_t GetNumMessages() const { return m_numMessages; }
-    size_t GetNumWrong() const { return m_numWrong; } // not whole, or not alone
+    size_t GetNumWrong() const { return m_numWrong; } // messages that were not whole or not alone
 
   private:
     Port_MsgManData::Sink MakeSink();
@@ -44,7 +44,7 @@ class CountingSink {
     size_t m_numWrong = 0;
     size_t m_numInside = 0;
     std::string m_last;
-    Port_MsgManData::Sink m_before; // last: messages come from here on
+    Port_MsgManData::Sink m_before; // must be last: from here on messages arrive
 };
 
 } // namespace threads

@@ -1,6 +1,7 @@
-// What the library itself says of texts, for the tool and the Python module to be compared with.
-// In: [--lsb-first] [--reverse] [--inputs NAME...], and lines, each a text.
-// Out: for each "refused", or hexadecimal column and inputs with tabs between; no column is "-".
+// The library's own answers about texts, for comparison with the tool and the Python module.
+// In: [--lsb-first] [--reverse] [--inputs NAME...], and a text in each line.
+// Out: for each text "refused", or hexadecimal column and inputs separated by tabs; "-" for no
+// column.
 #include <cstring>
 #include <iostream>
 #include <string>

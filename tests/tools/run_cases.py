@@ -1,11 +1,12 @@
 #!/usr/bin/env python3
 # Runs command lines of the tool and compares standard output, standard error and exit status,
-# whole and byte for byte, with what a file of cases expects. In such a file the first character
-# of a line tells what the line is:
+# completely and byte for byte, with a file of cases. In such a file the first character of a line
+# says what the line is:
 #   = name of a case   $ command for sh -c   | output   ! error output   ? exit status (none: 0)
-# An empty line or one that starts with # says nothing. --update writes the answers found. --differing
-# names a file of cases that another system or build answers otherwise, "GROUP: CASE -- reason"; one
-# of them that passes is a failure, so that the list stays true. It may be given more than once.
+# Empty lines and lines that start with # are ignored. --update writes the answers found.
+# --differing names a file of cases that another system or build answers differently, "GROUP: CASE
+# -- reason"; a case in it that passes is a failure, so that the list stays correct. It may be given
+# more than once.
 import argparse
 import difflib
 import os
@@ -59,7 +60,7 @@ def write_cases(head, cases):
     return text.lstrip("\n") + "\n"
 
 
-# The command runs in an empty directory, without input, with the tool first on the PATH.
+# Runs the command in an empty directory, without input, with the tool first on the PATH.
 def run(command, tool):
     environment = dict(os.environ, LC_ALL="C")
     environment.pop("MAV_KQ_BOOL_EQUATION_DEBUG", None)

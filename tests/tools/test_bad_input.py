@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-# Bad input to every command that the tool's help lists: a message, the right exit status, and
-# nothing on standard output that looks like a result. With --json a refusal is the one object.
+# Bad input to every command that the tool's help lists must give a message, the right exit status,
+# and nothing on standard output that looks like a result. With --json a refusal is the only object.
 import argparse
 import json
 import os
@@ -30,9 +30,9 @@ BAD_NETLISTS = {
     "cut gzip": b"\x1f\x8b\x08\0\0\0\0\0\0\x03\x01\x02",
 }
 NAMES31 = ["v%d" % number for number in range(31)]
-COLUMNS = {"table", "init", "kmap", "explain", "match"}  # no more than 30 inputs
-OWN_INPUTS = {"permute"}  # always lists A and B, by an option of its own
-ONE_TABLE = {"minimize"}  # lines make one answer, so the first bad one ends it
+COLUMNS = {"table", "init", "kmap", "explain", "match"}  # at most 30 inputs
+OWN_INPUTS = {"permute"}  # always lists A and B, by its own option
+ONE_TABLE = {"minimize"}  # all lines give one answer, so the first bad line ends it
 
 
 class Checker:
@@ -81,12 +81,12 @@ def check_texts(checker, command):
                        (b"\x80\xff\x01", "binary"), ("(" * 100000 + "A", "huge"),
                        ("A" * 100000 + " B", "a huge name"), ("%n %s {}", "formats")):
         checker.refuses(command, text, what)
-    if command not in OWN_INPUTS | {"match"}:  # which names the inputs A, B, C itself
+    if command not in OWN_INPUTS | {"match"}:  # match names the inputs A, B, C itself
         checker.refuses(command, "0x8", "an init value without inputs")
     for text, what in (("0x88", "wrong width"), ("0b1", "too narrow"), ("0x8g", "no digit"),
                        ("0 | A", "an expression that begins with 0")):
         if command == "match" and what in ("wrong width", "too narrow"):
-            continue  # inputs that do not fit are lettered
+            continue  # inputs that do not fit are named by letters
         checker.refuses(command, text, what,
                         [] if command in OWN_INPUTS else ["--inputs", "A,B"])
     if command in COLUMNS:
@@ -148,7 +148,7 @@ def listed_commands(tool):
 
 
 def check_netlists(checker, command):
-    """Files that are not netlists: a message with the file's name, or one object."""
+    """Files that are not netlists give a message with the file's name, or one object."""
     with tempfile.TemporaryDirectory() as directory:
         with open(os.path.join(directory, "good.blif"), "wb") as file:
             file.write(GOOD_NETLIST)
@@ -177,7 +177,7 @@ def main():
     parser.add_argument("--tool", required=True)
     tool = os.path.abspath(parser.parse_args().tool)
     checker = Checker(tool)
-    # These read no equation.
+    # These commands do not read an equation.
     commands = [name for name in listed_commands(tool) if name not in ("batch", "netlist")]
     for command in NETLIST_WORDS:
         check_netlists(checker, command)

@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
-# Clauses and proofs that the tool writes: the checker of tests/decide accepts the proof of every
-# random equation that is never 1, and refuses it for clauses that something satisfies.
+# Clauses and proofs that the tool writes: the checker of tests/decide must accept the proof of
+# every random equation that is never 1, and refuse it for satisfiable clauses.
 import argparse
 import pathlib
 import random
@@ -12,7 +12,7 @@ NO, YES = 1, 0 # exit statuses of 'sat'
 
 
 def pigeons(holes):
-    """One pigeon more than holes, each in a hole and no two in one: never 1, and out of reach for
+    """One more pigeon than holes, each in a hole and no two in the same: never 1, and too hard for
     any solver from a dozen holes on."""
     seats = [" | ".join(f"p{pigeon}_{hole}" for hole in range(holes))
              for pigeon in range(holes + 1)]
@@ -22,7 +22,7 @@ def pigeons(holes):
 
 
 def random_clauses(rng):
-    """Three literals each, as many as make both answers common."""
+    """Random clauses of three literals, in a number that makes both answers common."""
     inputs = rng.randrange(8, 24)
     return " & ".join(
         "(" + " | ".join(rng.choice(["", "~"]) + f"v{name}"
@@ -66,7 +66,8 @@ def main():
             checked = run(options.checker, clauses, proof)
             assert checked.returncode == 0, (text, checked.stdout)
             num_proved += 1
-            # The last clause is the demand: the others describe gates, and any input satisfies them.
+            # The last clause demands the result; the others describe gates and are satisfied for
+            # any input.
             clauses.write_text(without_last_clause(clauses.read_text()))
             checked = run(options.checker, clauses, proof)
             assert checked.returncode == 1 and checked.stdout.startswith("refused: "), checked

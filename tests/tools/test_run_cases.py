@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-# The runner itself: whatever differs from what a case expects makes it fail.
+# The runner itself: any difference from what a case expects must make it fail.
 import contextlib
 import io
 import sys

@@ -1,6 +1,6 @@
 #!/usr/bin/env python3
 # Random texts, init values and odd names: every command of the tool, and with --python every member
-# of the module that is on the path, reports the inputs and the column that the library itself has.
+# of the module on the path, must report the inputs and the column of the library itself.
 import argparse
 import io
 import json
@@ -31,17 +31,17 @@ def random_text(rng):
 
 
 class Group:
-    """Texts that are read over one list of inputs, and what the library says of each."""
+    """Texts that are read over one list of inputs, and the library's answer for each."""
 
     def __init__(self, rng, helper):
         self.inputs = rng.sample(NAMES, rng.randrange(1, 5)) if rng.random() < 0.8 else None
         flags = ["--lsb-first", "--reverse"]
         self.flags = rng.sample(flags, rng.randrange(0, 3)) if self.inputs else []
         self.texts = [random_text(rng) for _ in range(12)]
-        # One digit over one input is read by tool and module alone.
+        # Only tool and module read one digit over one input.
         if self.inputs and len(self.inputs) == 1:
             self.texts = [text for text in self.texts if not (text[:1] == "0" and len(text) == 3)]
-        if self.inputs: # one init value of each width that may fit
+        if self.inputs: # an init value of each width that may fit
             for width in range(1, 7):
                 self.texts.append("0b" + "".join(rng.choice("01") for _ in range(1 << width)))
         listed = ["--inputs", *self.inputs] if self.inputs else []
@@ -66,7 +66,7 @@ def run(command, lines):
     return done.stdout.splitlines()
 
 
-# What the answer of a command says of inputs and column, as far as it does.
+# What the answer of a command says about inputs and column, if it does.
 def reported(command, result):
     if command == "kmap":
         return result["row_inputs"] + result["column_inputs"], None
@@ -87,7 +87,7 @@ def column_of(known):
     return int(known[0], 16) if known[0] != "-" else None
 
 
-# The rows that any cube has, as an init value; None without inputs.
+# The rows in any of the cubes, as an init value; None without inputs.
 def ones_of(cubes, num_inputs):
     if num_inputs == 0:
         return None
@@ -125,7 +125,7 @@ def compare_commands(tool, group, comparison):
             known = group.known[index]
             is_init = text[:2] in ("0x", "0b")
             if known is None and command == "match" and is_init:
-                continue # inputs that nobody named for it get letters there
+                continue # without listed inputs it names them by letters
             if known is None:
                 comparison.expect("refused", answer["status"], *where)
                 continue
@@ -135,7 +135,7 @@ def compare_commands(tool, group, comparison):
             if command == "tree":
                 continue
             names, column = reported(command, answer["result"])
-            if command == "sat": # the first row that is 1, found by rows and not by columns
+            if command == "sat": # the first row that is 1, found without the column
                 value = column_of(known)
                 if value is not None:
                     comparison.expect((value & -value).bit_length() - 1 if value else None,
@@ -160,7 +160,7 @@ def compare_values(tool, group, comparison):
                           group.texts[index], values)
 
 
-# The lines of a file are outputs of one table for 'minimize', so it gets one text at a time.
+# For 'minimize' the lines of a file are outputs of one table, so it gets one text at a time.
 def compare_minimize(tool, group, comparison):
     for index, known in enumerate(group.known):
         where = ("minimize", group.options(), group.texts[index])
@@ -174,8 +174,8 @@ def compare_minimize(tool, group, comparison):
         comparison.expect(column_of(known), ones_of(answer["result"]["cubes"], len(names)), *where)
 
 
-# The columns as look-up tables of a file of gates, where a pin takes a net in place of a name; and
-# for each output its nets and its value.
+# The columns as look-up tables of a netlist, in which pins have nets instead of names; and for each
+# output its nets and its value.
 def netlist_of(group):
     gates, expected = [], {}
     for index, known in enumerate(group.known):
@@ -206,7 +206,7 @@ def compare_netlist(tool, group, comparison):
 
 
 def compare_batch(tool, group, comparison):
-    if group.flags or not group.inputs: # the table has neither
+    if group.flags or not group.inputs: # a table has neither
         return
     rows = [{"inputs": group.inputs, "init" if text[:2] in ("0x", "0b") else "equation": text}
             for text in group.texts]
@@ -253,7 +253,7 @@ def compare_netlist_members(group, comparison):
 
 def compare_members(group, comparison):
     import booleq
-    if "--reverse" in group.flags: # which the module does not have
+    if "--reverse" in group.flags: # the module has no such option
         return
     for index, text in enumerate(group.texts):
         where = ("Equation", group.options(), text)

@@ -1,12 +1,12 @@
 #!/usr/bin/env python3
-"""What 'netlist check --sarif' writes is SARIF 2.1.0, and says what the tool says.
+"""Checks that 'netlist check --sarif' writes valid SARIF 2.1.0 that agrees with the tool's lines.
 
 usage: test_sarif.py --tool BOOLEQ
 
-sarif.schema.json beside this file is the part of the standard's schema for the objects that the tool
-writes, as the schema itself cannot be had from Debian. It is compared with Debian's Python classes of
-the standard's objects, which were made from the whole schema: no property is made up, none that is
-required is left out.
+sarif.schema.json next to this file is the part of the standard's schema for the objects that the
+tool writes, because Debian does not provide the schema itself. It is compared with Debian's Python
+classes for the standard's objects, which were made from the whole schema: every property must exist
+there, and none that is required may be missing.
 """
 import argparse
 import json

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-# On a terminal long work says how far it is and can be interrupted; elsewhere nothing is said.
+# On a terminal, long work shows its progress and can be interrupted; elsewhere it shows nothing.
 import argparse
 import os
 import pty
@@ -25,7 +25,7 @@ def read_until(descriptor, wanted):
             continue
         try:
             piece = os.read(descriptor, 4096)
-        except OSError:  # the other side has gone
+        except OSError:  # the other side is closed
             break
         if not piece:
             break
@@ -34,7 +34,7 @@ def read_until(descriptor, wanted):
 
 
 def heed_interrupts():
-    """A shell's background job starts with them ignored, and so the tool would leave it."""
+    """A shell's background job starts with them ignored, and the tool would leave them so."""
     signal.signal(signal.SIGINT, signal.SIG_DFL)
 
 
@@ -54,7 +54,7 @@ def check_terminal(tool):
 
 
 def check_search(tool):
-    """A search that would take for ever says that it lives, and ends when it is told to."""
+    """An endless search shows progress, and ends when it is interrupted."""
     numbers = random.Random(1)
     rows = [f"{row:011b} " + "".join(numbers.choice("01-") for _ in range(8)) for row in range(2048)]
     with tempfile.NamedTemporaryFile("w", suffix=".pla") as file:
@@ -77,13 +77,13 @@ def check_search(tool):
 
 
 def check_wiped(tool):
-    """What was shown is gone at the end."""
+    """The progress line is erased at the end."""
     terminal, side = pty.openpty()
     words = ["table", "--format", "csv", "^".join(f"v{number}" for number in range(22))]
     with subprocess.Popen([tool, *words], stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
                           stderr=side) as process:
         os.close(side)
-        time.sleep(0.8)  # the pipe is full and the clock runs
+        time.sleep(0.8)  # the pipe is full while time passes
         with process.stdout:
             while process.stdout.read(1 << 20):
                 pass
@@ -102,10 +102,10 @@ def check_silence(tool):
 
 
 def searches(folder):
-    """Command lines that take longer than anybody waits."""
+    """Command lines that would take far too long."""
     hard = pigeons(14)
     inputs = ["--inputs", ",".join(f"i{k}" for k in range(16))]
-    # Here both groups are never 1, and whether they are is what has to be decided.
+    # Here both groups are never 1, and that is what has to be decided.
     grouped = f"({hard}) | ({hard.replace('p', 'q')}) & ({hard.replace('p', 'r')})"
     rng = random.Random(1)
     lines = os.path.join(folder, "lines")
@@ -127,7 +127,7 @@ def check_searches(tool, has_solver):
     longest = 0
     with tempfile.TemporaryDirectory() as folder:
         by_solver, over_lines = searches(folder)
-        if not has_solver: # which gives up at once
+        if not has_solver: # without a solver it gives up at once
             by_solver = []
         for words in by_solver + over_lines:
             terminal, side = pty.openpty()
@@ -143,7 +143,7 @@ def check_searches(tool, has_solver):
                 seen = read_until(terminal, b"not complete")
                 assert b"booleq: interrupted, the output is not complete" in seen, words[0]
             os.close(terminal)
-        # Without a terminal nothing is said, and the end is the same.
+        # Without a terminal nothing is shown, and the end is the same.
         for words in by_solver:
             with started(tool, words, subprocess.PIPE) as process:
                 time.sleep(1.2)
@@ -151,8 +151,8 @@ def check_searches(tool, has_solver):
                 said = process.stderr.read()
                 assert process.wait(TIMEOUT_SECONDS) == -signal.SIGINT, words[0]
             assert said == b"\nbooleq: interrupted, the output is not complete\n", said
-    # A tenth of a second is what is promised, and a thousandth what is measured; a machine that
-    # does other things too has its own time.
+    # A tenth of a second is promised, and a thousandth is measured; the limit allows for a busy
+    # machine.
     assert longest < 1, longest
     return longest
 

@@ -1,4 +1,4 @@
-// The packed result column and its kernels, each by name, against evaluation node by node; and the
+// The packed result column and its kernels, each by name, against evaluation node by node; also the
 // program that they run.
 #include <algorithm>
 #include <cstdlib>
@@ -24,7 +24,7 @@ std::vector<String> Names(unsigned int numVariables)
 
 Engine MakeEngine(const std::string& text, unsigned int numVariables)
 {
-    // Over listed inputs a text that starts with a 0 is an init value, or refused.
+    // Over listed inputs a text that starts with 0 is an init value or is refused.
     const std::string guarded =
         text.compare(0, 2, "0 ") == 0 || text == "0" ? "(" + text + ")" : text;
     Engine engine;
@@ -42,7 +42,7 @@ unsigned int EvalRow(const Node& root, Table& table, uint64_t row)
     return root.Eval(table);
 }
 
-// Compares all rows, or some thousand of them where there are more.
+// Compares all rows, or some thousand of them if there are more.
 void ExpectColumn(const Engine& engine, const std::vector<uint64_t>& words, const std::string& what)
 {
     Table table = engine.GetVariables();
@@ -70,7 +70,7 @@ std::string RandomOperand(std::mt19937& random, unsigned int numVariables)
     return (random() % 4 == 0 ? "~x" : "x") + std::to_string(random() % numVariables);
 }
 
-// A text without groups, from the left.
+// A text without groups, grouped from the left.
 std::string RandomChain(std::mt19937& random, unsigned int numVariables, unsigned int numOperators)
 {
     std::string text = RandomOperand(random, numVariables);
@@ -126,7 +126,7 @@ TEST(Column, FewVariablesAreOneWord)
     }
 }
 
-// A block that is met again is copied only while it is small.
+// A repeated block is copied only if it is small.
 TEST(Column, LargeBlocksThatAreMetAgain)
 {
     std::string rest = "x21";
@@ -136,7 +136,7 @@ TEST(Column, LargeBlocksThatAreMetAgain)
     ExpectColumn(engine, WholeColumn(engine), rest);
 }
 
-// A program that stays long while variables are fixed: what is left of it is given up in between.
+// A program that stays long while variables are fixed: remainders are discarded in between.
 TEST(Column, LongProgramsOverManyVariables)
 {
     std::mt19937 random(20268);
@@ -230,12 +230,12 @@ TEST(Column, ManyTermsOverFewVariables)
         value += "0123456789abcdef"[random() % 16];
     const Engine engine = MakeEngine(value, 10);
     ExpectColumn(engine, WholeColumn(engine), value);
-    // The same terms in an order that shares nothing.
+    // The same terms, in an order that shares nothing.
     const std::string text = RandomChain(random, 12, 5000);
     ExpectColumn(MakeEngine(text, 12), WholeColumn(MakeEngine(text, 12)), "5000 operators");
 }
 
-// What fixing a variable leaves is kept while there is room; these leave more.
+// Remainders after fixing a variable are kept while there is room; these programs leave more.
 TEST(Column, ManyOperatorsOverManyVariables)
 {
     std::mt19937 random(20268);
@@ -243,7 +243,7 @@ TEST(Column, ManyOperatorsOverManyVariables)
     ExpectColumn(engine, WholeColumn(engine), "2500 operators");
 }
 
-// Blocks too large to be copied: each half of x0 ^ ... is the complement of the other.
+// Blocks that are too large to copy: each half of x0 ^ ... is the complement of the other.
 TEST(Column, LargestBlocksAreExpandedAgain)
 {
     std::string text = "x0";
@@ -271,7 +271,7 @@ TEST(Column, DeepTreesOfEitherSideNeedLittle)
     }
 }
 
-// A kernel against the plain one, word by word, on programs and blocks of several sizes.
+// Each kernel against the plain one, word by word, on programs and blocks of several sizes.
 TEST(Column, EveryKernelGivesWhatThePlainOneGives)
 {
     size_t numKernels = 0;
@@ -294,7 +294,7 @@ TEST(Column, EveryKernelGivesWhatThePlainOneGives)
             if (program.numCodes == 0)
                 continue;
             std::vector<uint64_t> plain(size_t(1) << (numVariables - 6), 1);
-            const size_t shift = count % 8; // memory starts at any multiple of eight bytes
+            const size_t shift = count % 8; // memory may start at any multiple of eight bytes
             std::vector<uint64_t> words(plain.size() + shift, 2);
             kernels[0].run(program.codes.data(), program.numCodes, program.isInverted, plain.size(),
                            stack.data(), plain.data());
@@ -328,8 +328,8 @@ TEST(Column, AKernelIsChosenByNameAndOtherwiseTheFastestOneIs)
     EXPECT_EQ(&KqChooseKernel(std::getenv("MAV_KQ_BOOL_EQUATION_KERNEL")), &KqGetKernel());
 }
 
-// Blocks made by joins against the plain kernel, with the joins of each processor by name; trees in
-// which every operand has few variables, so that joins are taken.
+// Blocks made by joins against the plain kernel, with each processor's joins by name. In these
+// trees every operand has few variables, so that joins are used.
 TEST(Column, JoinsOfEveryKernelGiveWhatThePlainKernelGives)
 {
     size_t numKernels = 0;
@@ -371,7 +371,7 @@ TEST(Column, LargeTreesAreRightWhereverTheirBlocksComeFrom)
         const Engine engine = MakeEngine(text, numVariables);
         const std::vector<uint64_t> words = WholeColumn(engine);
         ExpectColumn(engine, words, text);
-        // In pieces, as texts are written.
+        // In pieces, as for writing texts.
         KqColumn column(engine.GetRoot(), numVariables);
         std::vector<uint64_t> piece(2048);
         for (uint64_t first = words.size(); first > 0; first -= piece.size()) {
@@ -399,7 +399,7 @@ TEST(Program, HasNeitherGroupsNorConstants)
     EXPECT_EQ(3u, KqVariableOf(reversed.codes[0]));
 }
 
-// Evaluation a second and third time runs the program.
+// The second and third evaluation run the program.
 TEST(Program, EvaluatesAsTheNodesDo)
 {
     std::mt19937 random(20266);

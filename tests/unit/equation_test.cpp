@@ -65,7 +65,8 @@ TEST(Equation, ExpressionStartsItsVariablesAtZeroInOrderOfTheText)
 
 TEST(Equation, VariablesFollowTheTextWhereTheTreeDoesNot)
 {
-    // "Z" is written first but hangs right of the operator that closes over an empty group.
+    // "Z" is written first but is the right operand of the operator that closes over an empty
+    // group.
     Engine engine;
     ASSERT_TRUE(engine.SetEquation("() Z & Y"));
     EXPECT_EQ("Z0 Y0", VariablesOf(engine));
@@ -117,7 +118,7 @@ TEST(Equation, ClearOfACopyLeavesTheOthers)
     EXPECT_EQ(0u, a.Eval());
 }
 
-// References into the variable list stay good.
+// References into the variable list stay valid.
 TEST(Equation, AssignmentToItselfMovesNothing)
 {
     Engine engine;

@@ -67,7 +67,7 @@ TEST(InitValue, DebugModeGivesTheSameDigits)
 
 TEST(InitValue, ConstantsHaveNoDigitsOfTheirOwn)
 {
-    // Deliberate: the constant 1 as well, and no digit at all in the binary form.
+    // Deliberate: also for the constant 1, and without any digit in the binary form.
     for (const char* text : {"0", "1"}) {
         EXPECT_EQ("0x0", HexOf(text));
         EXPECT_EQ("0b", BinaryOf(text));
@@ -146,7 +146,7 @@ struct ReadRow {
     const char* value;
     bool termOrderFlag;
     bool reverseTerms;
-    const char* expression; // null when refused
+    const char* expression; // null if refused
     const char* binary;
 };
 
@@ -204,7 +204,8 @@ TEST(InitValue, LenientNamesAreReadAsTheTextTheyProduce)
     Engine engine;
     ASSERT_TRUE(engine.SetEquationWithExplicitTerms({"'a'+b"}, "0b10", false, false));
     EXPECT_EQ("'a'+b0 'a'0 b0", VariablesOf(engine));
-    // One "1" and one "0" are a tie: the product of sums, whose one term is the name as it is.
+    // One "1" and one "0" are a tie, which gives the product of sums; its only term is the name
+    // itself.
     EXPECT_EQ("('a'+b)", Std(engine.GetEquationAlt2(false)));
     EXPECT_FALSE(engine.SetEquationWithExplicitTerms({"'a'b"}, "0b10", false, false));
     EXPECT_EQ(0u, engine.GetNumVariables());

@@ -1,5 +1,5 @@
-// Texts far beyond the ordinary: deep, long and wide ones are set, evaluated, rendered, compared,
-// copied and freed on an ordinary stack.
+// Extreme texts: deep, long and wide ones are set, evaluated, rendered, compared, copied and freed
+// on an ordinary stack.
 #include <string_view>
 
 #include <gtest/gtest.h>
@@ -10,7 +10,7 @@ namespace {
 
 constexpr size_t kMillion = 1000000;
 
-// 'piece' repeated, in time with the result's length.
+// 'piece' repeated, in time linear in the result's length.
 std::string Repeat(const std::string& piece, size_t count)
 {
     std::string text;
@@ -20,7 +20,7 @@ std::string Repeat(const std::string& piece, size_t count)
     return text;
 }
 
-// Sets 'text', asks for everything that works on a large equation and compares with what is known.
+// Sets 'text', asks everything that works on a large equation, and compares with known answers.
 void ExpectLarge(const std::string& text, unsigned int value, const std::string& rendered)
 {
     Engine engine;
@@ -124,7 +124,7 @@ TEST(Large, HundredThousandNames)
 
 TEST(Large, DumpOfADeepTreeDoesNotRecurse)
 {
-    // The names on each line grow with the depth, so the tree is not larger.
+    // The path names on each line grow with the depth, so the tree is kept small.
     Engine engine;
     ASSERT_TRUE(engine.SetEquation((Repeat("~", 1500) + "A").c_str()));
     Messages messages;
@@ -160,7 +160,7 @@ TEST(Large, ThirtyInputsHaveAnInitValueAndThirtyOneHaveNone)
     const String value = engine.GetEquationAsHexInitValue(false);
     ASSERT_EQ(2 + (size_t(1) << 28), value.length());
     EXPECT_EQ("0x8", std::string(value.c_str(), 3));
-    EXPECT_EQ(2u, std::string_view(value.c_str()).find_last_not_of('0')); // zeros after it
+    EXPECT_EQ(2u, std::string_view(value.c_str()).find_last_not_of('0')); // only zeros follow
     engine.DefineVariable("v30", 0);
     EXPECT_EQ("0x0", Std(engine.GetEquationAsHexInitValue(false)));
     EXPECT_EQ("0b", Std(engine.GetEquationAsBinaryInitValue()));
@@ -184,7 +184,7 @@ TEST(Large, InitValueOfManyRowsNeedsNoTree)
         EXPECT_EQ(0u, engine.Eval());
         engine.SetVariable(termOrderFlag ? "v2" : "v21", 1);
         EXPECT_EQ(1u, engine.Eval()) << "row 6 has a digit of its own";
-        // Two "+" between three terms; in the first term every name is negated.
+        // There are two "+" between three terms; in the first term every name is negated.
         const Kq_BoolEquation::Handle handle = engine.GetVariableHandle("v0");
         const std::vector<unsigned int> positions(handle.begin(), handle.end());
         EXPECT_EQ((std::vector<unsigned int>{0, 28, 28 + 73, 28 + 73 + 71 - 1}), positions);

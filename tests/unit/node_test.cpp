@@ -153,7 +153,7 @@ TEST(Node, TopParentOfARootIsTheRoot)
 
 TEST(Node, TopParentEndsInACircle)
 {
-    // A long way into a circle whose one false link is its last.
+    // A long way into a circle whose only false link is its last.
     std::vector<Node> nodes(1000);
     for (size_t index = 0; index + 1 < nodes.size(); ++index) {
         nodes[index].SetParent(&nodes[index + 1]);
@@ -163,7 +163,7 @@ TEST(Node, TopParentEndsInACircle)
         nodes.back().SetParent(&nodes[target]);
         EXPECT_EQ(&nodes.back(), nodes[0].GetTopParent()) << target;
     }
-    // A circle of true links is not a tree; the walk ends all the same.
+    // A circle of true links is not a tree, but the walk still ends.
     nodes.back().SetParent(&nodes[0]);
     nodes[0].SetRightChild(&nodes.back());
     EXPECT_NE(nullptr, nodes[0].GetTopParent());

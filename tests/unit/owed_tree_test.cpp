@@ -1,5 +1,5 @@
-// An init value's tree is made when somebody asks for it; nobody can tell that it was not there.
-// The tree made at once, in debug mode through the expression's text, is what it must equal.
+// An init value's tree is made on demand, which callers cannot notice. It must equal the tree that
+// is made at once in debug mode, from the expression's text.
 #include <gtest/gtest.h>
 
 #include <random>
@@ -33,7 +33,7 @@ std::string DumpOf(const Engine& engine)
     return messages.Text();
 }
 
-// Sets it with the tree made at once.
+// Sets the text with its tree made at once.
 void SetAtOnce(Engine& engine, const std::vector<String>& names, const String& text,
                bool termOrderFlag)
 {
@@ -113,7 +113,7 @@ TEST(OwedTree, ResultsComeFromTheDigits)
 
 TEST(OwedTree, BitsCountFromEitherEnd)
 {
-    // The result is that of digit r; with the flag on, the first name is the lowest bit of r.
+    // The result of row r is digit r; with the flag, the first name is the lowest bit of r.
     std::mt19937 random(3);
     for (size_t numNames : {2u, 5u, 6u, 7u, 12u, 13u, 16u}) {
         const size_t numRows = size_t(1) << numNames;
@@ -241,7 +241,7 @@ TEST(OwedTree, ComparesLikeATree)
 
 TEST(OwedTree, MissingRowsFollowTheForm)
 {
-    // 2^7 rows and two digits more: missing rows fill part of a word and whole words.
+    // 2^7 and two more digits over 8 names: missing rows fill part of a word and a whole word.
     for (const bool isSum : {false, true}) {
         std::string text = "0b" + std::string(130, isSum ? '0' : '1');
         text[2] = isSum ? '1' : '0';

@@ -1,6 +1,6 @@
-// What a receiver of messages may do: anything, to the very object that is written, evaluated or
-// built. What is being walked lives until the walk is over, and the switch counts message by
-// message.
+// A receiver of messages may do anything, even to the object that is being written, evaluated or
+// built. What is being walked lives until the walk is over, and the debug switch takes effect from
+// one message to the next.
 #include <functional>
 #include <memory>
 
@@ -10,7 +10,7 @@
 
 namespace {
 
-// Calls 'act' at each message while it lives, and counts them.
+// While it lives, calls 'act' for each message and counts messages.
 class Receiver {
   public:
     explicit Receiver(std::function<void(size_t)> act)
@@ -42,7 +42,7 @@ void SwitchOff(size_t)
     Engine::SetInternalDebugMode(false);
 }
 
-// What 'use' writes with nobody interfering.
+// What 'use' writes without interference.
 std::string WrittenBy(const std::function<void()>& use)
 {
     const DebugMode debugMode;
@@ -83,7 +83,7 @@ TEST(Receiver, SwitchesTheTraceOfATableOffAtItsFirstMessage)
     EXPECT_EQ(1u, table.GetRows()[3].GetResultValue());
 }
 
-// Ways to take the equation away from under the walk.
+// Ways to remove the equation during a walk.
 void Set(std::unique_ptr<Engine>& engine)
 {
     engine->SetEquation("Q ^ R");
@@ -116,7 +116,7 @@ TEST(Receiver, TakesAwayTheEquationThatIsEvaluated)
         const Receiver receiver([&](size_t number) {
             if (number != 0)
                 return;
-            SwitchOff(0); // so that what follows writes nothing of its own
+            SwitchOff(0); // so that the following code writes no messages
             interfere(engine);
             Engine::SetInternalDebugMode(true);
         });
@@ -166,7 +166,7 @@ TEST(Receiver, TakesAwayTheEquationThatIsBuilt)
             });
             EXPECT_FALSE(engine->SetEquation("A & ~B | C"));
             EXPECT_EQ(expected, receiver.GetText());
-            if (interfere == Set) { // what the receiver left is whole
+            if (interfere == Set) { // what the receiver left is intact
                 EXPECT_EQ("XOR(Q, R)", TreeText(engine->GetRoot()));
                 EXPECT_EQ("Q0 R0", VariablesOf(*engine));
             } else if (interfere == Clear) {
@@ -216,7 +216,7 @@ TEST(Receiver, TakesAwayTokensThatAreBuilt)
             engine->BuildTree();
             EXPECT_NE(0u, receiver.GetNumMessages());
             SwitchOff(0);
-            // The tokens are shared, so the tree is there for the other one.
+            // The tokens are shared, so the other object has the tree too.
             EXPECT_EQ(isRefused ? "-" : "AND(A, B)", TreeText(shares.GetRoot()));
         }
     }
@@ -287,7 +287,8 @@ TEST(Receiver, ChangesTheHandleTableAndRowThatAreDumped)
     }
 }
 
-// Every message's receiver is somebody else's copy at work: both builds end as they would alone.
+// The receiver of every message builds a copy of the same tokens: both builds end as they would
+// alone.
 TEST(Receiver, BuildsACopyOfTheTokensThatAreBuilt)
 {
     for (const char* text : {"A & B", "A & B C"}) {
@@ -308,7 +309,7 @@ TEST(Receiver, BuildsACopyOfTheTokensThatAreBuilt)
         }
         for (Engine* built : {&engine, &copy}) {
             EXPECT_EQ(isRefused ? "-" : "AND(A, B)", TreeText(built->GetRoot()));
-            built->TokenizeNodes("P"); // into a list that is empty, if the text was refused
+            built->TokenizeNodes("P"); // if the text was refused, the list is empty
             built->BuildTree();
             EXPECT_EQ(isRefused ? "P" : "AND(A, B)", TreeText(built->GetRoot()));
         }

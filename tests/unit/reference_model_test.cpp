@@ -12,7 +12,7 @@ namespace {
 
 using reference::Equation;
 
-// "AND(NOT(a), LP(b, RP))"; names and constants by their token.
+// "AND(NOT(a), LP(b, RP))"; names and constants are shown as their token.
 std::string Tree(const reference::Store& store, int index)
 {
     const reference::Node& node = store.nodes[static_cast<size_t>(index)];
@@ -108,7 +108,7 @@ TEST_F(ReferenceModel, TokenizesEverySpelling)
     };
     for (const Row& row : rows) {
         std::string expected = row.expected;
-        // Constants are typed "0" and "1" in type names.
+        // In type names the constants are "0" and "1".
         for (size_t at; (at = expected.find("ONE:")) != std::string::npos;)
             expected.replace(at, 4, "1:");
         for (size_t at; (at = expected.find("ZERO:")) != std::string::npos;)

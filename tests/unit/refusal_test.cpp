@@ -1,5 +1,5 @@
-// Why and where a text is refused: exact places, and for every short sequence of tokens that what
-// is said is true of the tokens there.
+// Why and where a text is refused: exact places; and for every short sequence of tokens, that the
+// reason given is true of the tokens there.
 #include <gtest/gtest.h>
 
 #include "unit_support.h"
@@ -8,7 +8,7 @@ namespace {
 
 typedef Kq_BoolEquation::Refusal Refusal;
 
-// "code offset length", or nothing for an accepted text.
+// "code offset length", or "" for an accepted text.
 std::string RefusalText(const Refusal& refusal)
 {
     if (refusal.code == Refusal::NONE)
@@ -130,7 +130,7 @@ bool IsTrue(const Refusal& refusal, const std::string& tokens)
     }
 }
 
-// A ")" too many by mere counting, or a "(" that is not closed.
+// Whether, by counting alone, a ")" is too many or a "(" is not closed.
 bool IsCountTrue(const Refusal& refusal, const std::string& tokens)
 {
     int open = 0;

@@ -51,7 +51,7 @@ TEST(Render, WithoutBlanksNothingStandsBetweenTokens)
     EXPECT_EQ("a&~b", Std(engine.GetEquation(false)));
     EXPECT_EQ("a*~b", Std(engine.GetEquationAlt2(false)));
     EXPECT_EQ("a.AND.~b", Std(engine.GetEquationAlt3(false)));
-    // Deliberate: a negated operator closes up to another token.
+    // Deliberate: without blanks, a negated operator becomes a different token.
     ASSERT_TRUE(engine.SetEquation("a ~ & b"));
     EXPECT_EQ("a~*b", Std(engine.GetEquationAlt2(false)));
 }

@@ -1,4 +1,4 @@
-// Text to tokens: every spelling, what is skipped, what is refused.
+// Text to tokens: every spelling, what is skipped and what is refused.
 #include <cctype>
 
 #include <gtest/gtest.h>
@@ -128,7 +128,7 @@ TEST(Tokenizer, ParenthesesMustBalanceInTotal)
 {
     EXPECT_EQ("refused", TreeOf("(A"));
     EXPECT_EQ("refused", TreeOf("A)"));
-    // Balanced in total: the tokenizer lets it pass, the builder refuses it and dumps a node.
+    // Balanced in total: the tokenizer accepts it, but the builder refuses it and dumps a node.
     Messages messages;
     Engine engine;
     EXPECT_FALSE(engine.SetEquation("(A"));

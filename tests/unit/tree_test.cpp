@@ -1,4 +1,4 @@
-// Tokens to tree: grouping, negation, groups, negated operators, refusals and what they dump.
+// Tokens to tree: grouping, negation, groups, negated operators, refusals and their dumps.
 #include <gtest/gtest.h>
 
 #include "unit_support.h"
@@ -100,7 +100,7 @@ TEST(Tree, NegatedOperatorWithoutAPlaceIsRefused)
 
 TEST(Tree, NegatedOperatorInsideAnOpenGroupTakesTheGroup)
 {
-    // The "(" itself is the operand; the ")" closes it although it now lies below the operator.
+    // The "(" itself is the operand; the ")" closes it although it is now below the operator.
     ExpectTrees({{"P & (~ | Y)", "AND(P, NOT(OR(LP(-), Y)))"}});
 }
 
@@ -137,7 +137,7 @@ TEST(Tree, RefusalDumpsTheNodeThatBrokeTheTree)
 
 TEST(Tree, FailureDumpIsWholeUpTo256Nodes)
 {
-    // n names in a row: the first one breaks the tree, with all others below it.
+    // n consecutive names: the first one breaks the tree, with all others below it.
     for (const size_t numNames : {256u, 257u, 5000u}) {
         std::string text;
         for (size_t count = 0; count < numNames; ++count)
@@ -206,7 +206,7 @@ TEST(Tree, FailureDumpIsWholeUpToOneMebibyte)
 {
     for (const size_t length : {40000u, 200000u, 2000000u}) {
         const std::string name(length, 'a');
-        std::string text; // six names in a row: the first one breaks the tree
+        std::string text; // six consecutive names: the first one breaks the tree
         for (const char* last : {"b ", "c ", "d ", "e ", "f ", "g "})
             text += name + last;
         const Messages messages;
@@ -221,13 +221,13 @@ TEST(Tree, FailureDumpIsWholeUpToOneMebibyte)
         if (isCut && dump.size() > end.size()) {
             EXPECT_EQ('\n', dump[dump.size() - end.size() - 1]);
         }
-        if (length == 200000u) { // the next line would have exceeded it
+        if (length == 200000u) { // the next line would have exceeded the limit
             EXPECT_GT(dump.size() + length, size_t(1) << 20);
         }
     }
 }
 
-// To the byte, lines for which child a node is and their indentation included.
+// Exact to the byte, including the lines that say which child a node is, and indentation.
 TEST(Tree, FailureDumpOfExactlyOneMebibyteIsWhole)
 {
     const auto dumpOf = [](size_t length) {
@@ -245,7 +245,7 @@ TEST(Tree, FailureDumpOfExactlyOneMebibyteIsWhole)
     EXPECT_EQ("NODE: ...\n", cut.substr(cut.size() - 10));
 }
 
-// A list that outlives the failure, because another object shares it, is one of loose tokens again.
+// A list that outlives the failure, because another object shares it, has loose tokens again.
 TEST(Tree, ListThatFailedCanBeBuiltAgain)
 {
     Engine first;

@@ -1,4 +1,4 @@
-// Truth tables: rows, names, comparison, what has none.
+// Truth tables: rows, names, comparison, and equations without one.
 #include <gtest/gtest.h>
 
 #include <stdexcept>
@@ -217,7 +217,7 @@ TEST(TruthTable, ManyRowsAreWhatEvalGives)
     }
 }
 
-// The column as the library gives it must be the rows of the truth table.
+// The column that the library gives must equal the rows of the truth table.
 void ExpectColumnIsTheRows(const Engine& engine)
 {
     std::vector<uint64_t> words(3, 7);
@@ -267,7 +267,7 @@ TEST(TruthTable, ColumnIsRefusedWithoutEquationAndAboveThirtyVariables)
     EXPECT_TRUE(words.empty());
 }
 
-// An exclusive or of so many products over 'numVariables' variables that the column of 19 takes
+// An exclusive-or of so many products over 'numVariables' variables that the column for 19 takes
 // several pieces.
 std::string LongText(size_t numVariables)
 {
@@ -316,7 +316,7 @@ TEST(TruthTable, ColumnStopsWhenItIsTold)
         EXPECT_EQ(-1, left);
     }
     std::vector<uint64_t> words;
-    EXPECT_TRUE(engine.GetColumn(words)); // nothing is left over
+    EXPECT_TRUE(engine.GetColumn(words)); // nothing remains of the stopped calls
     EXPECT_EQ(size_t(1) << 14, words.size());
 }
 
@@ -345,7 +345,7 @@ TEST(TruthTable, WhatColumnAsksMayThrow)
     EXPECT_EQ(std::vector<uint64_t>(1, 0xba), words);
 }
 
-// Of few variables, of an init value's digits, of a tree in several pieces.
+// For few variables, for an init value's digits, and for a tree in several pieces.
 TEST(TruthTable, WhatColumnAsksMaySetClearOrDestroyTheEquation)
 {
     std::string wide = "x0";

@@ -1,4 +1,4 @@
-// What unit tests share: trees as text, strings to compare, messages as one text.
+// Helpers that unit tests share: trees as text, strings for comparison, messages as one text.
 #ifndef UNIT_SUPPORT_H
 #define UNIT_SUPPORT_H
 
@@ -65,7 +65,7 @@ class DebugMode {
     DebugMode& operator=(const DebugMode&) = delete;
 };
 
-// A tree as TYPE(left, right), names and constants as they are, a group as LP(content).
+// A tree as TYPE(left, right), with names and constants as they are and a group as LP(content).
 inline std::string TreeText(const Node* node)
 {
     if (!node)
@@ -80,7 +80,7 @@ inline std::string TreeText(const Node* node)
     return text + ")";
 }
 
-// The tree that a text sets, "refused" when it sets none; dumps of the refusal are swallowed.
+// The tree that a text sets, or "refused"; dumps of the refusal are discarded.
 inline std::string TreeOf(const String& equation)
 {
     const Messages messages;
@@ -90,7 +90,7 @@ inline std::string TreeOf(const String& equation)
     return !engine && engine.GetNumVariables() == 0 ? "refused" : "refused but not cleared";
 }
 
-// Names of the variables, each followed by its value: "A0 B1".
+// The names of the variables, each followed by its value: "A0 B1".
 template <class Equation>
 std::string VariablesOf(const Equation& equation)
 {

@@ -1,5 +1,5 @@
-// A program of the tiny host: answers 1 when a result, or a byte of the messages, is wrong.
-// Requires: TINY_MESSAGES names a file to write, TINY_MAV_KQ_BOOL_EQUATION_DEBUG is set.
+// A program for the tiny host: exits with 1 if a result, or a byte of the messages, is wrong.
+// Requires: TINY_MESSAGES names a file to write; TINY_MAV_KQ_BOOL_EQUATION_DEBUG is set.
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
@@ -14,7 +14,7 @@
 
 typedef Port::StringBase<char> String;
 
-// The tiny host's string has no moves and holds no standard string.
+// The tiny host's string cannot be moved and does not hold a standard string.
 static_assert(!std::is_nothrow_move_constructible<String>::value, "not the tiny host's string");
 
 static int s_numWrong = 0;
@@ -80,7 +80,7 @@ static void CheckServices()
     Expect("services", "5", std::to_string(tiny_services()));
     Expect("debug mode", "1", std::to_string(Kq_BoolEquationImp::GetInternalDebugMode()));
 
-    // A size that is not the engine's own is the host's to serve.
+    // The host serves sizes that are not the engine's.
     const int numBlocks = tiny_live_blocks();
     void* memory = Kq_BoolEquationImp::operator new(1);
     Expect("blocks", std::to_string(numBlocks + 1), std::to_string(tiny_live_blocks()));

@@ -1,4 +1,4 @@
-// The tiny host library; see its headers for what is different.
+// The tiny host library; its headers say how it differs.
 #include <port/Port_Env.h>
 #include <port/Port_Init.h>
 #include <port/Port_MsgManData.h>

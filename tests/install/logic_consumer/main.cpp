@@ -1,4 +1,4 @@
-// A program outside: uses what is installed of the second library, answers 1 when a result is
+// A program outside the build that uses the installed second library; exits with 1 if a result is
 // wrong.
 #include <cstdio>
 #include <string>

@@ -1,4 +1,4 @@
-// Environment variables that are meant for programs of this host: their names start with TINY_.
+// Environment variables for programs of this host: their names start with TINY_.
 #ifndef TINY_ENV_H
 #define TINY_ENV_H
 

@@ -1,4 +1,4 @@
-// Start-up objects that do something: each counts itself, and the one of the messages opens their
+// Start-up objects that do something: each counts itself, and the one for messages opens their
 // file, so a message that comes earlier ends the program.
 #ifndef TINY_INIT_H
 #define TINY_INIT_H

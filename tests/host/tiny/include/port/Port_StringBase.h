@@ -1,4 +1,4 @@
-// A byte string with a buffer of its own and no operation but those of the platform interface.
+// A byte string with its own buffer and only the operations of the platform interface.
 #ifndef TINY_STRINGBASE_H
 #define TINY_STRINGBASE_H
 

@@ -1,4 +1,4 @@
-// Raw memory that is counted.
+// Raw memory, with a count.
 #ifndef TINY_MALLOC_H
 #define TINY_MALLOC_H
 
@@ -7,7 +7,7 @@
 void* mav_malloc(std::size_t size);
 void mav_free(void* memory);
 
-// Blocks that were given out and not yet given back.
+// Blocks that are allocated and not yet freed.
 int tiny_live_blocks();
 
 #endif

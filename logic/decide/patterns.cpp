@@ -42,7 +42,8 @@ void Patterns::FillAimed(bool aimsAtRoot, std::vector<uint64_t>& inputs)
     if (aimsAtRoot)
         Want(m_root, {~uint64_t(0), 0});
     for (uint64_t bit = 0; !aimsAtRoot && bit < 64 && !gates.empty(); ++bit) {
-        Wish& wish = m_wishes[gates[m_random() % gates.size()]];
+        const auto place = static_cast<size_t>(m_random() % gates.size());
+        Wish& wish = m_wishes[gates[place]];
         (m_random() % 2 == 0 ? wish.one : wish.zero) |= uint64_t(1) << bit;
     }
     for (size_t place = gates.size(); place-- > 0;) {

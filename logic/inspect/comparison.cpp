@@ -39,7 +39,7 @@ std::vector<NetId> NetOrder(const PinFunction& left, const PinFunction& right,
     return order;
 }
 
-// For functions with too many unknown nets to try all assignments.
+// For functions of unknown nets alone, of which there are too many to try all assignments.
 bool IsSameInSomeOrder(const Rows& left, const Rows& right)
 {
     const unsigned int numInputs = left.NumInputs();
@@ -136,8 +136,12 @@ Comparison::Verdict Comparison::Compare(const TablePair& pair) const
         return HasRenamed(pair) ? Verdict::Renamed : Verdict::Same;
     if (left.nets.size() != right.nets.size())
         return Verdict::Different;
-    const Assignments found = FindAssignments(left, right, m_nets);
-    if (found.number > 0 || (!found.isTried && IsSameInSomeOrder(left.rows, right.rows)))
+    // A known net must be the same on both sides, so an order of all nets is no proof beside one.
+    const bool isSame =
+        IsAllUnknown(left, right, m_nets) && left.nets.size() > Assignments::kMaxNets
+            ? IsSameInSomeOrder(left.rows, right.rows)
+            : FindAssignments(left, right, m_nets, Assignments::kMaxNetsOnce).number > 0;
+    if (isSame)
         return m_are_names_gone ? Verdict::SameByOrder : Verdict::Renamed;
     return Verdict::Different;
 }

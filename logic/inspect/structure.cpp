@@ -166,14 +166,15 @@ NetFunction RightFunction(const Design& right, uint32_t table, const NetMap& net
     return Normalise(std::move(pins));
 }
 
-Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets)
+Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets,
+                            unsigned int maxNets)
 {
     Assignments found;
     const std::vector<NetId> unknownLeft = UnknownOf(left, nets, true);
     std::vector<NetId> unknownRight = UnknownOf(right, nets, false);
     if (unknownLeft.size() != unknownRight.size())
         return found;
-    if (unknownLeft.size() > Assignments::kMaxNets) {
+    if (unknownLeft.size() > maxNets) {
         found.isTried = false;
         return found;
     }
@@ -187,6 +188,12 @@ Assignments FindAssignments(const NetFunction& left, const NetFunction& right, c
             found.first.emplace_back(unknownLeft[place], unknownRight[place]);
     } while (std::next_permutation(unknownRight.begin(), unknownRight.end()));
     return found;
+}
+
+bool IsAllUnknown(const NetFunction& left, const NetFunction& right, const NetMap& nets)
+{
+    return UnknownOf(left, nets, true).size() == left.nets.size() &&
+           UnknownOf(right, nets, false).size() == right.nets.size();
 }
 
 NetPairs JoinByStructure(const Design& left, const Design& right, const Pairing& pairing,

@@ -21,13 +21,17 @@ NetFunction RightFunction(const Design& right, uint32_t table, const NetMap& net
 // How many ways there are to identify the unknown nets of one function with those of the other so
 // that the functions are equal, and the first of these ways.
 struct Assignments {
-    static constexpr unsigned int kMaxNets = 5; // more would have too many orders
+    static constexpr unsigned int kMaxNets = 5;     // more have too many orders for every round
+    static constexpr unsigned int kMaxNetsOnce = 7; // and more have too many to try at all
 
     unsigned int number = 0;                    // 2 means two or more
     std::vector<std::pair<NetId, NetId>> first; // common numbers, left and right
     bool isTried = true;                        // false: too many nets
 };
-Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets);
+Assignments FindAssignments(const NetFunction& left, const NetFunction& right, const NetMap& nets,
+                            unsigned int maxNets = Assignments::kMaxNets);
+// Whether both functions have unknown nets alone.
+bool IsAllUnknown(const NetFunction& left, const NetFunction& right, const NetMap& nets);
 
 // Joins the outputs of pairs, then, round by round, the inputs that leave only one possibility, by
 // a vote of all pairs. A net for which tables vote for different nets stays unknown unless one of

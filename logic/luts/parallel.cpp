@@ -5,7 +5,6 @@
 #include <cassert>
 #include <exception>
 #include <mutex>
-#include <system_error>
 #include <thread>
 #include <vector>
 
@@ -78,7 +77,7 @@ void RunInParts(size_t count, size_t partSize, const LutWork& work, const PartRu
                 const WatchPause pause;
                 parts.Run([] {});
             });
-    } catch (const std::system_error&) {
+    } catch (const std::exception&) { // no more threads, or no memory for one
         // The threads that did start do all parts.
     }
     parts.Run(Watch);

@@ -75,7 +75,8 @@ class RowSumSearch {
                 const size_t output = LowestBit(rest);
                 size_t degree = 0;
                 for (size_t input = 0; input < m_num_inputs; ++input)
-                    degree += m_rows.allowed[row ^ size_t(1) << input] >> output & 1;
+                    degree +=
+                        static_cast<size_t>(m_rows.allowed[row ^ size_t(1) << input] >> output & 1);
                 degrees.push_back(static_cast<uint8_t>(degree));
                 pairs.push_back(static_cast<uint32_t>(row * numOutputs + output));
                 ++starts[degree + 1];

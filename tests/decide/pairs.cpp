@@ -207,7 +207,8 @@ Expression ChangeOneOperator(const Expression& expression, std::mt19937_64& rand
     Expression changed = expression;
     if (operators.empty())
         return changed;
-    Operator& op = changed.nodes[operators[random() % (operators.size() / 2 + 1)]].op;
+    Operator& op =
+        changed.nodes[operators[static_cast<size_t>(random() % (operators.size() / 2 + 1))]].op;
     const auto first = static_cast<uint64_t>(Operator::And);
     const uint64_t old = static_cast<uint64_t>(op) - first;
     op = static_cast<Operator>(first + (old + 1 + random() % 5) % 6);

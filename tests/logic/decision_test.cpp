@@ -214,8 +214,8 @@ TEST(GateGraph, FoldsToWhatTheOperandsSay)
         }
         std::vector<uint64_t> gates = {0};
         for (int step = 0; step < 20; ++step) {
-            const size_t left = random() % edges.size();
-            const size_t right = random() % edges.size();
+            const auto left = static_cast<size_t>(random() % edges.size());
+            const auto right = static_cast<size_t>(random() % edges.size());
             const bool inverts = random() % 2 == 0;
             const uint64_t leftValue = values[left] ^ (inverts ? ~0ull : 0);
             const Edge leftEdge = InvertedIf(edges[left], inverts);

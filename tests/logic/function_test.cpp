@@ -55,7 +55,7 @@ TEST(Function, AnotherOrderOfInputsIsTheSameFunctionRowByRow)
     for (size_t numInputs = 0; numInputs <= 9; ++numInputs) {
         for (int repeat = 0; repeat < 30; ++repeat) {
             const Function function = RandomFunction(Names(numInputs), random);
-            std::vector<std::string> inputs = Names(numInputs + random() % 3);
+            std::vector<std::string> inputs = Names(numInputs + static_cast<size_t>(random() % 3));
             std::shuffle(inputs.begin(), inputs.end(), random);
             const Function other = function.Over(inputs);
             ASSERT_EQ(inputs, other.Inputs());

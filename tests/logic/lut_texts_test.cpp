@@ -19,13 +19,13 @@ TEST(LutTexts, AreThoseOfEachFunctionAndReadBack)
         const std::vector<std::string> names = Names(numInputs);
         std::vector<uint64_t> words;
         for (int count = 0; count < 60; ++count)
-            words.push_back(count % 3 == 2 ? words[random() % words.size()]
+            words.push_back(count % 3 == 2 ? words[static_cast<size_t>(random() % words.size())]
                                            : random() & RowMask(numInputs));
         std::vector<uint64_t> places(words.size());
         const LutTexts found =
             DescribeLuts(LutsOf(words, numInputs), names, places.data(), LutWork{2});
         for (size_t place = 0; place < words.size(); ++place) {
-            const LutText& text = found.texts[places[place]];
+            const LutText& text = found.texts[static_cast<size_t>(places[place])];
             const Function function(names, Rows::OfWord(numInputs, words[place]));
             const FunctionKind kind = FindKind(function);
             ASSERT_EQ(text.kind, kind.kind);

@@ -248,7 +248,8 @@ TEST(Luts, DistinctOnesAreSortedAndCounted)
         const unsigned int tableBytes = owned.luts.tableBytes;
         for (size_t place = 1; place < kCount; ++place)
             if (random() % 2 != 0)
-                std::memcpy(owned.Bytes(place), owned.Bytes(random() % place), tableBytes);
+                std::memcpy(owned.Bytes(place), owned.Bytes(static_cast<size_t>(random() % place)),
+                            tableBytes);
         std::map<Values, std::vector<size_t>> expected; // by rows, the last the most significant
         for (size_t place = 0; place < kCount; ++place) {
             Values values = owned.ValuesAt(place);

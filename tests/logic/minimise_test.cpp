@@ -71,7 +71,7 @@ Rows RandomRows(size_t numInputs, size_t numOutputs, std::mt19937_64& random)
     Rows rows(numOutputs, std::string(size_t(1) << numInputs, '0'));
     for (std::string& output : rows)
         for (char& digit : output)
-            digit = choice[random() % choice.size()];
+            digit = choice[static_cast<size_t>(random() % choice.size())];
     return rows;
 }
 
@@ -263,7 +263,7 @@ TEST(Minimise, SumsAndProductsAreRightInEveryRow)
 {
     std::mt19937_64 random(99);
     for (int round = 0; round < 60; ++round) {
-        const size_t numInputs = 2 + random() % 7;
+        const size_t numInputs = 2 + static_cast<size_t>(random() % 7);
         const Rows rows = RandomRows(numInputs, 1 + random() % 4, random);
         const Pla table = FromRows(rows, numInputs);
         SumOptions options;
@@ -286,7 +286,7 @@ TEST(Minimise, ComplementAndTautologyAgreeWithRows)
     for (int round = 0; round < 200; ++round) {
         const CubeSpace space(9, 1);
         CubeList cubes(1);
-        for (size_t count = random() % 12; count-- > 0;) {
+        for (auto count = static_cast<size_t>(random() % 12); count-- > 0;) {
             uint64_t cube = uint64_t(1) << space.OutputBit(0);
             for (size_t input = 0; input < 9; ++input)
                 cube |= (random() % 3 == 0 ? 1 + random() % 2 : 3) << (2 * input);

@@ -137,7 +137,7 @@ TEST_F(SolverProof, IsOneForRandomPairs)
         ASSERT_FALSE(CheckProof(ToDimacs(Without(cnf, cnf.numClauses - 1)), proof).isAccepted);
         // Without any other clause, the solver says whether the rest is satisfiable, and the
         // checker must agree.
-        const Cnf fewer = Without(cnf, random() % cnf.numClauses);
+        const Cnf fewer = Without(cnf, static_cast<size_t>(random() % cnf.numClauses));
         if (WriteProof(fewer, m_path, {}) != ProofEnd::Satisfiable)
             continue;
         ++numSpoilt;

@@ -63,7 +63,8 @@ TEST(RowSum, IsRightIrredundantAndOfPrimes)
     std::mt19937_64 random(4711);
     for (unsigned round = 0; round < 120; ++round) {
         const size_t numInputs = 1 + random() % 8;
-        const Pla table = Parsed(RandomTable(numInputs, 1 + random() % 5, random() % 101, random));
+        const Pla table = Parsed(RandomTable(numInputs, 1 + static_cast<size_t>(random() % 5),
+                                             static_cast<size_t>(random() % 101), random));
         ASSERT_TRUE(CanListRows(table));
         Work work;
         const bool isInverted = round % 2 != 0;

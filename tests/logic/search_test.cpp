@@ -386,8 +386,8 @@ TEST(Spectrum, IsTheSumOfItsDefinition)
                 }
                 weight += difference ? 1 : 0;
             }
-            ASSERT_EQ(spectrum[set], sum) << numInputs << " " << set;
-            ASSERT_EQ(weights[set], weight) << numInputs << " " << set;
+            ASSERT_EQ(spectrum[static_cast<size_t>(set)], sum) << numInputs << " " << set;
+            ASSERT_EQ(weights[static_cast<size_t>(set)], weight) << numInputs << " " << set;
         }
     }
 }

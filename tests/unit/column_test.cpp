@@ -49,7 +49,8 @@ void ExpectColumn(const Engine& engine, const std::vector<uint64_t>& words, cons
     const uint64_t numRows = uint64_t(1) << table.size();
     const uint64_t step = std::max<uint64_t>(1, numRows / 4096) | 1u;
     for (uint64_t row = 0; row < numRows; row += step)
-        ASSERT_EQ(EvalRow(*engine.GetRoot(), table, row), words[row / 64] >> (row % 64) & 1u)
+        ASSERT_EQ(EvalRow(*engine.GetRoot(), table, row),
+                  words[static_cast<size_t>(row / 64)] >> (row % 64) & 1u)
             << what << ", row " << row;
 }
 
@@ -218,7 +219,7 @@ TEST(Column, ThirtyVariablesInPieces)
         column.Fill(first, 64, words.data());
         const uint64_t row = random() % 4096;
         ASSERT_EQ(EvalRow(*engine.GetRoot(), table, first * 64 + row),
-                  words[row / 64] >> (row % 64) & 1u);
+                  words[static_cast<size_t>(row / 64)] >> (row % 64) & 1u);
     }
 }
 

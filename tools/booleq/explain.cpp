@@ -50,9 +50,10 @@ void PutText(const kq_logic::Function& function, const kq_logic::Explanation& ex
     } else {
         PutField(output, "expression", "none short enough was found");
     }
-    PrintRows(
-        inputs, maxRows, RowFormat::kText, [&function](uint64_t row) { return function.At(row); },
-        output);
+    const auto valueAt = [&function](uint64_t row) {
+        return function.At(static_cast<size_t>(row));
+    };
+    PrintRows(inputs, maxRows, RowFormat::kText, valueAt, output);
 }
 
 Json ToJson(const kq_logic::Function& function, const kq_logic::Explanation& explanation,

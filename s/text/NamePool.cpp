@@ -13,10 +13,12 @@ constexpr size_t kFirstSlots = 16;
 // Its address differs from process to process where the system randomises addresses.
 const char kAnchor = 0;
 
-uint64_t LoadBytes(const char* bytes, size_t length)
+// The bytes of one Word, in the machine's order.
+template <class Word>
+uint64_t Load(const char* bytes)
 {
-    uint64_t word = 0;
-    std::memcpy(&word, bytes, length);
+    Word word = 0;
+    std::memcpy(&word, bytes, sizeof word);
     return word;
 }
 
@@ -24,7 +26,7 @@ uint64_t LoadBytes(const char* bytes, size_t length)
 uint64_t LoadShort(const char* text, size_t length)
 {
     if (length >= 4)
-        return LoadBytes(text, 4) << 32 | LoadBytes(text + length - 4, 4);
+        return Load<uint32_t>(text) << 32 | Load<uint32_t>(text + length - 4);
     if (length == 0)
         return 0;
     return uint64_t(static_cast<unsigned char>(text[0])) << 16 |
@@ -51,8 +53,8 @@ uint64_t KqHashText(const char* text, size_t length)
     uint64_t hash = seed;
     const char* const lastEight = text + length - 8;
     for (; text < lastEight; text += 8)
-        hash = Mix(hash ^ LoadBytes(text, 8));
-    return Mix(hash ^ LoadBytes(lastEight, 8));
+        hash = Mix(hash ^ Load<uint64_t>(text));
+    return Mix(hash ^ Load<uint64_t>(lastEight));
 }
 
 KqNamePool::~KqNamePool()

@@ -32,10 +32,19 @@ struct OwnedLuts {
     {
         return reinterpret_cast<unsigned char*>(words.data()) + place * luts.tableBytes;
     }
-    // This machine's words have their lowest byte first.
+    // The byte that holds a row: a table is a word in this machine's order, or two of 64 bits.
+    unsigned char& ByteOf(size_t place, unsigned int row)
+    {
+        const unsigned int wordBytes = std::min(luts.tableBytes, 8u);
+        unsigned int byte = row / 8 % wordBytes;
+#if __BYTE_ORDER__ == __ORDER_BIG_ENDIAN__
+        byte = wordBytes - 1 - byte;
+#endif
+        return Bytes(place)[row / 64 * 8 + byte];
+    }
     bool At(size_t place, unsigned int row)
     {
-        return (Bytes(place)[row / 8] >> (row % 8) & 1u) != 0;
+        return (ByteOf(place, row) >> (row % 8) & 1u) != 0;
     }
     Values ValuesAt(size_t place)
     {
@@ -60,8 +69,8 @@ void Fill(OwnedLuts& owned, std::mt19937_64& random)
             bool value = random() % 2 != 0;
             if (isIdle && row % 2 != 0)
                 value = owned.At(place, row - 1);
-            owned.Bytes(place)[row / 8] = static_cast<unsigned char>(
-                owned.Bytes(place)[row / 8] | (value ? 1u << (row % 8) : 0u));
+            unsigned char& byte = owned.ByteOf(place, row);
+            byte = static_cast<unsigned char>(byte | (value ? 1u << (row % 8) : 0u));
         }
     }
 }

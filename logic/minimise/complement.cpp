@@ -11,7 +11,7 @@ namespace booleq {
 
 namespace {
 
-constexpr size_t kMaxPairsToLift = size_t(1) << 16; // beyond that only equal cubes are merged
+constexpr uint64_t kMaxPairsToLift = 1u << 16; // beyond that only equal cubes are merged
 // A complement that takes more work than this for each cube that it may have counts as too large.
 constexpr uint64_t kMaxUnitsForCube = 1u << 9;
 
@@ -151,11 +151,12 @@ class ComplementSearch {
     std::vector<uint8_t> FindContained(const CubeList& cubes, const CubeList& holders)
     {
         std::vector<uint8_t> isIn(cubes.Size(), 0);
-        if (cubes.Size() * holders.Size() > kMaxPairsToLift) {
+        const uint64_t numPairs = uint64_t(cubes.Size()) * holders.Size();
+        if (numPairs > kMaxPairsToLift) {
             FindEqual(cubes, holders, isIn);
             return isIn;
         }
-        m_work.Spend(cubes.Size() * holders.Size());
+        m_work.Spend(numPairs);
         for (size_t index = 0; index < cubes.Size(); ++index)
             isIn[index] = IsInOne(holders, cubes.At(index)) ? 1 : 0;
         return isIn;

@@ -150,7 +150,7 @@ size_t Expander::CountAfter(const OpenCubes& others, size_t numFeasible, const u
         AppendBits((m_raised[word] | m_free[word]) & ~m_scratch[word], word, lost);
     if (lost.empty())
         return numFeasible;
-    m_work.Spend(m_feasible_blocks.size() * lost.size() / 2);
+    m_work.Spend(uint64_t(m_feasible_blocks.size()) * lost.size() / 2);
     size_t count = 0;
     for (const uint32_t block : m_feasible_blocks)
         count += CountBits(m_feasible[block] & ~AnyColumn(others.Columns().Block(block), lost));

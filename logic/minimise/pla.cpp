@@ -43,7 +43,8 @@ class MeetingSearch {
         if (left.empty() || right.empty())
             return false;
         size_t input = 0;
-        if (left.size() * right.size() <= kMaxPairsToTry || !ChooseInput(left, right, input))
+        if (uint64_t(left.size()) * right.size() <= kMaxPairsToTry ||
+            !ChooseInput(left, right, input))
             return TryPairs(left, right);
         m_is_split[input] = true;
         for (const size_t value : {0u, 1u})

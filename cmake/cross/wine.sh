@@ -9,6 +9,7 @@ libraries=$(dirname "$(x86_64-w64-mingw32-g++-posix -print-file-name=libstdc++-6
 export WINEPATH="$libraries;/usr/x86_64-w64-mingw32/lib"
 case $1 in
 --start)
+    mkdir -p -- "$WINEPREFIX"
     wineserver --persistent=300 # seconds, if nothing stops them
     exec wine wineboot --init
     ;;

@@ -10,7 +10,7 @@ export WINEPATH="$libraries;/usr/x86_64-w64-mingw32/lib"
 case $1 in
 --start)
     mkdir -p -- "$WINEPREFIX"
-    wineserver --persistent=300 # seconds, if nothing stops them
+    wineserver --persistent=300 || true # seconds; it may run already
     exec wine wineboot --init
     ;;
 --stop) exec wineserver --kill --wait ;;

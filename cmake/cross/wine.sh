@@ -10,8 +10,9 @@ export WINEPATH="$libraries;/usr/x86_64-w64-mingw32/lib"
 case $1 in
 --start)
     mkdir -p -- "$WINEPREFIX"
-    wineserver --persistent=300 || true # seconds; it may run already
-    exec wine wineboot --init
+    # What stays running must not hold the caller's output open: ctest waits for its end.
+    wineserver --persistent=300 > /dev/null 2>&1 || true # seconds; it may run already
+    exec wine wineboot --init > /dev/null 2>&1
     ;;
 --stop) exec wineserver --kill --wait ;;
 esac

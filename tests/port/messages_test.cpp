@@ -72,6 +72,7 @@ TEST_F(Messages, AreFormattedAsPrintfDoes)
 }
 
 // A wide character without a byte sequence cannot be printed; a null format prints nothing.
+#if !defined(_WIN32) // where the wide character is formatted as nothing
 TEST_F(Messages, WhatCannotBeFormattedIsNotIssued)
 {
     Port_MsgManData::setSink(Collect());
@@ -84,6 +85,7 @@ TEST_F(Messages, WhatCannotBeFormattedIsNotIssued)
     object.issueStatus("%s", "text");
     EXPECT_EQ(m_texts, std::vector<std::string>{"text"});
 }
+#endif
 
 TEST_F(Messages, NullOriginsCountAsEmpty)
 {

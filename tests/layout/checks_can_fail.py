@@ -100,10 +100,6 @@ class Includes(InCopy):
         self.append(SETTING, "const int kTable[] = {\n" + "    1,\n" * 600 + "};\n")
         self.assertEqual(self.find_new(), [])
 
-    def test_long_function(self):
-        self.append(SETTING, "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
-        self.expect(SETTING, "function of 60 lines")
-
     def test_byte_that_is_not_ascii(self):
         self.append("tools/booleq/text.cpp", "// \u00ab\n")
         self.expect("tools/booleq/text.cpp", "not plain ASCII")
@@ -111,10 +107,6 @@ class Includes(InCopy):
     def test_host_that_knows_us(self):
         self.append("port/Port_Env.cpp", "class Kq_BoolEquation;\n")
         self.expect("port/Port_Env.cpp", "knows nothing of Kq_")
-
-    def test_macro(self):
-        self.append(BUILDER, "#define MAXIMUM 5\n")
-        self.expect(BUILDER, "macro MAXIMUM")
 
     def test_file_macro(self):
         self.append(BUILDER, "const char* const kName = __FILE__;\n")
@@ -147,10 +139,6 @@ class Includes(InCopy):
     def test_header_of_the_tool_named_like_a_room_s(self):
         self.append("tools/booleq/rows.h", "")
         self.expect("tools/booleq/rows.h", "logic/column/rows.h has the same name")
-
-    def test_long_function_of_a_room(self):
-        self.append("logic/search/match.cpp", "void Long()\n{\n" + "    Step();\n" * 60 + "}\n")
-        self.expect("logic/search/match.cpp", "function of 60 lines")
 
     def test_python_module_that_uses_the_engine(self):
         self.append("python/src/reports.cpp", "#include <Kq_BoolEquationImp.h>\n")

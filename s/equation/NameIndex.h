@@ -31,12 +31,11 @@ class KqNameIndex {
     // Position of the name, or kKqNotFound.
     size_t Find(const Port::StringBase<char>& name, uint64_t hash) const
     {
+        const auto isName = [&](size_t position) { return IsAt(position, name, hash); };
         if (!m_slots.empty())
-            return m_slots[SlotOf(name, hash)];
-        size_t slot = hash % kFewSlots;
-        while (m_few[slot] != kFree && !IsAt(m_few[slot], name, hash))
-            slot = (slot + 1) % kFewSlots;
-        return m_few[slot] == kFree ? kKqNotFound : m_few[slot];
+            return m_slots[SlotOf(m_slots.data(), m_slots.size(), kKqNotFound, hash, isName)];
+        const uint8_t position = m_few[SlotOf(m_few, kFewSlots, kFree, hash, isName)];
+        return position == kFree ? kKqNotFound : position;
     }
 
     // The table's next name, which is new.  Fails: std::bad_alloc.
@@ -44,10 +43,7 @@ class KqNameIndex {
     {
         if (m_size < kInline) {
             m_first[m_size] = hash;
-            size_t slot = hash % kFewSlots;
-            while (m_few[slot] != kFree)
-                slot = (slot + 1) % kFewSlots;
-            m_few[slot] = static_cast<uint8_t>(m_size);
+            m_few[SlotOf(m_few, kFewSlots, kFree, hash, IsNone)] = static_cast<uint8_t>(m_size);
         } else {
             AddToHeap(hash);
         }
@@ -66,22 +62,25 @@ class KqNameIndex {
                KqIsNamed(m_variables[position].first, known, name.c_str(), name.length(), hash);
     }
 
-    // The slot that holds the position of the name, or the free one where it belongs.
-    size_t SlotOf(const Port::StringBase<char>& name, uint64_t hash) const
+    // For a name that is known to be new.
+    static bool IsNone(size_t /*position*/) { return false; }
+
+    // The slot of the position that 'isName' accepts, or the first free one on its way.
+    // Requires: a power of two as the number of slots, one of them free.
+    template <class Slot, class IsName>
+    static size_t SlotOf(const Slot* slots, size_t numSlots, Slot free, uint64_t hash,
+                         const IsName& isName)
     {
-        size_t slot = static_cast<size_t>(hash) & (m_slots.size() - 1);
-        while (m_slots[slot] != kKqNotFound && !IsAt(m_slots[slot], name, hash))
-            slot = (slot + 1) & (m_slots.size() - 1);
+        size_t slot = static_cast<size_t>(hash) & (numSlots - 1);
+        while (slots[slot] != free && !isName(slots[slot]))
+            slot = (slot + 1) & (numSlots - 1);
         return slot;
     }
 
-    // The slot for a name that is known to be new.
     void Place(size_t position)
     {
-        size_t slot = static_cast<size_t>(m_hashes[position]) & (m_slots.size() - 1);
-        while (m_slots[slot] != kKqNotFound)
-            slot = (slot + 1) & (m_slots.size() - 1);
-        m_slots[slot] = position;
+        m_slots[SlotOf(m_slots.data(), m_slots.size(), kKqNotFound, m_hashes[position], IsNone)] =
+            position;
     }
 
     void AddToHeap(uint64_t hash)

@@ -136,9 +136,9 @@ Comparison::Verdict Comparison::Compare(const TablePair& pair) const
         return HasRenamed(pair) ? Verdict::Renamed : Verdict::Same;
     if (left.nets.size() != right.nets.size())
         return Verdict::Different;
-    // A known net must be the same on both sides, so an order of all nets is no proof beside one.
+    // A known net must be the same on both sides, so only unknown nets may be taken in any order.
     const bool isSame =
-        IsAllUnknown(left, right, m_nets) && left.nets.size() > Assignments::kMaxNets
+        left.nets.size() > Assignments::kMaxNets && IsAllUnknown(left, right, m_nets)
             ? IsSameInSomeOrder(left.rows, right.rows)
             : FindAssignments(left, right, m_nets, Assignments::kMaxNetsOnce).number > 0;
     if (isSame)

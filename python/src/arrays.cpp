@@ -27,7 +27,7 @@ constexpr size_t kNodesLikeLookUps = 1500;    // nodes that take as long as a lo
 constexpr size_t kMaxCopiedInputs = 16;       // up to here, the column is always copied
 constexpr size_t kNoRow = static_cast<size_t>(-1);
 
-// A packed column behind a NumPy array.
+// The packed column that a NumPy array shows.
 struct Words {
     booleq::Rows rows;
 };

@@ -17,8 +17,8 @@ namespace {
 
 constexpr size_t kKeptSlots = 3000;
 
-// Guards what changes in stores that several objects may share: the list and the links while there
-// is no root, the moment in which an owed tree appears, and the watchers. Never held while memory
+// Guards what changes in stores that several objects may share: the list and the links before
+// there is a root, the moment in which an owed tree appears, and the watchers. Never held while memory
 // is allocated or freed, because that may use equations, or while a message goes out.
 std::mutex s_sharedStores;
 

@@ -18,8 +18,8 @@ namespace {
 constexpr size_t kKeptSlots = 3000;
 
 // Guards what changes in stores that several objects may share: the list and the links before
-// there is a root, the moment in which an owed tree appears, and the watchers. Never held while memory
-// is allocated or freed, because that may use equations, or while a message goes out.
+// there is a root, the moment in which an owed tree appears, and the watchers. Never held while
+// memory is allocated or freed, because that may use equations, or while a message goes out.
 std::mutex s_sharedStores;
 
 // Takes the lock while nodes are loose: once there is a root, nodes and list no longer change.

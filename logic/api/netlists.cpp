@@ -64,6 +64,7 @@ TableDifference ToPublic(const booleq::Comparison& comparison, booleq::NetEquati
 std::vector<LoneTable> LoneTables(const booleq::Design& design, const std::vector<uint32_t>& tables)
 {
     std::vector<LoneTable> lone;
+    lone.reserve(tables.size());
     for (const uint32_t table : tables)
         lone.push_back({TableName(design, table), NetName(design, design.tables[table].output),
                         WireText(design, table)});

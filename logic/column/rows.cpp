@@ -344,10 +344,11 @@ Rows PermuteInputs(Rows rows, const std::vector<unsigned int>& order)
 
 Rows ReverseInputs(Rows rows)
 {
-    for (unsigned int input = 0; input < rows.NumInputs() / 2; ++input) {
+    const unsigned int numInputs = rows.NumInputs();
+    for (unsigned int input = 0; input < numInputs / 2; ++input) {
         if (rows.Size() >= kWatchedWords)
             Watch();
-        rows = SwapInputs(std::move(rows), input, rows.NumInputs() - 1 - input);
+        rows = SwapInputs(std::move(rows), input, numInputs - 1 - input);
     }
     return rows;
 }

@@ -177,8 +177,22 @@ Edge GateGraph::And(Edge left, Edge right)
     if (IsInverted(left) && IsInverted(right) && gate.kind == GateKind::And &&
         other.kind == GateKind::And && Has(other, Inverse(gate.left)) &&
         Has(other, Inverse(gate.right)))
-        return Xor(gate.left, gate.right); // ~(a & b) & ~(~a & ~b)
+        return XorOfOperands(gate); // ~(a & b) & ~(~a & ~b)
     return FindOrAdd(GateKind::And, left, right);
+}
+
+// The exclusive OR of the operands of an AND. No folding of Xor() applies: neither operand is a
+// gate that has the other as its operand, or the AND itself would have been folded.
+Edge GateGraph::XorOfOperands(const Gate& gate)
+{
+    assert(gate.kind == GateKind::And);
+    const bool isInverted = IsInverted(gate.left) != IsInverted(gate.right);
+    const Edge left = OutputOf(GateOf(gate.left));
+    const Edge right = OutputOf(GateOf(gate.right));
+    [[maybe_unused]] const Gate& upper = m_gates[GateOf(right)];
+    assert(upper.kind == GateKind::Input || !Has(upper, left));
+    assert(upper.kind != GateKind::And || !Has(upper, Inverse(left)));
+    return InvertedIf(FindOrAdd(GateKind::Xor, left, right), isInverted);
 }
 
 Edge GateGraph::Xor(Edge left, Edge right)
@@ -219,7 +233,7 @@ Edge* GateGraph::JoinExclusive(Edge* first, Edge* last)
         Edge* const found = std::lower_bound(operand, last, Inverse(twin));
         if (found == last || *found != Inverse(twin))
             continue;
-        *operand = Xor(gate.left, gate.right);
+        *operand = XorOfOperands(gate);
         std::copy(found + 1, last, found);
         --last;
         isChanged = true;

@@ -73,6 +73,7 @@ class GateGraph {
     Edge XorOfAll(Edge* first, Edge* last);
 
   private:
+    Edge XorOfOperands(const Gate& gate);
     Edge FindOrAdd(GateKind kind, Edge left, Edge right);
     Edge* Slot(GateKind kind, Edge left, Edge right);
     Edge Find(GateKind kind, Edge left, Edge right);

@@ -128,7 +128,7 @@ bool WritesExpressions(const Target& target)
 
 std::string SpellNet(const Design& design, NetId net, const Target& target)
 {
-    const std::string name = NetName(design, net);
+    std::string name = NetName(design, net);
     if (net < kNumFixedNets)
         return ChangedName(design, net, net == kNetOpen ? "open" : "unknown");
     if (!target.notation) {

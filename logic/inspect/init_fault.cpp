@@ -99,10 +99,11 @@ std::vector<InitFault> InitFaults(unsigned int numInputs)
                           turn, turn, static_cast<int>(input)});
     }
     constexpr uint64_t kMaxDigits = 64;
-    if (numRows >= 2 * kDigitRows && numRows / kDigitRows <= kMaxDigits)
+    constexpr uint64_t kByteRows = 2 * uint64_t(kDigitRows);
+    if (numRows >= kByteRows && numRows / kDigitRows <= kMaxDigits)
         AddDigitFaults(numRows, kDigitRows, "hexadecimal digit", faults);
-    if (numRows >= 8 * kDigitRows) { // reversing two bytes would be exchanging halves
-        const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, 2 * kDigitRows); };
+    if (numRows >= 4 * kByteRows) { // reversing two bytes would be exchanging halves
+        const auto reverse = [](const Rows& rows) { return ReverseGroups(rows, kByteRows); };
         faults.push_back(
             {CauseCode::DigitsReversed, "bytes, the last one first", reverse, reverse});
     }

@@ -73,6 +73,7 @@ void DropIdleNets(PinFunction& pins)
     if (support.size() == pins.nets.size())
         return;
     std::vector<NetId> nets;
+    nets.reserve(support.size());
     for (const unsigned int input : support)
         nets.push_back(pins.nets[input]);
     pins.rows = Restrict(std::move(pins.rows), support);

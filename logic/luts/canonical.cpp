@@ -259,7 +259,7 @@ class Canonicaliser {
     const BlockTables& m_tables;
     // Of the table at hand:
     std::array<uint64_t, kMaxChoices> m_words;
-    std::array<std::array<uint16_t, 2 * kMaxBlocks>, kMaxChoices> m_leasts;
+    std::array<std::array<uint16_t, size_t(2) * kMaxBlocks>, kMaxChoices> m_leasts;
     uint64_t m_bound = 0; // the least form that the settled blocks allow
     std::array<Candidate, size_t(4) * kMaxBlocks * kMaxChoices> m_candidates;
     size_t m_num_candidates = 0;

@@ -96,6 +96,7 @@ constexpr Word LutMask(unsigned int numInputs)
 template <class Word>
 constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
 {
+    assert(low <= high);
     const unsigned int distance = (1u << high) - (1u << low);
     const auto movers = static_cast<Word>(LutPattern<Word>(low) & ~LutPattern<Word>(high));
     return DeltaSwapped(word, movers, distance);
@@ -105,6 +106,7 @@ constexpr Word SwapLutBits(Word word, unsigned int low, unsigned int high)
 template <class Word>
 constexpr Word InvertLutBit(Word word, unsigned int bit)
 {
+    assert(1u << bit < 8 * sizeof(Word));
     const Word upper = LutPattern<Word>(bit);
     return static_cast<Word>((word & upper) >> (1u << bit) | (word << (1u << bit) & upper));
 }
@@ -115,6 +117,7 @@ void WithLutWord(const LutArray& luts, const Visit& visit)
 {
     assert(HasLutShape(luts.numInputs, luts.tableBytes));
     switch (luts.tableBytes) {
+    // The branches differ in type alone. NOLINTNEXTLINE(bugprone-branch-clone)
     case 1:
         return visit(uint8_t());
     case 2:

@@ -88,6 +88,7 @@ class CoverSearch {
             return AddLast(
                 (*m_last_covers)[static_cast<size_t>(needed)][static_cast<size_t>(allowed)],
                 prefix);
+        assert(numInputs > 0); // a single row is either all or nothing
         const uint32_t input = InputOf(numInputs);
         const unsigned int numRows = 1u << (numInputs - 1); // of a half
         const uint64_t half = RowMask(numInputs - 1);

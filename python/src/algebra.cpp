@@ -93,7 +93,13 @@ Made FromNodes(const booleq::Expression& expression)
     return Read(std::move(text), expression.names, names != expression.names);
 }
 
-Made FromFunction(const booleq::Function& function);
+// Makes an init value, or a constant.  Requires: no split names.
+Made FromWholeNames(const booleq::Function& function)
+{
+    if (function.NumInputs() == 0)
+        return Read(function.At(0) ? "1" : "0", {}, false);
+    return Read(function.Hex(), function.Inputs(), true);
+}
 
 // Makes an equation of a function with split names, which may occur only in the list of inputs.
 Made FromIdleNames(const booleq::Function& function)
@@ -112,7 +118,7 @@ Made FromIdleNames(const booleq::Function& function)
     }
     if (names.size() > kMaxExpandedInputs)
         RefuseSplitName(booleq::FirstSplitName(function.Inputs()));
-    const Made whole = FromFunction({names, Restrict(function.GetRows(), places)});
+    const Made whole = FromWholeNames({names, Restrict(function.GetRows(), places)});
     booleq::Expression expression = ExpressionOf(*whole.content);
     for (booleq::Expression::Node& node : expression.nodes)
         if (node.op == booleq::Operator::Input)
@@ -124,11 +130,8 @@ Made FromIdleNames(const booleq::Function& function)
 // Makes an init value if the names of the inputs allow one.
 Made FromFunction(const booleq::Function& function)
 {
-    if (function.NumInputs() == 0)
-        return Read(function.At(0) ? "1" : "0", {}, false);
-    if (!booleq::FirstSplitName(function.Inputs()).empty())
-        return FromIdleNames(function);
-    return Read(function.Hex(), function.Inputs(), true);
+    return booleq::FirstSplitName(function.Inputs()).empty() ? FromWholeNames(function)
+                                                             : FromIdleNames(function);
 }
 
 py::object Give(const Made& made)

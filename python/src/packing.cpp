@@ -29,7 +29,7 @@ uint64_t PackBytes(const uint8_t* bytes, uint8_t& seen)
 {
     uint64_t word = 0;
     __m128i all = _mm_setzero_si128();
-    for (unsigned int part = 0; part < 4; ++part) {
+    for (size_t part = 0; part < 4; ++part) {
         const __m128i values = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + 16 * part));
         all = _mm_or_si128(all, values);
         const auto bits = static_cast<uint32_t>(_mm_movemask_epi8(_mm_slli_epi16(values, 7)));

@@ -183,6 +183,7 @@ void KqColumn::FillPiece(uint64_t firstWord, unsigned int level, uint64_t* words
 }
 
 // Calls itself through ExpandHalves, once for each variable and so at most 30 deep.
+// NOLINTNEXTLINE(misc-no-recursion)
 void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
 {
     if (rest.numCodes == 0) {
@@ -205,6 +206,7 @@ void KqColumn::Expand(const Rest& rest, unsigned int level, uint64_t* words)
     Repeat(NumWords(ownLevel), NumWords(level), words);
 }
 
+// NOLINTNEXTLINE(misc-no-recursion)
 void KqColumn::ExpandHalves(const Rest& rest, unsigned int level, uint64_t* words)
 {
     assert(level > kKernelLevel);

@@ -337,7 +337,10 @@ bool HasAllowedChildren(const Node& node)
     const Node* const right = node.GetRightChild();
     const unsigned int children = (node.GetLeftChild() ? 1u : 0u) + (right ? 2u : 0u);
     assert(node.GetType() <= Node::SENTINEL);
-    return (kAllowed.of[node.GetType()] >> children & 1u) != 0 && (!node.IsLp() || right->IsRp());
+    if ((kAllowed.of[node.GetType()] >> children & 1u) == 0)
+        return false;
+    assert(right || !node.IsLp());
+    return !node.IsLp() || right->IsRp();
 }
 
 // Checks every node; the one without a parent is the root.

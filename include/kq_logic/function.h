@@ -46,9 +46,9 @@ class KQ_EXPORT Function {
     size_t NumInputs() const { return Inputs().size(); }        // at most kMaxFunctionInputs
     size_t NumRows() const { return size_t(1) << NumInputs(); } // one without inputs
     // Requires: row < NumRows().
-    bool At(size_t row) const;
+    bool At(uint64_t row) const;
     // The value of input 'input' in row 'row'.
-    bool InputAt(size_t row, size_t input) const
+    bool InputAt(uint64_t row, size_t input) const
     {
         return (row >> (NumInputs() - 1 - input) & 1u) != 0;
     }

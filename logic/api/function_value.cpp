@@ -37,7 +37,7 @@ const std::vector<std::string>& Function::Inputs() const
     return m_imp->function.Inputs();
 }
 
-bool Function::At(size_t row) const
+bool Function::At(uint64_t row) const
 {
     return m_imp->function.At(row);
 }

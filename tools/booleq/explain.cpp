@@ -50,9 +50,7 @@ void PutText(const kq_logic::Function& function, const kq_logic::Explanation& ex
     } else {
         PutField(output, "expression", "none short enough was found");
     }
-    const auto valueAt = [&function](uint64_t row) {
-        return function.At(static_cast<size_t>(row));
-    };
+    const auto valueAt = [&function](uint64_t row) { return function.At(row); };
     PrintRows(inputs, maxRows, RowFormat::kText, valueAt, output);
 }
 

@@ -11,7 +11,7 @@ namespace {
 
 char ValueAt(const kq_logic::Function& function, const Map& map, size_t row, size_t column)
 {
-    return function.At(static_cast<size_t>(map.RowAt(row, column))) ? '1' : '0';
+    return function.At(map.RowAt(row, column)) ? '1' : '0';
 }
 
 void PutText(const kq_logic::Function& function, const Map& map, Output& output)

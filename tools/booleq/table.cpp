@@ -49,9 +49,7 @@ void PutRows(const Text& text, const Request& request, const kq_logic::Function&
     const uint64_t maxRows = request.Has("--rows") ? ParseRows(request.Get("--rows"))
                                                    : std::numeric_limits<uint64_t>::max();
     AnnounceSize(names, maxRows, format, output);
-    const auto valueAt = [&function](uint64_t row) {
-        return function.At(static_cast<size_t>(row));
-    };
+    const auto valueAt = [&function](uint64_t row) { return function.At(row); };
     if (format != RowFormat::kJson) {
         PrintRows(names, maxRows, format, valueAt, output);
         return;
